@@ -1,0 +1,153 @@
+// Where the sides of one triangle cross the sides of another.
+//
+// Points come out by side of the first triangle and along a side by distance from its start. A
+// point found is held back until the next one on the same side tells which of the two is nearer.
+
+#include <algorithm>
+#include <cmath>
+#include <cstddef>
+#include <optional>
+
+#include "vorn/GeometryUtils.h"
+
+namespace Vorn {
+
+namespace {
+
+using CrossingPoint = GeometryUtils::CrossingPoint;
+using Point = GeometryUtils::Point;
+
+struct Side {
+  Point const& start;
+  Point const& end;
+};
+
+/// The ends of the stretch that two sides of one line share.
+struct Stretch {
+  Point low;
+  Point high;
+};
+
+/// Along the axis on which the first side is longer. Nothing when the sides only lie on one line.
+std::optional<Stretch> SharedStretch(Side const& first, Side const& second) {
+  bool const isAlongX =
+      std::fabs(first.end.x - first.start.x) > std::fabs(first.end.y - first.start.y);
+  auto const along = [isAlongX](Point const& p) { return isAlongX ? p.x : p.y; };
+  double const low = std::min(along(first.start), along(first.end));
+  double const high = std::max(along(first.start), along(first.end));
+  if (low > along(second.start) && low > along(second.end)) return std::nullopt;
+  if (along(second.start) > high && along(second.end) > high) return std::nullopt;
+
+  Point ends[4] = {first.start, first.end, second.start, second.end};
+  // Exchanges of neighbours that are strictly out of order: equal ends keep their order, and the
+  // first side's come first.
+  for (int last = 3; last > 0; --last) {
+    for (int i = 0; i < last; ++i) {
+      if (along(ends[i]) > along(ends[i + 1])) std::swap(ends[i], ends[i + 1]);
+    }
+  }
+  return Stretch{ends[1], ends[2]};
+}
+
+/// Appends two records, the one nearer to the origin first; on equal distances the first one.
+template <typename Record, typename Distance2>
+void AppendByDistance(Record const& first, Record const& second, Distance2 const& distance2,
+                      std::vector<Record>* records) {
+  bool const isSecondNearer = distance2(first) > distance2(second);
+  records->push_back(isSecondNearer ? second : first);
+  records->push_back(isSecondNearer ? first : second);
+}
+
+}  // namespace
+
+bool GeometryUtils::GetCrossingPoints(Triangle const& first, int startSide, Triangle const& second,
+                                      std::vector<Point>* points) {
+  int const firstSide = (startSide % 3 + 3) % 3;
+  for (int turn = 0; turn < 3; ++turn) {
+    int const i = (firstSide + turn) % 3;
+    Point const& start = first.pts[i];
+    Point const& end = first.pts[(i + 1) % 3];
+    auto const distance2 = [&start](Point const& p) { return GetDist2(p, start); };
+    std::optional<Point> held;
+    for (int j = 0; j < 3; ++j) {
+      Point const& otherStart = second.pts[j];
+      Point const& otherEnd = second.pts[(j + 1) % 3];
+      Point found;
+      if (GetLineSegmentsIntersection(start.x, start.y, end.x, end.y, otherStart.x, otherStart.y,
+                                      otherEnd.x, otherEnd.y, &found.x,
+                                      &found.y) != SegmentsRelPosition::Intersecting) {
+        continue;
+      }
+      if (held) {
+        AppendByDistance(*held, found, distance2, points);
+        held.reset();
+      } else {
+        held = found;
+      }
+    }
+    if (held) points->push_back(*held);
+  }
+  return true;
+}
+
+void GeometryUtils::GetCrossingPoints(Triangle const& first, Triangle const& second,
+                                      std::vector<CrossingPoint>* points) {
+  for (int i = 0; i < 3; ++i) {
+    Side const side{first.pts[i], first.pts[(i + 1) % 3]};
+    auto const distance2 = [&side](CrossingPoint const& record) {
+      return GetDist2(record.pt, side.start);
+    };
+    std::size_t const begin = points->size();
+    std::optional<CrossingPoint> held;
+    for (int j = 0; j < 3; ++j) {
+      Side const other{second.pts[j], second.pts[(j + 1) % 3]};
+      CrossingPoint found{{}, i, j};
+      SegmentsRelPosition const relation = GetLineSegmentsIntersection(
+          side.start.x, side.start.y, side.end.x, side.end.y, other.start.x, other.start.y,
+          other.end.x, other.end.y, &found.pt.x, &found.pt.y);
+      if (relation == SegmentsRelPosition::Intersecting) {
+        if (held) {
+          AppendByDistance(*held, found, distance2, points);
+          held.reset();
+        } else {
+          held = found;
+        }
+      } else if (relation == SegmentsRelPosition::Collinear) {
+        if (std::optional<Stretch> const shared = SharedStretch(side, other)) {
+          AppendByDistance(CrossingPoint{shared->low, i, j}, CrossingPoint{shared->high, i, j},
+                           distance2, points);
+          // Deliberate: the ends of the stretch stand for the point that was held.
+          held.reset();
+        }
+      }
+    }
+    if (held) points->push_back(*held);
+
+    std::size_t const found = points->size() - begin;
+    if (found < 3) continue;
+    // More than a line can cross: sides that touch at vertices report them twice. Only the two
+    // points farthest apart matter.
+    std::size_t m = begin;
+    std::size_t n = begin + 1;
+    double farthest2 = GetDist2((*points)[m].pt, (*points)[n].pt);
+    for (std::size_t p = begin; p < points->size(); ++p) {
+      for (std::size_t q = p + 1; q < points->size(); ++q) {
+        double const distance = GetDist2((*points)[p].pt, (*points)[q].pt);
+        if (distance > farthest2) {
+          farthest2 = distance;
+          m = p;
+          n = q;
+        }
+      }
+    }
+    CrossingPoint fromM = (*points)[m];
+    CrossingPoint fromN = (*points)[n];
+    // Deliberate: the second record carries the first triangle's side in the place of the second's.
+    fromM.side1 = i;
+    fromN.side2 = i;
+    points->resize(begin);
+    AppendByDistance(fromM, fromN, distance2, points);
+  }
+}
+
+}  // namespace Vorn

@@ -1,0 +1,177 @@
+// The common part of two triangles, and of a triangle with a cell.
+//
+// The boundary of the overlap is walked side by side of the first triangle: at every crossing point
+// the walk changes over to the other triangle and takes up that triangle's vertices for as long as
+// they lie in the first. The order of the points, repeated ones included, decides the fan of
+// triangles that comes out, and with it the weights of a cell's centre.
+
+#include <array>
+#include <cstddef>
+
+#include "vorn/GeometryUtils.h"
+
+namespace Vorn {
+
+namespace {
+
+using CrossingPoint = GeometryUtils::CrossingPoint;
+using Point = GeometryUtils::Point;
+using PointStatus = GeometryUtils::PointStatus;
+using Triangle = GeometryUtils::Triangle;
+
+/// Where each vertex of the two triangles lies with respect to the other triangle.
+using VertexStatuses = std::array<std::array<PointStatus, 3>, 2>;
+
+bool IsInOrOn(PointStatus status) {
+  return status == PointStatus::Inside || status == PointStatus::OnSide ||
+         status == PointStatus::OnVertex;
+}
+
+int CountInOrOn(std::array<PointStatus, 3> const& statuses) {
+  int count = 0;
+  for (PointStatus const status : statuses) count += IsInOrOn(status) ? 1 : 0;
+  return count;
+}
+
+bool HasUndefined(VertexStatuses const& statuses) {
+  for (auto const& ofTriangle : statuses) {
+    for (PointStatus const status : ofTriangle) {
+      if (status == PointStatus::Undefined) return true;
+    }
+  }
+  return false;
+}
+
+/// The walk along the boundary of the overlap of two triangles whose sides cross.
+class BoundaryWalk {
+ public:
+  BoundaryWalk(std::array<Triangle, 2> const& triangles, VertexStatuses const& statuses,
+               std::vector<CrossingPoint> const& crossings)
+      : triangles_(triangles),
+        statuses_(statuses),
+        crossings_(crossings),
+        current_(statuses[0][0] == PointStatus::Outside ? 1 : 0) {}
+
+  std::vector<Point> Polygon() {
+    int side = 0;
+    std::size_t record = 0;
+    while (side < 3) {
+      if (record == crossings_.size() || crossings_[record].side1 != side) {
+        ++side;
+        continue;
+      }
+      CrossTo(crossings_[record]);
+      if (TakeVertices(crossings_[record])) {
+        record = EndOfSide(record, side);
+        ++side;
+        continue;
+      }
+      ++record;
+      if (record == crossings_.size()) continue;
+      CrossingPoint const& next = crossings_[record];
+      if (next.side1 == side) {
+        CrossTo(next);
+        TakeVertices(next);
+        ++record;
+        ++side;
+      } else if (!IsOutside((SideOf(next) + 1) % 3)) {
+        // The record stays: it is examined again under its own side, and its point may come twice.
+        CrossTo(next);
+        ++side;
+      }
+    }
+    return polygon_;
+  }
+
+ private:
+  /// The side of the triangle now followed that a crossing point lies on.
+  int SideOf(CrossingPoint const& crossing) const {
+    return current_ == 0 ? crossing.side1 : crossing.side2;
+  }
+
+  bool IsOutside(int vertex) const {
+    return statuses_[current_][static_cast<std::size_t>(vertex)] == PointStatus::Outside;
+  }
+
+  void CrossTo(CrossingPoint const& crossing) {
+    polygon_.push_back(crossing.pt);
+    current_ = 1 - current_;
+  }
+
+  /// Takes up the two vertices that follow the crossed side, as long as they are not outside the
+  /// other triangle. False when already the first one is.
+  bool TakeVertices(CrossingPoint const& crossing) {
+    int const side = SideOf(crossing);
+    int const next = (side + 1) % 3;
+    if (IsOutside(next)) return false;
+    polygon_.push_back(triangles_[current_].pts[next]);
+    int const afterNext = (side + 2) % 3;
+    if (!IsOutside(afterNext)) polygon_.push_back(triangles_[current_].pts[afterNext]);
+    return true;
+  }
+
+  std::size_t EndOfSide(std::size_t record, int side) const {
+    while (record < crossings_.size() && crossings_[record].side1 == side) ++record;
+    return record;
+  }
+
+  std::array<Triangle, 2> const& triangles_;
+  VertexStatuses const& statuses_;
+  std::vector<CrossingPoint> const& crossings_;
+  std::size_t current_;
+  std::vector<Point> polygon_;
+};
+
+}  // namespace
+
+GeometryUtils::OverlappingStatus GeometryUtils::GetOverlapping(Triangle const& first,
+                                                               Triangle const& second,
+                                                               std::vector<Triangle>* result) {
+  std::array<Triangle, 2> const triangles = {first, second};
+  VertexStatuses statuses;
+  for (std::size_t k = 0; k < 2; ++k) {
+    for (std::size_t v = 0; v < 3; ++v) {
+      statuses[k][v] = GetPointStatus(triangles[k].pts[v], triangles[1 - k]);
+    }
+  }
+  if (HasUndefined(statuses)) return OverlappingStatus::OverlapFailed;
+
+  std::vector<CrossingPoint> crossings;
+  GetCrossingPoints(triangles[0], triangles[1], &crossings);
+  if (crossings.empty()) {
+    int const firstIn = CountInOrOn(statuses[0]);
+    int const secondIn = CountInOrOn(statuses[1]);
+    if (firstIn + secondIn == 0) return OverlappingStatus::NoOverlap;
+    bool const isOneContained = firstIn + secondIn == 3 && (firstIn == 3 || secondIn == 3);
+    if (!isOneContained) return OverlappingStatus::OverlapFailed;
+    // Deliberate: three copies. They weigh in the centre of the cell and in its size.
+    result->insert(result->end(), 3, triangles[firstIn == 3 ? 0 : 1]);
+    return OverlappingStatus::Overlap;
+  }
+
+  std::vector<Point> const polygon = BoundaryWalk(triangles, statuses, crossings).Polygon();
+  if (polygon.size() < 3) return OverlappingStatus::NoOverlap;
+  std::vector<Triangle> parts;
+  if (!ConvexPolygonDivide(polygon, 0, static_cast<int>(polygon.size()), &parts)) {
+    return OverlappingStatus::OverlapFailed;
+  }
+  result->insert(result->end(), parts.begin(), parts.end());
+  return OverlappingStatus::Overlap;
+}
+
+GeometryUtils::OverlappingStatus GeometryUtils::GetOverlapping(Triangle const& first,
+                                                               std::vector<Triangle> const* cell,
+                                                               std::vector<Triangle>* result) {
+  Triangle const own = first;
+  OverlappingStatus status = OverlappingStatus::NoOverlap;
+  // By index and to the size at the start: result may be the cell itself.
+  std::size_t const size = cell->size();
+  for (std::size_t i = 0; i < size; ++i) {
+    if (GetOverlapping(own, (*cell)[i], result) == OverlappingStatus::Overlap) {
+      status = OverlappingStatus::Overlap;
+    }
+  }
+  return status;
+}
+
+}  // namespace Vorn

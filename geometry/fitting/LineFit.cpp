@@ -1,0 +1,356 @@
+// The longest run of points that one segment can follow.
+//
+// Every pair of neighbouring points allows the lines of one line cell; the lines that pass near all
+// points taken so far are the overlap of these cells. A run grows point by point while that overlap
+// is not empty and the points keep moving away from the first one. When it ends, the line at the
+// centre of the cell is measured against the points; a line that leaves a tolerance (the cell only
+// knows pairs of neighbours) sends the growth back to the start with a lower limit.
+
+#include <algorithm>
+#include <cstddef>
+#include <cstdint>
+#include <optional>
+#include <vector>
+
+#include "geometry/fitting/Runs.h"
+#include "vorn/GeometryUtils.h"
+
+namespace Vorn {
+
+using Fitting::At;
+using Fitting::ToPoint;
+
+/// One call of the line fitter.
+class LineRun {
+ public:
+  using Point = GeometryUtils::Point;
+  using Triangle = GeometryUtils::Triangle;
+  using ProgressBase = GeometryUtils::ProgressBase;
+
+  struct Ends {
+    bool startFixed;
+    Point* start;
+    bool endFixed;
+    Point* end;
+  };
+
+  struct Outputs {
+    std::int32_t* count;
+    double* deviation;
+    std::int32_t* deviationIndex;
+    std::vector<std::int32_t>* indexList;
+    ErrorCode* code;
+  };
+
+  LineRun(std::vector<WPoint> const& points, std::int32_t start, std::int32_t count,
+          Ends const& ends, bool lastAttempt, Outputs const& out, ProgressBase const& progress)
+      : points_(points),
+        start_(start),
+        limit_(count),
+        ends_(ends),
+        lastAttempt_(lastAttempt),
+        out_(out),
+        progress_(progress) {}
+
+  /// Grows, closes, and grows again with a lower limit until a run is returned. Every round lowers
+  /// the limit, and two points always are a run.
+  ErrorCode Fit() {
+    for (;;) {
+      if (limit_ <= 2) return CloseWithTwoPoints();
+      std::optional<ErrorCode> const result = GrowAndClose();
+      if (result) return *result;
+    }
+  }
+
+ private:
+  /// How a round of growth ended.
+  enum class Growth { Full, Early, TurnedBack, LowerLimit, Failed };
+
+  /// The line through the cell's centre, cut to the run, and its largest relative deviation.
+  struct Segment {
+    Point start;
+    Point end;
+    double deviation;
+    std::int32_t deviationIndex;
+  };
+
+  std::optional<ErrorCode> GrowAndClose() {
+    switch (Grow()) {
+      case Growth::Failed:
+        return ErrorCode::Failed;
+      case Growth::TurnedBack:
+        LowerLimit(taken_, true);
+        return std::nullopt;
+      case Growth::LowerLimit:
+        LowerLimit(taken_, false);
+        return std::nullopt;
+      case Growth::Early:
+        return CloseEarly();
+      case Growth::Full:
+        break;
+    }
+    return CloseFull();
+  }
+
+  void LowerLimit(std::int32_t limit, bool hasTurnedBack) {
+    limit_ = limit;
+    hasTurnedBack_ = hasTurnedBack;
+  }
+
+  /// Takes points until the limit is reached or the next one does not fit.
+  Growth Grow() {
+    WPoint const& first = At(points_, start_);
+    WPoint previous = first;
+    taken_ = 1;
+    cell_.clear();
+    while (taken_ < limit_) {
+      WPoint const& next = At(points_, start_ + taken_);
+      if (taken_ > 1 &&
+          !GeometryUtils::IsValidLineOrder(ToPoint(first), ToPoint(previous), ToPoint(next))) {
+        return Growth::TurnedBack;
+      }
+      std::vector<Triangle> pairCell;
+      if (GeometryUtils::GetLineTriangles(previous, next, &formFixed_, &xOfY_, &pairCell) !=
+          ErrorCode::Ok) {
+        // Points too close, or lines that have no parameters in this run's form: the run so far is
+        // all there is, and no later round could make a longer one.
+        return Growth::Early;
+      }
+      if (cell_.empty()) {
+        cell_ = pairCell;
+      } else if (Fitting::IsOversized(cell_, Fitting::kLineCellWeight)) {
+        Growth const rebuilt = RebuildCell(next);
+        if (rebuilt != Growth::Full) return rebuilt;
+      } else {
+        std::vector<Triangle> common = Overlap(cell_, pairCell);
+        if (common.empty()) return Growth::Early;
+        cell_.swap(common);
+      }
+      previous = next;
+      ++taken_;
+      GeometryUtils::SetProgressState(progress_, start_ + taken_ - 1);
+    }
+    return Growth::Full;
+  }
+
+  static std::vector<Triangle> Overlap(std::vector<Triangle> const& cell,
+                                       std::vector<Triangle> const& other) {
+    std::vector<Triangle> common;
+    for (Triangle const& triangle : cell) {
+      GeometryUtils::GetOverlapping(triangle, &other, &common);
+    }
+    return common;
+  }
+
+  /// Replaces an oversized cell by that of a short chain: the first point, the points that deviate
+  /// most from the chord to the next point, those that deviated most in earlier attempts, and the
+  /// next point itself. Full when the cell was rebuilt.
+  Growth RebuildCell(WPoint const& next) {
+    std::vector<std::int32_t> chain;
+    if (!GeometryUtils::GetDeviationFromLineParameters(ToPoint(At(points_, start_)), ToPoint(next),
+                                                       points_, start_ + 1, taken_ - 1, &chain)) {
+      return Growth::Failed;
+    }
+    for (std::int32_t const index : *out_.indexList) {
+      if (index > start_ && index < start_ + taken_) chain.push_back(index);
+    }
+    std::sort(chain.begin(), chain.end());
+    chain.erase(std::unique(chain.begin(), chain.end()), chain.end());
+    chain.push_back(start_ + taken_);
+
+    std::vector<Triangle> chainCell;
+    std::int32_t from = start_;
+    for (std::int32_t const to : chain) {
+      std::vector<Triangle> pairCell;
+      if (GeometryUtils::GetLineTriangles(At(points_, from), At(points_, to), &formFixed_, &xOfY_,
+                                          &pairCell) != ErrorCode::Ok) {
+        return lastAttempt_ ? Growth::LowerLimit : Growth::Failed;
+      }
+      if (from == start_) {
+        chainCell = pairCell;
+      } else {
+        chainCell = Overlap(chainCell, pairCell);
+        if (chainCell.empty()) return Growth::LowerLimit;
+      }
+      from = to;
+    }
+    cell_.swap(chainCell);
+    return Growth::Full;
+  }
+
+  std::optional<Segment> MakeSegment() const {
+    WPoint const& first = At(points_, start_);
+    WPoint const& last = At(points_, start_ + taken_ - 1);
+    Segment segment{};
+    if (!GeometryUtils::GetOptimalLineSegment(&cell_, first.x, first.y, last.x, last.y, xOfY_,
+                                              ends_.startFixed, *ends_.start, ends_.endFixed,
+                                              *ends_.end, &segment.start.x, &segment.start.y,
+                                              &segment.end.x, &segment.end.y)) {
+      return std::nullopt;
+    }
+    segment.deviation = GeometryUtils::GetMaxDeviationFromLine(
+        points_, start_, taken_, segment.start, segment.end, &segment.deviationIndex);
+    return segment;
+  }
+
+  /// Ends a run that stopped before the limit: it must be within tolerance as it stands.
+  std::optional<ErrorCode> CloseEarly() {
+    std::optional<Segment> const segment = MakeSegment();
+    if (!segment || !IsWithinTolerance(*segment)) {
+      LowerLimit(taken_ - 1, false);
+      return std::nullopt;
+    }
+    WriteOutputs(*segment);
+    out_.indexList->clear();
+    return Finish();
+  }
+
+  /// Ends a run that reached the limit. Unless this is the last attempt, a run that leaves the
+  /// tolerance is handed out as well, with the points that deviate most for the next attempt.
+  std::optional<ErrorCode> CloseFull() {
+    std::optional<Segment> const segment = MakeSegment();
+    if (!segment) {
+      LowerLimit(taken_ - 1, false);
+      return std::nullopt;
+    }
+    WriteOutputs(*segment);
+    if (IsWithinTolerance(*segment)) {
+      out_.indexList->clear();
+      return Finish();
+    }
+    if (lastAttempt_) {
+      LowerLimit(taken_ - 1, false);
+      return std::nullopt;
+    }
+    if (!GeometryUtils::GetDeviationFromLineParameters(segment->start, segment->end, points_,
+                                                       start_ + 1, taken_ - 2, out_.indexList)) {
+      return ErrorCode::Failed;
+    }
+    return Finish();
+  }
+
+  /// Two points need no cell, and deliberately no tolerance test either: the segment joins them.
+  ErrorCode CloseWithTwoPoints() {
+    *out_.count = 2;
+    if (!ends_.startFixed) *ends_.start = ToPoint(At(points_, start_));
+    if (!ends_.endFixed) *ends_.end = ToPoint(At(points_, start_ + 1));
+    *out_.deviation = GeometryUtils::GetMaxDeviationFromLine(points_, start_, 2, *ends_.start,
+                                                             *ends_.end, out_.deviationIndex);
+    out_.indexList->clear();
+    GeometryUtils::SetProgressState(progress_, start_ + 2);
+    return Finish();
+  }
+
+  /// False for a NaN.
+  static bool IsWithinTolerance(Segment const& segment) { return segment.deviation <= 1.0; }
+
+  void WriteOutputs(Segment const& segment) {
+    *out_.count = taken_;
+    *ends_.start = segment.start;
+    *ends_.end = segment.end;
+    *out_.deviation = segment.deviation;
+    *out_.deviationIndex = segment.deviationIndex;
+    GeometryUtils::SetProgressState(progress_, start_ + taken_);
+  }
+
+  ErrorCode Finish() {
+    *out_.code = hasTurnedBack_ ? ErrorCode::SelfIntersection : ErrorCode::Ok;
+    return ErrorCode::Ok;
+  }
+
+  std::vector<WPoint> const& points_;
+  std::int32_t const start_;
+  std::int32_t limit_;
+  Ends const ends_;
+  bool const lastAttempt_;
+  Outputs const out_;
+  ProgressBase const& progress_;
+
+  /// Whether the limit stands where it does because the points turned back there.
+  bool hasTurnedBack_ = false;
+  bool formFixed_ = false;
+  bool xOfY_ = false;
+  std::int32_t taken_ = 0;
+  std::vector<Triangle> cell_;
+};
+
+ErrorCode GeometryUtils::GetFittingLine(std::vector<WPoint> const& points, std::int32_t start,
+                                        std::int32_t count, bool startFixed, Point* startPoint,
+                                        bool endFixed, Point* endPoint, bool lastAttempt,
+                                        std::int32_t* lineCount, double* lineDeviation,
+                                        std::int32_t* lineDeviationIndex,
+                                        std::vector<std::int32_t>* indexList, ErrorCode* lineCode,
+                                        ProgressBase const& progress) {
+  if (count < 2 || !Fitting::HoldsRun(points, start, count)) return ErrorCode::Failed;
+  *lineCode = ErrorCode::Ok;
+  return LineRun(points, start, count, {startFixed, startPoint, endFixed, endPoint}, lastAttempt,
+                 {lineCount, lineDeviation, lineDeviationIndex, indexList, lineCode}, progress)
+      .Fit();
+}
+
+bool GeometryUtils::GetOptimalLineSegment(std::vector<Triangle> const* cell, double x1, double y1,
+                                          double x2, double y2, bool xOfY, bool startFixed,
+                                          Point startPoint, bool endFixed, Point endPoint,
+                                          double* sx, double* sy, double* ex, double* ey) {
+  Point center;
+  if (!GetCenterForLine(startFixed, startPoint, endFixed, endPoint, xOfY, cell, &center)) {
+    return false;
+  }
+  double const a = xOfY ? 1.0 : center.y;
+  double const b = xOfY ? center.y : 1.0;
+  double const c = center.x;
+  Point start = startPoint;
+  Point end = endPoint;
+  if (!startFixed && !GetNearestPointOnLine(a, b, c, {x1, y1}, &start)) return false;
+  if (!endFixed && !GetNearestPointOnLine(a, b, c, {x2, y2}, &end)) return false;
+  *sx = start.x;
+  *sy = start.y;
+  *ex = end.x;
+  *ey = end.y;
+  return true;
+}
+
+bool GeometryUtils::ReduceOverlappedTrianglesQuantityForStraightLine(
+    std::vector<WPoint> const& points, int start, int count, double /*tolerance*/,
+    std::vector<Triangle>* cell) {
+  if (count < 4 || !Fitting::HoldsRun(points, start, count)) return false;
+  WPoint const& first = At(points, start);
+  WPoint const& last = At(points, start + count - 1);
+  double smallest = 0.0;
+  double largest = 0.0;
+  int smallestAt = 0;
+  int largestAt = 0;
+  for (int i = start + 1; i < start + count; ++i) {
+    WPoint const& p = At(points, i);
+    double const coords[6] = {first.x, first.y, last.x, last.y, p.x, p.y};
+    double deviation = 0.0;
+    if (!GetDeviation(coords, &deviation)) return false;
+    if (i == start + 1 || deviation < smallest) {
+      smallest = deviation;
+      smallestAt = i;
+    }
+    if (i == start + 1 || deviation > largest) {
+      largest = deviation;
+      largestAt = i;
+    }
+  }
+  std::vector<WPoint> shortRun = {first, At(points, smallestAt)};
+  if (largestAt != smallestAt) shortRun.push_back(At(points, largestAt));
+  shortRun.push_back(last);
+  // Deliberate: the cell is emptied and stays empty; the caller rebuilds it.
+  cell->clear();
+
+  Point startPoint = ToPoint(first);
+  Point endPoint = ToPoint(last);
+  std::int32_t lineCount = 0;
+  double lineDeviation = 0.0;
+  std::int32_t lineDeviationIndex = -1;
+  std::vector<std::int32_t> indexList;
+  ErrorCode lineCode = ErrorCode::Ok;
+  ProgressBase const silent{nullptr, 100, 100};
+  return GetFittingLine(shortRun, 0, static_cast<std::int32_t>(shortRun.size()), false, &startPoint,
+                        false, &endPoint, true, &lineCount, &lineDeviation, &lineDeviationIndex,
+                        &indexList, &lineCode, silent) == ErrorCode::Ok;
+}
+
+}  // namespace Vorn
