@@ -3,25 +3,55 @@
 #include <algorithm>
 #include <cmath>
 
+#include "geometry/cells/FixedPoints.h"
+#include "geometry/cells/TriangleCentre.h"
+#include "geometry/intersections/CirclePoints.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 #include "vorn/MathUtils.h"
 
 namespace Vorn {
 
+bool Cells::ChordAcross(double const* rect, double a, double b, double c,
+                        GeometryUtils::Triangle* chord) {
+  GeometryUtils::Point const middle{(rect[0] + rect[2]) * 0.5, (rect[1] + rect[3]) * 0.5};
+  double const dx = rect[0] - middle.x;
+  double const dy = rect[1] - middle.y;
+  double const radius = std::sqrt(dy * dy + dx * dx);
+  Intersections::CirclePoints const found =
+      Intersections::CutCircleByLine(a, b, c, middle.x, middle.y, radius);
+  if (found.count == 0) return false;
+  GeometryUtils::Point const& p1 = found.pts[0];
+  GeometryUtils::Point const& p2 = found.pts[found.count - 1];
+  *chord = {{p1, p2, p2}};
+  return true;
+}
+
+bool Cells::FixedPoints::FindCandidate(double const* rect,
+                                       GeometryUtils::Triangle* candidate) const {
+  // The parameter (u, v) stands for v*x + y + u = 0, so the lines through one point form a line.
+  auto const along = [this](GeometryUtils::Point const& p) { return swapped ? p.y : p.x; };
+  auto const across = [this](GeometryUtils::Point const& p) { return swapped ? p.x : p.y; };
+  if (!hasP1 || !hasP2) {
+    GeometryUtils::Point const& p = hasP1 ? p1 : p2;
+    return ChordAcross(rect, 1.0, along(p), across(p), candidate);
+  }
+  double matrix[4] = {1.0, along(p1),  //
+                      1.0, along(p2)};
+  double rhs[2] = {-across(p1), -across(p2)};
+  double solution[2];
+  if (!MathUtils::LinearEquationSystemSolve(2, matrix, rhs, solution)) return false;
+  GeometryUtils::Point const only{solution[0], solution[1]};
+  *candidate = {{only, only, only}};
+  return true;
+}
+
 bool GeometryUtils::GetBoundingRect(std::vector<Triangle> const* cell, double* rect) {
   if (cell->empty()) return false;
   Point const& first = cell->front().pts[0];
   rect[0] = rect[2] = first.x;
   rect[1] = rect[3] = first.y;
-  for (Triangle const& triangle : *cell) {
-    for (Point const& p : triangle.pts) {
-      if (p.x < rect[0]) rect[0] = p.x;
-      if (p.y < rect[1]) rect[1] = p.y;
-      if (p.x > rect[2]) rect[2] = p.x;
-      if (p.y > rect[3]) rect[3] = p.y;
-    }
-  }
+  for (Triangle const& triangle : *cell) Cells::ExtendRect(triangle, rect);
   return true;
 }
 
@@ -29,16 +59,7 @@ bool GeometryUtils::GetBoundingCircleAndLineIntersectionTriangle(std::vector<Tri
                                                                  double a, double b, double c,
                                                                  Triangle* chord) {
   double rect[4];
-  if (!GetBoundingRect(cell, rect)) return false;
-  Point const middle{(rect[0] + rect[2]) * 0.5, (rect[1] + rect[3]) * 0.5};
-  double const radius = std::sqrt(GetDist2({rect[0], rect[1]}, middle));
-  Point p1;
-  Point p2;
-  int const count =
-      GetLineAndCircleIntersection(a, b, c, middle.x, middle.y, radius, &p1.x, &p1.y, &p2.x, &p2.y);
-  if (count != 1 && count != 2) return false;
-  *chord = count == 1 ? Triangle{{p1, p1, p1}} : Triangle{{p1, p2, p2}};
-  return true;
+  return GetBoundingRect(cell, rect) && Cells::ChordAcross(rect, a, b, c, chord);
 }
 
 bool GeometryUtils::GetCenter(std::vector<Triangle> const* cell, Point* center) {
@@ -48,17 +69,15 @@ bool GeometryUtils::GetCenter(std::vector<Triangle> const* cell, Point* center) 
   Point degenerateSum;
   int degenerateCount = 0;
   for (Triangle const& triangle : *cell) {
-    double const area = std::fabs(GetArea(triangle));
-    Point own;
-    if (!CalcCenter(triangle, &own)) return false;
-    if (Numeric::IsZero(area)) {
-      degenerateSum.x += own.x;
-      degenerateSum.y += own.y;
+    Cells::TriangleCentre const own(triangle);
+    if (Numeric::IsZero(own.area)) {
+      degenerateSum.x += own.center.x;
+      degenerateSum.y += own.center.y;
       ++degenerateCount;
     } else {
-      totalArea += area;
-      weighted.x += own.x * area;
-      weighted.y += own.y * area;
+      totalArea += own.area;
+      weighted.x += own.center.x * own.area;
+      weighted.y += own.center.y * own.area;
     }
   }
   // Deliberate: degenerate triangles count only where there are no others, which leaves chords and
@@ -97,26 +116,11 @@ bool GeometryUtils::GetCenterForCircle(Point const& p1, Point const& p2,
 bool GeometryUtils::GetCenterForLine(bool hasP1, Point const& p1, bool hasP2, Point const& p2,
                                      bool swapped, std::vector<Triangle> const* cell,
                                      Point* center) {
-  if (!hasP1 && !hasP2) return GetCenter(cell, center);
-
-  // The parameter (u, v) stands for v*x + y + u = 0, so the lines through one point form a line.
-  auto const along = [swapped](Point const& p) { return swapped ? p.y : p.x; };
-  auto const across = [swapped](Point const& p) { return swapped ? p.x : p.y; };
+  Cells::FixedPoints const fixed{hasP1, p1, hasP2, p2, swapped};
+  if (!fixed.IsAny()) return GetCenter(cell, center);
+  double rect[4];
   Triangle candidate;
-  if (hasP1 && hasP2) {
-    double matrix[4] = {1.0, along(p1),  //
-                        1.0, along(p2)};
-    double rhs[2] = {-across(p1), -across(p2)};
-    double solution[2];
-    if (!MathUtils::LinearEquationSystemSolve(2, matrix, rhs, solution)) return false;
-    Point const only{solution[0], solution[1]};
-    candidate = {{only, only, only}};
-  } else {
-    Point const& p = hasP1 ? p1 : p2;
-    if (!GetBoundingCircleAndLineIntersectionTriangle(cell, 1.0, along(p), across(p), &candidate)) {
-      return false;
-    }
-  }
+  if (!GetBoundingRect(cell, rect) || !fixed.FindCandidate(rect, &candidate)) return false;
   // Deliberate: what was collected counts here, not the status.
   std::vector<Triangle> overlap;
   GetOverlapping(candidate, cell, &overlap);

@@ -8,6 +8,8 @@
 #include <cstddef>
 #include <optional>
 
+#include "geometry/cells/TriangleOverlap.h"
+#include "geometry/intersections/SegmentPair.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
@@ -16,6 +18,7 @@ namespace {
 
 using CrossingPoint = GeometryUtils::CrossingPoint;
 using Point = GeometryUtils::Point;
+using Triangle = GeometryUtils::Triangle;
 
 struct Side {
   Point const& start;
@@ -50,12 +53,77 @@ std::optional<Stretch> SharedStretch(Side const& first, Side const& second) {
 }
 
 /// Appends two records, the one nearer to the origin first; on equal distances the first one.
-template <typename Record, typename Distance2>
+template <typename Record, typename Distance2, typename Records>
 void AppendByDistance(Record const& first, Record const& second, Distance2 const& distance2,
-                      std::vector<Record>* records) {
+                      Records* records) {
   bool const isSecondNearer = distance2(first) > distance2(second);
   records->push_back(isSecondNearer ? second : first);
   records->push_back(isSecondNearer ? first : second);
+}
+
+double SquaredDistance(Point const& p, Point const& q) {
+  double const dx = p.x - q.x;
+  double const dy = p.y - q.y;
+  return dy * dy + dx * dx;
+}
+
+auto DistanceFromStartOf(Side const& side) {
+  return [&side](CrossingPoint const& record) { return SquaredDistance(record.pt, side.start); };
+}
+
+/// Appends what lies on side i of the first triangle.
+void CollectOnSide(Side const& side, int i, Triangle const& second, Cells::CrossingPoints* points) {
+  auto const distance2 = DistanceFromStartOf(side);
+  std::optional<CrossingPoint> held;
+  for (int j = 0; j < 3; ++j) {
+    Side const other{second.pts[j], second.pts[(j + 1) % 3]};
+    CrossingPoint found{{}, i, j};
+    SegmentsRelPosition const relation =
+        Intersections::IntersectSegments({side.start.x, side.start.y, side.end.x, side.end.y,
+                                          other.start.x, other.start.y, other.end.x, other.end.y},
+                                         &found.pt.x, &found.pt.y);
+    if (relation == SegmentsRelPosition::Intersecting) {
+      if (held) {
+        AppendByDistance(*held, found, distance2, points);
+        held.reset();
+      } else {
+        held = found;
+      }
+    } else if (relation == SegmentsRelPosition::Collinear) {
+      if (std::optional<Stretch> const shared = SharedStretch(side, other)) {
+        AppendByDistance(CrossingPoint{shared->low, i, j}, CrossingPoint{shared->high, i, j},
+                         distance2, points);
+        // Deliberate: the ends of the stretch stand for the point that was held.
+        held.reset();
+      }
+    }
+  }
+  if (held) points->push_back(*held);
+}
+
+/// Of the records from `begin` on, more than a line can cross since sides that touch at vertices
+/// report them twice, keeps the two points farthest apart.
+void KeepFarthestTwo(Side const& side, int i, std::size_t begin, Cells::CrossingPoints* points) {
+  std::size_t m = begin;
+  std::size_t n = begin + 1;
+  double farthest2 = SquaredDistance((*points)[m].pt, (*points)[n].pt);
+  for (std::size_t p = begin; p < points->size(); ++p) {
+    for (std::size_t q = p + 1; q < points->size(); ++q) {
+      double const distance2 = SquaredDistance((*points)[p].pt, (*points)[q].pt);
+      if (distance2 > farthest2) {
+        farthest2 = distance2;
+        m = p;
+        n = q;
+      }
+    }
+  }
+  CrossingPoint fromM = (*points)[m];
+  CrossingPoint fromN = (*points)[n];
+  // Deliberate: the second record carries the first triangle's side in the place of the second's.
+  fromM.side1 = i;
+  fromN.side2 = i;
+  points->resize(begin);
+  AppendByDistance(fromM, fromN, DistanceFromStartOf(side), points);
 }
 
 }  // namespace
@@ -67,7 +135,7 @@ bool GeometryUtils::GetCrossingPoints(Triangle const& first, int startSide, Tria
     int const i = (firstSide + turn) % 3;
     Point const& start = first.pts[i];
     Point const& end = first.pts[(i + 1) % 3];
-    auto const distance2 = [&start](Point const& p) { return GetDist2(p, start); };
+    auto const distance2 = [&start](Point const& p) { return SquaredDistance(p, start); };
     std::optional<Point> held;
     for (int j = 0; j < 3; ++j) {
       Point const& otherStart = second.pts[j];
@@ -90,64 +158,21 @@ bool GeometryUtils::GetCrossingPoints(Triangle const& first, int startSide, Tria
   return true;
 }
 
-void GeometryUtils::GetCrossingPoints(Triangle const& first, Triangle const& second,
-                                      std::vector<CrossingPoint>* points) {
+void Cells::FindCrossingPoints(Triangle const& first, Triangle const& second,
+                               CrossingPoints* points) {
   for (int i = 0; i < 3; ++i) {
     Side const side{first.pts[i], first.pts[(i + 1) % 3]};
-    auto const distance2 = [&side](CrossingPoint const& record) {
-      return GetDist2(record.pt, side.start);
-    };
     std::size_t const begin = points->size();
-    std::optional<CrossingPoint> held;
-    for (int j = 0; j < 3; ++j) {
-      Side const other{second.pts[j], second.pts[(j + 1) % 3]};
-      CrossingPoint found{{}, i, j};
-      SegmentsRelPosition const relation = GetLineSegmentsIntersection(
-          side.start.x, side.start.y, side.end.x, side.end.y, other.start.x, other.start.y,
-          other.end.x, other.end.y, &found.pt.x, &found.pt.y);
-      if (relation == SegmentsRelPosition::Intersecting) {
-        if (held) {
-          AppendByDistance(*held, found, distance2, points);
-          held.reset();
-        } else {
-          held = found;
-        }
-      } else if (relation == SegmentsRelPosition::Collinear) {
-        if (std::optional<Stretch> const shared = SharedStretch(side, other)) {
-          AppendByDistance(CrossingPoint{shared->low, i, j}, CrossingPoint{shared->high, i, j},
-                           distance2, points);
-          // Deliberate: the ends of the stretch stand for the point that was held.
-          held.reset();
-        }
-      }
-    }
-    if (held) points->push_back(*held);
-
-    std::size_t const found = points->size() - begin;
-    if (found < 3) continue;
-    // More than a line can cross: sides that touch at vertices report them twice. Only the two
-    // points farthest apart matter.
-    std::size_t m = begin;
-    std::size_t n = begin + 1;
-    double farthest2 = GetDist2((*points)[m].pt, (*points)[n].pt);
-    for (std::size_t p = begin; p < points->size(); ++p) {
-      for (std::size_t q = p + 1; q < points->size(); ++q) {
-        double const distance = GetDist2((*points)[p].pt, (*points)[q].pt);
-        if (distance > farthest2) {
-          farthest2 = distance;
-          m = p;
-          n = q;
-        }
-      }
-    }
-    CrossingPoint fromM = (*points)[m];
-    CrossingPoint fromN = (*points)[n];
-    // Deliberate: the second record carries the first triangle's side in the place of the second's.
-    fromM.side1 = i;
-    fromN.side2 = i;
-    points->resize(begin);
-    AppendByDistance(fromM, fromN, distance2, points);
+    CollectOnSide(side, i, second, points);
+    if (points->size() - begin >= 3) KeepFarthestTwo(side, i, begin, points);
   }
+}
+
+void GeometryUtils::GetCrossingPoints(Triangle const& first, Triangle const& second,
+                                      std::vector<CrossingPoint>* points) {
+  Cells::CrossingPoints found;
+  Cells::FindCrossingPoints(first, second, &found);
+  points->insert(points->end(), found.begin(), found.end());
 }
 
 }  // namespace Vorn

@@ -8,16 +8,23 @@
 #include <array>
 #include <cstddef>
 
+#include "geometry/cells/Ring.h"
+#include "geometry/cells/TriangleOverlap.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
 
 namespace {
 
+using Cells::CrossingPoints;
+using Cells::Shape;
 using CrossingPoint = GeometryUtils::CrossingPoint;
+using OverlappingStatus = GeometryUtils::OverlappingStatus;
 using Point = GeometryUtils::Point;
 using PointStatus = GeometryUtils::PointStatus;
 using Triangle = GeometryUtils::Triangle;
+
+using Polygon = Cells::InlineVector<Point, 12>;
 
 /// Where each vertex of the two triangles lies with respect to the other triangle.
 using VertexStatuses = std::array<std::array<PointStatus, 3>, 2>;
@@ -45,14 +52,14 @@ bool HasUndefined(VertexStatuses const& statuses) {
 /// The walk along the boundary of the overlap of two triangles whose sides cross.
 class BoundaryWalk {
  public:
-  BoundaryWalk(std::array<Triangle, 2> const& triangles, VertexStatuses const& statuses,
-               std::vector<CrossingPoint> const& crossings)
+  BoundaryWalk(std::array<Triangle const*, 2> const& triangles, VertexStatuses const& statuses,
+               CrossingPoints const& crossings)
       : triangles_(triangles),
         statuses_(statuses),
         crossings_(crossings),
         current_(statuses[0][0] == PointStatus::Outside ? 1 : 0) {}
 
-  std::vector<Point> Polygon() {
+  Polygon& Walk() {
     int side = 0;
     std::size_t record = 0;
     while (side < 3) {
@@ -104,9 +111,9 @@ class BoundaryWalk {
     int const side = SideOf(crossing);
     int const next = (side + 1) % 3;
     if (IsOutside(next)) return false;
-    polygon_.push_back(triangles_[current_].pts[next]);
+    polygon_.push_back(triangles_[current_]->pts[next]);
     int const afterNext = (side + 2) % 3;
-    if (!IsOutside(afterNext)) polygon_.push_back(triangles_[current_].pts[afterNext]);
+    if (!IsOutside(afterNext)) polygon_.push_back(triangles_[current_]->pts[afterNext]);
     return true;
   }
 
@@ -115,61 +122,88 @@ class BoundaryWalk {
     return record;
   }
 
-  std::array<Triangle, 2> const& triangles_;
+  std::array<Triangle const*, 2> const& triangles_;
   VertexStatuses const& statuses_;
-  std::vector<CrossingPoint> const& crossings_;
+  CrossingPoints const& crossings_;
   std::size_t current_;
-  std::vector<Point> polygon_;
+  Polygon polygon_;
 };
 
+/// The overlap of two triangles whose sides do not cross: one of them, or nothing.
+void FindContained(Shape const& first, Shape const& second, VertexStatuses const& statuses,
+                   Cells::Overlap* overlap) {
+  int const firstIn = CountInOrOn(statuses[0]);
+  int const secondIn = CountInOrOn(statuses[1]);
+  if (firstIn + secondIn == 0) return;
+  if (firstIn + secondIn != 3 || (firstIn != 3 && secondIn != 3)) {
+    overlap->status = OverlappingStatus::OverlapFailed;
+    return;
+  }
+  // Deliberate: three copies. They weigh in the centre of the cell and in its size.
+  Triangle const& contained = firstIn == 3 ? first.triangle : second.triangle;
+  for (int copy = 0; copy < 3; ++copy) overlap->parts.push_back(contained);
+  overlap->status = OverlappingStatus::Overlap;
+}
+
 }  // namespace
+
+void Cells::FindOverlap(Shape const& first, Shape const& second, Overlap* overlap) {
+  overlap->status = OverlappingStatus::NoOverlap;
+  overlap->parts.clear();
+  // Apart by their boxes: every vertex is outside and no side crosses another.
+  if (first.IsApartFrom(second)) return;
+
+  VertexStatuses statuses;
+  for (std::size_t v = 0; v < 3; ++v) {
+    statuses[0][v] = second.StatusOf(first.triangle.pts[v]);
+    statuses[1][v] = first.StatusOf(second.triangle.pts[v]);
+  }
+  if (HasUndefined(statuses)) {
+    overlap->status = OverlappingStatus::OverlapFailed;
+    return;
+  }
+  CrossingPoints crossings;
+  FindCrossingPoints(first.triangle, second.triangle, &crossings);
+  if (crossings.empty()) {
+    FindContained(first, second, statuses, overlap);
+    return;
+  }
+  std::array<Triangle const*, 2> const triangles = {&first.triangle, &second.triangle};
+  BoundaryWalk walk(triangles, statuses, crossings);
+  Polygon& polygon = walk.Walk();
+  if (polygon.size() < 3) return;
+  bool const isDivided = CutEars(polygon.data(), static_cast<int>(polygon.size()),
+                                 [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });
+  if (!isDivided) {
+    overlap->parts.clear();
+    overlap->status = OverlappingStatus::OverlapFailed;
+    return;
+  }
+  overlap->status = OverlappingStatus::Overlap;
+}
 
 GeometryUtils::OverlappingStatus GeometryUtils::GetOverlapping(Triangle const& first,
                                                                Triangle const& second,
                                                                std::vector<Triangle>* result) {
-  std::array<Triangle, 2> const triangles = {first, second};
-  VertexStatuses statuses;
-  for (std::size_t k = 0; k < 2; ++k) {
-    for (std::size_t v = 0; v < 3; ++v) {
-      statuses[k][v] = GetPointStatus(triangles[k].pts[v], triangles[1 - k]);
-    }
-  }
-  if (HasUndefined(statuses)) return OverlappingStatus::OverlapFailed;
-
-  std::vector<CrossingPoint> crossings;
-  GetCrossingPoints(triangles[0], triangles[1], &crossings);
-  if (crossings.empty()) {
-    int const firstIn = CountInOrOn(statuses[0]);
-    int const secondIn = CountInOrOn(statuses[1]);
-    if (firstIn + secondIn == 0) return OverlappingStatus::NoOverlap;
-    bool const isOneContained = firstIn + secondIn == 3 && (firstIn == 3 || secondIn == 3);
-    if (!isOneContained) return OverlappingStatus::OverlapFailed;
-    // Deliberate: three copies. They weigh in the centre of the cell and in its size.
-    result->insert(result->end(), 3, triangles[firstIn == 3 ? 0 : 1]);
-    return OverlappingStatus::Overlap;
-  }
-
-  std::vector<Point> const polygon = BoundaryWalk(triangles, statuses, crossings).Polygon();
-  if (polygon.size() < 3) return OverlappingStatus::NoOverlap;
-  std::vector<Triangle> parts;
-  if (!ConvexPolygonDivide(polygon, 0, static_cast<int>(polygon.size()), &parts)) {
-    return OverlappingStatus::OverlapFailed;
-  }
-  result->insert(result->end(), parts.begin(), parts.end());
-  return OverlappingStatus::Overlap;
+  Cells::Overlap overlap;
+  Cells::FindOverlap(Shape(first), Shape(second), &overlap);
+  result->insert(result->end(), overlap.parts.begin(), overlap.parts.end());
+  return overlap.status;
 }
 
 GeometryUtils::OverlappingStatus GeometryUtils::GetOverlapping(Triangle const& first,
                                                                std::vector<Triangle> const* cell,
                                                                std::vector<Triangle>* result) {
-  Triangle const own = first;
+  Shape const shape(first);
   OverlappingStatus status = OverlappingStatus::NoOverlap;
+  Cells::Overlap overlap;
   // By index and to the size at the start: result may be the cell itself.
   std::size_t const size = cell->size();
   for (std::size_t i = 0; i < size; ++i) {
-    if (GetOverlapping(own, (*cell)[i], result) == OverlappingStatus::Overlap) {
-      status = OverlappingStatus::Overlap;
-    }
+    Cells::FindOverlap(shape, Shape((*cell)[i]), &overlap);
+    result->insert(result->end(), overlap.parts.begin(), overlap.parts.end());
+    // Deliberate: a pair that could not be resolved counts like one without a common part.
+    if (overlap.status == OverlappingStatus::Overlap) status = OverlappingStatus::Overlap;
   }
   return status;
 }

@@ -3,6 +3,7 @@
 
 #include <cstddef>
 
+#include "geometry/cells/Ring.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
@@ -17,47 +18,29 @@ bool IsWithin(int begin, int count, std::size_t size) {
 
 }  // namespace
 
-bool GeometryUtils::ConvexPolygonDivide(std::vector<Point> const& polygon, int first, int count,
-                                        std::vector<Triangle>* triangles) {
-  if (count < 3 || !IsWithin(0, count, polygon.size())) return false;
-  std::vector<Point> ring = polygon;
-  if (count == 3) {
-    // Deliberate: the only place where the first vertex can be chosen.
-    if (!IsWithin(first, count, polygon.size())) return false;
-    auto const begin = static_cast<std::size_t>(first);
-    triangles->push_back({{ring[begin], ring[begin + 1], ring[begin + 2]}});
-    return true;
-  }
-  int live = count;
-  int i = 0;
-  while (live >= 3) {
-    if (!SimplePolygonIsValid(ring, i, live, 3)) {
-      ++i;
-      if (i >= live) return false;
-      continue;
+bool Cells::IsInsideRing(GeometryUtils::Point const& p, GeometryUtils::Point const* ring, int begin,
+                         int end) {
+  bool inside = false;
+  GeometryUtils::Point prev = ring[end - 1];
+  for (int j = begin; j < end; ++j) {
+    GeometryUtils::Point const& cur = ring[j];
+    bool const isCurAbove = cur.y >= p.y;
+    bool const isPrevAbove = prev.y >= p.y;
+    if (isCurAbove != isPrevAbove &&
+        ((cur.y - p.y) * (prev.x - cur.x) >= (prev.y - cur.y) * (cur.x - p.x)) == isCurAbove) {
+      inside = !inside;
     }
-    // An ear that starts at one of the last two vertices, which only a polygon that touches itself
-    // brings about, goes on at the beginning of the ring: that is where its sides lead.
-    auto const corner = static_cast<std::size_t>((i + 1) % live);
-    triangles->push_back({{ring[static_cast<std::size_t>(i)], ring[corner],
-                           ring[static_cast<std::size_t>((i + 2) % live)]}});
-    --live;
-    if (live < 3) return true;
-    ring.erase(ring.begin() + static_cast<std::ptrdiff_t>(corner));
-    i = 0;
+    prev = cur;
   }
-  return true;
+  return inside;
 }
 
-bool GeometryUtils::SimplePolygonIsValid(std::vector<Point> const& polygon, int start, int count,
-                                         int size) {
-  if (size > count || size < 3) return false;
-  if (size == count) return true;
-  if (!IsWithin(0, count, polygon.size()) || start < 0 || start >= count) return false;
+bool Cells::IsFreeOfOthers(GeometryUtils::Point const* ring, int start, int count, int size) {
+  // Deliberate: start and size bound the tested polygon as begin and end.
   auto const isInside = [&](int vertex) {
-    // Deliberate: start and size bound the tested polygon as begin and end.
-    return PointIsInsideOfPolygon(polygon[static_cast<std::size_t>(vertex)], polygon, start, size);
+    return start < size && IsInsideRing(ring[vertex], ring, start, size);
   };
+  if (size == count) return true;
   int before = 0;
   if (start + size < count) {
     for (int j = start + size; j < count; ++j) {
@@ -73,22 +56,33 @@ bool GeometryUtils::SimplePolygonIsValid(std::vector<Point> const& polygon, int 
   return true;
 }
 
+bool GeometryUtils::ConvexPolygonDivide(std::vector<Point> const& polygon, int first, int count,
+                                        std::vector<Triangle>* triangles) {
+  if (count < 3 || !IsWithin(0, count, polygon.size())) return false;
+  if (count == 3) {
+    // Deliberate: the only place where the first vertex can be chosen.
+    if (!IsWithin(first, count, polygon.size())) return false;
+    Point const* const corners = polygon.data() + first;
+    triangles->push_back({{corners[0], corners[1], corners[2]}});
+    return true;
+  }
+  std::vector<Point> ring = polygon;
+  return Cells::CutEars(ring.data(), count,
+                        [triangles](Triangle const& ear) { triangles->push_back(ear); });
+}
+
+bool GeometryUtils::SimplePolygonIsValid(std::vector<Point> const& polygon, int start, int count,
+                                         int size) {
+  if (size > count || size < 3) return false;
+  if (size == count) return true;
+  if (!IsWithin(0, count, polygon.size()) || start < 0 || start >= count) return false;
+  return Cells::IsFreeOfOthers(polygon.data(), start, count, size);
+}
+
 bool GeometryUtils::PointIsInsideOfPolygon(Point const& p, std::vector<Point> const& polygon,
                                            int begin, int end) {
   if (begin >= end || !IsWithin(begin, end - begin, polygon.size())) return false;
-  bool inside = false;
-  Point prev = polygon[static_cast<std::size_t>(end - 1)];
-  for (int j = begin; j < end; ++j) {
-    Point const& cur = polygon[static_cast<std::size_t>(j)];
-    bool const isCurAbove = cur.y >= p.y;
-    bool const isPrevAbove = prev.y >= p.y;
-    if (isCurAbove != isPrevAbove &&
-        ((cur.y - p.y) * (prev.x - cur.x) >= (prev.y - cur.y) * (cur.x - p.x)) == isCurAbove) {
-      inside = !inside;
-    }
-    prev = cur;
-  }
-  return inside;
+  return Cells::IsInsideRing(p, polygon.data(), begin, end);
 }
 
 }  // namespace Vorn

@@ -6,7 +6,11 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
+#include "geometry/cells/TriangleCentre.h"
+#include "geometry/cells/TriangleOverlap.h"
+#include "geometry/intersections/SegmentPair.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
@@ -15,43 +19,49 @@ namespace Vorn {
 namespace {
 
 using Point = GeometryUtils::Point;
+using PointStatus = GeometryUtils::PointStatus;
 using Triangle = GeometryUtils::Triangle;
 
 Point Middle(Point const& p, Point const& q) { return {(p.x + q.x) / 2.0, (p.y + q.y) / 2.0}; }
 
-bool IsInBoxOf(Point const& p, Point const& end1, Point const& end2) {
-  return std::min(end1.x, end2.x) <= p.x && p.x <= std::max(end1.x, end2.x) &&
-         std::min(end1.y, end2.y) <= p.y && p.y <= std::max(end1.y, end2.y);
+double SideTerm(Point const& start, Point const& end) { return end.x * start.y - start.x * end.y; }
+
+/// Twice halved only at the end: an area that the halving turns into zero counts as zero.
+double AreaOfTerms(double term0, double term1, double term2) {
+  return 0.5 * (term0 + term1 + term2);
 }
 
-/// Whether one coordinate of a point lies beyond all three of a triangle.
-bool IsBeyond(double v, double v0, double v1, double v2) {
-  return (v0 > v && v1 > v && v2 > v) || (v > v0 && v > v1 && v > v2);
+/// The interval that three values span; without bounds when one of them is not a number, so that
+/// nothing is ever found to lie beyond it.
+void Span(double v0, double v1, double v2, double* low, double* high) {
+  *low = std::min({v0, v1, v2});
+  *high = std::max({v0, v1, v2});
+  if (std::isnan(v0) || std::isnan(v1) || std::isnan(v2)) {
+    *low = -std::numeric_limits<double>::infinity();
+    *high = std::numeric_limits<double>::infinity();
+  }
 }
 
-}  // namespace
-
-double GeometryUtils::GetArea(Triangle const& triangle) {
-  Point const& p0 = triangle.pts[0];
-  Point const& p1 = triangle.pts[1];
-  Point const& p2 = triangle.pts[2];
-  return 0.5 *
-         ((p1.x * p0.y - p0.x * p1.y) + (p2.x * p1.y - p1.x * p2.y) + (p0.x * p2.y - p2.x * p0.y));
-}
-
-bool GeometryUtils::IsValidTriangle(Triangle const& triangle) {
-  return Numeric::Sign(GetArea(triangle)) != 0;
-}
-
-bool GeometryUtils::CalcCenter(Triangle const& triangle, Point* center) {
+double SignedArea(Triangle const& triangle) {
   Point const* const pts = triangle.pts;
-  double const length2[3] = {GetDist2(pts[1], pts[0]), GetDist2(pts[2], pts[1]),
-                             GetDist2(pts[0], pts[2])};
+  return AreaOfTerms(SideTerm(pts[0], pts[1]), SideTerm(pts[1], pts[2]), SideTerm(pts[2], pts[0]));
+}
+
+double SquaredDistance(Point const& p, Point const& q) {
+  double const dx = p.x - q.x;
+  double const dy = p.y - q.y;
+  return dy * dy + dx * dx;
+}
+
+/// The crossing of the medians of the two longer sides, which meet at the widest angle; where they
+/// do not meet, the middle between the middles of those sides.
+Point InnerPoint(Triangle const& triangle) {
+  Point const* const pts = triangle.pts;
+  double const length2[3] = {SquaredDistance(pts[1], pts[0]), SquaredDistance(pts[2], pts[1]),
+                             SquaredDistance(pts[0], pts[2])};
   int shortest = 0;
   if (length2[1] < length2[shortest]) shortest = 1;
   if (length2[2] < length2[shortest]) shortest = 2;
-
-  // The medians of the two longer sides cross at the widest angle.
   int const a = shortest == 0 ? 1 : 0;
   int const b = shortest == 2 ? 1 : 2;
   Point const middleA = Middle(pts[a], pts[(a + 1) % 3]);
@@ -59,30 +69,37 @@ bool GeometryUtils::CalcCenter(Triangle const& triangle, Point* center) {
   if (length2[shortest] > Numeric::kZero) {
     Point const& oppositeA = pts[(a + 2) % 3];
     Point const& oppositeB = pts[(b + 2) % 3];
+    Point crossing;
     SegmentsRelPosition const medians =
-        GetLineSegmentsIntersection(middleA.x, middleA.y, oppositeA.x, oppositeA.y, middleB.x,
-                                    middleB.y, oppositeB.x, oppositeB.y, &center->x, &center->y);
+        Intersections::IntersectSegments({middleA.x, middleA.y, oppositeA.x, oppositeA.y, middleB.x,
+                                          middleB.y, oppositeB.x, oppositeB.y},
+                                         &crossing.x, &crossing.y);
     if (medians == SegmentsRelPosition::Collinear || medians == SegmentsRelPosition::Intersecting) {
-      return true;
+      return crossing;
     }
   }
-  *center = Middle(middleA, middleB);
-  return true;
+  return Middle(middleA, middleB);
 }
 
-GeometryUtils::PointStatus GeometryUtils::GetPointStatus(Point const& p, Triangle const& triangle) {
-  Point const* const pts = triangle.pts;
-  if (IsBeyond(p.x, pts[0].x, pts[1].x, pts[2].x) || IsBeyond(p.y, pts[0].y, pts[1].y, pts[2].y)) {
-    return PointStatus::Outside;
-  }
-  int const sense = Numeric::Sign(GetArea(triangle));
+}  // namespace
+
+Cells::Shape::Shape(Triangle const& from) : triangle(from) {
+  for (int i = 0; i < 3; ++i) sideTerm[i] = SideTerm(from.pts[i], from.pts[(i + 1) % 3]);
+  sense = Numeric::Sign(AreaOfTerms(sideTerm[0], sideTerm[1], sideTerm[2]));
+  Span(from.pts[0].x, from.pts[1].x, from.pts[2].x, &xMin, &xMax);
+  Span(from.pts[0].y, from.pts[1].y, from.pts[2].y, &yMin, &yMax);
+}
+
+PointStatus Cells::Shape::StatusOf(Point const& p) const {
+  if (xMin > p.x || p.x > xMax || yMin > p.y || p.y > yMax) return PointStatus::Outside;
   int hits = 0;
   bool isOutside = false;
   for (int i = 0; i < 3; ++i) {
-    Point const& start = pts[i];
-    Point const& end = pts[(i + 1) % 3];
-    int const side = Numeric::Sign(GetArea(Triangle{{p, start, end}}));
-    if (side == 0 && IsInBoxOf(p, start, end)) {
+    Point const& start = triangle.pts[i];
+    Point const& end = triangle.pts[(i + 1) % 3];
+    int const side = Numeric::Sign(AreaOfTerms(SideTerm(p, start), sideTerm[i], SideTerm(end, p)));
+    if (side == 0 && Intersections::IsWithin(p.x, start.x, end.x) &&
+        Intersections::IsWithin(p.y, start.y, end.y)) {
       ++hits;
     } else if (side == 0 || side != sense) {
       // On the line of a side but not on the side counts as beyond it.
@@ -100,6 +117,24 @@ GeometryUtils::PointStatus GeometryUtils::GetPointStatus(Point const& p, Triangl
     default:
       return PointStatus::Undefined;
   }
+}
+
+Cells::TriangleCentre::TriangleCentre(Triangle const& triangle)
+    : area(std::fabs(SignedArea(triangle))), center(InnerPoint(triangle)) {}
+
+double GeometryUtils::GetArea(Triangle const& triangle) { return SignedArea(triangle); }
+
+bool GeometryUtils::IsValidTriangle(Triangle const& triangle) {
+  return Numeric::Sign(GetArea(triangle)) != 0;
+}
+
+bool GeometryUtils::CalcCenter(Triangle const& triangle, Point* center) {
+  *center = Cells::TriangleCentre(triangle).center;
+  return true;
+}
+
+PointStatus GeometryUtils::GetPointStatus(Point const& p, Triangle const& triangle) {
+  return Cells::Shape(triangle).StatusOf(p);
 }
 
 }  // namespace Vorn

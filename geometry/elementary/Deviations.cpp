@@ -5,13 +5,13 @@
 #include <algorithm>
 #include <cmath>
 
+#include "geometry/elementary/ImplicitLine.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
 
 using Numeric::IsZero;
-using Numeric::IsZeroMagnitude;
 using Numeric::kZero;
 
 namespace {
@@ -30,10 +30,11 @@ double GeometryUtils::GetDist2(Point const& p, Point const& q) {
 
 bool GeometryUtils::GetLineParameters(double x1, double y1, double x2, double y2, double* a,
                                       double* b, double* c) {
-  if (IsZeroMagnitude(x1 - x2) && IsZeroMagnitude(y1 - y2)) return false;
-  *a = y1 - y2;
-  *b = x2 - x1;
-  *c = x1 * y2 - y1 * x2;
+  Lines::ImplicitLine line;
+  if (!line.Through(x1, y1, x2, y2)) return false;
+  *a = line.a;
+  *b = line.b;
+  *c = line.c;
   return true;
 }
 
@@ -73,11 +74,12 @@ bool GeometryUtils::GetDeviation(double const* coords, double* dev) {
   return true;
 }
 
-void GeometryUtils::GetNormal(double a, double b, double /*c*/, Point const& p, double* na,
-                              double* nb, double* nc) {
-  *na = b;
-  *nb = -a;
-  *nc = a * p.y - b * p.x;
+void GeometryUtils::GetNormal(double a, double b, double c, Point const& p, double* na, double* nb,
+                              double* nc) {
+  Lines::ImplicitLine const normal = Lines::ImplicitLine{a, b, c}.NormalThrough(p.x, p.y);
+  *na = normal.a;
+  *nb = normal.b;
+  *nc = normal.c;
 }
 
 void GeometryUtils::GetXyminXymax(double x1, double y1, double x2, double y2, double* box) {

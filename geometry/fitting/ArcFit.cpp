@@ -5,13 +5,17 @@
 // the run outwards, each step with its mirror image. ArcCellBuilder overlaps the cells of one run,
 // ArcSearch lengthens the run point by point.
 
+#include <algorithm>
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <utility>
 #include <vector>
 
+#include "geometry/cells/CellSequence.h"
 #include "geometry/fitting/Runs.h"
+#include "geometry/fitting/SampleThinning.h"
 #include "geometry/fitting/Triples.h"
 #include "vorn/GeometryUtils.h"
 
@@ -27,19 +31,9 @@ class ArcCellBuilder {
   using Point = GeometryUtils::Point;
   using Triangle = GeometryUtils::Triangle;
 
-  struct Run {
-    std::vector<WPoint> const& points;
-    std::int32_t first;
-    std::int32_t count;
-    bool startFixed;
-    Point* start;
-    bool endFixed;
-    Point* end;
-    bool ccw;
-  };
-
-  ArcCellBuilder(Run const& run, std::vector<IndexedPoint>* samples, std::vector<Triangle>* cell)
-      : run_(run), samples_(*samples), cell_(*cell) {}
+  ArcCellBuilder(Fitting::ArcRun const& run, bool ccw, std::vector<IndexedPoint>* samples,
+                 Cells::CellSequence* cell)
+      : run_(run), ccw_(ccw), samples_(*samples), cell_(*cell) {}
 
   /// Takes up every point of the run, or, when the samples of a shorter run over the same start are
   /// at hand, these with the new ends.
@@ -93,32 +87,34 @@ class ArcCellBuilder {
         if (!used.Mark(triple)) continue;
         ErrorCode const code = NarrowBy(triple, &isFirstCell);
         if (code != ErrorCode::Ok) return code;
-        if (isGuarded && Fitting::IsOversized(cell_, Fitting::kArcCellWeight)) {
+        if (isGuarded && Fitting::IsOversized(cell_.size(), Fitting::kArcCellWeight)) {
           *hasThinned = true;
-          return GeometryUtils::ReduceCircleArcPoints(
-              &samples_, &cell_, step, run_.startFixed, run_.start, run_.endFixed, run_.end,
-              run_.points, run_.first, run_.count, run_.ccw);
+          return Thin(step);
         }
       }
     }
     return ErrorCode::Ok;
   }
 
+  ErrorCode Thin(int steps) {
+    Point centre;
+    if (!cell_.Center(&centre)) return ErrorCode::Failed;
+    ErrorCode const code = Fitting::ThinSamples(run_, centre, steps, ccw_, &samples_);
+    if (code == ErrorCode::Ok) cell_.clear();
+    return code;
+  }
+
   /// Overlaps the cell with that of one triple.
   ErrorCode NarrowBy(Fitting::Triple const& triple, bool* isFirstCell) {
-    std::vector<Triangle> tripleCell;
-    ErrorCode const code = CellOf(triple, &tripleCell);
+    tripleCell_.clear();
+    ErrorCode const code = CellOf(triple, &tripleCell_);
     if (code != ErrorCode::Ok) return code;
     if (*isFirstCell) {
       *isFirstCell = false;
-      cell_.swap(tripleCell);
+      cell_ = Cells::CellSequence(tripleCell_);
       return ErrorCode::Ok;
     }
-    std::vector<Triangle> common;
-    for (Triangle const& triangle : cell_) {
-      GeometryUtils::GetOverlapping(triangle, &tripleCell, &common);
-    }
-    cell_.swap(common);
+    cell_.NarrowBy(tripleCell_);
     return cell_.empty() ? ErrorCode::NoFit : ErrorCode::Ok;
   }
 
@@ -127,7 +123,7 @@ class ArcCellBuilder {
     bool usesEnd = false;
     double coords[6];
     GeometryUtils::TriPointsCoordsToArray(&samples_, triple.i0, triple.i1, triple.i2,
-                                          run_.startFixed, *run_.start, run_.endFixed, *run_.end,
+                                          run_.startFixed, run_.start, run_.endFixed, run_.end,
                                           &usesStart, &usesEnd, coords);
     return GeometryUtils::GetCircleTriangles({coords[0], coords[1], ToleranceAt(triple.i0)},
                                              {coords[2], coords[3], ToleranceAt(triple.i1)},
@@ -137,9 +133,11 @@ class ArcCellBuilder {
 
   double ToleranceAt(int position) const { return samples_[static_cast<std::size_t>(position)].w; }
 
-  Run const run_;
+  Fitting::ArcRun const& run_;
+  bool const ccw_;
   std::vector<IndexedPoint>& samples_;
-  std::vector<Triangle>& cell_;
+  Cells::CellSequence& cell_;
+  std::vector<Triangle> tripleCell_;
 };
 
 namespace {
@@ -150,6 +148,120 @@ constexpr std::int32_t kFewestArcPoints = 3;
 
 }  // namespace
 
+/// One arc over one fixed run.
+class ArcFit {
+ public:
+  /// What a successful fit hands out.
+  struct Arc {
+    Point start;
+    Point end;
+    Point centre;
+    double radius = 0.0;
+    bool ccw = false;
+    double deviation = 0.0;
+    std::int32_t deviationIndex = -1;
+  };
+
+  /// Fits an arc; as GetFittingCircleO, but for the cell, which is held without copies. `samples`
+  /// and `cell` are left alone when the run is too short, does not exist, or does not turn.
+  ErrorCode Fit(Fitting::ArcRun const& run, std::vector<GeometryUtils::IndexedPoint>* samples,
+                Cells::CellSequence* cell, Arc* arc) {
+    hasBuiltCell_ = false;
+    if (run.count < kFewestArcPoints || !Fitting::HoldsRun(run.points, run.first, run.count)) {
+      return ErrorCode::Failed;
+    }
+    Point const firstPoint = ToPoint(At(run.points, run.first));
+    Point const middlePoint = ToPoint(At(run.points, run.first + run.count / 2));
+    Point const lastPoint = ToPoint(At(run.points, run.first + run.count - 1));
+    Arc found{run.start, run.end, {}};
+    if (GeometryUtils::IsCcw(firstPoint, middlePoint, lastPoint, &found.ccw) != ErrorCode::Ok) {
+      return ErrorCode::Failed;
+    }
+    hasBuiltCell_ = true;
+    ArcCellBuilder builder(run, found.ccw, samples, cell);
+    builder.CollectSamples();
+    ErrorCode const built = builder.Build();
+    if (built != ErrorCode::Ok) return built;
+
+    ErrorCode const placed = PlaceCircle(run, *cell, &found);
+    if (placed != ErrorCode::Ok) return placed;
+    if (!run.startFixed && !Snap(found, firstPoint, &found.start)) return ErrorCode::Failed;
+    if (!run.endFixed && !Snap(found, lastPoint, &found.end)) return ErrorCode::Failed;
+    MeasureDeviation(run, &found);
+    *arc = found;
+    return ErrorCode::Ok;
+  }
+
+  /// Whether the last fit got as far as to collect samples and to build a cell.
+  bool HasBuiltCell() const { return hasBuiltCell_; }
+
+ private:
+  /// Centre and radius: from the cell and the points' tolerances, or from the fixed ends.
+  ErrorCode PlaceCircle(Fitting::ArcRun const& run, Cells::CellSequence const& cell, Arc* arc) {
+    if (!cell.Center(&arc->centre)) return ErrorCode::Failed;
+    if (!FindRadiusRange(run, arc->centre)) return ErrorCode::NoFit;
+    if (run.startFixed && run.endFixed) {
+      if (!GeometryUtils::AdjustCenter(run.start, run.end, arc->centre, &arc->centre)) {
+        return ErrorCode::Failed;
+      }
+      if (!FindRadiusRange(run, arc->centre)) return ErrorCode::NoFit;
+    }
+    arc->radius = (minRadius_ + maxRadius_) * 0.5;
+    if (run.startFixed) {
+      arc->radius = std::sqrt(GeometryUtils::GetDist2(run.start, arc->centre));
+    } else if (run.endFixed) {
+      arc->radius = std::sqrt(GeometryUtils::GetDist2(run.end, arc->centre));
+    }
+    bool const isInRange = minRadius_ <= arc->radius && arc->radius <= maxRadius_;
+    return isInRange ? ErrorCode::Ok : ErrorCode::NoFit;
+  }
+
+  /// As GetRadiusRange with each point's own tolerance; keeps the distances for the deviation.
+  bool FindRadiusRange(Fitting::ArcRun const& run, Point const& centre) {
+    distances_.resize(static_cast<std::size_t>(run.count));
+    WPoint const* const points = run.points.data() + run.first;
+    for (std::size_t i = 0; i < distances_.size(); ++i) {
+      double const dx = points[i].x - centre.x;
+      double const dy = points[i].y - centre.y;
+      distances_[i] = std::sqrt(dy * dy + dx * dx);
+    }
+    minRadius_ = distances_[0] - points[0].w;
+    maxRadius_ = distances_[0] + points[0].w;
+    if (minRadius_ > maxRadius_) return false;
+    for (std::size_t i = 1; i < distances_.size(); ++i) {
+      minRadius_ = std::max(minRadius_, distances_[i] - points[i].w);
+      maxRadius_ = std::min(maxRadius_, distances_[i] + points[i].w);
+      if (minRadius_ > maxRadius_) return false;
+    }
+    return true;
+  }
+
+  static bool Snap(Arc const& arc, Point const& p, Point* onArc) {
+    return GeometryUtils::GetNearestPointOnCircle(arc.centre, arc.radius, p, onArc);
+  }
+
+  /// The largest relative deviation, and the first point that has it.
+  void MeasureDeviation(Fitting::ArcRun const& run, Arc* arc) const {
+    WPoint const* const points = run.points.data() + run.first;
+    std::size_t largestAt = 0;
+    double largest = std::fabs(arc->radius - distances_[0]) / points[0].w;
+    for (std::size_t i = 1; i < distances_.size(); ++i) {
+      double const relative = std::fabs(arc->radius - distances_[i]) / points[i].w;
+      if (relative > largest) {
+        largest = relative;
+        largestAt = i;
+      }
+    }
+    arc->deviation = largest;
+    arc->deviationIndex = run.first + static_cast<std::int32_t>(largestAt);
+  }
+
+  bool hasBuiltCell_ = false;
+  double minRadius_ = 0.0;
+  double maxRadius_ = 0.0;
+  std::vector<double> distances_;
+};
+
 ErrorCode GeometryUtils::GetFittingCircleO(std::vector<WPoint> const& points, std::int32_t first,
                                            std::int32_t count, bool startFixed, Point* start,
                                            bool endFixed, Point* end,
@@ -158,65 +270,21 @@ ErrorCode GeometryUtils::GetFittingCircleO(std::vector<WPoint> const& points, st
                                            Point* centre, double* radius, bool* ccw,
                                            double* deviation, std::int32_t* deviationIndex) {
   *deviationIndex = -1;
-  if (count < kFewestArcPoints || !Fitting::HoldsRun(points, first, count))
-    return ErrorCode::Failed;
-  Point const firstPoint = ToPoint(At(points, first));
-  Point const lastPoint = ToPoint(At(points, first + count - 1));
-  double const area =
-      GetArea(Triangle{{firstPoint, ToPoint(At(points, first + count / 2)), lastPoint}});
-  if (area == 0.0) return ErrorCode::Failed;
-  bool const isCcw = area < 0.0;
-
-  ArcCellBuilder builder({points, first, count, startFixed, start, endFixed, end, isCcw},
-                         indexedPoints, cells);
-  builder.CollectSamples();
-  ErrorCode const code = builder.Build();
+  ArcFit fit;
+  ArcFit::Arc arc;
+  Cells::CellSequence cell;
+  ErrorCode const code = fit.Fit({points, first, count, startFixed, *start, endFixed, *end},
+                                 indexedPoints, &cell, &arc);
+  if (cells != nullptr && fit.HasBuiltCell()) *cells = cell.Expand();
   if (code != ErrorCode::Ok) return code;
-
-  Point found;
-  if (!GetCenter(cells, &found)) return ErrorCode::Failed;
-  double rMin = 0.0;
-  double rMax = 0.0;
-  auto const findRadiusRange = [&] {
-    return GetRadiusRange(points, first, count, found.x, found.y, -1.0, &rMin, &rMax);
-  };
-  if (!findRadiusRange()) return ErrorCode::NoFit;
-  if (startFixed && endFixed) {
-    if (!AdjustCenter(*start, *end, found, &found)) return ErrorCode::Failed;
-    if (!findRadiusRange()) return ErrorCode::NoFit;
-  }
-  double foundRadius = (rMin + rMax) * 0.5;
-  if (startFixed) {
-    foundRadius = std::sqrt(GetDist2(*start, found));
-  } else if (endFixed) {
-    foundRadius = std::sqrt(GetDist2(*end, found));
-  }
-  bool const isInRange = rMin <= foundRadius && foundRadius <= rMax;
-  if (!isInRange) return ErrorCode::NoFit;
-
-  Point arcStart = *start;
-  Point arcEnd = *end;
-  if (!startFixed && !GetNearestPointOnCircle(found, foundRadius, firstPoint, &arcStart)) {
-    return ErrorCode::Failed;
-  }
-  if (!endFixed && !GetNearestPointOnCircle(found, foundRadius, lastPoint, &arcEnd)) {
-    return ErrorCode::Failed;
-  }
-  *start = arcStart;
-  *end = arcEnd;
-
-  for (std::int32_t i = 0; i < count; ++i) {
-    WPoint const& p = At(points, first + i);
-    double const relative = std::fabs(foundRadius - std::sqrt(GetDist2(ToPoint(p), found))) / p.w;
-    if (i == 0 || relative > *deviation) {
-      *deviation = relative;
-      *deviationIndex = first + i;
-    }
-  }
+  *start = arc.start;
+  *end = arc.end;
   *arcCount = count;
-  *centre = found;
-  *radius = foundRadius;
-  *ccw = isCcw;
+  *centre = arc.centre;
+  *radius = arc.radius;
+  *ccw = arc.ccw;
+  *deviation = arc.deviation;
+  *deviationIndex = arc.deviationIndex;
   return ErrorCode::Ok;
 }
 
@@ -236,7 +304,7 @@ class ArcSearch {
     bool endFixed;
   };
 
-  /// The caller's outputs. Tries write straight into them, but for the end point and the count.
+  /// The caller's outputs. `cells` may be null.
   struct Outputs {
     Point* start;
     Point* end;
@@ -253,51 +321,65 @@ class ArcSearch {
       : run_(run), out_(out), progress_(progress), workingEnd_(*out.end) {}
 
   ErrorCode Search() {
-    out_.cells->clear();
     ErrorCode code = ErrorCode::NoFit;
-    std::int32_t triedCount = 0;
     for (std::int32_t n = run_.minCount; n <= run_.maxCount; ++n) {
-      code = Try(n, &triedCount);
+      code = Try(n);
       if (code == ErrorCode::OrientationMismatch && IsInLineOrder(n)) {
         // The points still lie on a line: the arc may begin to bend later.
-        out_.cells->clear();
+        cell_.clear();
         continue;
       }
       if (code == ErrorCode::OrientationMismatch) code = ErrorCode::SelfIntersection;
       if (code == ErrorCode::Ok && !ContinuesArc(n)) code = ErrorCode::SelfIntersection;
       if (code != ErrorCode::Ok) break;
+      triedCount_ = n;
       if (n < run_.maxCount) {
-        Save(triedCount);
+        Save();
         PrepareEnd(n + 1);
       }
       GeometryUtils::SetProgressState(progress_, run_.first + n + 1);
     }
-    if (code == ErrorCode::Ok) return Finish(triedCount);
-    if (!saved_) return code;
-    Restore(code);
-    return ErrorCode::Ok;
+    if (code == ErrorCode::Ok) {
+      Finish();
+    } else if (saved_) {
+      Restore(code);
+      code = ErrorCode::Ok;
+    }
+    if (out_.cells != nullptr) *out_.cells = cell_.Expand();
+    return code;
   }
 
  private:
   /// The longest success so far.
   struct Success {
-    Point start;
+    ArcFit::Arc arc;
     Point end;
     std::int32_t count;
-    Point centre;
-    double radius;
-    bool ccw;
-    double deviation;
-    std::int32_t deviationIndex;
-    std::vector<Triangle> cells;
+    Cells::CellSequence cell;
     std::vector<IndexedPoint> samples;
   };
 
-  ErrorCode Try(std::int32_t n, std::int32_t* triedCount) {
-    return GeometryUtils::GetFittingCircleO(run_.points, run_.first, n, run_.startFixed, out_.start,
-                                            run_.endFixed, &workingEnd_, &samples_, out_.cells,
-                                            triedCount, out_.centre, out_.radius, out_.ccw,
-                                            out_.deviation, out_.deviationIndex);
+  /// One try; a success goes straight into the outputs, but for the end point and the count.
+  ErrorCode Try(std::int32_t n) {
+    *out_.deviationIndex = -1;
+    ErrorCode const code = fit_.Fit(RunOf(n), &samples_, &cell_, &arc_);
+    if (code != ErrorCode::Ok) return code;
+    workingEnd_ = arc_.end;
+    WriteArc();
+    return ErrorCode::Ok;
+  }
+
+  Fitting::ArcRun RunOf(std::int32_t n) const {
+    return {run_.points, run_.first, n, run_.startFixed, *out_.start, run_.endFixed, workingEnd_};
+  }
+
+  void WriteArc() {
+    *out_.start = arc_.start;
+    *out_.centre = arc_.centre;
+    *out_.radius = arc_.radius;
+    *out_.ccw = arc_.ccw;
+    *out_.deviation = arc_.deviation;
+    *out_.deviationIndex = arc_.deviationIndex;
   }
 
   Point PointAt(std::int32_t position) const {
@@ -312,21 +394,25 @@ class ArcSearch {
   bool ContinuesArc(std::int32_t n) {
     bool const skipFirstGap = n != run_.minCount;
     for (std::int32_t j = lastTested_ + 1; j < n; ++j) {
-      if (!GeometryUtils::IsValidArcOrder(*out_.centre, *out_.ccw, PointAt(0), PointAt(j - 1),
+      if (!GeometryUtils::IsValidArcOrder(arc_.centre, arc_.ccw, PointAt(0), PointAt(j - 1),
                                           PointAt(j), skipFirstGap)) {
         return false;
       }
     }
-    if (sense_ && *sense_ != *out_.ccw) return false;
+    if (sense_ && *sense_ != arc_.ccw) return false;
     lastTested_ = n - 1;
-    sense_ = *out_.ccw;
+    sense_ = arc_.ccw;
     return true;
   }
 
-  void Save(std::int32_t count) {
-    saved_ = Success{*out_.start,  workingEnd_, count,           *out_.centre,
-                     *out_.radius, *out_.ccw,   *out_.deviation, *out_.deviationIndex,
-                     *out_.cells,  samples_};
+  void Save() {
+    if (!saved_) saved_.emplace();
+    saved_->arc = arc_;
+    saved_->end = workingEnd_;
+    saved_->count = triedCount_;
+    if (out_.cells == nullptr) return;
+    saved_->cell = std::move(cell_);
+    saved_->samples = samples_;
   }
 
   /// The end that the next try of n points starts from.
@@ -340,38 +426,42 @@ class ArcSearch {
     }
   }
 
-  ErrorCode Finish(std::int32_t count) {
+  void Finish() {
     *out_.end = workingEnd_;
-    *out_.count = count;
-    GeometryUtils::SetProgressState(progress_, run_.first + count);
-    return ErrorCode::Ok;
+    *out_.count = triedCount_;
+    GeometryUtils::SetProgressState(progress_, run_.first + triedCount_);
   }
 
   void Restore(ErrorCode reason) {
-    if (reason == ErrorCode::SelfIntersection) {
-      // Where it cannot be thinned, the cell stays as it is.
-      GeometryUtils::ReduceCircleArcPoints(
-          &saved_->samples, &saved_->cells, static_cast<int>((saved_->samples.size() - 1) / 2),
-          run_.startFixed, &saved_->start, run_.endFixed, &saved_->end, run_.points, run_.first,
-          saved_->count, saved_->ccw);
+    arc_ = saved_->arc;
+    workingEnd_ = saved_->end;
+    triedCount_ = saved_->count;
+    WriteArc();
+    cell_ = std::move(saved_->cell);
+    // A cell whose samples can be thinned is handed out empty.
+    if (reason == ErrorCode::SelfIntersection && out_.cells != nullptr) ThinSaved();
+    Finish();
+  }
+
+  void ThinSaved() {
+    Point centre;
+    if (!cell_.Center(&centre)) return;
+    int const steps = static_cast<int>((saved_->samples.size() - 1) / 2);
+    if (Fitting::ThinSamples(RunOf(triedCount_), centre, steps, arc_.ccw, &saved_->samples) ==
+        ErrorCode::Ok) {
+      cell_.clear();
     }
-    *out_.start = saved_->start;
-    *out_.end = saved_->end;
-    *out_.cells = saved_->cells;
-    *out_.count = saved_->count;
-    *out_.centre = saved_->centre;
-    *out_.radius = saved_->radius;
-    *out_.ccw = saved_->ccw;
-    *out_.deviation = saved_->deviation;
-    *out_.deviationIndex = saved_->deviationIndex;
-    GeometryUtils::SetProgressState(progress_, run_.first + saved_->count);
   }
 
   Run const run_;
   Outputs const out_;
   ProgressBase const& progress_;
+  ArcFit fit_;
+  ArcFit::Arc arc_;
   Point workingEnd_;
+  std::int32_t triedCount_ = 0;
   std::vector<IndexedPoint> samples_;
+  Cells::CellSequence cell_;
   /// Positions up to here are known to be in order; the first three need no test.
   std::int32_t lastTested_ = 2;
   std::optional<bool> sense_;

@@ -147,7 +147,6 @@ ErrorCode CellsWalk::FitArc(std::int32_t count, bool startFixed, bool endFixed, 
   Point arcStart = CurrentEnd();
   Point arcEnd = end;
   std::vector<GeometryUtils::IndexedPoint> samples;
-  std::vector<GeometryUtils::Triangle> cells;
   std::int32_t arcCount = 0;
   Point centre;
   double radius = 0.0;
@@ -155,7 +154,7 @@ ErrorCode CellsWalk::FitArc(std::int32_t count, bool startFixed, bool endFixed, 
   double deviation = 0.0;
   std::int32_t deviationIndex = -1;
   ErrorCode const code = GeometryUtils::GetFittingCircleO(
-      points_, anchor_, count, startFixed, &arcStart, endFixed, &arcEnd, &samples, &cells,
+      points_, anchor_, count, startFixed, &arcStart, endFixed, &arcEnd, &samples, nullptr,
       &arcCount, &centre, &radius, &ccw, &deviation, &deviationIndex);
   if (code != ErrorCode::Ok) return code;
   PlaceStart(arcStart);

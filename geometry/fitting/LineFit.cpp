@@ -10,8 +10,12 @@
 #include <cstddef>
 #include <cstdint>
 #include <optional>
+#include <utility>
 #include <vector>
 
+#include "geometry/cells/CellSequence.h"
+#include "geometry/cells/FixedPoints.h"
+#include "geometry/elementary/ImplicitLine.h"
 #include "geometry/fitting/Runs.h"
 #include "vorn/GeometryUtils.h"
 
@@ -19,6 +23,42 @@ namespace Vorn {
 
 using Fitting::At;
 using Fitting::ToPoint;
+
+namespace {
+
+using Cells::CellSequence;
+using Point = GeometryUtils::Point;
+
+/// As GetCenterForLine.
+bool CenterForLine(Cells::FixedPoints const& fixed, CellSequence const& cell, Point* center) {
+  if (!fixed.IsAny()) return cell.Center(center);
+  double rect[4];
+  GeometryUtils::Triangle candidate;
+  return cell.BoundingRect(rect) && fixed.FindCandidate(rect, &candidate) &&
+         cell.CenterOfOverlapWith(candidate, center);
+}
+
+/// The ends of the line that a parameter point stands for: fixed ones as they are, the others the
+/// feet of the given points.
+bool CutLine(Point const& parameters, Point const& nearStart, Point const& nearEnd,
+             Cells::FixedPoints const& fixed, Point* start, Point* end) {
+  Lines::ImplicitLine const line{fixed.swapped ? 1.0 : parameters.y,
+                                 fixed.swapped ? parameters.y : 1.0, parameters.x};
+  auto const findFoot = [&line](Point const& p, Point* foot) {
+    return Lines::Cross(line, line.NormalThrough(p.x, p.y), &foot->x, &foot->y) ==
+           SegmentsRelPosition::Intersecting;
+  };
+  *start = fixed.p1;
+  *end = fixed.p2;
+  return (fixed.hasP1 || findFoot(nearStart, start)) && (fixed.hasP2 || findFoot(nearEnd, end));
+}
+
+/// Stretches of a run that are kept to go back to. A limit falls by one point at a time, and a
+/// stretch spans half a dozen points or more, so older ones are hardly ever asked for; then the run
+/// is grown anew.
+constexpr std::size_t kKeptStretches = 16;
+
+}  // namespace
 
 /// One call of the line fitter.
 class LineRun {
@@ -52,18 +92,37 @@ class LineRun {
         out_(out),
         progress_(progress) {}
 
-  /// Grows, closes, and grows again with a lower limit until a run is returned. Every round lowers
-  /// the limit, and two points always are a run.
+  /// Grows until the run ends, then closes it, with a lower limit again and again, until a run is
+  /// returned. Two points always are a run.
   ErrorCode Fit() {
-    for (;;) {
-      if (limit_ <= 2) return CloseWithTwoPoints();
-      std::optional<ErrorCode> const result = GrowAndClose();
-      if (result) return *result;
+    if (limit_ <= 2) return CloseWithTwoPoints();
+    std::optional<ErrorCode> result;
+    switch (Grow()) {
+      case Growth::Failed:
+        return ErrorCode::Failed;
+      case Growth::TurnedBack:
+        LowerLimit(taken_, true);
+        break;
+      case Growth::LowerLimit:
+        LowerLimit(taken_, false);
+        break;
+      case Growth::Early:
+        result = CloseEarly();
+        break;
+      case Growth::Full:
+        result = CloseFull();
+        break;
     }
+    while (!result) {
+      if (limit_ <= 2) return CloseWithTwoPoints();
+      GrowAgain();
+      result = CloseFull();
+    }
+    return *result;
   }
 
  private:
-  /// How a round of growth ended.
+  /// How the growth ended.
   enum class Growth { Full, Early, TurnedBack, LowerLimit, Failed };
 
   /// The line through the cell's centre, cut to the run, and its largest relative deviation.
@@ -74,72 +133,83 @@ class LineRun {
     std::int32_t deviationIndex;
   };
 
-  std::optional<ErrorCode> GrowAndClose() {
-    switch (Grow()) {
-      case Growth::Failed:
-        return ErrorCode::Failed;
-      case Growth::TurnedBack:
-        LowerLimit(taken_, true);
-        return std::nullopt;
-      case Growth::LowerLimit:
-        LowerLimit(taken_, false);
-        return std::nullopt;
-      case Growth::Early:
-        return CloseEarly();
-      case Growth::Full:
-        break;
+  /// A stretch of the growth over which the cell was only narrowed. Its first depth belongs to
+  /// `begin` points taken, every further depth to one point more.
+  struct Stretch {
+    std::int32_t begin;
+    std::size_t firstDepth;
+    CellSequence cell;
+
+    void ReturnTo(std::int32_t taken) {
+      cell.ReturnTo(firstDepth + static_cast<std::size_t>(taken - begin));
     }
-    return CloseFull();
-  }
+  };
 
   void LowerLimit(std::int32_t limit, bool hasTurnedBack) {
     limit_ = limit;
     hasTurnedBack_ = hasTurnedBack;
   }
 
+  CellSequence& Cell() { return stretches_.back().cell; }
+  bool HasCell() const { return !stretches_.empty(); }
+
   /// Takes points until the limit is reached or the next one does not fit.
   Growth Grow() {
     WPoint const& first = At(points_, start_);
-    WPoint previous = first;
     taken_ = 1;
-    cell_.clear();
+    stretches_.clear();
     while (taken_ < limit_) {
+      WPoint const& previous = At(points_, start_ + taken_ - 1);
       WPoint const& next = At(points_, start_ + taken_);
       if (taken_ > 1 &&
           !GeometryUtils::IsValidLineOrder(ToPoint(first), ToPoint(previous), ToPoint(next))) {
         return Growth::TurnedBack;
       }
-      std::vector<Triangle> pairCell;
-      if (GeometryUtils::GetLineTriangles(previous, next, &formFixed_, &xOfY_, &pairCell) !=
+      if (GeometryUtils::GetLineTriangles(previous, next, &formFixed_, &xOfY_, &pairCell_) !=
           ErrorCode::Ok) {
         // Points too close, or lines that have no parameters in this run's form: the run so far is
         // all there is, and no later round could make a longer one.
         return Growth::Early;
       }
-      if (cell_.empty()) {
-        cell_ = pairCell;
-      } else if (Fitting::IsOversized(cell_, Fitting::kLineCellWeight)) {
+      if (!HasCell()) {
+        BeginStretch(CellSequence(pairCell_));
+      } else if (Fitting::IsOversized(Cell().size(), Fitting::kLineCellWeight)) {
         Growth const rebuilt = RebuildCell(next);
         if (rebuilt != Growth::Full) return rebuilt;
       } else {
-        std::vector<Triangle> common = Overlap(cell_, pairCell);
-        if (common.empty()) return Growth::Early;
-        cell_.swap(common);
+        Cell().NarrowBy(pairCell_);
+        if (Cell().empty()) {
+          Cell().ReturnTo(Cell().Depth() - 1);
+          return Growth::Early;
+        }
       }
-      previous = next;
       ++taken_;
       GeometryUtils::SetProgressState(progress_, start_ + taken_ - 1);
     }
     return Growth::Full;
   }
 
-  static std::vector<Triangle> Overlap(std::vector<Triangle> const& cell,
-                                       std::vector<Triangle> const& other) {
-    std::vector<Triangle> common;
-    for (Triangle const& triangle : cell) {
-      GeometryUtils::GetOverlapping(triangle, &other, &common);
+  /// The cell after one point more.
+  void BeginStretch(CellSequence&& cell) {
+    std::size_t const depth = cell.Depth();
+    stretches_.push_back({taken_ + 1, depth, std::move(cell)});
+    if (stretches_.size() > kKeptStretches) stretches_.erase(stretches_.begin());
+  }
+
+  /// Growing again from the first point would take the same points into the same cells, so the run
+  /// only goes back to what it was at the limit. What it would report as progress is reported.
+  void GrowAgain() {
+    while (HasCell() && stretches_.back().begin > limit_) stretches_.pop_back();
+    if (!HasCell()) {
+      Grow();
+      return;
     }
-    return common;
+    stretches_.back().ReturnTo(limit_);
+    taken_ = limit_;
+    if (progress_.state == nullptr) return;
+    for (std::int32_t taken = 2; taken <= limit_; ++taken) {
+      GeometryUtils::SetProgressState(progress_, start_ + taken - 1);
+    }
   }
 
   /// Replaces an oversized cell by that of a short chain: the first point, the points that deviate
@@ -158,44 +228,57 @@ class LineRun {
     chain.erase(std::unique(chain.begin(), chain.end()), chain.end());
     chain.push_back(start_ + taken_);
 
-    std::vector<Triangle> chainCell;
+    CellSequence chainCell;
     std::int32_t from = start_;
     for (std::int32_t const to : chain) {
-      std::vector<Triangle> pairCell;
       if (GeometryUtils::GetLineTriangles(At(points_, from), At(points_, to), &formFixed_, &xOfY_,
-                                          &pairCell) != ErrorCode::Ok) {
+                                          &pairCell_) != ErrorCode::Ok) {
         return lastAttempt_ ? Growth::LowerLimit : Growth::Failed;
       }
       if (from == start_) {
-        chainCell = pairCell;
+        chainCell = CellSequence(pairCell_);
       } else {
-        chainCell = Overlap(chainCell, pairCell);
+        chainCell.NarrowBy(pairCell_);
         if (chainCell.empty()) return Growth::LowerLimit;
       }
       from = to;
     }
-    cell_.swap(chainCell);
+    BeginStretch(std::move(chainCell));
     return Growth::Full;
   }
 
   std::optional<Segment> MakeSegment() const {
-    WPoint const& first = At(points_, start_);
-    WPoint const& last = At(points_, start_ + taken_ - 1);
+    Cells::FixedPoints const fixed{ends_.startFixed, *ends_.start, ends_.endFixed, *ends_.end,
+                                   xOfY_};
     Segment segment{};
-    if (!GeometryUtils::GetOptimalLineSegment(&cell_, first.x, first.y, last.x, last.y, xOfY_,
-                                              ends_.startFixed, *ends_.start, ends_.endFixed,
-                                              *ends_.end, &segment.start.x, &segment.start.y,
-                                              &segment.end.x, &segment.end.y)) {
+    Point center;
+    if (!HasCell() || !CenterForLine(fixed, stretches_.back().cell, &center) ||
+        !CutLine(center, ToPoint(At(points_, start_)), ToPoint(At(points_, start_ + taken_ - 1)),
+                 fixed, &segment.start, &segment.end)) {
       return std::nullopt;
     }
-    segment.deviation = GeometryUtils::GetMaxDeviationFromLine(
-        points_, start_, taken_, segment.start, segment.end, &segment.deviationIndex);
     return segment;
+  }
+
+  void Measure(Segment* segment) {
+    segment->deviation = GeometryUtils::GetMaxDeviationFromLine(
+        points_, start_, taken_, segment->start, segment->end, &segment->deviationIndex);
+    offender_ = segment->deviationIndex;
+  }
+
+  /// Whether the point that spoilt the round before spoils this one as well; then nothing else need
+  /// be measured. A run is closed dozens of times for one and the same point.
+  bool IsSpoiltAgain(Segment const& segment) const {
+    if (offender_ < start_ || offender_ >= start_ + taken_) return false;
+    std::int32_t index = -1;
+    return GeometryUtils::GetMaxDeviationFromLine(points_, offender_, 1, segment.start, segment.end,
+                                                  &index) > 1.0;
   }
 
   /// Ends a run that stopped before the limit: it must be within tolerance as it stands.
   std::optional<ErrorCode> CloseEarly() {
-    std::optional<Segment> const segment = MakeSegment();
+    std::optional<Segment> segment = MakeSegment();
+    if (segment) Measure(&*segment);
     if (!segment || !IsWithinTolerance(*segment)) {
       LowerLimit(taken_ - 1, false);
       return std::nullopt;
@@ -208,11 +291,17 @@ class LineRun {
   /// Ends a run that reached the limit. Unless this is the last attempt, a run that leaves the
   /// tolerance is handed out as well, with the points that deviate most for the next attempt.
   std::optional<ErrorCode> CloseFull() {
-    std::optional<Segment> const segment = MakeSegment();
+    std::optional<Segment> segment = MakeSegment();
     if (!segment) {
       LowerLimit(taken_ - 1, false);
       return std::nullopt;
     }
+    if (lastAttempt_ && IsSpoiltAgain(*segment)) {
+      ReportTaken();
+      LowerLimit(taken_ - 1, false);
+      return std::nullopt;
+    }
+    Measure(&*segment);
     WriteOutputs(*segment);
     if (IsWithinTolerance(*segment)) {
       out_.indexList->clear();
@@ -250,8 +339,10 @@ class LineRun {
     *ends_.end = segment.end;
     *out_.deviation = segment.deviation;
     *out_.deviationIndex = segment.deviationIndex;
-    GeometryUtils::SetProgressState(progress_, start_ + taken_);
+    ReportTaken();
   }
+
+  void ReportTaken() { GeometryUtils::SetProgressState(progress_, start_ + taken_); }
 
   ErrorCode Finish() {
     *out_.code = hasTurnedBack_ ? ErrorCode::SelfIntersection : ErrorCode::Ok;
@@ -271,7 +362,10 @@ class LineRun {
   bool formFixed_ = false;
   bool xOfY_ = false;
   std::int32_t taken_ = 0;
-  std::vector<Triangle> cell_;
+  /// Where the line of the last round deviated most.
+  std::int32_t offender_ = -1;
+  std::vector<Stretch> stretches_;
+  std::vector<Triangle> pairCell_;
 };
 
 ErrorCode GeometryUtils::GetFittingLine(std::vector<WPoint> const& points, std::int32_t start,
@@ -293,16 +387,13 @@ bool GeometryUtils::GetOptimalLineSegment(std::vector<Triangle> const* cell, dou
                                           Point startPoint, bool endFixed, Point endPoint,
                                           double* sx, double* sy, double* ex, double* ey) {
   Point center;
-  if (!GetCenterForLine(startFixed, startPoint, endFixed, endPoint, xOfY, cell, &center)) {
+  Point start;
+  Point end;
+  if (!GetCenterForLine(startFixed, startPoint, endFixed, endPoint, xOfY, cell, &center) ||
+      !CutLine(center, {x1, y1}, {x2, y2}, {startFixed, startPoint, endFixed, endPoint, xOfY},
+               &start, &end)) {
     return false;
   }
-  double const a = xOfY ? 1.0 : center.y;
-  double const b = xOfY ? center.y : 1.0;
-  double const c = center.x;
-  Point start = startPoint;
-  Point end = endPoint;
-  if (!startFixed && !GetNearestPointOnLine(a, b, c, {x1, y1}, &start)) return false;
-  if (!endFixed && !GetNearestPointOnLine(a, b, c, {x2, y2}, &end)) return false;
   *sx = start.x;
   *sy = start.y;
   *ex = end.x;

@@ -87,7 +87,7 @@ bool MixedWalk::FitArc(std::int32_t remaining, std::int32_t minimumRun, Arc* arc
   arc->start = start_;
   arc->end = end_;
   return GeometryUtils::GetFittingCircle2(points_, runStart_, remaining, minimumRun, startFixed_,
-                                          &arc->start, false, &arc->end, &cells_, &arc->count,
+                                          &arc->start, false, &arc->end, nullptr, &arc->count,
                                           &arc->centre, &arc->radius, &arc->ccw, &arc->deviation,
                                           &arc->deviationIndex, progress_) == ErrorCode::Ok;
 }

@@ -13,6 +13,7 @@
 #include <vector>
 
 #include "geometry/fitting/Runs.h"
+#include "geometry/fitting/SampleThinning.h"
 #include "geometry/fitting/Triples.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
@@ -28,22 +29,13 @@ class SampleThinning {
   using IndexedPoint = GeometryUtils::IndexedPoint;
   using Point = GeometryUtils::Point;
 
-  struct Run {
-    std::vector<WPoint> const& points;
-    std::int32_t begin;
-    std::int32_t count;
-
-    WPoint const& First() const { return At(points, begin); }
-    WPoint const& Last() const { return At(points, begin + count - 1); }
-  };
-
-  SampleThinning(std::vector<IndexedPoint> const& samples, Run const& run, Point const& centre)
+  SampleThinning(std::vector<IndexedPoint> const& samples, Fitting::ArcRun const& run,
+                 Point const& centre)
       : samples_(samples), run_(run), centre_(centre) {}
 
   /// Enters the samples of all triples up to a step into the map. False when a triple leaves the
   /// list.
-  bool EnterTriples(int steps, bool firstFixed, Point const& first, bool lastFixed,
-                    Point const& last) {
+  bool EnterTriples(int steps) {
     int const size = static_cast<int>(samples_.size());
     Fitting::UsedSamples used(samples_.size());
     for (int step = 1; step <= steps; ++step) {
@@ -56,8 +48,8 @@ class SampleThinning {
         bool usedLast = false;
         double coords[6];
         GeometryUtils::TriPointsCoordsToArray(&samples_, triple.i0, triple.i1, triple.i2,
-                                              firstFixed, first, lastFixed, last, &usedFirst,
-                                              &usedLast, coords);
+                                              run_.startFixed, run_.start, run_.endFixed, run_.end,
+                                              &usedFirst, &usedLast, coords);
         Enter(triple.i0, {coords[0], coords[1]});
         Enter(triple.i1, {coords[2], coords[3]});
         Enter(triple.i2, {coords[4], coords[5]});
@@ -96,8 +88,8 @@ class SampleThinning {
   /// Finds the measured point whose direction from the centre is nearest to the middle of the arc.
   /// False when the run has no chord or the arc no middle.
   bool FindMiddle(bool ccw) {
-    WPoint const& first = run_.First();
-    WPoint const& last = run_.Last();
+    WPoint const& first = At(run_.points, run_.first);
+    WPoint const& last = At(run_.points, run_.first + run_.count - 1);
     double a = 0.0;
     double b = 0.0;
     double c = 0.0;
@@ -164,7 +156,7 @@ class SampleThinning {
   std::optional<std::int32_t> NearestInDirection(double direction) const {
     std::optional<std::int32_t> nearest;
     double smallest = 0.0;
-    for (std::int32_t j = run_.begin + 1; j <= run_.begin + run_.count - 2; ++j) {
+    for (std::int32_t j = run_.first + 1; j <= run_.first + run_.count - 2; ++j) {
       double difference = std::fabs(Direction(ToPoint(At(run_.points, j))) - direction);
       if (difference > Numeric::kTruncatedPi) difference = Numeric::kTruncatedTwoPi - difference;
       if (!nearest || difference < smallest) {
@@ -188,7 +180,7 @@ class SampleThinning {
   }
 
   std::vector<IndexedPoint> const& samples_;
-  Run const run_;
+  Fitting::ArcRun const& run_;
   Point const centre_;
 
   SampleMap entered_;
@@ -199,6 +191,16 @@ class SampleThinning {
   std::optional<std::int32_t> middle_;
 };
 
+ErrorCode Fitting::ThinSamples(ArcRun const& run, GeometryUtils::Point const& centre, int steps,
+                               bool ccw, std::vector<GeometryUtils::IndexedPoint>* samples) {
+  SampleThinning thinning(*samples, run, centre);
+  if (!thinning.EnterTriples(steps) || !thinning.HasEnoughSamples()) return ErrorCode::Failed;
+  thinning.FindNearestAndFarthest();
+  if (!thinning.FindMiddle(ccw)) return ErrorCode::Failed;
+  *samples = thinning.Rebuild();
+  return ErrorCode::Ok;
+}
+
 ErrorCode GeometryUtils::ReduceCircleArcPoints(std::vector<IndexedPoint>* samples,
                                                std::vector<Triangle>* cell, int steps,
                                                bool firstFixed, Point* first, bool lastFixed,
@@ -207,17 +209,10 @@ ErrorCode GeometryUtils::ReduceCircleArcPoints(std::vector<IndexedPoint>* sample
   if (count < 1 || !Fitting::HoldsRun(wpoints, begin, count)) return ErrorCode::Failed;
   Point centre;
   if (!GetCenter(cell, &centre)) return ErrorCode::Failed;
-
-  SampleThinning thinning(*samples, {wpoints, begin, count}, centre);
-  if (!thinning.EnterTriples(steps, firstFixed, *first, lastFixed, *last)) {
-    return ErrorCode::Failed;
-  }
-  if (!thinning.HasEnoughSamples()) return ErrorCode::Failed;
-  thinning.FindNearestAndFarthest();
-  if (!thinning.FindMiddle(ccw)) return ErrorCode::Failed;
-  *samples = thinning.Rebuild();
-  cell->clear();
-  return ErrorCode::Ok;
+  ErrorCode const code = Fitting::ThinSamples(
+      {wpoints, begin, count, firstFixed, *first, lastFixed, *last}, centre, steps, ccw, samples);
+  if (code == ErrorCode::Ok) cell->clear();
+  return code;
 }
 
 void GeometryUtils::GetTriPointIndices(int step, int size, int mirror, int* i0, int* i1, int* i2) {

@@ -37,8 +37,8 @@ inline constexpr std::size_t kCellBudget = 625000;
 inline constexpr std::size_t kLineCellWeight = 8;
 inline constexpr std::size_t kArcCellWeight = 32;
 
-inline bool IsOversized(std::vector<GeometryUtils::Triangle> const& cell, std::size_t weight) {
-  return cell.size() * weight > kCellBudget;
+constexpr bool IsOversized(std::size_t cellSize, std::size_t weight) {
+  return cellSize * weight > kCellBudget;
 }
 
 }  // namespace Vorn::Fitting

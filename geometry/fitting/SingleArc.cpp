@@ -87,12 +87,11 @@ ErrorCode SingleArcFit::FindStartingCircle() {
 
   Point start;
   Point end;
-  std::vector<GeometryUtils::Triangle> cells;
   std::int32_t arcCount = 0;
   double deviation = 0.0;
   std::int32_t deviationIndex = -1;
   ErrorCode const code = GeometryUtils::GetFittingCircle2(
-      reduced, 0, reducedCount, kFewestArcPoints, false, &start, false, &end, &cells, &arcCount,
+      reduced, 0, reducedCount, kFewestArcPoints, false, &start, false, &end, nullptr, &arcCount,
       &circle_.centre, &circle_.radius, &ccw_, &deviation, &deviationIndex, progress_);
   if (code != ErrorCode::Ok && code != ErrorCode::OrientationMismatch) return code;
   if (code == ErrorCode::Ok && arcCount >= reducedCount) {

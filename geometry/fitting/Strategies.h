@@ -64,7 +64,6 @@ class MixedWalk {
   Point start_;
   Point end_;
   std::vector<std::int32_t> indexList_;
-  std::vector<GeometryUtils::Triangle> cells_;
   LargestDeviation largest_;
 };
 

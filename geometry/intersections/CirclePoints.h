@@ -20,4 +20,7 @@ struct CirclePoints {
 /// point when the line is tangent to the circle, none for a segment of zero length.
 CirclePoints CutCircle(double x1, double y1, double x2, double y2, double cx, double cy, double r);
 
+/// Where the line a*x + b*y + c = 0 cuts the circle.
+CirclePoints CutCircleByLine(double a, double b, double c, double cx, double cy, double r);
+
 }  // namespace Vorn::Intersections

@@ -5,6 +5,7 @@
 
 #include <cmath>
 
+#include "geometry/elementary/ImplicitLine.h"
 #include "geometry/intersections/CirclePoints.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
@@ -54,27 +55,34 @@ int GeometryUtils::GetLineSegmentAndCircleIntersection(double x1, double y1, dou
   return Intersections::CutCircle(x1, y1, x2, y2, cx, cy, r).Write(ax, ay, bx, by);
 }
 
-int GeometryUtils::GetLineAndCircleIntersection(double a, double b, double c, double cx, double cy,
-                                                double r, double* ax, double* ay, double* bx,
-                                                double* by) {
+CirclePoints Intersections::CutCircleByLine(double a, double b, double c, double cx, double cy,
+                                            double r) {
   double distance = 0.0;
-  if (!GetDeviation(a, b, c, cx, cy, &distance) || distance > r) return 0;
-  Point foot;
-  if (!GetNearestPointOnLine(a, b, c, {cx, cy}, &foot)) return 0;
-
+  if (!GeometryUtils::GetDeviation(a, b, c, cx, cy, &distance) || distance > r) return {};
+  Lines::ImplicitLine const line{a, b, c};
+  double footX = 0.0;
+  double footY = 0.0;
+  if (Lines::Cross(line, line.NormalThrough(cx, cy), &footX, &footY) !=
+      SegmentsRelPosition::Intersecting) {
+    return {};
+  }
   // A stretch of the line that is sure to hold the chord, measured along the coordinate in which
   // the line changes faster; the other coordinate follows from the line itself.
   double const reach = 2.0 * r;
   if (std::fabs(a) > std::fabs(b)) {
-    double const y1 = foot.y + reach;
-    double const y2 = foot.y - reach;
-    return GetLineSegmentAndCircleIntersection(-(b / a) * y1 - c / a, y1, -(b / a) * y2 - c / a, y2,
-                                               cx, cy, r, ax, ay, bx, by);
+    double const y1 = footY + reach;
+    double const y2 = footY - reach;
+    return CutCircle(-(b / a) * y1 - c / a, y1, -(b / a) * y2 - c / a, y2, cx, cy, r);
   }
-  double const x1 = foot.x + reach;
-  double const x2 = foot.x - reach;
-  return GetLineSegmentAndCircleIntersection(x1, -(a / b) * x1 - c / b, x2, -(a / b) * x2 - c / b,
-                                             cx, cy, r, ax, ay, bx, by);
+  double const x1 = footX + reach;
+  double const x2 = footX - reach;
+  return CutCircle(x1, -(a / b) * x1 - c / b, x2, -(a / b) * x2 - c / b, cx, cy, r);
+}
+
+int GeometryUtils::GetLineAndCircleIntersection(double a, double b, double c, double cx, double cy,
+                                                double r, double* ax, double* ay, double* bx,
+                                                double* by) {
+  return Intersections::CutCircleByLine(a, b, c, cx, cy, r).Write(ax, ay, bx, by);
 }
 
 bool GeometryUtils::GetNearestPointOnCircle(Point const& center, double radius, Point const& p,

@@ -582,6 +582,7 @@ class VORN_EXPORT GeometryUtils {
   // Each holds the working state of one operation while it runs and calls the inner steps below.
   friend class LineRun;
   friend class ArcCellBuilder;
+  friend class ArcFit;
   friend class ArcSearch;
   friend class SampleThinning;
   friend class MeanCircleRun;

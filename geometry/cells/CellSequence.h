@@ -1,0 +1,86 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <span>
+#include <vector>
+
+#include "geometry/cells/TriangleOverlap.h"
+#include "vorn/GeometryUtils.h"
+
+namespace Vorn::Cells {
+
+/// A cell that is narrowed again and again, held without its copies.
+///
+/// Narrowing puts in the place of every triangle the triangles of its overlaps with another cell. A
+/// contained triangle is replaced by three copies of itself, so after a few rounds a cell of
+/// thousands of triangles consists of copies of a few dozen. Equal triangles have equal overlaps;
+/// so each distinct one is overlapped once, and the cell as a sequence is what comes of the first
+/// one by replacing letters by words, round after round:
+///
+///   level 0   A B            the triangles the cell began with
+///   level 1   A -> C C C     B -> D E
+///   level 2   C -> F F F     D -> G      E -> (nothing)
+///
+/// stands for F F F F F F F F F G. Letters of a level are numbered in the order in which they first
+/// occur in the sequence. Order and number of the copies are kept exactly: the cell's centre is a
+/// floating-point sum over them.
+class CellSequence {
+ public:
+  CellSequence() = default;
+  explicit CellSequence(std::span<GeometryUtils::Triangle const> triangles);
+
+  /// The number of triangles, copies included.
+  std::size_t size() const { return levels_.empty() ? 0 : levels_.back().size; }
+  bool empty() const { return size() == 0; }
+  void clear() { levels_.clear(); }
+
+  /// Replaces every triangle by its overlaps with the triangles of another cell, in order.
+  void NarrowBy(std::span<GeometryUtils::Triangle const> other);
+
+  /// How often the cell has been narrowed, plus one.
+  std::size_t Depth() const { return levels_.size(); }
+
+  /// Goes back to what the cell was at a depth.
+  void ReturnTo(std::size_t depth) { levels_.resize(depth); }
+
+  /// As GetBoundingRect, GetCenter and the centre of what GetOverlapping gives for a candidate.
+  bool BoundingRect(double* rect) const;
+  bool Center(GeometryUtils::Point* center) const;
+  bool CenterOfOverlapWith(GeometryUtils::Triangle const& candidate,
+                           GeometryUtils::Point* center) const;
+
+  /// The triangles one by one, copies included.
+  std::vector<GeometryUtils::Triangle> Expand() const;
+
+  /// The words that replace the letters of one level by letters of the next.
+  struct Words {
+    /// Where each word ends in `letters`; it begins where the one before ends.
+    std::vector<std::uint32_t> ends;
+    std::vector<std::uint32_t> letters;
+
+    std::span<std::uint32_t const> Of(std::uint32_t letter) const {
+      std::uint32_t const begin = letter == 0 ? 0 : ends[letter - 1];
+      return {letters.data() + begin, letters.data() + ends[letter]};
+    }
+  };
+
+ private:
+  struct Level {
+    Words words;
+    std::vector<Shape> shapes;
+    /// How often each letter occurs in the sequence.
+    std::vector<std::size_t> counts;
+    std::size_t size = 0;
+  };
+
+  /// Collects the words of a new level and numbers its letters.
+  class LevelBuilder;
+
+  Level OverlapWith(Shape const& candidate) const;
+  bool CenterWith(Level const* last, GeometryUtils::Point* center) const;
+
+  std::vector<Level> levels_;
+};
+
+}  // namespace Vorn::Cells

@@ -1,0 +1,77 @@
+#pragma once
+
+#include <cstddef>
+#include <type_traits>
+
+#include "vorn/GeometryUtils.h"
+
+/// The common part of two triangles without allocation, for cells that are cut thousands of times.
+namespace Vorn::Cells {
+
+/// A vector of fixed capacity on the stack, for plain records. Room is left as it is until it is
+/// used: clearing it would cost more than many an overlap.
+template <typename T, std::size_t kCapacity>
+class InlineVector {
+  static_assert(std::is_trivially_copyable_v<T>);
+
+ public:
+  InlineVector() {}  // NOLINT(modernize-use-equals-default): the union has no default
+
+  void push_back(T const& value) { items_[size_++] = value; }
+  void resize(std::size_t size) { size_ = size; }
+  void clear() { size_ = 0; }
+  std::size_t size() const { return size_; }
+  bool empty() const { return size_ == 0; }
+  T& operator[](std::size_t i) { return items_[i]; }
+  T const& operator[](std::size_t i) const { return items_[i]; }
+  T* data() { return items_; }
+  T const* begin() const { return items_; }
+  T const* end() const { return items_ + size_; }
+
+ private:
+  union {
+    T items_[kCapacity];
+  };
+  std::size_t size_ = 0;
+};
+
+/// A triangle with what every overlap asks of it: its sense, the part of its sides in the areas of
+/// the triangles that they form with a point, and its box.
+struct Shape {
+  explicit Shape(GeometryUtils::Triangle const& from);
+
+  /// Whether the boxes have no point in common. False when a coordinate is not a number.
+  bool IsApartFrom(Shape const& other) const {
+    return xMin > other.xMax || other.xMin > xMax || yMin > other.yMax || other.yMin > yMax;
+  }
+
+  /// Where a point lies; as GetPointStatus.
+  GeometryUtils::PointStatus StatusOf(GeometryUtils::Point const& p) const;
+
+  GeometryUtils::Triangle triangle;
+  /// x(i+1) * y(i) - x(i) * y(i+1) of side i.
+  double sideTerm[3];
+  double xMin, yMin, xMax, yMax;
+  int sense;
+};
+
+/// What two triangles have in common. A walk takes at most four points on each of three sides,
+/// twelve in all, and those make at most ten triangles.
+struct Overlap {
+  GeometryUtils::OverlappingStatus status = GeometryUtils::OverlappingStatus::NoOverlap;
+  InlineVector<GeometryUtils::Triangle, 10> parts;
+};
+
+/// The same triangles in the same order as GetOverlapping.
+void FindOverlap(Shape const& first, Shape const& second, Overlap* overlap);
+
+/// On one side at most three crossings and three shared stretches of two ends each are found, of
+/// which two stay.
+using CrossingPoints = InlineVector<GeometryUtils::CrossingPoint, 12>;
+
+/// Where the sides of one triangle cross those of another, by side of the first and along a side
+/// by distance from its start: at most two points a side.
+void FindCrossingPoints(GeometryUtils::Triangle const& first, GeometryUtils::Triangle const& second,
+                        CrossingPoints* points);
+
+}  // namespace Vorn::Cells
