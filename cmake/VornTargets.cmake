@@ -1,0 +1,89 @@
+# What every target of this project has in common.
+
+# Warnings, language level and floating-point mode for a target of ours.
+function(vorn_set_defaults target)
+  target_compile_features(${target} PRIVATE cxx_std_20)
+  if(MSVC)
+    target_compile_options(${target} PRIVATE /W4 /fp:precise $<$<BOOL:${VORN_WARNINGS_AS_ERRORS}>:/WX>)
+    return()
+  endif()
+
+  # No fused multiply-add: a compiler that contracts a*b + c rounds once where the source rounds
+  # twice, so the same contour would get other bits on another machine or optimisation level, and
+  # a cross product that is exactly zero could come out non-zero. Nor ever -ffast-math.
+  target_compile_options(${target} PRIVATE -ffp-contract=off)
+
+  # Not among them: -Wfloat-equal, because exact comparisons of doubles are meant here.
+  target_compile_options(
+    ${target}
+    PRIVATE -Wall
+            -Wextra
+            -Wpedantic
+            -Wshadow
+            -Wconversion
+            -Wsign-conversion
+            -Wdouble-promotion
+            -Wold-style-cast
+            -Wcast-align
+            -Wcast-qual
+            -Wformat=2
+            -Wimplicit-fallthrough
+            -Woverloaded-virtual
+            -Wundef
+            -Wunused
+            $<$<CXX_COMPILER_ID:GNU>:-Wduplicated-branches>
+            $<$<CXX_COMPILER_ID:GNU>:-Wduplicated-cond>
+            $<$<CXX_COMPILER_ID:GNU>:-Wlogical-op>
+            $<$<CXX_COMPILER_ID:Clang>:-Wextra-semi>
+            $<$<CXX_COMPILER_ID:Clang>:-Wcomma>
+            $<$<CXX_COMPILER_ID:Clang>:-Wunreachable-code>
+            $<$<BOOL:${VORN_WARNINGS_AS_ERRORS}>:-Werror>)
+endfunction()
+
+# Hidden visibility does not hide the instances of standard templates (namespace std has default
+# visibility), so the linker gets the list of what leaves the library.
+function(vorn_export_only_the_classes target)
+  if(NOT CMAKE_SYSTEM_NAME STREQUAL "Linux")
+    return()
+  endif()
+  set(map ${PROJECT_SOURCE_DIR}/cmake/exports.map)
+  target_link_options(${target} PRIVATE LINKER:--version-script=${map})
+  set_target_properties(${target} PROPERTIES LINK_DEPENDS ${map})
+  if(NOT VORN_SANITIZE)
+    # A sanitizer's run time is found in the program only, so its symbols stay open there.
+    target_link_options(${target} PRIVATE LINKER:--no-undefined)
+  endif()
+endfunction()
+
+# Sanitizers and coverage hold for every target made after this call.
+function(vorn_enable_instrumentation)
+  if(VORN_SANITIZE)
+    add_compile_options(-fsanitize=${VORN_SANITIZE} -fno-sanitize-recover=all
+                        -fno-omit-frame-pointer)
+    add_link_options(-fsanitize=${VORN_SANITIZE})
+    add_compile_definitions(_GLIBCXX_ASSERTIONS)
+  endif()
+  if(VORN_COVERAGE)
+    add_compile_options(--coverage)
+    add_link_options(--coverage)
+  endif()
+endfunction()
+
+# Rebuilds after a switch of branch or a fresh clone cost seconds instead of minutes.
+macro(vorn_use_ccache)
+  find_program(VORN_CCACHE ccache)
+  mark_as_advanced(VORN_CCACHE)
+  if(VORN_CCACHE AND NOT CMAKE_CXX_COMPILER_LAUNCHER)
+    set(CMAKE_CXX_COMPILER_LAUNCHER ${VORN_CCACHE})
+  endif()
+endmacro()
+
+# Adds the folder when the option says so; the option exists only when the folder is there.
+macro(vorn_add_optional_part option folder what)
+  if(EXISTS ${PROJECT_SOURCE_DIR}/${folder}/CMakeLists.txt)
+    option(${option} "Build ${what}" ${PROJECT_IS_TOP_LEVEL})
+    if(${option})
+      add_subdirectory(${folder})
+    endif()
+  endif()
+endmacro()
