@@ -1,0 +1,111 @@
+#include "cli/Json.h"
+
+#include <nlohmann/json.hpp>
+
+namespace Vorn::Cli {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+Json PointJson(GeometryUtils::Point const& point) { return {{"x", point.x}, {"y", point.y}}; }
+
+Json InputJson(Report const& report) {
+  Json units = nullptr;
+  if (!report.file.units.empty()) units = report.file.units;
+  return {
+      {"file", report.file.path},
+      {"points", report.file.points.size()},
+      {"units", units},
+      {"tolerance",
+       {{"source", report.toleranceSource},
+        {"smallest", report.SmallestTolerance()},
+        {"largest", report.LargestTolerance()}}},
+  };
+}
+
+Json RangeJson(std::optional<std::vector<PointRange>> const& ranges, std::size_t piece) {
+  if (!ranges) return nullptr;
+  PointRange const& range = (*ranges)[piece];
+  Json first = nullptr;
+  if (range.count > 0) first = range.first;
+  return {{"first", first}, {"count", range.count}};
+}
+
+Json ElementJson(Report const& report, std::size_t i) {
+  Piece const& piece = report.pieces[i];
+  Json json = {
+      {"number", i + 1},
+      {"kind", piece.IsArc() ? "arc" : "line"},
+      {"start", PointJson(piece.start)},
+      {"end", PointJson(piece.end)},
+      {"length", piece.length},
+      {"points", RangeJson(report.ranges, i)},
+  };
+  if (!piece.IsArc()) return json;
+  json["center"] = PointJson(piece.center);
+  json["radius"] = piece.radius;
+  json["direction"] = piece.counterClockwise ? "ccw" : "cw";
+  json["startAngle"] = piece.startAngle;
+  json["endAngle"] = piece.endAngle;
+  json["sweep"] = piece.sweep;
+  return json;
+}
+
+Json ReportedJson(Report const& report) {
+  bool const hasIndex = report.fit.deviationIndex >= 0;
+  Json index = nullptr;
+  if (hasIndex) index = report.fit.deviationIndex;
+  return {
+      {"value", report.fit.deviation},
+      {"kind", IsDeviationRelative(report.strategy) ? "relative" : "absolute"},
+      {"point", index},
+  };
+}
+
+Json RemeasuredJson(Report const& report) {
+  PointDeviation const& worst = report.remeasured.Worst();
+  return {
+      {"value", worst.relative},          {"kind", "relative"},
+      {"point", report.remeasured.worst}, {"distance", worst.distance},
+      {"element", worst.piece + 1},
+  };
+}
+
+char const* VerdictName(Verdict verdict) {
+  switch (verdict) {
+    case Verdict::WithinTolerance:
+      return "within tolerance";
+    case Verdict::OutsideTolerance:
+      return "outside tolerance";
+    case Verdict::StopsEarly:
+      return "stops early";
+  }
+  return "unknown";
+}
+
+}  // namespace
+
+std::string ToJson(Report const& report) {
+  Json elements = Json::array();
+  for (std::size_t i = 0; i < report.pieces.size(); ++i) {
+    elements.push_back(ElementJson(report, i));
+  }
+  Json const document = {
+      {"schemaVersion", kJsonSchemaVersion},
+      {"input", InputJson(report)},
+      {"strategy", NameOf(report.strategy)},
+      {"code", static_cast<std::int32_t>(report.fit.code)},
+      {"verdict", VerdictName(report.verdict)},
+      {"counts",
+       {{"elements", report.pieces.size()},
+        {"lines", report.LineCount()},
+        {"arcs", report.ArcCount()}}},
+      {"deviation", {{"reported", ReportedJson(report)}, {"remeasured", RemeasuredJson(report)}}},
+      {"elements", elements},
+  };
+  // A file name need not be UTF-8; a replacement character is better than no document.
+  return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+}
+
+}  // namespace Vorn::Cli

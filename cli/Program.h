@@ -1,0 +1,13 @@
+#pragma once
+
+#include <iosfwd>
+
+#include "cli/Failure.h"
+
+namespace Vorn::Cli {
+
+/// The whole program but for the process around it: results to `out`, messages to `err`, progress
+/// to the terminal, if any, on standard error.
+ExitCode RunProgram(int argc, char const* const* argv, std::ostream& out, std::ostream& err);
+
+}  // namespace Vorn::Cli

@@ -1,0 +1,75 @@
+#include "cli/Spacing.h"
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+
+#include "cli/Numbers.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr double kSpacingFactor = 1.5;
+constexpr int kDigits = 6;
+
+bool AreTooClose(WPoint const& a, WPoint const& b, double sumOfTolerances) {
+  double const needed = sumOfTolerances * kSpacingFactor;
+  double const dx = b.x - a.x;
+  double const dy = b.y - a.y;
+  return needed * needed >= dx * dx + dy * dy;
+}
+
+bool AllPass(std::vector<WPoint> const& points, double tolerance) {
+  for (std::size_t i = 1; i < points.size(); ++i) {
+    if (AreTooClose(points[i - 1], points[i], tolerance + tolerance)) return false;
+  }
+  return true;
+}
+
+}  // namespace
+
+double Distance(WPoint const& a, WPoint const& b) { return std::hypot(b.x - a.x, b.y - a.y); }
+
+std::optional<ClosePair> FindClosePair(std::vector<WPoint> const& points) {
+  for (std::size_t i = 1; i < points.size(); ++i) {
+    WPoint const& a = points[i - 1];
+    WPoint const& b = points[i];
+    if (AreTooClose(a, b, a.w + b.w)) {
+      return ClosePair{i, Distance(a, b), kSpacingFactor * (a.w + b.w)};
+    }
+  }
+  return {};
+}
+
+std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points) {
+  double smallest = std::numeric_limits<double>::infinity();
+  for (std::size_t i = 1; i < points.size(); ++i) {
+    smallest = std::min(smallest, Distance(points[i - 1], points[i]));
+  }
+  double const limit = smallest / (2.0 * kSpacingFactor);
+  // Rounding to six digits may go up, past the limit; one or two steps of the last digit down
+  // bring it below.
+  double const lastDigit = std::pow(10.0, std::floor(std::log10(limit)) - (kDigits - 1));
+  for (int steps = 0; steps < 4; ++steps) {
+    std::optional<double> const rounded =
+        ParseNumber(FormatShort(limit - steps * lastDigit, kDigits));
+    if (rounded && *rounded > 0.0 && AllPass(points, *rounded)) return rounded;
+  }
+  return {};
+}
+
+std::string DescribeClosePair(PointFile const& file, ClosePair const& pair) {
+  std::string text = file.path + ": " + file.NameOf(pair.second - 1) + " and " +
+                     file.NameOf(pair.second) + " are too close: distance " +
+                     FormatShort(pair.distance) + ", needed more than " + FormatShort(pair.needed) +
+                     " (1.5 times the sum of their tolerances)\n";
+  std::optional<double> const largest = LargestSingleTolerance(file.points);
+  if (!largest) {
+    return text + "no tolerance would pass: neighbours in this file coincide; remove one of them";
+  }
+  return text + "the largest single tolerance that would pass for this file is " +
+         FormatShort(*largest) + "; --tolerance-per-point CAP adapts it to the spacing";
+}
+
+}  // namespace Vorn::Cli

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "cli/CsvReader.h"
+#include "vorn/Types.h"
+
+namespace Vorn::Cli {
+
+/// Two neighbours too close to each other for their tolerances.
+struct ClosePair {
+  std::size_t second = 0;  ///< index of the later of the two points
+  double distance = 0.0;
+  double needed = 0.0;  ///< the distance must be above this
+};
+
+double Distance(WPoint const& a, WPoint const& b);
+
+/// The first pair of neighbours that is not further apart than 1.5 times the sum of its
+/// tolerances. The test is made on squares, as the library makes it, so both agree to the last
+/// bit.
+std::optional<ClosePair> FindClosePair(std::vector<WPoint> const& points);
+
+/// The largest tolerance, of six digits at most, with which every pair passes when all points
+/// have it; nothing when neighbours coincide.
+std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points);
+
+/// What the user needs to know about the pair to choose another tolerance.
+std::string DescribeClosePair(PointFile const& file, ClosePair const& pair);
+
+}  // namespace Vorn::Cli

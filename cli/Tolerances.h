@@ -1,0 +1,29 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "cli/CsvReader.h"
+
+namespace Vorn::Cli {
+
+/// The ways to state tolerances on the command line; at most one is set.
+struct ToleranceChoice {
+  std::optional<double> same;         ///< --tolerance
+  std::optional<std::string> column;  ///< --tolerance-column
+  std::optional<double> cap;          ///< --tolerance-per-point
+};
+
+/// Which column of the file the reader has to look for.
+ToleranceColumn ColumnFor(ToleranceChoice const& choice);
+
+/// Gives every point of the file its tolerance and says in words where it came from.
+///
+/// An option goes before what the file holds; without one a column `w` goes before a comment
+/// `# tolerance T`.
+///
+/// @throws Failure (ExitCode::Usage) when nobody gives a tolerance, or (PointsTooClose) when a
+///         tolerance by spacing would be zero because neighbours coincide.
+std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file);
+
+}  // namespace Vorn::Cli
