@@ -1,0 +1,18 @@
+# Makes the drawings anew with PROGRAM in WORK and compares them with those in SHIPPED.
+file(REMOVE_RECURSE ${WORK})
+file(MAKE_DIRECTORY ${WORK})
+execute_process(COMMAND ${PROGRAM} ${WORK} RESULT_VARIABLE code)
+if(NOT code EQUAL 0)
+  message(FATAL_ERROR "${PROGRAM} ended with ${code}")
+endif()
+file(GLOB drawings RELATIVE ${WORK} ${WORK}/*.svg)
+if(NOT drawings)
+  message(FATAL_ERROR "${PROGRAM} made no drawings")
+endif()
+foreach(drawing ${drawings})
+  execute_process(COMMAND ${CMAKE_COMMAND} -E compare_files ${WORK}/${drawing} ${SHIPPED}/${drawing}
+                  RESULT_VARIABLE different)
+  if(different)
+    message(FATAL_ERROR "${SHIPPED}/${drawing} is out of date: build the target \"drawings\"")
+  endif()
+endforeach()

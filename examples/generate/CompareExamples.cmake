@@ -1,0 +1,20 @@
+# Runs GENERATOR into the folder WORK and compares every contour with the one in SHIPPED.
+file(REMOVE_RECURSE ${WORK})
+file(MAKE_DIRECTORY ${WORK})
+execute_process(COMMAND ${GENERATOR} ${WORK} RESULT_VARIABLE result)
+if(NOT result EQUAL 0)
+  message(FATAL_ERROR "${GENERATOR} ended with ${result}")
+endif()
+
+file(GLOB shipped RELATIVE ${SHIPPED} ${SHIPPED}/*.csv)
+file(GLOB written RELATIVE ${WORK} ${WORK}/*.csv)
+if(NOT shipped OR NOT shipped STREQUAL written)
+  message(FATAL_ERROR "shipped: ${shipped}; written: ${written}")
+endif()
+foreach(name IN LISTS shipped)
+  execute_process(COMMAND ${CMAKE_COMMAND} -E compare_files ${SHIPPED}/${name} ${WORK}/${name}
+                  RESULT_VARIABLE different)
+  if(different)
+    message(FATAL_ERROR "${name} differs from what the generator writes")
+  endif()
+endforeach()
