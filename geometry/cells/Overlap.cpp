@@ -172,13 +172,8 @@ void Cells::FindOverlap(Shape const& first, Shape const& second, Overlap* overla
   BoundaryWalk walk(triangles, statuses, crossings);
   Polygon& polygon = walk.Walk();
   if (polygon.size() < 3) return;
-  bool const isDivided = CutEars(polygon.data(), static_cast<int>(polygon.size()),
-                                 [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });
-  if (!isDivided) {
-    overlap->parts.clear();
-    overlap->status = OverlappingStatus::OverlapFailed;
-    return;
-  }
+  CutEars(polygon.data(), static_cast<int>(polygon.size()),
+          [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });
   overlap->status = OverlappingStatus::Overlap;
 }
 

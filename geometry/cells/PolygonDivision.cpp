@@ -67,8 +67,9 @@ bool GeometryUtils::ConvexPolygonDivide(std::vector<Point> const& polygon, int f
     return true;
   }
   std::vector<Point> ring = polygon;
-  return Cells::CutEars(ring.data(), count,
-                        [triangles](Triangle const& ear) { triangles->push_back(ear); });
+  Cells::CutEars(ring.data(), count,
+                 [triangles](Triangle const& ear) { triangles->push_back(ear); });
+  return true;
 }
 
 bool GeometryUtils::SimplePolygonIsValid(std::vector<Point> const& polygon, int start, int count,
@@ -81,7 +82,7 @@ bool GeometryUtils::SimplePolygonIsValid(std::vector<Point> const& polygon, int 
 
 bool GeometryUtils::PointIsInsideOfPolygon(Point const& p, std::vector<Point> const& polygon,
                                            int begin, int end) {
-  if (begin >= end || !IsWithin(begin, end - begin, polygon.size())) return false;
+  if (begin < 0 || begin >= end || static_cast<std::size_t>(end) > polygon.size()) return false;
   return Cells::IsInsideRing(p, polygon.data(), begin, end);
 }
 

@@ -14,28 +14,18 @@ bool IsInsideRing(GeometryUtils::Point const& p, GeometryUtils::Point const* rin
 /// others. The ring must hold `count` vertices and `start` must be one of them.
 bool IsFreeOfOthers(GeometryUtils::Point const* ring, int start, int count, int size);
 
-/// Cuts the ring, of which it makes a shambles, into triangles: at most count - 2 of them, handed
-/// to `emit` one by one. False when no ear is left before the ring is used up; what was cut until
-/// then has been emitted.
+/// Cuts a ring of three or more vertices, of which it makes a shambles, into count - 2 triangles,
+/// handed to `emit` one by one. An ear is always found by position 2 at the latest: what is tested
+/// there is a single vertex, which contains nothing; of four vertices, position 1 is taken since
+/// the only other vertex is the one that a wrapped run passes over.
 template <typename Emit>
-bool CutEars(GeometryUtils::Point* ring, int count, Emit const& emit) {
-  int live = count;
-  int i = 0;
-  while (live >= 3) {
-    if (!IsFreeOfOthers(ring, i, live, 3)) {
-      ++i;
-      if (i >= live) return false;
-      continue;
-    }
-    // An ear that starts at one of the last two vertices, which only a polygon that touches itself
-    // brings about, goes on at the beginning of the ring: that is where its sides lead.
-    int const corner = (i + 1) % live;
-    emit(GeometryUtils::Triangle{{ring[i], ring[corner], ring[(i + 2) % live]}});
-    --live;
-    for (int j = corner; j < live; ++j) ring[j] = ring[j + 1];
-    i = 0;
+void CutEars(GeometryUtils::Point* ring, int count, Emit const& emit) {
+  for (int live = count; live >= 3; --live) {
+    int i = 0;
+    while (!IsFreeOfOthers(ring, i, live, 3)) ++i;
+    emit(GeometryUtils::Triangle{{ring[i], ring[i + 1], ring[i + 2]}});
+    for (int j = i + 1; j + 1 < live; ++j) ring[j] = ring[j + 1];
   }
-  return true;
 }
 
 }  // namespace Vorn::Cells

@@ -589,8 +589,6 @@ class VORN_EXPORT GeometryUtils {
   friend class MixedWalk;
   friend class CellsWalk;
   friend class SingleArcFit;
-  friend class ContourCrossings;
-  friend class PolylineCrossings;
 
   /// @name Inner steps: angles, distances and deviations
   /// @{
