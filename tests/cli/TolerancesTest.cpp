@@ -1,0 +1,84 @@
+#include <gtest/gtest.h>
+
+#include "cli/Failure.h"
+#include "cli/Spacing.h"
+#include "cli/Tolerances.h"
+
+namespace Vorn::Cli {
+namespace {
+
+PointFile FileWith(std::vector<WPoint> points) {
+  PointFile file;
+  file.path = "p.csv";
+  for (std::size_t i = 0; i < points.size(); ++i) file.lines.push_back(i + 2);
+  file.points = std::move(points);
+  return file;
+}
+
+ExitCode CodeOfRefusal(ToleranceChoice const& choice, PointFile file, std::string* message) {
+  try {
+    AssignTolerances(choice, &file);
+  } catch (Failure const& failure) {
+    *message = failure.what();
+    return failure.Code();
+  }
+  return ExitCode::Ok;
+}
+
+TEST(AssignTolerances, OneToleranceGoesToEveryPoint) {
+  PointFile file = FileWith({{0, 0, 9}, {1, 0, 9}});
+  AssignTolerances({.same = 0.5, .column = {}, .cap = {}}, &file);
+  EXPECT_EQ(file.points[0].w, 0.5);
+  EXPECT_EQ(file.points[1].w, 0.5);
+}
+
+TEST(AssignTolerances, PerPointTakesTheNearerNeighbourAndTheCap) {
+  PointFile file = FileWith({{0, 0, 0}, {1, 0, 0}, {1, 10, 0}, {1, 100, 0}});
+  AssignTolerances({.same = {}, .column = {}, .cap = 4.0}, &file);
+  EXPECT_EQ(file.points[0].w, 0.3 * 1.0);
+  EXPECT_EQ(file.points[1].w, 0.3 * 1.0);
+  EXPECT_EQ(file.points[2].w, 0.3 * 10.0);
+  EXPECT_EQ(file.points[3].w, 4.0);
+  EXPECT_FALSE(FindClosePair(file.points).has_value());
+}
+
+TEST(AssignTolerances, PerPointNamesCoincidingNeighbours) {
+  std::string message;
+  EXPECT_EQ(CodeOfRefusal({.same = {}, .column = {}, .cap = 4.0},
+                          FileWith({{0, 0, 0}, {1, 0, 0}, {1, 0, 0}, {2, 0, 0}}), &message),
+            ExitCode::PointsTooClose);
+  EXPECT_EQ(message,
+            "p.csv: point 1 (line 3) and point 2 (line 4) coincide: no tolerance can follow from "
+            "a spacing of zero");
+}
+
+TEST(AssignTolerances, OptionGoesBeforeColumnBeforeComment) {
+  PointFile file = FileWith({{0, 0, 0.1}, {1, 0, 0.2}});
+  file.hasTolerances = true;
+  file.tolerance = 0.7;
+  AssignTolerances({}, &file);
+  EXPECT_EQ(file.points[1].w, 0.2);
+  file.hasTolerances = false;
+  AssignTolerances({}, &file);
+  EXPECT_EQ(file.points[1].w, 0.7);
+  AssignTolerances({.same = 0.5, .column = {}, .cap = {}}, &file);
+  EXPECT_EQ(file.points[1].w, 0.5);
+}
+
+TEST(AssignTolerances, NoToleranceAnywhereIsAUsageError) {
+  std::string message;
+  EXPECT_EQ(CodeOfRefusal({}, FileWith({{0, 0, 0}, {1, 0, 0}}), &message), ExitCode::Usage);
+  EXPECT_EQ(message.rfind("no tolerance: give --tolerance T", 0), 0u) << message;
+}
+
+TEST(ColumnFor, ReadsAColumnOnlyWhenNoOtherOptionRules) {
+  EXPECT_EQ(ColumnFor({}).use, ToleranceColumn::Use::IfPresent);
+  EXPECT_EQ(ColumnFor({.same = 1.0, .column = {}, .cap = {}}).use, ToleranceColumn::Use::Ignore);
+  EXPECT_EQ(ColumnFor({.same = {}, .column = {}, .cap = 1.0}).use, ToleranceColumn::Use::Ignore);
+  ToleranceColumn const named = ColumnFor({.same = {}, .column = "tol", .cap = {}});
+  EXPECT_EQ(named.use, ToleranceColumn::Use::Required);
+  EXPECT_EQ(named.name, "tol");
+}
+
+}  // namespace
+}  // namespace Vorn::Cli
