@@ -141,8 +141,8 @@ std::string Transcribe(Deviation const& d) {
   return transcript.Text();
 }
 
-/// Points of a circle of radius 40 at these angles in degrees: the allowance is capped at
-/// 10, so neighbours closer than 30 are too close.
+/// Points of a circle of radius 40 at these angles in degrees. Over a half turn the allowance is
+/// capped at 10, so neighbours closer than 30, about 44 degrees, are too close.
 std::vector<WPoint> OnCircle(std::vector<double> const& degrees) {
   std::vector<WPoint> points;
   for (double d : degrees) {
@@ -162,7 +162,6 @@ TEST(GetEstimatedDeviationForCircle, WideSpacingExcludesNothing) {
   EXPECT_NEAR(d.center.y, 0.0, 1e-9);
 }
 
-// 30 apart is about 43.9 degrees on this circle.
 TEST(GetEstimatedDeviationForCircle, ThinsPointsTooCloseToTheLastKeptOne) {
   Deviation const d = EstimateDeviation(OnCircle({0, 20, 45, 60, 90, 135, 180}));
   EXPECT_TRUE(d.ok);

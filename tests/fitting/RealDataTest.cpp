@@ -39,9 +39,9 @@ constexpr std::size_t kAll = static_cast<std::size_t>(-1);
 constexpr DataFile kFiles[] = {
     {"rail_head_known_arcs", 0.01, false, kAll, true},
     {"wheel_worn_a", 0.03, false, kAll, true},
-    {"rail_worn_low", 0.025, false, kAll, true},
+    {"rail_worn_low", 0.025, false, kAll, false},
     {"mirror_sphere_83m", 0.00005, false, kAll, false},
-    {"hatch_boundary", 0.002, false, kAll, true},
+    {"hatch_boundary", 0.002, false, kAll, false},
     {"glyph_five", 2.0, true, kAll, false},
     {"test_track_centreline", 0.03, true, 1000, true},
     {"gcode_letter_d", 0.015, false, kAll, false},
