@@ -10,12 +10,14 @@
 
 #include "geometry/cells/TriangleOverlap.h"
 #include "geometry/intersections/SegmentPair.h"
+#include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
 
 namespace {
 
+using Cells::Shape;
 using CrossingPoint = GeometryUtils::CrossingPoint;
 using Point = GeometryUtils::Point;
 using Triangle = GeometryUtils::Triangle;
@@ -71,17 +73,46 @@ auto DistanceFromStartOf(Side const& side) {
   return [&side](CrossingPoint const& record) { return SquaredDistance(record.pt, side.start); };
 }
 
+/// Whether side i of the first triangle may meet side j of the second: they cross, as the
+/// intersection of two segments decides it, or they are parallel and not apart. Without a branch,
+/// since nearly all sides do not meet. For coordinates that are numbers.
+bool MayMeet(Shape const& first, int i, Shape const& second, int j) {
+  Shape::Side const& a = first.sides[i];
+  Shape::Side const& b = second.sides[j];
+  double const dx = first.triangle.pts[i].x - second.triangle.pts[j].x;
+  double const dy = first.triangle.pts[i].y - second.triangle.pts[j].y;
+  bool const areApart =
+      (b.xLow > a.xHigh) | (a.xLow > b.xHigh) | (b.yLow > a.yHigh) | (a.yLow > b.yHigh);
+  double const det = b.dy * a.dx - a.dy * b.dx;
+  double const s = dy * b.dx - dx * b.dy;
+  double const u = dy * a.dx - dx * a.dy;
+  double const magnitude = std::fabs(det);
+  bool const isProper = magnitude > Numeric::kZero;
+  bool const isNegative = det < 0.0;
+  double const alongFirst = isNegative ? -s : s;
+  double const alongSecond = isNegative ? -u : u;
+  bool const isInRange = (0.0 <= alongFirst) & (alongFirst <= magnitude) & (0.0 <= alongSecond) &
+                         (alongSecond <= magnitude);
+  return !(areApart | (isProper & !isInRange));
+}
+
+Intersections::SegmentPair PairOfSides(Side const& side, Side const& other) {
+  return {side.start.x,  side.start.y,  side.end.x,  side.end.y,
+          other.start.x, other.start.y, other.end.x, other.end.y};
+}
+
 /// Appends what lies on side i of the first triangle.
-void CollectOnSide(Side const& side, int i, Triangle const& second, Cells::CrossingPoints* points) {
+void CollectOnSide(Side const& side, int i, Shape const& first, Shape const& second,
+                   Cells::CrossingPoints* points) {
   auto const distance2 = DistanceFromStartOf(side);
+  bool const areOrdered = first.isOrdered && second.isOrdered;
   std::optional<CrossingPoint> held;
   for (int j = 0; j < 3; ++j) {
-    Side const other{second.pts[j], second.pts[(j + 1) % 3]};
+    if (areOrdered && !MayMeet(first, i, second, j)) continue;
+    Side const other{second.triangle.pts[j], second.triangle.pts[(j + 1) % 3]};
     CrossingPoint found{{}, i, j};
     SegmentsRelPosition const relation =
-        Intersections::IntersectSegments({side.start.x, side.start.y, side.end.x, side.end.y,
-                                          other.start.x, other.start.y, other.end.x, other.end.y},
-                                         &found.pt.x, &found.pt.y);
+        Intersections::IntersectSegments(PairOfSides(side, other), &found.pt.x, &found.pt.y);
     if (relation == SegmentsRelPosition::Intersecting) {
       if (held) {
         AppendByDistance(*held, found, distance2, points);
@@ -158,12 +189,11 @@ bool GeometryUtils::GetCrossingPoints(Triangle const& first, int startSide, Tria
   return true;
 }
 
-void Cells::FindCrossingPoints(Triangle const& first, Triangle const& second,
-                               CrossingPoints* points) {
+void Cells::FindCrossingPoints(Shape const& first, Shape const& second, CrossingPoints* points) {
   for (int i = 0; i < 3; ++i) {
-    Side const side{first.pts[i], first.pts[(i + 1) % 3]};
+    Side const side{first.triangle.pts[i], first.triangle.pts[(i + 1) % 3]};
     std::size_t const begin = points->size();
-    CollectOnSide(side, i, second, points);
+    CollectOnSide(side, i, first, second, points);
     if (points->size() - begin >= 3) KeepFarthestTwo(side, i, begin, points);
   }
 }
@@ -171,7 +201,7 @@ void Cells::FindCrossingPoints(Triangle const& first, Triangle const& second,
 void GeometryUtils::GetCrossingPoints(Triangle const& first, Triangle const& second,
                                       std::vector<CrossingPoint>* points) {
   Cells::CrossingPoints found;
-  Cells::FindCrossingPoints(first, second, &found);
+  Cells::FindCrossingPoints(Shape(first), Shape(second), &found);
   points->insert(points->end(), found.begin(), found.end());
 }
 

@@ -163,7 +163,7 @@ void Cells::FindOverlap(Shape const& first, Shape const& second, Overlap* overla
     return;
   }
   CrossingPoints crossings;
-  FindCrossingPoints(first.triangle, second.triangle, &crossings);
+  FindCrossingPoints(first, second, &crossings);
   if (crossings.empty()) {
     FindContained(first, second, statuses, overlap);
     return;

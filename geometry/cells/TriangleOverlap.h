@@ -35,8 +35,7 @@ class InlineVector {
   std::size_t size_ = 0;
 };
 
-/// A triangle with what every overlap asks of it: its sense, the part of its sides in the areas of
-/// the triangles that they form with a point, and its box.
+/// A triangle with what every overlap asks of it.
 struct Shape {
   explicit Shape(GeometryUtils::Triangle const& from);
 
@@ -48,11 +47,26 @@ struct Shape {
   /// Where a point lies; as GetPointStatus.
   GeometryUtils::PointStatus StatusOf(GeometryUtils::Point const& p) const;
 
+  /// Side i runs from vertex i to the next one.
+  struct Side {
+    double dx, dy;
+    /// x(end) * y(start) - x(start) * y(end): the part of the side in the area of the triangle that
+    /// it forms with a point.
+    double term;
+    double xLow, yLow, xHigh, yHigh;
+  };
+
   GeometryUtils::Triangle triangle;
-  /// x(i+1) * y(i) - x(i) * y(i+1) of side i.
-  double sideTerm[3];
+  Side sides[3];
   double xMin, yMin, xMax, yMax;
+  /// Sign of the area.
   int sense;
+  /// Whether all coordinates are numbers, so that boxes can be compared.
+  bool isOrdered;
+
+ private:
+  GeometryUtils::PointStatus StatusNearSides(GeometryUtils::Point const& p,
+                                             double const* areas) const;
 };
 
 /// What two triangles have in common. A walk takes at most four points on each of three sides,
@@ -71,7 +85,6 @@ using CrossingPoints = InlineVector<GeometryUtils::CrossingPoint, 12>;
 
 /// Where the sides of one triangle cross those of another, by side of the first and along a side
 /// by distance from its start: at most two points a side.
-void FindCrossingPoints(GeometryUtils::Triangle const& first, GeometryUtils::Triangle const& second,
-                        CrossingPoints* points);
+void FindCrossingPoints(Shape const& first, Shape const& second, CrossingPoints* points);
 
 }  // namespace Vorn::Cells

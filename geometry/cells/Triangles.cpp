@@ -84,20 +84,45 @@ Point InnerPoint(Triangle const& triangle) {
 }  // namespace
 
 Cells::Shape::Shape(Triangle const& from) : triangle(from) {
-  for (int i = 0; i < 3; ++i) sideTerm[i] = SideTerm(from.pts[i], from.pts[(i + 1) % 3]);
-  sense = Numeric::Sign(AreaOfTerms(sideTerm[0], sideTerm[1], sideTerm[2]));
+  for (int i = 0; i < 3; ++i) {
+    Point const& start = from.pts[i];
+    Point const& end = from.pts[(i + 1) % 3];
+    sides[i] = {end.x - start.x,          end.y - start.y,          SideTerm(start, end),
+                std::min(start.x, end.x), std::min(start.y, end.y), std::max(start.x, end.x),
+                std::max(start.y, end.y)};
+  }
+  sense = Numeric::Sign(AreaOfTerms(sides[0].term, sides[1].term, sides[2].term));
   Span(from.pts[0].x, from.pts[1].x, from.pts[2].x, &xMin, &xMax);
   Span(from.pts[0].y, from.pts[1].y, from.pts[2].y, &yMin, &yMax);
+  double const sum =
+      from.pts[0].x + from.pts[1].x + from.pts[2].x + from.pts[0].y + from.pts[1].y + from.pts[2].y;
+  isOrdered = !std::isnan(sum);
 }
 
 PointStatus Cells::Shape::StatusOf(Point const& p) const {
   if (xMin > p.x || p.x > xMax || yMin > p.y || p.y > yMax) return PointStatus::Outside;
+  double fromVertex[3];
+  for (int i = 0; i < 3; ++i) fromVertex[i] = SideTerm(p, triangle.pts[i]);
+  // The term of the way back to p is that of the way from p, negated, down to the last bit.
+  double const areas[3] = {AreaOfTerms(fromVertex[0], sides[0].term, -fromVertex[1]),
+                           AreaOfTerms(fromVertex[1], sides[1].term, -fromVertex[2]),
+                           AreaOfTerms(fromVertex[2], sides[2].term, -fromVertex[0])};
+  bool const isNearSide = (areas[0] == 0.0) | (areas[1] == 0.0) | (areas[2] == 0.0);
+  if (isNearSide || sense == 0) return StatusNearSides(p, areas);
+  bool const isNegative = sense < 0;
+  bool const isInside = ((areas[0] < 0.0) == isNegative) & ((areas[1] < 0.0) == isNegative) &
+                        ((areas[2] < 0.0) == isNegative);
+  return isInside ? PointStatus::Inside : PointStatus::Outside;
+}
+
+/// The status of a point on the line of a side, or in a degenerate triangle.
+PointStatus Cells::Shape::StatusNearSides(Point const& p, double const* areas) const {
   int hits = 0;
   bool isOutside = false;
   for (int i = 0; i < 3; ++i) {
     Point const& start = triangle.pts[i];
     Point const& end = triangle.pts[(i + 1) % 3];
-    int const side = Numeric::Sign(AreaOfTerms(SideTerm(p, start), sideTerm[i], SideTerm(end, p)));
+    int const side = Numeric::Sign(areas[i]);
     if (side == 0 && Intersections::IsWithin(p.x, start.x, end.x) &&
         Intersections::IsWithin(p.y, start.y, end.y)) {
       ++hits;
