@@ -11,6 +11,7 @@
 #include <cmath>
 #include <cstddef>
 
+#include "geometry/cells/Ring.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
@@ -48,10 +49,12 @@ Bunch BunchOfRect(double const* rect) {
   return bunch;
 }
 
+using Corners = std::array<Point, kLines>;
+
 /// The corners of the cell in cyclic order: the parameter points of L2, L3, L4, L1.
-std::array<Point, kLines> CellCorners(Bunch const& bunch, bool xOfY) {
+Corners CellCorners(Bunch const& bunch, bool xOfY) {
   constexpr int kOrder[kLines] = {1, 2, 3, 0};
-  std::array<Point, kLines> corners;
+  Corners corners;
   for (std::size_t k = 0; k < kLines; ++k) {
     int const i = kOrder[k];
     corners[k] = xOfY ? Point{bunch.d[i] / bunch.a[i], bunch.b[i] / bunch.a[i]}
@@ -65,7 +68,7 @@ std::array<Point, kLines> CellCorners(Bunch const& bunch, bool xOfY) {
 /// cells of a run must lie in one plane.
 template <typename IsValidBunch>
 ErrorCode CellOfBunch(Bunch const& bunch, bool* formFixed, bool* xOfY,
-                      IsValidBunch const& isValidBunch, std::array<Point, kLines>* corners) {
+                      IsValidBunch const& isValidBunch, Corners* corners) {
   bool maySwitch = !*formFixed;
   if (maySwitch) {
     *formFixed = true;
@@ -81,6 +84,13 @@ ErrorCode CellOfBunch(Bunch const& bunch, bool* formFixed, bool* xOfY,
   }
   *corners = CellCorners(bunch, *xOfY);
   return ErrorCode::Ok;
+}
+
+/// Replaces a cell by the triangles of its corners, which are used up.
+void Divide(Corners* corners, std::vector<GeometryUtils::Triangle>* cell) {
+  cell->clear();
+  Cells::CutEars(corners->data(), kLines,
+                 [cell](GeometryUtils::Triangle const& ear) { cell->push_back(ear); });
 }
 
 }  // namespace
@@ -175,7 +185,7 @@ ErrorCode GeometryUtils::GetLinePolygon(WPoint a, WPoint b, bool* formFixed, boo
                                         Point2D<double>* const polygon) {
   double rect[8];
   if (!GetPermissibleRect(a, b, rect)) return ErrorCode::Failed;
-  std::array<Point, kLines> corners;
+  Corners corners;
   ErrorCode const code = CellOfBunch(BunchOfRect(rect), formFixed, xOfY, IsValidBunch, &corners);
   if (code != ErrorCode::Ok) return code;
   for (std::size_t i = 0; i < kLines; ++i) polygon[i] = {corners[i].x, corners[i].y};
@@ -184,15 +194,12 @@ ErrorCode GeometryUtils::GetLinePolygon(WPoint a, WPoint b, bool* formFixed, boo
 
 ErrorCode GeometryUtils::GetLineTriangles(WPoint a, WPoint b, bool* formFixed, bool* xOfY,
                                           std::vector<Triangle>* cell) {
-  Point2D<double> polygon[kLines];
-  ErrorCode const code = GetLinePolygon(a, b, formFixed, xOfY, polygon);
-  if (code != ErrorCode::Ok) return code;
-  std::vector<Point> corners;
-  for (Point2D<double> const& corner : polygon) corners.push_back({corner.x, corner.y});
-  std::vector<Triangle> triangles;
-  if (!ConvexPolygonDivide(corners, 0, kLines, &triangles)) return ErrorCode::Failed;
-  *cell = triangles;
-  return ErrorCode::Ok;
+  double rect[8];
+  if (!GetPermissibleRect(a, b, rect)) return ErrorCode::Failed;
+  Corners corners;
+  ErrorCode const code = CellOfBunch(BunchOfRect(rect), formFixed, xOfY, IsValidBunch, &corners);
+  if (code == ErrorCode::Ok) Divide(&corners, cell);
+  return code;
 }
 
 ErrorCode GeometryUtils::GetLineTriangles(double x1, double y1, double x2, double y2, double r,
@@ -200,15 +207,10 @@ ErrorCode GeometryUtils::GetLineTriangles(double x1, double y1, double x2, doubl
                                           std::vector<Triangle>* cell) {
   double rect[8];
   if (!GetPermissibleRect(x1, y1, x2, y2, r, rect)) return ErrorCode::Failed;
-  std::array<Point, kLines> corners;
+  Corners corners;
   ErrorCode const code = CellOfBunch(BunchOfRect(rect), formFixed, xOfY, IsValidBunch, &corners);
-  if (code != ErrorCode::Ok) return code;
-  std::vector<Triangle> triangles;
-  if (!ConvexPolygonDivide({corners.begin(), corners.end()}, 0, kLines, &triangles)) {
-    return ErrorCode::Failed;
-  }
-  *cell = triangles;
-  return ErrorCode::Ok;
+  if (code == ErrorCode::Ok) Divide(&corners, cell);
+  return code;
 }
 
 bool GeometryUtils::GetPermissibleHexagon(Point const& a, Point const& b, Point const& c, double r,

@@ -16,11 +16,10 @@
 namespace Vorn {
 
 using Fitting::At;
+using Fitting::kFewestArcPoints;
 using Fitting::ToPoint;
 
 namespace {
-
-constexpr std::int32_t kFewestArcPoints = 3;
 
 /// Points passed over before the next segment is looked for: with the anchor, three for an arc.
 constexpr std::int32_t kArcRoom = 2;

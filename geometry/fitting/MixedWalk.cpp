@@ -11,6 +11,7 @@
 
 namespace Vorn {
 
+using Fitting::kFewestArcPoints;
 using Fitting::ToPoint;
 
 namespace {
@@ -18,8 +19,6 @@ namespace {
 /// Tries of the line fitter on one run, each fed with the points that deviated most in the one
 /// before.
 constexpr int kLineAttempts = 3;
-
-constexpr std::int32_t kFewestArcPoints = 3;
 
 }  // namespace
 

@@ -30,6 +30,9 @@ inline WPoint const& At(std::vector<WPoint> const& points, std::int32_t index) {
 
 inline GeometryUtils::Point ToPoint(WPoint const& p) { return {p.x, p.y}; }
 
+/// An arc needs three points; fewer do not turn.
+inline constexpr std::int32_t kFewestArcPoints = 3;
+
 /// The bytes that the triangles of a cell may take before the cell is rebuilt from fewer points,
 /// divided by what one triangle is weighed with: 8 for lines, 32 for arcs, whose unions grow
 /// faster.

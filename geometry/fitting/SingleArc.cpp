@@ -16,13 +16,12 @@
 namespace Vorn {
 
 using Fitting::At;
+using Fitting::kFewestArcPoints;
 using Fitting::ToPoint;
 
 namespace {
 
 constexpr int kMaxRefinements = 100;
-constexpr std::int32_t kFewestArcPoints = 3;
-
 }  // namespace
 
 SingleArcFit::SingleArcFit(std::vector<WPoint> const& points,
