@@ -48,6 +48,10 @@ function(vorn_export_only_the_classes target)
   endif()
   set(map ${PROJECT_SOURCE_DIR}/cmake/exports.map)
   target_link_options(${target} PRIVATE LINKER:--version-script=${map})
+  # The library's calls of its own exported members go straight to them, not by way of the table
+  # through which a program could put its own in their place.
+  target_link_options(${target} PRIVATE LINKER:-Bsymbolic-functions)
+  target_compile_options(${target} PRIVATE -fno-semantic-interposition)
   set_target_properties(${target} PROPERTIES LINK_DEPENDS ${map})
   if(NOT VORN_SANITIZE)
     # A sanitizer's run time is found in the program only, so its symbols stay open there.

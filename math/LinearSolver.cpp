@@ -3,6 +3,7 @@
 
 #include <cmath>
 #include <cstddef>
+#include <type_traits>
 #include <utility>
 
 #include "vorn/MathUtils.h"
@@ -11,10 +12,12 @@ namespace Vorn {
 
 namespace {
 
-/// A square system in the caller's arrays.
+/// A square system in the caller's arrays. The order is a number or, for the small ones that every
+/// circle is found with, a constant, which lets the compiler unroll the loops.
+template <typename Order>
 class LinearSystem {
  public:
-  LinearSystem(std::size_t order, double* matrix, double* rhs)
+  LinearSystem(Order order, double* matrix, double* rhs)
       : order_(order), matrix_(matrix), rhs_(rhs) {}
 
   /// Brings the entry of greatest magnitude at or below the diagonal of this column onto the
@@ -61,17 +64,14 @@ class LinearSystem {
  private:
   double* Row(std::size_t row) { return matrix_ + row * order_; }
 
-  std::size_t order_;
-  double* matrix_;
-  double* rhs_;
+  Order const order_;
+  double* const matrix_;
+  double* const rhs_;
 };
 
-}  // namespace
-
-bool MathUtils::LinearEquationSystemSolve(int n, double* matrix, double* rhs, double* solution) {
-  if (n <= 0) return true;
-  auto const order = static_cast<std::size_t>(n);
-  LinearSystem system(order, matrix, rhs);
+template <typename Order>
+bool Solve(Order order, double* matrix, double* rhs, double* solution) {
+  LinearSystem<Order> system(order, matrix, rhs);
   // Deliberate: the last column is never pivoted, so a system that turns out singular only there
   // is answered with infinities or NaNs and true.
   for (std::size_t column = 0; column + 1 < order; ++column) {
@@ -80,6 +80,24 @@ bool MathUtils::LinearEquationSystemSolve(int n, double* matrix, double* rhs, do
   }
   system.SubstituteBack(solution);
   return true;
+}
+
+template <std::size_t kOrder>
+using FixedOrder = std::integral_constant<std::size_t, kOrder>;
+
+}  // namespace
+
+bool MathUtils::LinearEquationSystemSolve(int n, double* matrix, double* rhs, double* solution) {
+  switch (n) {
+    case 2:
+      return Solve(FixedOrder<2>{}, matrix, rhs, solution);
+    case 3:
+      return Solve(FixedOrder<3>{}, matrix, rhs, solution);
+    case 4:
+      return Solve(FixedOrder<4>{}, matrix, rhs, solution);
+    default:
+      return n <= 0 || Solve(static_cast<std::size_t>(n), matrix, rhs, solution);
+  }
 }
 
 }  // namespace Vorn

@@ -40,6 +40,7 @@ class CellSequence::LevelBuilder {
   /// For the overlaps of a level's letters, each of which occurs as often as `counts` says.
   explicit LevelBuilder(std::vector<std::size_t> const& counts) : counts_(counts) {
     level_.words.ends.reserve(counts.size());
+    level_.shapes.reserve(2 * counts.size());
   }
 
   void AddToWord(Triangle const& triangle) {

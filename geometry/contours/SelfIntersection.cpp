@@ -7,11 +7,17 @@
 //
 // The end points of arcs never count as intersections, which is how an arc and its neighbours may
 // share their joints. Two consecutive segments are not tested: all they can share is their joint.
-// The walk is quadratic in the number of elements and needs no storage.
+//
+// The plain walk is quadratic in the number of elements and needs no storage. On long contours only
+// its first pass is walked. Of the later ones it matters which is the first to meet an invalid
+// pair, for that pair ends the walk; that can be told without looking at pairs. What is left is
+// whether any pair of an earlier pass crosses, and for this the pairs may be taken in any order.
 
 #include <iterator>
 
-#include "geometry/contours/ArcSteps.h"
+#include "geometry/contours/PieceExtents.h"
+#include "geometry/contours/SelfIntersectionSteps.h"
+#include "geometry/intersections/SegmentPair.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
@@ -24,8 +30,6 @@ using Elem = GeometryUtils::Elem;
 using ElemType = GeometryUtils::ElemType;
 using Contour = std::vector<Elem>;
 using Iterator = Contour::const_iterator;
-
-using NextIter = ErrorCode (*)(Contour const& contour, Iterator& it, Iterator* next);
 
 enum class PairResult { Clear, EndOfScan, Crossing, Invalid };
 
@@ -45,25 +49,109 @@ PairResult JudgeTouch(int count, bool isAccepted) {
   return PairResult::Crossing;
 }
 
-class Walk {
+/// Knows which passes over a chain of elements meet an invalid pair, if nothing ends them before.
+class InvalidPairs {
  public:
-  Walk(Contour const& contour, NextIter nextIter, ArcSteps const& arcSteps)
-      : contour_(contour), nextIter_(nextIter), arcSteps_(arcSteps) {}
+  explicit InvalidPairs(std::vector<Iterator> const& chain) : chain_(chain) {
+    for (std::size_t k = 0; k < chain.size(); ++k) {
+      if (IsSegment(chain[k])) continue;
+      lastArc_ = k;
+      if (chain[k]->startAngle == chain[k]->endAngle) lastOfEqualAngles_ = k;
+      if (chain[k]->radius <= 0.0) lastWithoutRadius_ = k;
+    }
+  }
 
-  ErrorCode Run() const {
-    if (contour_.empty() || !IsSegment(contour_.begin())) return ErrorCode::Failed;
-    Iterator i = contour_.begin();
-    if (!Advance(&i)) return ErrorCode::Failed;
-    bool isFirstPass = true;
-    do {
-      ErrorCode const code = ScanCandidates(i, isFirstPass);
-      if (code != ErrorCode::Ok) return code;
-      isFirstPass = false;
-    } while (Advance(&i));
-    return ErrorCode::Ok;
+  bool HasPass(std::size_t i) const {
+    if (IsSegment(chain_[i])) return lastOfEqualAngles_ > i;
+    return chain_[i]->radius <= 0.0 ? lastArc_ > i : lastWithoutRadius_ > i;
   }
 
  private:
+  std::vector<Iterator> const& chain_;
+  // The greatest numbers of their kind; 0, which is after no element, also when there is none.
+  std::size_t lastArc_ = 0;
+  std::size_t lastOfEqualAngles_ = 0;
+  std::size_t lastWithoutRadius_ = 0;
+};
+
+class Walk {
+ public:
+  Walk(Contour const& contour, Contours::ContourSteps const& steps)
+      : contour_(contour), nextIter_(steps.nextIter), arcSteps_(steps.arcSteps) {}
+
+  ErrorCode Run(std::size_t plainSize) const {
+    if (contour_.empty() || !IsSegment(contour_.begin())) return ErrorCode::Failed;
+    Iterator first = contour_.begin();
+    if (!Advance(&first)) return ErrorCode::Failed;
+    ErrorCode const code = ScanCandidates(first, true);
+    if (code != ErrorCode::Ok) return code;
+    return contour_.size() > plainSize ? SearchLaterPasses(first) : WalkLaterPasses(first);
+  }
+
+ private:
+  using Chain = std::vector<Iterator>;
+
+  ErrorCode WalkLaterPasses(Iterator first) const {
+    for (Iterator i = first; Advance(&i);) {
+      ErrorCode const code = ScanCandidates(i, false);
+      if (code != ErrorCode::Ok) return code;
+    }
+    return ErrorCode::Ok;
+  }
+
+  ErrorCode SearchLaterPasses(Iterator first) const {
+    Chain chain;
+    chain.reserve(contour_.size());
+    for (Iterator i = first; Advance(&i);) chain.push_back(i);
+    InvalidPairs const invalidPairs(chain);
+    // Passes that look beyond the element right after i; the others are cut short by a touch.
+    std::vector<bool> isLong(chain.size(), false);
+    ErrorCode code = ErrorCode::Ok;
+    for (std::size_t i = 0; i + 1 < chain.size() && code == ErrorCode::Ok; ++i) {
+      PairResult const next = TestNext(chain[i], chain[i + 1]);
+      if (next == PairResult::Crossing) return ErrorCode::SelfIntersection;
+      if (next == PairResult::EndOfScan) continue;
+      if (invalidPairs.HasPass(i)) {
+        code = ScanCandidates(chain[i], false);
+      } else {
+        isLong[i] = true;
+      }
+    }
+    if (code == ErrorCode::SelfIntersection) return code;
+    return HasCrossing(chain, isLong) ? ErrorCode::SelfIntersection : code;
+  }
+
+  PairResult TestNext(Iterator i, Iterator k) const {
+    if (IsSegment(i) && IsSegment(k)) return PairResult::Clear;
+    return TestPair(i, k, {false, true, std::next(i) == k});
+  }
+
+  /// Does any element of a long pass cross an element after the one right after it? Nothing is
+  /// exempted there, and a negative count means an arc that is passed over.
+  bool HasCrossing(Chain const& chain, std::vector<bool> const& isLong) const {
+    std::vector<Contours::Shape> shapes;
+    shapes.reserve(chain.size());
+    for (Iterator const elem : chain) {
+      shapes.push_back({StartOf(elem), elem->end, IsSegment(elem) ? nullptr : &*elem});
+    }
+    return Contours::AnyPair(shapes, [&](std::size_t i, std::size_t k) {
+      return k > i + 1 && isLong[i] && DoCross(shapes[i], shapes[k]);
+    });
+  }
+
+  bool DoCross(Contours::Shape const& a, Contours::Shape const& b) const {
+    if (a.arc != nullptr) {
+      return (b.arc != nullptr ? arcSteps_.CountArcArc(*a.arc, *b.arc)
+                               : arcSteps_.CountSegmentArc(b.start, b.end, *a.arc)) > 0;
+    }
+    if (b.arc != nullptr) return arcSteps_.CountSegmentArc(a.start, a.end, *b.arc) > 0;
+    Intersections::SegmentPair const pair(a.start.x, a.start.y, a.end.x, a.end.y, b.start.x,
+                                          b.start.y, b.end.x, b.end.y);
+    double x = 0.0;
+    double y = 0.0;
+    return Intersections::IntersectSegments(pair, &x, &y) == SegmentsRelPosition::Intersecting;
+  }
+
   /// Moves to the next element of non-zero length. False, it untouched, when there is none before
   /// the end of the contour or before an element of invalid type.
   bool Advance(Iterator* it) const {
@@ -151,16 +239,21 @@ class Walk {
   }
 
   Contour const& contour_;
-  NextIter nextIter_;
+  Contours::ContourSteps::NextIter nextIter_;
   ArcSteps arcSteps_;
 };
 
 }  // namespace
 
+ErrorCode Contours::CheckContour(Contour const& contour, ContourSteps const& steps,
+                                 std::size_t plainSize) {
+  return Walk(contour, steps).Run(plainSize);
+}
+
 ErrorCode GeometryUtils::CheckPolySelfIntersection(std::vector<Elem> const& contour) {
   ArcSteps const arcSteps{&GetLineSegmentAndCircleArcIntersection,
                           &GetCircleArcAndCircleArcIntersection};
-  return Walk(contour, &GetNextIter, arcSteps).Run();
+  return Contours::CheckContour(contour, {&GetNextIter, arcSteps}, Contours::kPlainSize);
 }
 
 }  // namespace Vorn

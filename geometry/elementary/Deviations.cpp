@@ -47,10 +47,11 @@ bool GeometryUtils::GetDeviation(double a, double b, double c, double x, double 
 
 bool GeometryUtils::GetSignedDeviation(double a, double b, double c, double x, double y,
                                        double* dev) {
-  double const norm = std::sqrt(a * a + b * b);
-  if (IsZero(norm)) return false;
   // The origin never gets a positive deviation: positive means the side away from it.
-  *dev = (a * x + b * y + c) / (c > 0.0 ? -norm : norm);
+  Lines::ImplicitLine const line{a, b, c};
+  double const divisor = line.SignedNorm();
+  if (Numeric::IsZeroMagnitude(divisor)) return false;
+  *dev = line.At(x, y) / divisor;
   return true;
 }
 

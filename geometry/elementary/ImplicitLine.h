@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cmath>
+
 #include "math/NumericConstants.h"
 #include "vorn/Types.h"
 
@@ -21,6 +23,13 @@ struct ImplicitLine {
   }
 
   double At(double x, double y) const { return a * x + b * y + c; }
+
+  /// The length of (a, b), with the sign that makes the origin's deviation At(0, 0) / SignedNorm()
+  /// no greater than zero.
+  double SignedNorm() const {
+    double const norm = std::sqrt(a * a + b * b);
+    return c > 0.0 ? -norm : norm;
+  }
 
   /// The perpendicular through a point; c is not needed for it.
   ImplicitLine NormalThrough(double x, double y) const { return {b, -a, a * y - b * x}; }

@@ -4,7 +4,9 @@
 #include <cstdint>
 #include <utility>
 
+#include "geometry/elementary/ImplicitLine.h"
 #include "geometry/fitting/Runs.h"
+#include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
@@ -37,10 +39,11 @@ bool GeometryUtils::GetDeviationFromLineParameters(Point const& a, Point const& 
                                                    double* minDeviation, double* maxDeviation,
                                                    std::int32_t* minIndex, std::int32_t* maxIndex) {
   if (!Fitting::HoldsRun(points, start, count)) return false;
-  double la = 0.0;
-  double lb = 0.0;
-  double lc = 0.0;
-  if (!GetLineParameters(a.x, a.y, b.x, b.y, &la, &lb, &lc)) return false;
+  Lines::ImplicitLine line;
+  if (!line.Through(a.x, a.y, b.x, b.y)) return false;
+  // Without a norm no point has a deviation, and there are no extremes to hand out.
+  double const divisor = line.SignedNorm();
+  if (Numeric::IsZeroMagnitude(divisor)) return false;
   bool isAnyMeasured = false;
   double smallest = 0.0;
   double largest = 0.0;
@@ -48,8 +51,7 @@ bool GeometryUtils::GetDeviationFromLineParameters(Point const& a, Point const& 
   std::int32_t largestAt = -1;
   for (std::int32_t i = start; i < start + count; ++i) {
     WPoint const& p = Fitting::At(points, i);
-    double deviation = 0.0;
-    if (!GetSignedDeviation(la, lb, lc, p.x, p.y, &deviation)) continue;
+    double const deviation = line.At(p.x, p.y) / divisor;
     if (!isAnyMeasured || deviation < smallest) {
       smallest = deviation;
       smallestAt = i;
@@ -60,7 +62,6 @@ bool GeometryUtils::GetDeviationFromLineParameters(Point const& a, Point const& 
     }
     isAnyMeasured = true;
   }
-  // Without one measured point there are no extremes to hand out.
   if (!isAnyMeasured) return false;
   *minDeviation = smallest;
   *maxDeviation = largest;
