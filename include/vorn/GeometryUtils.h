@@ -1275,6 +1275,8 @@ class VORN_EXPORT GeometryUtils {
   ///                also on failures after the sense was found.
   /// @param[in,out] cells      scratch; what it holds on entry does not matter. On return the
   ///                common part of the centre cells, also on failures after the sense was found.
+  ///                May be null: then the cell, which may hold thousands of triangles, is not
+  ///                handed out.
   /// @param[out]    arcCount   count
   /// @param[out]    centre     centre of the arc
   /// @param[out]    radius     radius of the arc
@@ -1311,7 +1313,7 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in,out] start      in: the fixed start, if any; out: start of the arc
   /// @param[in]     endFixed   the arc ends exactly at *end if it reaches the last measured point
   /// @param[in,out] end        in: the fixed end, if any; out: end of the arc
-  /// @param[in,out] cells      emptied first; on return the centre cell of the run
+  /// @param[in,out] cells      may be null; emptied first; on return the centre cell of the run
   /// @param[out]    arcCount   number of points covered
   /// @param[out]    centre     centre of the arc
   /// @param[out]    radius     radius of the arc

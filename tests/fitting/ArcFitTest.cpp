@@ -137,6 +137,34 @@ TEST(GetFittingCircleO, IgnoresTheCellsOnEntry) {
   EXPECT_EQ(Transcribe(FitArcRun<GeometryUtils>(in)), Transcribe(clean));
 }
 
+TEST(GetFittingCircleO, NullCellsChangeNothingElse) {
+  std::vector<WPoint> const points = MakeArcPoints({1, 2}, 20, 1, 0.3, 24, 0.05);
+  auto const count = static_cast<std::int32_t>(points.size());
+  std::vector<Triangle> cells;
+  std::vector<Triangle>* const handedOut[] = {&cells, nullptr};
+  Point start[2];
+  Point end[2];
+  Point centre[2];
+  double radius[2] = {kSentinel, kSentinel};
+  double deviation[2] = {kSentinel, kSentinel};
+  for (int i = 0; i < 2; ++i) {
+    std::vector<GeometryUtils::IndexedPoint> samples;
+    std::int32_t arcCount = 0;
+    std::int32_t deviationIndex = 0;
+    bool ccw = false;
+    ASSERT_EQ(GeometryUtils::GetFittingCircleO(points, 0, count, false, &start[i], false, &end[i],
+                                               &samples, handedOut[i], &arcCount, &centre[i],
+                                               &radius[i], &ccw, &deviation[i], &deviationIndex),
+              ErrorCode::Ok);
+  }
+  EXPECT_FALSE(cells.empty());
+  EXPECT_SAME_POINT(start[0], start[1]);
+  EXPECT_SAME_POINT(end[0], end[1]);
+  EXPECT_SAME_POINT(centre[0], centre[1]);
+  EXPECT_SAME_BITS(radius[0], radius[1]);
+  EXPECT_SAME_BITS(deviation[0], deviation[1]);
+}
+
 TEST(GetFittingCircleO, KeepsAFixedStart) {
   ArcFitInput in = WholeRun(MakeArcPoints({0, 0}, 10, 0, 1.5, 9, 0.05));
   in.startFixed = true;
