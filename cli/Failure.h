@@ -14,6 +14,7 @@ enum class ExitCode : int {
   PointsTooClose = 4,
   NoFit = 5,
   Internal = 70,
+  Interrupted = 130,
 };
 
 /// Ends the program with a message for the user and the exit code that goes with it.

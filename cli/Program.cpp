@@ -1,103 +1,68 @@
 #include "cli/Program.h"
 
-#include <cstdio>
+#include <CLI/CLI.hpp>
 #include <exception>
-#include <memory>
 #include <ostream>
-#include <utility>
+#include <sstream>
 
-#include "cli/AtomicFile.h"
-#include "cli/CsvReader.h"
-#include "cli/Fit.h"
-#include "cli/Json.h"
-#include "cli/Numbers.h"
-#include "cli/Options.h"
-#include "cli/Progress.h"
-#include "cli/Report.h"
-#include "cli/Spacing.h"
-#include "cli/Svg.h"
-#include "cli/Table.h"
-#include "cli/Tolerances.h"
+#include "cli/commands/Command.h"
+#include "cli/commands/FitCommand.h"
 
 namespace Vorn::Cli {
 
 namespace {
 
-FitAnswer FitWithProgress(Options const& options, PointFile const& file) {
-  ProgressBar progress(stderr);
-  return Fit(file.points, options.strategy, &progress);
+constexpr char const* kText = "contour: measured points become a contour of lines and arcs.";
+
+constexpr char const* kFooter =
+    "Run 'contour COMMAND --help' for the options, exit codes and examples of a command.";
+
+/// In the order in which --help lists them.
+constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
+    AddFitCommand,
+};
+
+[[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {
+  std::string name;
+  for (CLI::App const* command : program.get_subcommands()) name += command->get_name() + " ";
+  throw Failure(ExitCode::Usage, complaint + "\nRun 'contour " + name + "--help' for the usage.");
 }
 
-void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
-  if (answer.code == ErrorCode::PointsTooClose) {
-    if (std::optional<ClosePair> const pair = FindClosePair(file.points)) {
-      throw Failure(ExitCode::PointsTooClose, DescribeClosePair(file, *pair));
-    }
+/// What the command line asks for.
+/// @throws Failure (ExitCode::Usage) when it is not understood or contradicts itself.
+Action ParseCommandLine(int argc, char const* const* argv) {
+  CLI::App program(kText, "contour");
+  program.set_version_flag("--version", "contour " CONTOUR_VERSION);
+  program.require_subcommand(1);
+  program.footer(kFooter);
+  Action action;
+  for (auto const& add : kCommands) add(program, &action);
+  try {
+    program.parse(argc, argv);
+  } catch (CLI::ParseError const& error) {
+    std::ostringstream answer;
+    std::ostringstream complaint;
+    if (program.exit(error, answer, complaint) != 0) RefuseUsage(program, error.what());
+    return [text = answer.str()](Console const& console) {
+      console.out << text;
+      return ExitCode::Ok;
+    };
   }
-  if (answer.code != ErrorCode::Ok) {
-    throw Failure(ExitCode::NoFit, file.path + ": no fit (code " + Describe(answer.code) + ")");
-  }
-  if (answer.contour.size() < 2) {
-    throw Failure(ExitCode::NoFit, file.path + ": no fit (the contour has no pieces)");
-  }
+  return action;
 }
 
-void WriteFiles(Options const& options, Report const& report) {
-  std::unique_ptr<AtomicFile> json;
-  std::unique_ptr<AtomicFile> svg;
-  if (options.json) json = std::make_unique<AtomicFile>(*options.json, ToJson(report));
-  if (options.svg) svg = std::make_unique<AtomicFile>(*options.svg, ToSvg(report));
-  if (json) json->Commit();
-  if (svg) svg->Commit();
-}
-
-std::string Complaint(Report const& report) {
-  PointFile const& file = report.file;
-  if (report.verdict == Verdict::StopsEarly) {
-    GeometryUtils::Point const& end = report.pieces.back().end;
-    return file.path + ": no fit beyond (" + FormatShort(end.x) + ", " + FormatShort(end.y) +
-           "): the contour stops before the last point, " + file.NameOf(file.points.size() - 1);
-  }
-  return file.path + ": the contour leaves the tolerance of " +
-         file.NameOf(report.remeasured.worst) + " (relative deviation " +
-         FormatShort(report.remeasured.Worst().relative) + ")";
-}
-
-ExitCode RunFit(Options const& options, std::ostream& out, std::ostream& err) {
-  if (options.json) RequireWritable(*options.json);
-  if (options.svg) RequireWritable(*options.svg);
-  PointFile file = ReadPoints(options.points, ColumnFor(options.tolerance));
-  std::string toleranceSource = AssignTolerances(options.tolerance, &file);
-  FitAnswer answer = FitWithProgress(options, file);
-  RefuseFailedFit(file, answer);
-  Report const report =
-      MakeReport(std::move(file), std::move(toleranceSource), options.strategy, std::move(answer));
-  WriteFiles(options, report);
-  out << ToTable(report);
-  if (options.json) out << "wrote       " << *options.json << '\n';
-  if (options.svg) out << "wrote       " << *options.svg << '\n';
-  if (report.verdict != Verdict::WithinTolerance) err << "contour: " << Complaint(report) << '\n';
-  return ExitCodeOf(report.verdict);
-}
-
-ExitCode Dispatch(int argc, char const* const* argv, std::ostream& out, std::ostream& err) {
-  std::string message;
-  std::optional<Options> const options = ParseCommandLine(argc, argv, &message);
-  ExitCode code = ExitCode::Ok;
-  if (options) {
-    code = RunFit(*options, out, err);
-  } else {
-    out << message;
-  }
-  if (!out.flush()) throw Failure(ExitCode::File, "standard output: cannot be written");
+ExitCode Dispatch(int argc, char const* const* argv, Console const& console) {
+  ExitCode const code = ParseCommandLine(argc, argv)(console);
+  if (!console.out.flush()) throw Failure(ExitCode::File, "standard output: cannot be written");
   return code;
 }
 
 }  // namespace
 
-ExitCode RunProgram(int argc, char const* const* argv, std::ostream& out, std::ostream& err) {
+ExitCode RunProgram(int argc, char const* const* argv, std::istream& in, std::ostream& out,
+                    std::ostream& err) {
   try {
-    return Dispatch(argc, argv, out, err);
+    return Dispatch(argc, argv, {in, out, err});
   } catch (Failure const& failure) {
     err << "contour: " << failure.what() << '\n';
     return failure.Code();

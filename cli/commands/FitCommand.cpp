@@ -1,0 +1,156 @@
+#include "cli/commands/FitCommand.h"
+
+#include <CLI/CLI.hpp>
+#include <cstdio>
+#include <memory>
+#include <ostream>
+#include <utility>
+
+#include "cli/Fit.h"
+#include "cli/Json.h"
+#include "cli/Numbers.h"
+#include "cli/Progress.h"
+#include "cli/Report.h"
+#include "cli/Spacing.h"
+#include "cli/Svg.h"
+#include "cli/Table.h"
+#include "cli/Tolerances.h"
+#include "cli/commands/CommonOptions.h"
+#include "cli/commands/Outputs.h"
+#include "cli/commands/PointsInput.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+using Strategy = GeometryUtils::FittingStrategy;
+
+constexpr char const* kText =
+    "Fit a contour of lines and arcs to measured points, so that it passes every point within\n"
+    "its tolerance. Prints a table of the pieces and a summary; writes JSON and a drawing.";
+
+constexpr char const* kFooter =
+    R"(
+Tolerance: at most one of the three options. Without one, the column w of the file counts, and
+without that its comment "# tolerance T". Neighbouring points must be more than 1.5 times the
+sum of their tolerances apart (strategies mixed and cells).
+
+Deviations are multiples of the tolerance of the point: up to 1 is within tolerance. They are
+printed as the fit reports them, and as measured again by the program over every point. Up to
+1 + 1e-9 counts as within, for the rounding of the second measurement. Points are counted from
+0. The strategy arc reports its deviation as a length, and no point.
+
+Exit codes:
+  0   every point is within its tolerance
+  1   the contour leaves the tolerance of a point (table and files are written)
+  2   wrong usage
+  3   a file cannot be read or written, or a line of the points file is wrong
+  4   two neighbouring points are too close for their tolerances
+  5   no fit, or a contour that stops before the last point (then table and files are written)
+  70  internal error
+  130 interrupted
+
+Output files are written whole or not at all.
+
+Examples:
+  contour fit part.csv --tolerance 0.02 --svg part.svg
+  contour fit part.csv --tolerance-per-point 0.05 --strategy cells --json part.json
+)";
+
+struct Options {
+  PointsInput points;
+  Strategy strategy = Strategy::Mixed;
+  std::string json;
+  std::string svg;
+
+  std::vector<NamedFile> Written() const {
+    std::vector<NamedFile> files;
+    if (!json.empty()) files.push_back({"--json", json});
+    if (!svg.empty()) files.push_back({"--svg", svg});
+    return files;
+  }
+};
+
+FitAnswer FitWithProgress(Options const& options, PointFile const& file) {
+  ProgressBar progress(stderr);
+  return Fit(file.points, options.strategy, &progress);
+}
+
+void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
+  if (answer.code == ErrorCode::PointsTooClose) {
+    if (std::optional<ClosePair> const pair = FindClosePair(file.points)) {
+      throw Failure(ExitCode::PointsTooClose, DescribeClosePair(file, *pair));
+    }
+  }
+  if (answer.code != ErrorCode::Ok) {
+    throw Failure(ExitCode::NoFit, file.path + ": no fit (code " + Describe(answer.code) + ")");
+  }
+  if (answer.contour.size() < 2) {
+    throw Failure(ExitCode::NoFit, file.path + ": no fit (the contour has no pieces)");
+  }
+}
+
+std::string Complaint(Report const& report) {
+  PointFile const& file = report.file;
+  if (report.verdict == Verdict::StopsEarly) {
+    GeometryUtils::Point const& end = report.pieces.back().end;
+    return file.path + ": no fit beyond (" + FormatShort(end.x) + ", " + FormatShort(end.y) +
+           "): the contour stops before the last point, " + file.NameOf(file.points.size() - 1);
+  }
+  return file.path + ": the contour leaves the tolerance of " +
+         file.NameOf(report.remeasured.worst) + " (relative deviation " +
+         FormatShort(report.remeasured.Worst().relative) + ")";
+}
+
+void WriteResults(Options const& options, Report const& report, Console const& console) {
+  Outputs outputs;
+  if (!options.json.empty()) outputs.Add(options.json, ToJson(report));
+  if (!options.svg.empty()) outputs.Add(options.svg, ToSvg(report));
+  outputs.Write(console);
+  console.out << ToTable(report);
+  for (NamedFile const& file : options.Written()) {
+    console.out << "wrote       " << file.path << '\n';
+  }
+}
+
+ExitCode Run(Options const& options, Console const& console) {
+  RequireWritable(options.Written());
+  PointFile file = ReadPointsInput(options.points, console);
+  std::string toleranceSource = AssignTolerances(options.points.tolerance, &file);
+  FitAnswer answer = FitWithProgress(options, file);
+  RefuseFailedFit(file, answer);
+  Report const report =
+      MakeReport(std::move(file), std::move(toleranceSource), options.strategy, std::move(answer));
+  WriteResults(options, report, console);
+  if (report.verdict != Verdict::WithinTolerance) {
+    console.err << "contour: " << Complaint(report) << '\n';
+  }
+  return ExitCodeOf(report.verdict);
+}
+
+void AddOptions(CLI::App& app, Options* options) {
+  AddPointsInput(app, &options->points);
+  AddChoice<Strategy>(
+      app, "--strategy", &options->strategy,
+      {{"mixed", Strategy::Mixed}, {"cells", Strategy::MixedCells}, {"arc", Strategy::SingleArc}},
+      "mixed: lines and arcs compared run by run (default); cells: lines first, arcs between "
+      "them; arc: one arc for all points");
+  app.add_option("--json", options->json, "Write the contour and its deviations to this file")
+      ->type_name("FILE");
+  app.add_option("--svg", options->svg, "Write a drawing to this file")->type_name("FILE");
+  app.footer(std::string(kPointsFileText) + kFooter);
+}
+
+}  // namespace
+
+void AddFitCommand(CLI::App& program, Action* action) {
+  CLI::App* const app = program.add_subcommand("fit", kText);
+  auto const options = std::make_shared<Options>();
+  AddOptions(*app, options.get());
+  app->callback([options, action] {
+    RefuseSharedFiles({{"POINTS", options->points.path}}, options->Written());
+    *action = [options](Console const& console) { return Run(*options, console); };
+  });
+}
+
+}  // namespace Vorn::Cli

@@ -1,0 +1,35 @@
+#pragma once
+
+#include <string>
+
+#include "cli/CsvReader.h"
+#include "cli/Tolerances.h"
+#include "cli/commands/Command.h"
+
+namespace CLI {
+class App;
+}
+
+namespace Vorn::Cli {
+
+/// How a message calls the standard input.
+inline constexpr char const* kStandardInputName = "standard input";
+
+/// The measured points a command reads, and the options that say how.
+struct PointsInput {
+  std::string path;  ///< "-" is the standard input
+  ToleranceChoice tolerance;
+  std::string units;  ///< --units; empty: what the file says
+};
+
+/// Adds the positional POINTS and the options for tolerances and units.
+void AddPointsInput(CLI::App& app, PointsInput* input);
+
+/// Reads the points. Tolerances that come from options are not assigned yet, see AssignTolerances.
+/// @throws Failure as ReadPoints does.
+PointFile ReadPointsInput(PointsInput const& input, Console const& console);
+
+/// For the footer of a command's help.
+extern char const* const kPointsFileText;
+
+}  // namespace Vorn::Cli
