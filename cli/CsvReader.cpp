@@ -1,16 +1,16 @@
 #include "cli/CsvReader.h"
 
 #include <algorithm>
-#include <cerrno>
 #include <cmath>
-#include <cstring>
-#include <filesystem>
-#include <fstream>
+#include <istream>
 #include <iterator>
-#include <sstream>
+#include <utility>
 
 #include "cli/Failure.h"
+#include "cli/Fields.h"
 #include "cli/Numbers.h"
+#include "cli/TextFile.h"
+#include "cli/TextLines.h"
 
 namespace Vorn::Cli {
 
@@ -18,28 +18,9 @@ namespace {
 
 constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 constexpr std::string_view kUtf16Marks[] = {"\xFF\xFE", "\xFE\xFF"};
-
-[[noreturn]] void Refuse(std::string const& path, std::string const& message) {
-  throw Failure(ExitCode::File, path + ": " + message);
-}
-
-[[noreturn]] void RefuseLine(std::string const& path, std::size_t line,
-                             std::string const& message) {
-  throw Failure(ExitCode::File, path + ":" + std::to_string(line) + ": " + message);
-}
-
-/// Cuts the next line off the text; a line ends with LF, CR LF or CR.
-std::string_view TakeLine(std::string_view* text) {
-  std::size_t const end = text->find_first_of("\r\n");
-  std::string_view const line = text->substr(0, end);
-  if (end == std::string_view::npos) {
-    *text = {};
-    return line;
-  }
-  bool const isPair = text->substr(end, 2) == "\r\n";
-  text->remove_prefix(end + (isPair ? 2 : 1));
-  return line;
-}
+constexpr std::size_t kMostNamesInMessage = 8;
+constexpr std::size_t kLongestColumnNumber = 9;
+constexpr std::size_t kShortestLine = 4;  // 1,2 and its end
 
 std::string_view TakeWord(std::string_view* text) {
   *text = Trimmed(*text);
@@ -50,225 +31,335 @@ std::string_view TakeWord(std::string_view* text) {
   return word;
 }
 
-char FindSeparator(std::string_view line) {
-  for (char const separator : {';', '\t', ','}) {
-    if (line.find(separator) != std::string_view::npos) return separator;
-  }
-  return ' ';
-}
-
-std::vector<std::string_view> SplitAtBlanks(std::string_view line) {
-  std::vector<std::string_view> fields;
-  while (!(line = Trimmed(line)).empty()) {
-    std::size_t const end = std::min(line.find_first_of(" \t"), line.size());
-    fields.push_back(line.substr(0, end));
-    line.remove_prefix(end);
-  }
-  return fields;
-}
-
-std::vector<std::string_view> Split(std::string_view line, char separator) {
-  if (separator == ' ') return SplitAtBlanks(line);
-  std::vector<std::string_view> fields;
-  for (std::size_t end = 0; end != std::string_view::npos;) {
-    end = line.find(separator);
-    fields.push_back(Trimmed(line.substr(0, end)));
-    if (end != std::string_view::npos) line.remove_prefix(end + 1);
-  }
-  return fields;
-}
-
-/// Also what begins like a number without being one, such as 1,5 or 3mm: it is meant as data and
-/// must not pass for the name of a column.
+/// Also what begins like a number without being one, such as 3mm: it is meant as data and must not
+/// pass for the name of a column.
 bool LooksLikeNumber(std::string_view field) {
+  field = Unquoted(field);
   if (ParseNumber(field)) return true;
   std::string_view const digits =
-      field.substr(std::min(field.find_first_not_of("+-."), field.size()));
+      field.substr(std::min(field.find_first_not_of("+-.,"), field.size()));
   return !digits.empty() && digits.front() >= '0' && digits.front() <= '9';
 }
 
-std::string ColumnName(std::string_view field) {
-  if (field.size() >= 2 && field.front() == '"' && field.back() == '"') {
-    field = field.substr(1, field.size() - 2);
+std::string ColumnName(std::string_view field) { return LowerCase(Trimmed(Unquoted(field))); }
+
+/// The index of the column with this number, counted from 1; nothing for other text.
+std::optional<std::size_t> IndexOfNumber(std::string_view text) {
+  bool const isNumber = !text.empty() && text.size() <= kLongestColumnNumber &&
+                        text.find_first_not_of("0123456789") == std::string_view::npos;
+  if (!isNumber) return {};
+  std::size_t const number = std::stoul(std::string(text));
+  if (number == 0) return {};
+  return number - 1;
+}
+
+bool IsBlank(char c) { return c == ' ' || c == '\t'; }
+
+/// Where the comment of a line begins. A // within other text is none: it stands in addresses.
+std::size_t FindComment(std::string_view line) {
+  std::size_t const hash = line.find('#');
+  std::size_t slashes = line.find('/');
+  while (slashes < hash) {
+    bool const isFree = slashes == 0 || IsBlank(line[slashes - 1]);
+    if (isFree && line.substr(slashes, 2) == "//") return slashes;
+    slashes = line.find('/', slashes + 1);
   }
-  return LowerCase(Trimmed(field));
+  return hash;
 }
 
 class Parser {
  public:
-  Parser(std::string const& path, ToleranceColumn const& column) : column_(column) {
-    file_.path = path;
+  Parser(std::string const& path, ToleranceColumn const& tolerance, ColumnChoice const& columns)
+      : tolerance_(tolerance), columns_(columns) {
+    file_.path = InputName(path);
+    if (columns.w.empty()) return;
+    if (tolerance.use == ToleranceColumn::Use::Required) {
+      throw Failure(ExitCode::Usage, "two columns for the tolerance: " + Quoted(columns.w) +
+                                         " and " + Quoted(tolerance.name));
+    }
+    if (tolerance.use == ToleranceColumn::Use::Ignore) return;
+    tolerance_ = {ToleranceColumn::Use::Required, columns.w};
   }
 
   PointFile Parse(std::string_view text) {
     if (text.substr(0, kUtf8Mark.size()) == kUtf8Mark) text.remove_prefix(kUtf8Mark.size());
-    for (std::string_view const mark : kUtf16Marks) {
-      if (text.substr(0, mark.size()) == mark) {
-        Refuse(file_.path, "is UTF-16 text; save it as UTF-8");
-      }
-    }
-    while (!text.empty()) {
+    RefuseOtherThanText(text);
+    auto const lineFeeds = static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n'));
+    std::size_t const mostPoints = std::min(lineFeeds, text.size() / kShortestLine) + 1;
+    file_.points.reserve(mostPoints);
+    file_.lines.reserve(mostPoints);
+    TextLines lines(text);
+    while (!lines.AtEnd()) {
       ++line_;
-      ParseLine(TakeLine(&text));
+      lineText_ = lines.Take();
+      ParseLine();
     }
     RefuseTooFewPoints();
     return std::move(file_);
   }
 
  private:
-  void ParseLine(std::string_view line) {
-    std::size_t const comment = line.find('#');
-    if (comment != std::string_view::npos) {
-      if (file_.points.empty()) ParseComment(line.substr(comment + 1));
-      line = line.substr(0, comment);
+  void ParseLine() {
+    std::size_t const comment = FindComment(lineText_);
+    std::string_view line = lineText_.substr(0, comment);
+    if (comment != std::string_view::npos && file_.points.empty()) {
+      ParseComment(lineText_.substr(comment));
     }
-    line = Trimmed(line);
-    if (line.empty()) return;
-    if (columnCount_ != 0) return ParsePoint(Split(line, separator_));
-    separator_ = FindSeparator(line);
-    std::vector<std::string_view> const fields = Split(line, separator_);
-    bool const isHeader = std::none_of(fields.begin(), fields.end(), LooksLikeNumber);
-    isHeader ? ParseHeader(fields) : ChooseColumnsWithoutHeader(fields);
-    columnCount_ = fields.size();
-    if (!isHeader) ParsePoint(fields);
+    if (Trimmed(line).empty()) return;
+    if (columnCount_ != 0) return ParseLineOfData(line);
+    separator_ = FindSeparator(Trimmed(line));
+    SplitFields(Trimmed(line), separator_, &fields_);
+    bool const isHeader = std::none_of(fields_.begin(), fields_.end(), LooksLikeNumber);
+    columnCount_ = fields_.size();
+    if (columnCount_ < 2) RefuseOneColumn();
+    isHeader ? ParseHeader() : ChooseColumnsWithoutHeader();
+    if (!isHeader) ParsePoint();
   }
 
+  void ParseLineOfData(std::string_view line) {
+    if (file_.points.empty()) AdoptSeparatorOfData(Trimmed(line));
+    // A tab at the end of a line is an empty field if the columns ask for one, and else nothing.
+    SplitFields(separator_ == '\t' ? line : Trimmed(line), separator_, &fields_);
+    if (separator_ == '\t' && !HasAllFields()) SplitFields(Trimmed(line), separator_, &fields_);
+    ParsePoint();
+  }
+
+  /// The data may have another separator than the header.
+  void AdoptSeparatorOfData(std::string_view firstLine) {
+    char const separator = FindSeparator(firstLine);
+    SplitFields(firstLine, separator, &fields_);
+    if (HasAllFields()) separator_ = separator;
+  }
+
+  bool HasAllFields() const { return fields_.size() == columnCount_; }
+
   void ParseComment(std::string_view comment) {
+    comment.remove_prefix(comment.front() == '#' ? 1 : 2);
     std::string const key = LowerCase(TakeWord(&comment));
     if (key == "units" || key == "unit") file_.units = std::string(TakeWord(&comment));
     if (key != "tolerance") return;
-    std::optional<double> const value = ParseNumber(TakeWord(&comment));
+    std::string_view const word = TakeWord(&comment);
+    std::optional<double> const value = ParseNumber(word);
     // A sentence that merely begins with the word is no statement of a tolerance.
     if (!value) return;
-    file_.tolerance = CheckedTolerance(*value, "tolerance in the comment");
+    file_.tolerance = CheckedTolerance(*value, "tolerance in the comment", word);
   }
 
-  void ParseHeader(std::vector<std::string_view> const& fields) {
-    if (fields.size() < 2) RefuseOneColumn(fields.front());
-    std::vector<std::string> names;
-    std::transform(fields.begin(), fields.end(), std::back_inserter(names), ColumnName);
-    auto find = [&](std::string const& name) {
-      return static_cast<std::size_t>(std::find(names.begin(), names.end(), LowerCase(name)) -
-                                      names.begin());
-    };
-    if (find("x") < names.size() && find("y") < names.size()) {
-      xColumn_ = find("x");
-      yColumn_ = find("y");
+  void ParseHeader() {
+    std::transform(fields_.begin(), fields_.end(), std::back_inserter(names_), ColumnName);
+    if (columns_.IsGiven()) {
+      ChooseGivenColumns();
+    } else if (FindName("x") && FindName("y")) {
+      xColumn_ = *FindName("x");
+      yColumn_ = *FindName("y");
     }
-    if (column_.use == ToleranceColumn::Use::Ignore) return;
-    wColumn_ = find(column_.name);
-    file_.hasTolerances = wColumn_ < names.size();
-    if (!file_.hasTolerances && column_.use == ToleranceColumn::Use::Required) {
-      std::string list;
-      for (std::string_view const field : fields)
-        list += (list.empty() ? "" : ", ") + Quoted(field);
-      RefuseLine(file_.path, line_,
-                 "no column " + Quoted(column_.name) + "; the header has " + list);
+    if (tolerance_.use == ToleranceColumn::Use::Required) {
+      ChooseTolerance(IndexOf(tolerance_.name));
+    } else if (tolerance_.use == ToleranceColumn::Use::IfPresent && FindName(tolerance_.name)) {
+      ChooseTolerance(*FindName(tolerance_.name));
     }
   }
 
-  void ChooseColumnsWithoutHeader(std::vector<std::string_view> const& fields) {
-    if (fields.size() < 2) RefuseOneColumn(fields.front());
-    if (fields.size() > 3) {
-      RefuseLine(
-          file_.path, line_,
-          std::to_string(fields.size()) + " columns without a header; expected x,y or x,y,w");
+  void ChooseColumnsWithoutHeader() {
+    if (columns_.IsGiven()) {
+      ChooseGivenColumns();
+    } else if (columnCount_ > 3) {
+      RefuseAt(fields_[3], std::to_string(columnCount_) +
+                               " columns without a header; expected x,y or x,y,w, or --columns "
+                               "with the numbers of those to take");
     }
-    if (column_.use == ToleranceColumn::Use::Ignore) return;
-    file_.hasTolerances = fields.size() == 3 && LowerCase(column_.name) == "w";
-    if (!file_.hasTolerances && column_.use == ToleranceColumn::Use::Required) {
-      RefuseLine(file_.path, line_,
-                 "no column " + Quoted(column_.name) + "; the file has no header");
+    bool const isThird = !columns_.IsGiven() && columnCount_ == 3 && !fields_[2].empty() &&
+                         LowerCase(tolerance_.name) == "w";
+    if (tolerance_.use == ToleranceColumn::Use::Required) {
+      ChooseTolerance(isThird ? 2 : IndexOf(tolerance_.name));
+    } else if (tolerance_.use == ToleranceColumn::Use::IfPresent && isThird) {
+      ChooseTolerance(2);
     }
   }
 
-  void ParsePoint(std::vector<std::string_view> const& fields) {
-    if (fields.size() != columnCount_) {
-      RefuseLine(file_.path, line_,
-                 "expected " + std::to_string(columnCount_) + " columns, found " +
-                     std::to_string(fields.size()) + ": " + QuotedFields(fields));
+  void ChooseGivenColumns() {
+    xColumn_ = IndexOf(columns_.x);
+    yColumn_ = IndexOf(columns_.y);
+  }
+
+  void ChooseTolerance(std::size_t column) {
+    wColumn_ = column;
+    file_.hasTolerances = true;
+    file_.toleranceColumn = tolerance_.name;
+  }
+
+  std::optional<std::size_t> FindName(std::string const& name) const {
+    auto const found = std::find(names_.begin(), names_.end(), LowerCase(name));
+    if (found == names_.end()) return {};
+    return static_cast<std::size_t>(found - names_.begin());
+  }
+
+  /// A column that the user named or numbered.
+  std::size_t IndexOf(std::string const& column) const {
+    if (std::optional<std::size_t> const named = FindName(column)) return *named;
+    std::optional<std::size_t> const numbered = IndexOfNumber(column);
+    if (numbered && *numbered < columnCount_) return *numbered;
+    std::string const reason = numbered         ? "there are " + std::to_string(columnCount_)
+                               : names_.empty() ? "the file has no header"
+                                                : "the header has " + NamesInHeader();
+    RefuseAt(fields_.front(), "no column " + Quoted(column) + "; " + reason);
+  }
+
+  std::string NamesInHeader() const {
+    std::string list;
+    for (std::size_t i = 0; i < std::min(fields_.size(), kMostNamesInMessage); ++i) {
+      list += (i == 0 ? "" : ", ") + Quoted(fields_[i]);
     }
+    return fields_.size() > kMostNamesInMessage
+               ? list + " and " + std::to_string(fields_.size() - kMostNamesInMessage) + " more"
+               : list;
+  }
+
+  void ParsePoint() {
+    if (!HasAllFields()) RefuseColumnCount();
     WPoint point;
-    point.x = ParseField("x", fields[xColumn_]);
-    point.y = ParseField("y", fields[yColumn_]);
+    point.x = ParseField("x", fields_[xColumn_]);
+    point.y = ParseField("y", fields_[yColumn_]);
     if (file_.hasTolerances) {
-      point.w = CheckedTolerance(ParseField(column_.name, fields[wColumn_]),
-                                 "tolerance " + Quoted(fields[wColumn_]));
+      std::string_view const field = fields_[wColumn_];
+      point.w =
+          CheckedTolerance(ParseField(tolerance_.name, field), "tolerance " + Quoted(field), field);
     }
     file_.points.push_back(point);
     file_.lines.push_back(line_);
   }
 
-  double ParseField(std::string const& name, std::string_view field) const {
-    std::optional<double> const value = ParseNumber(field);
-    if (!value) {
-      bool const decimalComma = field.find(',') != std::string_view::npos;
-      RefuseLine(
-          file_.path, line_,
-          (field.empty() ? name + " is missing" : name + " is not a number: " + Quoted(field)) +
-              (decimalComma ? " (write a decimal point, not a comma)" : ""));
-    }
+  double ParseField(std::string_view name, std::string_view field) {
+    std::string_view const text = Unquoted(field);
+    if (lineOfMark_ == 0) LearnDecimalMark(text);
+    std::optional<double> const value = ParseNumber(text, mark_);
+    if (!value) RefuseNumber(std::string(name), field);
     if (!std::isfinite(*value)) {
-      RefuseLine(file_.path, line_, name + " is not a finite number: " + Quoted(field));
+      RefuseAt(field, std::string(name) + " is not a finite number: " + Quoted(field));
     }
     return *value;
   }
 
-  double CheckedTolerance(double value, std::string const& what) const {
+  /// The first number with either mark decides: the other one, met later, may group thousands.
+  void LearnDecimalMark(std::string_view text) {
+    std::size_t const at = text.find_first_of(".,");
+    if (at == std::string_view::npos) return;
+    mark_ = text[at] == ',' ? DecimalMark::Comma : DecimalMark::Point;
+    lineOfMark_ = line_;
+  }
+
+  [[noreturn]] void RefuseNumber(std::string const& name, std::string_view field) const {
+    if (field.empty()) RefuseAt(field, name + " is missing");
+    char const otherMark = mark_ == DecimalMark::Comma ? '.' : ',';
+    bool const isOther = lineOfMark_ != line_ && field.find(otherMark) != std::string_view::npos;
+    std::string const mark = mark_ == DecimalMark::Comma ? "comma" : "point";
+    RefuseAt(field,
+             name + " is not a number: " + Quoted(field) +
+                 (isOther ? " (line " + std::to_string(lineOfMark_) + " has a decimal " + mark + ")"
+                          : ""));
+  }
+
+  double CheckedTolerance(double value, std::string const& what, std::string_view at) const {
     if (!(value > 0.0) || !std::isfinite(value)) {
-      RefuseLine(file_.path, line_, what + " must be a finite number above 0");
+      RefuseAt(at, what + " must be a finite number above 0");
     }
     return value;
   }
 
-  [[noreturn]] void RefuseOneColumn(std::string_view field) const {
-    RefuseLine(file_.path, line_, "only one column, " + Quoted(field) + "; expected x,y or x,y,w");
+  [[noreturn]] void RefuseOneColumn() const {
+    RefuseAt(fields_.front(),
+             "only one column, " + Quoted(fields_.front()) + "; expected x,y or x,y,w");
   }
 
-  std::string QuotedFields(std::vector<std::string_view> const& fields) const {
-    char const* const begin = fields.front().data();
-    char const* const end = fields.back().data() + fields.back().size();
-    return Quoted({begin, static_cast<std::size_t>(end - begin)});
+  [[noreturn]] void RefuseColumnCount() const {
+    std::string_view const where =
+        fields_.size() > columnCount_ ? fields_[columnCount_] : fields_.front();
+    char const* const begin = fields_.front().data();
+    char const* const end = fields_.back().data() + fields_.back().size();
+    RefuseAt(where, "expected " + std::to_string(columnCount_) + " columns, found " +
+                        std::to_string(fields_.size()) + ": " +
+                        Quoted({begin, static_cast<std::size_t>(end - begin)}));
+  }
+
+  void RefuseOtherThanText(std::string_view text) {
+    for (std::string_view const mark : kUtf16Marks) {
+      if (text.substr(0, mark.size()) == mark) Refuse("is UTF-16 text; save it as UTF-8");
+    }
+    std::size_t const zero = text.find('\0');
+    if (zero == std::string_view::npos) return;
+    Refuse("is not text: byte " + std::to_string(zero) + " is zero");
   }
 
   void RefuseTooFewPoints() const {
     if (file_.points.size() >= 2) return;
-    if (columnCount_ == 0) Refuse(file_.path, "holds no points");
-    if (file_.points.empty()) Refuse(file_.path, "holds a header but no points");
-    Refuse(file_.path, "holds one point only; a fit needs two");
+    if (columnCount_ == 0) Refuse("holds no points");
+    if (file_.points.empty()) Refuse("holds a header but no points");
+    Refuse("holds one point only; a contour needs two");
   }
 
-  ToleranceColumn column_;
+  [[noreturn]] void Refuse(std::string const& message) const {
+    throw Failure(ExitCode::File, file_.path + ": " + message);
+  }
+
+  /// `field` is part of the current line.
+  [[noreturn]] void RefuseAt(std::string_view field, std::string const& message) const {
+    throw Failure(ExitCode::File, file_.path + ":" + std::to_string(line_) + ":" +
+                                      std::to_string(ColumnOf(field.data())) + ": " + message);
+  }
+
+  /// Counted in characters, as editors do.
+  std::size_t ColumnOf(char const* place) const {
+    constexpr unsigned kContinuation = 0x80;
+    constexpr unsigned kContinuationMask = 0xC0;
+    return 1 + static_cast<std::size_t>(std::count_if(lineText_.data(), place, [](char c) {
+             return (static_cast<unsigned char>(c) & kContinuationMask) != kContinuation;
+           }));
+  }
+
+  ToleranceColumn tolerance_;
+  ColumnChoice columns_;
   PointFile file_;
   std::size_t line_ = 0;
+  std::string_view lineText_;
+  std::vector<std::string_view> fields_;  ///< of the current line; kept for its memory
+  std::vector<std::string> names_;        ///< of the columns, in lower case
   char separator_ = ',';
   std::size_t columnCount_ = 0;
   std::size_t xColumn_ = 0;
   std::size_t yColumn_ = 1;
   std::size_t wColumn_ = 2;
+  DecimalMark mark_ = DecimalMark::Point;
+  std::size_t lineOfMark_ = 0;  ///< where the decimal mark was seen first; 0: not yet
 };
 
 }  // namespace
+
+std::optional<ColumnChoice> ParseColumnChoice(std::string_view text) {
+  std::vector<std::string_view> names;
+  SplitFields(text, ',', &names);
+  if (names.size() < 2 || names.size() > 3) return {};
+  names.resize(3);
+  ColumnChoice const choice{std::string(Unquoted(names[0])), std::string(Unquoted(names[1])),
+                            std::string(Unquoted(names[2]))};
+  bool const anyEmpty =
+      choice.x.empty() || choice.y.empty() || (choice.w.empty() && names[2].data() != nullptr);
+  bool const anyTwice = choice.x == choice.y || choice.x == choice.w || choice.y == choice.w;
+  if (anyEmpty || anyTwice) return {};
+  return choice;
+}
 
 std::string PointFile::NameOf(std::size_t index) const {
   return "point " + std::to_string(index) + " (line " + std::to_string(lines[index]) + ")";
 }
 
 PointFile ParsePoints(std::string_view text, std::string const& path,
-                      ToleranceColumn const& column) {
-  return Parser(path, column).Parse(text);
+                      ToleranceColumn const& tolerance, ColumnChoice const& columns) {
+  return Parser(path, tolerance, columns).Parse(text);
 }
 
-PointFile ReadPoints(std::string const& path, ToleranceColumn const& column) {
-  std::error_code ignored;
-  if (std::filesystem::is_directory(path, ignored)) Refuse(path, "is a directory");
-  errno = 0;
-  std::ifstream file(path, std::ios::binary);
-  if (!file) Refuse(path, std::strerror(errno));
-  std::ostringstream text;
-  text << file.rdbuf();
-  if (file.bad()) Refuse(path, "cannot be read");
-  return ParsePoints(text.str(), path, column);
+PointFile ReadPoints(std::string const& path, std::istream& in, ToleranceColumn const& tolerance,
+                     ColumnChoice const& columns) {
+  return ParsePoints(ReadTextFile(path, in), path, tolerance, columns);
 }
 
 }  // namespace Vorn::Cli

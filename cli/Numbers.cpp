@@ -15,6 +15,14 @@ constexpr std::size_t kLongestQuote = 40;
 
 bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f'; }
 
+bool EveryCommaHasADigitBehind(std::string_view text) {
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    if (text[i] != ',') continue;
+    if (i + 1 == text.size() || text[i + 1] < '0' || text[i + 1] > '9') return false;
+  }
+  return true;
+}
+
 std::string WithoutMinusOnZero(std::string text) {
   bool const isZero = text.find_first_not_of("-0.") == std::string::npos;
   if (isZero && text.front() == '-') text.erase(0, 1);
@@ -23,11 +31,15 @@ std::string WithoutMinusOnZero(std::string text) {
 
 }  // namespace
 
-std::optional<double> ParseNumber(std::string_view text) {
+std::optional<double> ParseNumber(std::string_view text, DecimalMark mark) {
   if (text.size() > 1 && text.front() == '+' && text[1] != '-') text.remove_prefix(1);
+  if (mark == DecimalMark::Comma && !EveryCommaHasADigitBehind(text)) return {};
   double value = 0.0;
   char const* const end = text.data() + text.size();
-  fast_float::from_chars_result const result = fast_float::from_chars(text.data(), end, value);
+  fast_float::parse_options const options(fast_float::chars_format::general,
+                                          mark == DecimalMark::Comma ? ',' : '.');
+  fast_float::from_chars_result const result =
+      fast_float::from_chars_advanced(text.data(), end, value, options);
   if (text.empty() || result.ptr != end || result.ec == std::errc::invalid_argument) return {};
   return value;
 }

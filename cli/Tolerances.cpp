@@ -52,7 +52,7 @@ std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file) {
     AssignOne(*choice.same, file);
     return "given by --tolerance";
   }
-  if (file->hasTolerances) return "column " + Quoted(choice.column.value_or("w")) + " of the file";
+  if (file->hasTolerances) return "column " + Quoted(file->toleranceColumn) + " of the file";
   if (file->tolerance) {
     AssignOne(*file->tolerance, file);
     return "comment in the file";

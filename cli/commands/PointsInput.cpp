@@ -1,21 +1,22 @@
 #include "cli/commands/PointsInput.h"
 
 #include <CLI/CLI.hpp>
-#include <istream>
-#include <iterator>
 
+#include "cli/Numbers.h"
 #include "cli/commands/CommonOptions.h"
 
 namespace Vorn::Cli {
 
 namespace {
 
-PointFile ReadPath(PointsInput const& input, Console const& console) {
-  ToleranceColumn const column = ColumnFor(input.tolerance);
-  if (input.path != "-") return ReadPoints(input.path, column);
-  std::string const text(std::istreambuf_iterator<char>(console.in), {});
-  if (console.in.bad()) throw Failure(ExitCode::File, "standard input: cannot be read");
-  return ParsePoints(text, kStandardInputName, column);
+/// The words of --columns.
+CLI::Validator Columns() {
+  return CLI::Validator(
+      [](std::string& text) -> std::string {
+        return ParseColumnChoice(text) ? ""
+                                       : Quoted(text) + " is not two or three different columns";
+      },
+      "");
 }
 
 }  // namespace
@@ -23,7 +24,8 @@ PointFile ReadPath(PointsInput const& input, Console const& console) {
 char const* const kPointsFileText =
     R"(Points file: one point a line, x,y or x,y,w (w: the tolerance of the point), in the order of
 the contour. The first line may be a header. Fields are separated by a comma, a semicolon, a
-tab or blanks. Lines that begin with # are comments; "# tolerance T" and "# units mm" are read.
+tab or blanks; decimal commas are read where the separator is none. What follows # or // is a
+comment; "# tolerance T" and "# units mm" are read.
 )";
 
 void AddPointsInput(CLI::App& app, PointsInput* input) {
@@ -37,20 +39,27 @@ void AddPointsInput(CLI::App& app, PointsInput* input) {
                         "One tolerance for all points, in the units of the file");
   CLI::Option* const column =
       app.add_option("--tolerance-column", choice.column,
-                     "Take each point's tolerance from the column of this name")
+                     "Take each point's tolerance from the column of this name or number")
           ->type_name("NAME");
   CLI::Option* const cap = AddPositiveNumber(
       app, "--tolerance-per-point", &choice.cap, "CAP",
       "Give each point the smaller of CAP and 0.3 times the distance to its nearer neighbour");
   same->excludes(column)->excludes(cap);
   column->excludes(cap);
+  app.add_option_function<std::string>(
+         "--columns",
+         [input](std::string const& text) { input->columns = ParseColumnChoice(text).value(); },
+         "The columns that hold x, y and, if there is a third, the tolerance: names from the "
+         "header or numbers counted from 1")
+      ->check(Columns())
+      ->type_name("X,Y[,W]");
   app.add_option("--units", input->units,
                  "The units of the coordinates, for example mm; goes before what the file says")
       ->type_name("NAME");
 }
 
 PointFile ReadPointsInput(PointsInput const& input, Console const& console) {
-  PointFile file = ReadPath(input, console);
+  PointFile file = ReadPoints(input.path, console.in, ColumnFor(input.tolerance), input.columns);
   if (!input.units.empty()) file.units = input.units;
   return file;
 }

@@ -12,17 +12,15 @@ class App;
 
 namespace Vorn::Cli {
 
-/// How a message calls the standard input.
-inline constexpr char const* kStandardInputName = "standard input";
-
 /// The measured points a command reads, and the options that say how.
 struct PointsInput {
   std::string path;  ///< "-" is the standard input
   ToleranceChoice tolerance;
+  ColumnChoice columns;
   std::string units;  ///< --units; empty: what the file says
 };
 
-/// Adds the positional POINTS and the options for tolerances and units.
+/// Adds the positional POINTS and the options for tolerances, columns and units.
 void AddPointsInput(CLI::App& app, PointsInput* input);
 
 /// Reads the points. Tolerances that come from options are not assigned yet, see AssignTolerances.

@@ -49,7 +49,7 @@ TEST(FitCommand, ToleranceIsReadInEveryForm) {
 TEST(FitCommand, PointsMayComeFromTheStandardInput) {
   RunResult const result = RunInProcess({"fit", "-", "-t", "0.1"}, "0,0\n1,oops\n");
   EXPECT_EQ(result.code, ExitCode::File);
-  EXPECT_EQ(result.err, "contour: standard input:2: y is not a number: 'oops'\n");
+  EXPECT_EQ(result.err, "contour: standard input:2:3: y is not a number: 'oops'\n");
 }
 
 TEST(FitCommand, ToleranceMustBeAFiniteNumberAboveZero) {

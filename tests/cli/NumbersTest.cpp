@@ -20,6 +20,15 @@ TEST(ParseNumber, TakesTheWholeTextOrNothing) {
   }
 }
 
+TEST(ParseNumber, ReadsADecimalCommaWhereAskedTo) {
+  EXPECT_EQ(ParseNumber("1,5E+03", DecimalMark::Comma), 1500.0);
+  EXPECT_EQ(ParseNumber("-,5", DecimalMark::Comma), -0.5);
+  EXPECT_EQ(ParseNumber("7", DecimalMark::Comma), 7.0);
+  for (char const* text : {"", ",", "1,", "1,e5", "1.5", "1,5,2", "1.000,5"}) {
+    EXPECT_FALSE(ParseNumber(text, DecimalMark::Comma).has_value()) << text;
+  }
+}
+
 TEST(ParseNumber, KeepsTheSignOfZero) { EXPECT_TRUE(std::signbit(ParseNumber("-0.0").value())); }
 
 TEST(ParseNumber, LeavesJudgingNonFiniteValuesToTheCaller) {

@@ -112,16 +112,16 @@ TEST_F(Program, ExitCode3UnreadableFiles) {
   ExpectRefusal("fit ." + option, 3, ".: is a directory");
   ExpectRefusal("fit empty.csv" + option, 3, "empty.csv: holds no points");
   ExpectRefusal("fit header.csv" + option, 3, "header.csv: holds a header but no points");
-  ExpectRefusal("fit one.csv" + option, 3, "one.csv: holds one point only; a fit needs two");
-  ExpectRefusal("fit nan.csv" + option, 3, "nan.csv:3: x is not a finite number: 'nan'");
-  ExpectRefusal("fit text.csv" + option, 3, "text.csv:3: y is not a number: 'four'");
-  ExpectRefusal("fit column.csv" + option, 3, "column.csv:3: expected 2 columns, found 1: '3'");
+  ExpectRefusal("fit one.csv" + option, 3, "one.csv: holds one point only; a contour needs two");
+  ExpectRefusal("fit nan.csv" + option, 3, "nan.csv:3:1: x is not a finite number: 'nan'");
+  ExpectRefusal("fit text.csv" + option, 3, "text.csv:3:3: y is not a number: 'four'");
+  ExpectRefusal("fit column.csv" + option, 3, "column.csv:3:1: expected 2 columns, found 1: '3'");
   ExpectRefusal("fit single.csv" + option, 3,
-                "single.csv:1: only one column, '1'; expected x,y or x,y,w");
+                "single.csv:1:1: only one column, '1'; expected x,y or x,y,w");
   ExpectRefusal("fit weights.csv", 3,
-                "weights.csv:2: tolerance '0' must be a finite number above 0");
+                "weights.csv:2:5: tolerance '0' must be a finite number above 0");
   ExpectRefusal("fit weights.csv --tolerance-column tol", 3,
-                "weights.csv:1: no column 'tol'; the header has 'x', 'y', 'w'");
+                "weights.csv:1:1: no column 'tol'; the header has 'x', 'y', 'w'");
 }
 
 TEST_F(Program, ExitCode4PointsTooClose) {
