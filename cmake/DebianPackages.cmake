@@ -92,6 +92,7 @@ file.")
 set(CPACK_DEBIAN_TOOLS_PACKAGE_NAME ${tools_package})
 set(CPACK_DEBIAN_TOOLS_PACKAGE_SECTION science)
 set(CPACK_DEBIAN_TOOLS_PACKAGE_DEPENDS "${library_package} (>= ${debian_version})")
+set(CPACK_DEBIAN_TOOLS_PACKAGE_RECOMMENDS fonts-dejavu-core)
 set(CPACK_COMPONENT_TOOLS_DESCRIPTION
     "fit lines and arcs to measured contour points
 The program contour reads measured points from a CSV file, fits a

@@ -12,12 +12,12 @@
 #include "cli/Progress.h"
 #include "cli/Report.h"
 #include "cli/Spacing.h"
-#include "cli/Svg.h"
 #include "cli/Table.h"
 #include "cli/Tolerances.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
+#include "cli/drawing/Drawing.h"
 
 namespace Vorn::Cli {
 
@@ -105,7 +105,7 @@ std::string Complaint(Report const& report) {
 void WriteResults(Options const& options, Report const& report, Console const& console) {
   Outputs outputs;
   if (!options.json.empty()) outputs.Add(options.json, ToJson(report));
-  if (!options.svg.empty()) outputs.Add(options.svg, ToSvg(report));
+  if (!options.svg.empty()) outputs.Add(options.svg, ToSvg(DrawingOf(report)));
   outputs.Write(console);
   console.out << ToTable(report);
   for (NamedFile const& file : options.Written()) {

@@ -1,4 +1,4 @@
-#include "cli/SvgLayout.h"
+#include "cli/drawing/Layout.h"
 
 #include <algorithm>
 #include <cmath>
@@ -8,8 +8,6 @@
 namespace Vorn::Cli::Svg {
 
 namespace {
-
-constexpr int kPixelDecimals = 2;
 
 /// Share of the box left free around it.
 constexpr double kMargin = 0.07;
@@ -21,6 +19,11 @@ constexpr double kLargestOvershoot = 0.5;
 constexpr int kMostTicks = 40;
 
 constexpr int kArcSamples = 64;
+
+/// How far from the contour a tolerance is drawn that is as large as can be, and at most any
+/// deviation, in pixels.
+constexpr double kReadableTolerance = 14.0;
+constexpr double kReadableDeviation = 70.0;
 
 int Exponent(double value) { return static_cast<int>(std::floor(std::log10(value))); }
 
@@ -36,12 +39,30 @@ void Box::Include(double x, double y) {
   yMax = std::max(yMax, y);
 }
 
+bool Rect::Contains(Rect const& inner) const {
+  return inner.left >= left && inner.Right() <= Right() && inner.top >= top &&
+         inner.Bottom() <= Bottom();
+}
+
+bool Rect::Overlaps(Rect const& other) const {
+  return left < other.Right() && other.left < Right() && top < other.Bottom() &&
+         other.top < Bottom();
+}
+
 double NiceStep(double least) {
   double const power = std::pow(10.0, std::floor(std::log10(least)));
   for (double const factor : {1.0, 2.0, 5.0}) {
     if (factor * power >= least) return factor * power;
   }
   return 10.0 * power;
+}
+
+double NiceFloor(double most) {
+  double const power = std::pow(10.0, std::floor(std::log10(most)));
+  for (double const factor : {5.0, 2.0}) {
+    if (factor * power <= most) return factor * power;
+  }
+  return power;
 }
 
 Ticks TicksBetween(double low, double high, double leastStep) {
@@ -92,10 +113,10 @@ Box View::Visible() const {
   return {xMiddle_ - halfWidth, xMiddle_ + halfWidth, yMiddle_ - halfHeight, yMiddle_ + halfHeight};
 }
 
-Box BoxAround(Report const& report) {
-  WPoint const& first = report.file.points.front();
+Box BoxAround(Drawing const& drawing, std::vector<GeometryUtils::Point> const& others) {
+  WPoint const& first = drawing.points.front();
   Box box{first.x, first.x, first.y, first.y};
-  for (WPoint const& point : report.file.points) box.Include(point.x, point.y);
+  for (WPoint const& point : drawing.points) box.Include(point.x, point.y);
 
   double const reach = kLargestOvershoot * std::max(box.Width(), box.Height());
   Box const limit{box.xMin - reach, box.xMax + reach, box.yMin - reach, box.yMax + reach};
@@ -104,76 +125,24 @@ Box BoxAround(Report const& report) {
     box.Include(std::clamp(point.x, limit.xMin, limit.xMax),
                 std::clamp(point.y, limit.yMin, limit.yMax));
   };
-  for (Piece const& piece : report.pieces) {
+  for (Piece const& piece : drawing.pieces) {
     include(piece.start);
     include(piece.end);
     for (int i = 1; piece.IsArc() && i < kArcSamples; ++i) {
       include(PointOnArc(piece, piece.sweep * i / kArcSamples));
     }
   }
+  for (GeometryUtils::Point const& point : others) include(point);
   return box;
 }
 
-std::string Px(double value) {
-  if (!std::isfinite(value)) return "0";
-  std::string text = FormatFixed(value, kPixelDecimals);
-  text.erase(text.find_last_not_of('0') + 1);
-  if (text.back() == '.') text.pop_back();
-  return text;
-}
-
-std::string Px(Pixel const& pixel) { return Px(pixel.x) + "," + Px(pixel.y); }
-
-std::string Escaped(std::string_view text) {
-  std::string escaped;
-  for (char const c : text) {
-    switch (c) {
-      case '&':
-        escaped += "&amp;";
-        break;
-      case '<':
-        escaped += "&lt;";
-        break;
-      case '>':
-        escaped += "&gt;";
-        break;
-      case '"':
-        escaped += "&quot;";
-        break;
-      default:
-        if (c < 0 || c >= ' ') escaped += c;
-    }
-  }
-  return escaped;
-}
-
-std::string Text(Pixel const& at, std::string const& attributes, std::string_view text) {
-  return "<text x=\"" + Px(at.x) + "\" y=\"" + Px(at.y) + "\" " + attributes + ">" + Escaped(text) +
-         "</text>\n";
-}
-
-std::string LineElement(Pixel const& from, Pixel const& to, std::string const& attributes) {
-  return "<line x1=\"" + Px(from.x) + "\" y1=\"" + Px(from.y) + "\" x2=\"" + Px(to.x) + "\" y2=\"" +
-         Px(to.y) + "\" " + attributes + "/>\n";
-}
-
-std::string CircleElement(Pixel const& center, double radius, std::string const& attributes) {
-  return "<circle cx=\"" + Px(center.x) + "\" cy=\"" + Px(center.y) + "\" r=\"" + Px(radius) +
-         "\" " + attributes + "/>\n";
-}
-
-std::string RectElement(Rect const& rect, std::string const& attributes) {
-  return "<rect x=\"" + Px(rect.left) + "\" y=\"" + Px(rect.top) + "\" width=\"" + Px(rect.width) +
-         "\" height=\"" + Px(rect.height) + "\" " + attributes + "/>\n";
-}
-
-std::string Dots(std::vector<Pixel> const& at, double diameter, std::string const& color) {
-  if (at.empty()) return "";
-  std::string path = "<path fill=\"none\" stroke=\"" + color + "\" stroke-width=\"" + Px(diameter) +
-                     "\" stroke-linecap=\"round\" d=\"";
-  // A stroke without length is drawn as its round cap.
-  for (Pixel const& pixel : at) path += "M" + Px(pixel) + "h0";
-  return path + "\"/>\n";
+double ReadableMagnification(Drawing const& drawing, double scale) {
+  if (!drawing.HasContour()) return 1.0;
+  double const deviation = drawing.deviations[drawing.Worst()].distance;
+  double const tolerance = drawing.HasTolerances() ? drawing.LargestTolerance() : deviation;
+  double const most =
+      std::min(kReadableTolerance / (tolerance * scale), kReadableDeviation / (deviation * scale));
+  return std::isfinite(most) && most > 1.0 ? NiceFloor(most) : 1.0;
 }
 
 }  // namespace Vorn::Cli::Svg

@@ -1,13 +1,12 @@
 #pragma once
 
 #include <string>
-#include <string_view>
 #include <vector>
 
-#include "cli/Report.h"
+#include "cli/drawing/Drawing.h"
 
-/// The plumbing of the drawing: pixels, scales, ticks and text. Everything is laid out in pixels
-/// before it is written, so strokes and letters look the same whatever the size of the contour.
+/// Where things go on the page: pixels, scales and ticks. Everything is laid out in pixels before
+/// it is written, so strokes and letters look the same whatever the size of the contour.
 namespace Vorn::Cli::Svg {
 
 /// Where something is on the page, y down as SVG has it.
@@ -24,6 +23,8 @@ struct Rect {
 
   double Right() const { return left + width; }
   double Bottom() const { return top + height; }
+  bool Contains(Rect const& inner) const;
+  bool Overlaps(Rect const& other) const;
 };
 
 /// A box in the plane of the contour, y up.
@@ -50,6 +51,9 @@ struct Ticks {
 /// 1, 2 or 5 times a power of ten, not below `least`.
 double NiceStep(double least);
 
+/// The same, not above `most`.
+double NiceFloor(double most);
+
 /// Ticks in [low, high] no closer than `leastStep`.
 Ticks TicksBetween(double low, double high, double leastStep);
 
@@ -73,28 +77,12 @@ class View {
   double yMiddle_ = 0.0;
 };
 
-/// A box around the points and, as far as it stays near them, the contour.
-Box BoxAround(Report const& report);
+/// A box around points and, as far as they stay near them, the contour and other places.
+Box BoxAround(Drawing const& drawing, std::vector<GeometryUtils::Point> const& others = {});
 
-/// A coordinate or a length on the page.
-std::string Px(double value);
-
-/// "12.5,30".
-std::string Px(Pixel const& pixel);
-
-/// Safe inside an element or an attribute; control characters are left out.
-std::string Escaped(std::string_view text);
-
-/// One text element; `attributes` are written as they are.
-std::string Text(Pixel const& at, std::string const& attributes, std::string_view text);
-
-std::string LineElement(Pixel const& from, Pixel const& to, std::string const& attributes);
-
-std::string CircleElement(Pixel const& center, double radius, std::string const& attributes);
-
-std::string RectElement(Rect const& rect, std::string const& attributes);
-
-/// Round dots of one size as a single element, which keeps thousands of them small.
-std::string Dots(std::vector<Pixel> const& at, double diameter, std::string const& color);
+/// A round number that draws the largest tolerance some millimetres wide where a unit is `scale`
+/// pixels long, and never less than 1. Deviations far beyond the tolerance ask for less, and
+/// without tolerances the largest deviation counts.
+double ReadableMagnification(Drawing const& drawing, double scale);
 
 }  // namespace Vorn::Cli::Svg

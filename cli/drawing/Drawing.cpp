@@ -1,0 +1,89 @@
+#include "cli/drawing/Drawing.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <utility>
+
+#include "cli/Numbers.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+bool ByTolerance(WPoint const& a, WPoint const& b) { return a.w < b.w; }
+
+std::string WithUnits(std::string text, Drawing const& drawing) {
+  return drawing.units.empty() ? text : std::move(text) + " " + drawing.units;
+}
+
+}  // namespace
+
+bool Drawing::HasTolerances() const {
+  return std::all_of(points.begin(), points.end(), [](WPoint const& point) { return point.w > 0; });
+}
+
+bool Drawing::IsToleranceUniform() const { return SmallestTolerance() == LargestTolerance(); }
+
+double Drawing::SmallestTolerance() const {
+  return std::min_element(points.begin(), points.end(), ByTolerance)->w;
+}
+
+double Drawing::LargestTolerance() const {
+  return std::max_element(points.begin(), points.end(), ByTolerance)->w;
+}
+
+std::size_t Drawing::ArcCount() const {
+  return static_cast<std::size_t>(std::count_if(pieces.begin(), pieces.end(),
+                                                [](Piece const& piece) { return piece.IsArc(); }));
+}
+
+bool Drawing::IsClosed() const {
+  if (pieces.empty()) return false;
+  GeometryUtils::Point const& start = pieces.front().start;
+  GeometryUtils::Point const& end = pieces.back().end;
+  return start.x == end.x && start.y == end.y;
+}
+
+std::size_t Drawing::Worst() const {
+  bool const isRelative = HasTolerances();
+  auto const largest = std::max_element(
+      deviations.begin(), deviations.end(), [&](PointDeviation const& a, PointDeviation const& b) {
+        return isRelative ? a.relative < b.relative : a.distance < b.distance;
+      });
+  return static_cast<std::size_t>(largest - deviations.begin());
+}
+
+Drawing DrawingOf(Report const& report) {
+  Drawing drawing;
+  drawing.title = std::filesystem::path(report.file.path).filename().string();
+  drawing.units = report.file.units;
+  drawing.points = report.file.points;
+  drawing.pieces = report.pieces;
+  drawing.deviations = report.remeasured.points;
+  drawing.verdict = report.verdict;
+  drawing.facts = {DescribeTolerance(drawing), "strategy " + NameOf(report.strategy)};
+  return drawing;
+}
+
+Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece> pieces) {
+  Drawing drawing;
+  drawing.points = std::move(points);
+  drawing.pieces = std::move(pieces);
+  if (drawing.HasTolerances()) drawing.facts = {DescribeTolerance(drawing)};
+  if (!drawing.HasContour()) return drawing;
+  drawing.deviations = Remeasure(drawing.points, drawing.pieces).points;
+  if (drawing.HasTolerances()) {
+    bool const isWithin = drawing.deviations[drawing.Worst()].relative <= kLargestRelative;
+    drawing.verdict = isWithin ? Verdict::WithinTolerance : Verdict::OutsideTolerance;
+  }
+  return drawing;
+}
+
+std::string DescribeTolerance(Drawing const& drawing) {
+  if (!drawing.HasTolerances()) return "";
+  std::string range = FormatShort(drawing.SmallestTolerance());
+  if (!drawing.IsToleranceUniform()) range += " to " + FormatShort(drawing.LargestTolerance());
+  return WithUnits("tolerance " + range, drawing);
+}
+
+}  // namespace Vorn::Cli

@@ -1,0 +1,13 @@
+#pragma once
+
+#include <string>
+
+#include "cli/drawing/Scene.h"
+
+namespace Vorn::Cli::Svg {
+
+/// What the marks of the drawing mean, one row at this height of the page, and at its right end a
+/// length to compare with.
+std::string LegendRow(Scene const& scene, double y);
+
+}  // namespace Vorn::Cli::Svg

@@ -1,0 +1,32 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "cli/drawing/Feet.h"
+#include "cli/drawing/Layout.h"
+
+namespace Vorn::Cli::Svg {
+
+/// A drawing that has found its place on the page.
+struct Scene {
+  Drawing const& drawing;
+  View view;
+  double magnify = 1.0;
+  std::vector<Foot> feet;        ///< of each point; empty without a contour
+  std::vector<Pixel> feetAt;     ///< the same on the page
+  std::vector<Pixel> magnified;  ///< each point as drawn: moved away from its foot
+
+  bool HasContour() const { return drawing.HasContour(); }
+  /// Whether the tolerance is wide enough on the page to be seen at all.
+  bool IsBandVisible() const;
+  /// Whether there is a tolerance and the point lies beyond it.
+  bool IsOutside(std::size_t point) const;
+  bool IsOnArc(std::size_t point) const;
+  bool AnyOutside() const;
+};
+
+/// Lays the contour out in the place and width given, as high as it needs within the limits.
+Scene MakeScene(Drawing const& drawing, Rect const& least, double mostHeight);
+
+}  // namespace Vorn::Cli::Svg
