@@ -7,6 +7,7 @@
 
 #include "cli/commands/Command.h"
 #include "cli/commands/FitCommand.h"
+#include "cli/commands/InfoCommand.h"
 
 namespace Vorn::Cli {
 
@@ -20,6 +21,7 @@ constexpr char const* kFooter =
 /// In the order in which --help lists them.
 constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
     AddFitCommand,
+    AddInfoCommand,
 };
 
 [[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {

@@ -29,6 +29,10 @@ bool AllPass(std::vector<WPoint> const& points, double tolerance) {
 
 }  // namespace
 
+double NeededDistance(WPoint const& a, WPoint const& b) { return (a.w + b.w) * kSpacingFactor; }
+
+bool AreTooClose(WPoint const& a, WPoint const& b) { return AreTooClose(a, b, a.w + b.w); }
+
 double Distance(WPoint const& a, WPoint const& b) { return std::hypot(b.x - a.x, b.y - a.y); }
 
 std::optional<ClosePair> FindClosePair(std::vector<WPoint> const& points) {

@@ -19,6 +19,12 @@ struct ClosePair {
 
 double Distance(WPoint const& a, WPoint const& b);
 
+/// What the distance of two neighbours must be above: 1.5 times the sum of their tolerances.
+double NeededDistance(WPoint const& a, WPoint const& b);
+
+/// Whether two neighbours are not further apart than that; see FindClosePair.
+bool AreTooClose(WPoint const& a, WPoint const& b);
+
 /// The first pair of neighbours that is not further apart than 1.5 times the sum of its
 /// tolerances. The test is made on squares, as the library makes it, so both agree to the last
 /// bit.

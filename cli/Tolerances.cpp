@@ -43,6 +43,10 @@ ToleranceColumn ColumnFor(ToleranceChoice const& choice) {
   return {ToleranceColumn::Use::IfPresent, "w"};
 }
 
+bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file) {
+  return choice.same || choice.column || choice.cap || file.hasTolerances || file.tolerance;
+}
+
 std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file) {
   if (choice.cap) {
     AssignBySpacing(*choice.cap, file);

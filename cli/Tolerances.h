@@ -17,6 +17,9 @@ struct ToleranceChoice {
 /// Which column of the file the reader has to look for.
 ToleranceColumn ColumnFor(ToleranceChoice const& choice);
 
+/// Whether AssignTolerances finds a tolerance, in the options or in the file.
+bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file);
+
 /// Gives every point of the file its tolerance and says in words where it came from.
 ///
 /// An option goes before what the file holds; without one a column `w` goes before a comment

@@ -1,0 +1,14 @@
+#include "cli/analysis/InfoReport.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace Vorn::Cli {
+
+RuleCheck CheckRule(std::vector<WPoint> const& points, std::string source) {
+  auto const [smallest, largest] = std::minmax_element(
+      points.begin(), points.end(), [](WPoint const& a, WPoint const& b) { return a.w < b.w; });
+  return {std::move(source), smallest->w, largest->w, FindBrokenPairs(points)};
+}
+
+}  // namespace Vorn::Cli

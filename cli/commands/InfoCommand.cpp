@@ -1,0 +1,71 @@
+#include "cli/commands/InfoCommand.h"
+
+#include <CLI/CLI.hpp>
+#include <memory>
+#include <ostream>
+
+#include "cli/Tolerances.h"
+#include "cli/analysis/InfoReport.h"
+#include "cli/commands/PointsInput.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr char const* kText =
+    "Tell what there is to know about measured points before a fit: number, extent, spacing,\n"
+    "duplicates, corners, noise, and the tolerances that they allow.";
+
+constexpr char const* kFooter =
+    R"(
+Spacing: neighbouring points must be more than 1.5 times the sum of their tolerances apart. With a
+tolerance given, the pairs that break this rule are listed; without one, none is needed.
+
+Corners: turns of 30 degrees or more, measured over chords long enough for the noise not to matter.
+Noise: what differs from point to point, not a ripple that many neighbours share. The suggestion is
+five times the noise or a ten-thousandth of the size, whichever is more.
+
+Points are counted from 0. Exit codes:
+  0   the points are described, whatever there is to say about them
+  2   wrong usage
+  3   the file cannot be read, or one of its lines is wrong
+  4   a tolerance by spacing was asked for, but neighbours coincide
+  70  internal error
+
+Examples:
+  contour info part.csv
+  contour info part.csv --tolerance 0.02
+  contour info part.csv --json | jq .noise
+)";
+
+struct Options {
+  PointsInput points;
+  bool asJson = false;
+};
+
+ExitCode Run(Options const& options, Console const& console) {
+  InfoReport report;
+  report.file = ReadPointsInput(options.points, console);
+  report.info = Analyse(report.file.points);
+  if (IsToleranceStated(options.points.tolerance, report.file)) {
+    std::string source = AssignTolerances(options.points.tolerance, &report.file);
+    report.rule = CheckRule(report.file.points, std::move(source));
+  }
+  console.out << (options.asJson ? ToJson(report) : ToText(report));
+  return ExitCode::Ok;
+}
+
+}  // namespace
+
+void AddInfoCommand(CLI::App& program, Action* action) {
+  CLI::App* const app = program.add_subcommand("info", kText);
+  auto const options = std::make_shared<Options>();
+  AddPointsInput(*app, &options->points);
+  app->add_flag("--json", options->asJson, "Write the facts as JSON, long lists whole");
+  app->footer(std::string(kPointsFileText) + kFooter);
+  app->callback([options, action] {
+    *action = [options](Console const& console) { return Run(*options, console); };
+  });
+}
+
+}  // namespace Vorn::Cli
