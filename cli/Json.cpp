@@ -2,13 +2,13 @@
 
 #include <nlohmann/json.hpp>
 
+#include "cli/formats/JsonPieces.h"
+
 namespace Vorn::Cli {
 
 namespace {
 
 using Json = nlohmann::ordered_json;
-
-Json PointJson(GeometryUtils::Point const& point) { return {{"x", point.x}, {"y", point.y}}; }
 
 Json InputJson(Report const& report) {
   Json units = nullptr;
@@ -30,26 +30,6 @@ Json RangeJson(std::optional<std::vector<PointRange>> const& ranges, std::size_t
   Json first = nullptr;
   if (range.count > 0) first = range.first;
   return {{"first", first}, {"count", range.count}};
-}
-
-Json ElementJson(Report const& report, std::size_t i) {
-  Piece const& piece = report.pieces[i];
-  Json json = {
-      {"number", i + 1},
-      {"kind", piece.IsArc() ? "arc" : "line"},
-      {"start", PointJson(piece.start)},
-      {"end", PointJson(piece.end)},
-      {"length", piece.length},
-      {"points", RangeJson(report.ranges, i)},
-  };
-  if (!piece.IsArc()) return json;
-  json["center"] = PointJson(piece.center);
-  json["radius"] = piece.radius;
-  json["direction"] = piece.counterClockwise ? "ccw" : "cw";
-  json["startAngle"] = piece.startAngle;
-  json["endAngle"] = piece.endAngle;
-  json["sweep"] = piece.sweep;
-  return json;
 }
 
 Json ReportedJson(Report const& report) {
@@ -89,7 +69,7 @@ char const* VerdictName(Verdict verdict) {
 std::string ToJson(Report const& report) {
   Json elements = Json::array();
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {
-    elements.push_back(ElementJson(report, i));
+    elements.push_back(PieceJson(report.pieces[i], i + 1, RangeJson(report.ranges, i)));
   }
   Json const document = {
       {"schemaVersion", kJsonSchemaVersion},

@@ -6,6 +6,7 @@
 #include <sstream>
 
 #include "cli/commands/Command.h"
+#include "cli/commands/ConvertCommand.h"
 #include "cli/commands/FitCommand.h"
 #include "cli/commands/InfoCommand.h"
 
@@ -22,6 +23,7 @@ constexpr char const* kFooter =
 constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
     AddFitCommand,
     AddInfoCommand,
+    AddConvertCommand,
 };
 
 [[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {

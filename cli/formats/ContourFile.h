@@ -36,6 +36,10 @@ std::vector<Gap> FindGaps(ContourFile const& contour);
 /// or radius. Contours of the fit meet to some last digits; files with nine digits still pass.
 double JointTolerance(std::vector<Piece> const& pieces);
 
+/// Whether the last piece leads back to the start of the first, up to JointTolerance: what a file
+/// without a flag of its own says about being closed.
+bool ReturnsToStart(std::vector<Piece> const& pieces);
+
 /// "pieces 3 and 4 do not meet: the gap is 0.01"; pieces counted from 1 as the tables do.
 std::string Describe(Gap const& gap);
 

@@ -9,7 +9,7 @@
 /// Making pieces from what files tell, and getting pieces ready for what files can hold.
 namespace Vorn::Cli {
 
-using Point = GeometryUtils::Point;
+using XY = GeometryUtils::Point;
 
 /// Above this, squares of coordinates leave the range of doubles and nothing can be measured.
 inline constexpr double kLargestCoordinate = 1e150;
@@ -21,26 +21,26 @@ inline constexpr double kWidestArc = 5.497787143782138;  // 315 degrees
 /// Whether the number can be a coordinate or a radius.
 bool IsUsable(double value);
 
-double Distance(Point const& a, Point const& b);
+double Distance(XY const& a, XY const& b);
 
-bool AreEqual(Point const& a, Point const& b);
+bool AreEqual(XY const& a, XY const& b);
 
-Piece MakeLine(Point const& start, Point const& end);
+Piece MakeLine(XY const& start, XY const& end);
 
 /// The arc with these data; angles, sweep and length follow. Ends in the same direction from the
 /// centre mean no sweep.
-Piece MakeArc(Point const& start, Point const& end, Point const& center, double radius,
+Piece MakeArc(XY const& start, XY const& end, XY const& center, double radius,
               bool counterClockwise);
 
 /// The arc from `start` to `end` whose bulge is the tangent of a quarter of its sweep, positive
 /// counter-clockwise. A line where that is nearer to the arc than its rounded circle would be.
-Piece MakeBulge(Point const& start, Point const& end, double bulge);
+Piece MakeBulge(XY const& start, XY const& end, double bulge);
 
 /// The tangent of a quarter of the sweep, positive counter-clockwise; 0 for lines.
 double BulgeOf(Piece const& piece);
 
 /// The whole circle as two halves, from `start` back to it.
-std::vector<Piece> MakeCircle(Point const& start, Point const& center, double radius,
+std::vector<Piece> MakeCircle(XY const& start, XY const& center, double radius,
                               bool counterClockwise);
 
 Piece Reversed(Piece const& piece);
@@ -58,13 +58,10 @@ std::vector<std::vector<Piece>> ConnectedRuns(std::vector<Piece> const& pieces, 
 /// Files with three good digits pass.
 std::optional<std::string> FaultOf(Piece const& arc);
 
-/// Whether the pieces end exactly where they start.
-bool EndsAtStart(std::vector<Piece> const& pieces);
-
 /// The box around the pieces, what arcs bulge out included. Needs at least one piece.
 struct Extent {
-  Point low;
-  Point high;
+  XY low;
+  XY high;
 };
 Extent ExtentOf(std::vector<Piece> const& pieces);
 

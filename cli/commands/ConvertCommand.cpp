@@ -1,0 +1,155 @@
+#include "cli/commands/ConvertCommand.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <memory>
+#include <ostream>
+#include <utility>
+
+#include "cli/Numbers.h"
+#include "cli/commands/CommonOptions.h"
+#include "cli/commands/Outputs.h"
+#include "cli/formats/Format.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr char const* kText = "Write a contour in another format: JSON, CSV, DXF, G-code or WKT.";
+
+constexpr char const* kFooter =
+    R"(
+The ending of a file tells its format: .json, .csv, .dxf, .nc or .gcode, .wkt. For - and other
+names --from and --to say it; without --from the content tells.
+
+What a format keeps:
+  json   everything: doubles to the last bit, gaps, units, closed or not
+  csv    the same, but for what follows from ends, centre and radius
+  dxf    R12; one POLYLINE with bulges, or with --dxf-entities LINE and ARC; units in a comment.
+         Arcs read back to about 1e-14 of the largest coordinate or radius
+  gcode  rounded to --gcode-decimals; mm or inch. G1, G2 and G3 with incremental I and J, G0 over
+         gaps. Arcs are worked out from the rounded numbers, so that the radii at both ends agree
+         within 0.002 mm
+  wkt    LINESTRING, CIRCULARSTRING or COMPOUNDCURVE, a MULTICURVE over gaps; no units
+DXF, G-code and WKT hold arcs of more than 315 degrees as two halves. Where pieces do not meet, the
+gap is kept and reported.
+
+Exit codes:
+  0   the files are written
+  2   wrong usage, or the format cannot hold the contour
+  3   a file cannot be read or written, or holds no contour
+  70  internal error
+  130 interrupted
+
+Output files are written whole or not at all.
+
+Examples:
+  contour convert part.json -o part.dxf -o part.nc --feed 600
+  contour convert part.dxf -o - --to csv
+)";
+
+struct Options {
+  std::string input;
+  std::vector<std::string> outputs;
+  std::optional<Format> from;
+  std::optional<Format> to;
+  std::string units;
+  WriteOptions write;
+
+  std::vector<NamedFile> Written() const {
+    std::vector<NamedFile> files;
+    for (std::string const& path : outputs) files.push_back({"--output", path});
+    return files;
+  }
+};
+
+Format FormatFor(Options const& options, std::string const& path) {
+  std::optional<Format> const format = options.to ? options.to : FormatOf(path);
+  std::string const what = path == "-" ? "the standard output" : path;
+  if (!format) throw Failure(ExitCode::Usage, what + ": --to must say which format to write");
+  if (!HoldsContour(*format)) {
+    throw Failure(ExitCode::Usage, what + ": a drawing is made by 'contour plot'");
+  }
+  return *format;
+}
+
+std::string Summary(ContourFile const& contour) {
+  auto const arcs =
+      static_cast<std::size_t>(std::count_if(contour.pieces.begin(), contour.pieces.end(),
+                                             [](Piece const& piece) { return piece.IsArc(); }));
+  std::size_t const lines = contour.pieces.size() - arcs;
+  return Counted(contour.pieces.size(), "piece") + ": " + Counted(lines, "line") + ", " +
+         Counted(arcs, "arc") + (contour.isClosed ? "; closed" : "; open");
+}
+
+void Report(Options const& options, ContourFile const& contour, Console const& console) {
+  for (Gap const& gap : FindGaps(contour)) {
+    console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
+  }
+  bool const isOutTaken =
+      std::find(options.outputs.begin(), options.outputs.end(), "-") != options.outputs.end();
+  if (isOutTaken) return;
+  console.out << "pieces      " << Summary(contour) << '\n';
+  for (std::string const& path : options.outputs) console.out << "wrote       " << path << '\n';
+}
+
+ExitCode Run(Options const& options, Console const& console) {
+  RequireWritable(options.Written());
+  ContourFile contour = ReadContour(options.input, console, options.from);
+  if (!options.units.empty()) contour.units = options.units;
+  Outputs outputs;
+  for (std::string const& path : options.outputs) {
+    outputs.Add(path, ToText(contour, FormatFor(options, path), options.write));
+  }
+  outputs.Write(console);
+  Report(options, contour, console);
+  return ExitCode::Ok;
+}
+
+void AddFormat(CLI::App& app, std::string const& name, std::optional<Format>* format,
+               std::string const& help) {
+  AddWord(
+      app, name, {"json", "csv", "dxf", "gcode", "wkt"},
+      [format](std::string const& word) { *format = FormatNamed(word); }, help);
+}
+
+void AddOptions(CLI::App& app, Options* options) {
+  constexpr int kMostDecimals = 9;
+  app.add_option("CONTOUR", options->input, "File with the contour; - is the standard input")
+      ->required()
+      ->type_name("FILE");
+  app.add_option("-o,--output", options->outputs,
+                 "Write the contour to this file; may be given several times; - is the standard "
+                 "output")
+      ->required()
+      ->expected(1)
+      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
+      ->type_name("FILE");
+  AddFormat(app, "--from", &options->from, "Read the input as this");
+  AddFormat(app, "--to", &options->to, "Write the outputs as this");
+  app.add_option("--units", options->units,
+                 "The units of the coordinates, for example mm; goes before what the file says")
+      ->type_name("NAME");
+  app.add_flag("--dxf-entities", options->write.dxfEntities,
+               "DXF: a LINE or an ARC for each piece in place of one POLYLINE");
+  AddPositiveNumber(app, "--feed", &options->write.feed, "F",
+                    "G-code: the feed in units a minute; without it there is no F word");
+  AddWholeNumber(app, "--gcode-decimals", &options->write.gcodeDecimals, 0, kMostDecimals, "N",
+                 "G-code: digits after the point; 4 unless the units are inches, then 5");
+  app.footer(kFooter);
+}
+
+}  // namespace
+
+void AddConvertCommand(CLI::App& program, Action* action) {
+  CLI::App* const app = program.add_subcommand("convert", kText);
+  auto const options = std::make_shared<Options>();
+  AddOptions(*app, options.get());
+  app->callback([options, action] {
+    RefuseSharedFiles({{"CONTOUR", options->input}}, options->Written());
+    for (std::string const& path : options->outputs) FormatFor(*options, path);
+    *action = [options](Console const& console) { return Run(*options, console); };
+  });
+}
+
+}  // namespace Vorn::Cli
