@@ -9,6 +9,7 @@
 #include "cli/commands/ConvertCommand.h"
 #include "cli/commands/FitCommand.h"
 #include "cli/commands/InfoCommand.h"
+#include "cli/commands/SimplifyCommand.h"
 
 namespace Vorn::Cli {
 
@@ -24,6 +25,7 @@ constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
     AddFitCommand,
     AddInfoCommand,
     AddConvertCommand,
+    AddSimplifyCommand,
 };
 
 [[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {

@@ -43,6 +43,10 @@ ToleranceColumn ColumnFor(ToleranceChoice const& choice) {
   return {ToleranceColumn::Use::IfPresent, "w"};
 }
 
+double ToleranceForSpacing(double cap, double spacing) {
+  return std::min(cap, kShareOfSpacing * spacing);
+}
+
 bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file) {
   return choice.same || choice.column || choice.cap || file.hasTolerances || file.tolerance;
 }

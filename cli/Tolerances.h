@@ -17,6 +17,9 @@ struct ToleranceChoice {
 /// Which column of the file the reader has to look for.
 ToleranceColumn ColumnFor(ToleranceChoice const& choice);
 
+/// The tolerance that follows from the distance to the nearer neighbour: 0.3 of it, at most `cap`.
+double ToleranceForSpacing(double cap, double spacing);
+
 /// Whether AssignTolerances finds a tolerance, in the options or in the file.
 bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file);
 
