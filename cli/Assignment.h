@@ -10,6 +10,7 @@
 namespace Vorn::Cli {
 
 /// The stretch of points that one piece stands for. The fit does not tell, so it is found again.
+/// On a closed contour it may run past the last point and on from the first.
 struct PointRange {
   std::size_t first = 0;
   std::size_t count = 0;

@@ -11,6 +11,9 @@
 
 namespace Vorn::Cli {
 
+/// How messages call the standard input.
+inline constexpr char const* kStandardInputName = "standard input";
+
 /// Where the reader takes each point's tolerance from.
 struct ToleranceColumn {
   enum class Use {

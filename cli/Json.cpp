@@ -52,6 +52,13 @@ Json RemeasuredJson(Report const& report) {
   };
 }
 
+Json ClosureJson(Report const& report) {
+  bool const isClosed = report.closure.isClosed;
+  Json seam = nullptr;
+  if (isClosed) seam = report.seam;
+  return {{"closed", isClosed}, {"seam", seam}, {"gap", report.Gap()}};
+}
+
 char const* VerdictName(Verdict verdict) {
   switch (verdict) {
     case Verdict::WithinTolerance:
@@ -71,7 +78,7 @@ std::string ToJson(Report const& report) {
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {
     elements.push_back(PieceJson(report.pieces[i], i + 1, RangeJson(report.ranges, i)));
   }
-  Json const document = {
+  Json document = {
       {"schemaVersion", kJsonSchemaVersion},
       {"input", InputJson(report)},
       {"strategy", NameOf(report.strategy)},
@@ -82,8 +89,9 @@ std::string ToJson(Report const& report) {
         {"lines", report.LineCount()},
         {"arcs", report.ArcCount()}}},
       {"deviation", {{"reported", ReportedJson(report)}, {"remeasured", RemeasuredJson(report)}}},
-      {"elements", elements},
   };
+  document.update(ClosureJson(report));
+  document["elements"] = elements;
   // A file name need not be UTF-8; a replacement character is better than no document.
   return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
 }

@@ -86,6 +86,15 @@ std::string Quoted(std::string_view text) {
   return "'" + quoted + (cut ? "...'" : "'");
 }
 
+std::string ShellQuoted(std::string const& text) {
+  constexpr std::string_view kPlain =
+      "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ0123456789_-./+:,@%";
+  if (!text.empty() && text.find_first_not_of(kPlain) == std::string::npos) return text;
+  std::string quoted = "'";
+  for (char const c : text) quoted += c == '\'' ? "'\\''" : std::string(1, c);
+  return quoted + "'";
+}
+
 std::string Counted(std::size_t count, std::string const& noun) {
   return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
 }

@@ -33,6 +33,9 @@ std::string LowerCase(std::string_view text);
 /// replaced.
 std::string Quoted(std::string_view text);
 
+/// One word on a command line, in single quotes where a shell needs them.
+std::string ShellQuoted(std::string const& text);
+
 /// "1 line", "2 lines".
 std::string Counted(std::size_t count, std::string const& noun);
 

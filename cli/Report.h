@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "cli/Assignment.h"
+#include "cli/Closure.h"
 #include "cli/CsvReader.h"
 #include "cli/Failure.h"
 #include "cli/Fit.h"
@@ -25,11 +26,16 @@ struct Report {
   std::string toleranceSource;
   GeometryUtils::FittingStrategy strategy = GeometryUtils::FittingStrategy::Mixed;
   FitAnswer fit;
+  Closure closure;
+  std::size_t seam = 0;       ///< where a closed contour was cut open, as counted in the file
+  bool isFullCircle = false;  ///< found by the program; the fit has nothing to say then
   std::vector<Piece> pieces;
   std::optional<std::vector<PointRange>> ranges;
   Remeasured remeasured;
   Verdict verdict = Verdict::WithinTolerance;
 
+  /// From the end of the contour to its start; 0 when it is closed exactly.
+  double Gap() const;
   std::size_t LineCount() const;
   std::size_t ArcCount() const;
   double SmallestTolerance() const;
@@ -39,6 +45,13 @@ struct Report {
 /// Measures the contour of a fit that answered Ok with at least one piece, and judges it.
 Report MakeReport(PointFile file, std::string toleranceSource,
                   GeometryUtils::FittingStrategy strategy, FitAnswer fit);
+
+/// The same for a closed contour: closes the pieces exactly if it can. Without pieces in `fit` the
+/// contour is the full circle `circle`.
+Report MakeClosedReport(PointFile file, std::string toleranceSource,
+                        GeometryUtils::FittingStrategy strategy, FitAnswer fit,
+                        Closure const& closure, Circuit const& circuit,
+                        std::optional<std::vector<Piece>> circle);
 
 /// One line of words.
 std::string Describe(Verdict verdict);

@@ -40,7 +40,7 @@ std::optional<ClosePair> FindClosePair(std::vector<WPoint> const& points) {
     WPoint const& a = points[i - 1];
     WPoint const& b = points[i];
     if (AreTooClose(a, b, a.w + b.w)) {
-      return ClosePair{i, Distance(a, b), kSpacingFactor * (a.w + b.w)};
+      return ClosePair{i - 1, i, Distance(a, b), kSpacingFactor * (a.w + b.w)};
     }
   }
   return {};
@@ -63,17 +63,29 @@ std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points) 
   return {};
 }
 
-std::string DescribeClosePair(PointFile const& file, ClosePair const& pair) {
-  std::string text = file.path + ": " + file.NameOf(pair.second - 1) + " and " +
+std::string DescribeClosePair(PointFile const& file, ClosePair const& pair,
+                              std::optional<double> largest, std::string const& options) {
+  std::string const arguments = ArgumentFor(file) + (options.empty() ? "" : " " + options);
+  std::string text = file.path + ": " + file.NameOf(pair.first) + " and " +
                      file.NameOf(pair.second) + " are too close: distance " +
                      FormatShort(pair.distance) + ", needed more than " + FormatShort(pair.needed) +
                      " (1.5 times the sum of their tolerances)\n";
-  std::optional<double> const largest = LargestSingleTolerance(file.points);
-  if (!largest) {
-    return text + "no tolerance would pass: neighbours in this file coincide; remove one of them";
+  if (largest) {
+    text += "the largest single tolerance that would pass for this file is " +
+            FormatShort(*largest) + "\n";
+  } else {
+    text += "no tolerance would pass: neighbours in this file coincide\n";
   }
-  return text + "the largest single tolerance that would pass for this file is " +
-         FormatShort(*largest) + "; --tolerance-per-point CAP adapts it to the spacing";
+  text += "see: contour info " + arguments + "\nways out: ";
+  if (largest) {
+    text += "--tolerance " + FormatShort(*largest) +
+            ", or --tolerance-per-point CAP to follow the spacing, or leave points out: ";
+  }
+  return text + "contour simplify " + arguments + " --drop-close";
+}
+
+std::string ArgumentFor(PointFile const& file) {
+  return file.path == kStandardInputName ? "-" : ShellQuoted(file.path);
 }
 
 }  // namespace Vorn::Cli

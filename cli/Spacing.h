@@ -12,7 +12,8 @@ namespace Vorn::Cli {
 
 /// Two neighbours too close to each other for their tolerances.
 struct ClosePair {
-  std::size_t second = 0;  ///< index of the later of the two points
+  std::size_t first = 0;
+  std::size_t second = 0;  ///< of a closed contour this may be the first point of the file
   double distance = 0.0;
   double needed = 0.0;  ///< the distance must be above this
 };
@@ -34,7 +35,14 @@ std::optional<ClosePair> FindClosePair(std::vector<WPoint> const& points);
 /// have it; nothing when neighbours coincide.
 std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points);
 
-/// What the user needs to know about the pair to choose another tolerance.
-std::string DescribeClosePair(PointFile const& file, ClosePair const& pair);
+/// What the user needs to know about the pair, and the ways out of it.
+///
+/// @param largest what LargestSingleTolerance says of the same points
+/// @param options the tolerance options of this run, for the commands that show or do more
+std::string DescribeClosePair(PointFile const& file, ClosePair const& pair,
+                              std::optional<double> largest, std::string const& options);
+
+/// How another command line names the points file: "-" for the standard input.
+std::string ArgumentFor(PointFile const& file);
 
 }  // namespace Vorn::Cli

@@ -91,6 +91,7 @@ std::string ToleranceText(Report const& report) {
 
 std::string ReportedText(Report const& report) {
   FitAnswer const& fit = report.fit;
+  if (report.isFullCircle) return "nothing: a full circle is fitted by the program itself";
   if (!IsDeviationRelative(report.strategy)) {
     return WithUnits(FormatShort(fit.deviation), report) +
            " as a length (this strategy reports no relative deviation and no point)";
@@ -108,14 +109,31 @@ std::string RemeasuredText(Report const& report) {
          std::to_string(worst.piece + 1);
 }
 
+std::string ClosedText(Report const& report) {
+  Closure const& closure = report.closure;
+  if (!closure.isClosed) return "no" + (closure.reason.empty() ? "" : " (" + closure.reason + ")");
+  std::string const seam = report.file.NameOf(report.seam);
+  std::string const text = "yes (" + closure.reason + "), ";
+  if (report.Gap() == 0.0) return text + "joined exactly at " + seam;
+  return text + "GAP of " + WithUnits(FormatShort(report.Gap()), report) + " at " + seam;
+}
+
+std::string CompressionText(Report const& report) {
+  auto const points = static_cast<double>(report.file.points.size());
+  auto const pieces = static_cast<double>(report.pieces.size());
+  return FormatFixed(points / pieces, 1) + " points a piece, " +
+         FormatFixed(100.0 * pieces / points, 1) + " % of the points";
+}
+
 std::string Summary(Report const& report) {
   return "points      " + std::to_string(report.file.points.size()) + "\n" + "tolerance   " +
          ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) + "\n" +
-         "pieces      " + std::to_string(report.pieces.size()) + ": " +
-         Counted(report.LineCount(), "line") + ", " + Counted(report.ArcCount(), "arc") + "\n" +
-         "reported    " + ReportedText(report) + "\n" + "re-measured " + RemeasuredText(report) +
-         "\n" + "result      " + Describe(report.verdict) + "\n" + "time        " +
-         FormatFixed(report.fit.seconds, 3) + " s\n";
+         "closed      " + ClosedText(report) + "\n" + "pieces      " +
+         std::to_string(report.pieces.size()) + ": " + Counted(report.LineCount(), "line") + ", " +
+         Counted(report.ArcCount(), "arc") + "\n" + "compression " + CompressionText(report) +
+         "\n" + "reported    " + ReportedText(report) + "\n" + "re-measured " +
+         RemeasuredText(report) + "\n" + "result      " + Describe(report.verdict) + "\n" +
+         "time        " + FormatFixed(report.fit.seconds, 3) + " s\n";
 }
 
 }  // namespace

@@ -1,7 +1,6 @@
 #include "cli/Tolerances.h"
 
 #include <algorithm>
-#include <limits>
 
 #include "cli/Failure.h"
 #include "cli/Numbers.h"
@@ -14,24 +13,42 @@ namespace {
 /// With 0.3 of the spacing on both sides, 1.5 times the sum is at most 0.9 of it.
 constexpr double kShareOfSpacing = 0.3;
 
+/// As many as any decimal text that a user types keeps through a double.
+constexpr int kDigits = 15;
+
 void AssignOne(double tolerance, PointFile* file) {
   for (WPoint& point : file->points) point.w = tolerance;
 }
 
-void AssignBySpacing(double cap, PointFile* file) {
+[[noreturn]] void RefuseCoinciding(PointFile const& file, std::size_t first, std::size_t second) {
+  throw Failure(ExitCode::PointsTooClose,
+                file.path + ": " + file.NameOf(first) + " and " + file.NameOf(second) +
+                    " coincide: no tolerance can follow from a spacing of zero\n" +
+                    "to leave one of them out: contour simplify " + ArgumentFor(file) +
+                    " --drop-close");
+}
+
+bool RepeatsFirst(std::vector<WPoint> const& points) {
+  return points.front().x == points.back().x && points.front().y == points.back().y;
+}
+
+void AssignBySpacing(double cap, bool isClosed, PointFile* file) {
   std::vector<WPoint>& points = file->points;
-  double before = std::numeric_limits<double>::infinity();
-  for (std::size_t i = 0; i < points.size(); ++i) {
-    double const after = i + 1 < points.size() ? Distance(points[i], points[i + 1])
-                                               : std::numeric_limits<double>::infinity();
-    points[i].w = std::min(cap, kShareOfSpacing * std::min(before, after));
-    if (!(points[i].w > 0.0)) {
-      std::size_t const second = after > 0.0 ? i : i + 1;
-      throw Failure(ExitCode::PointsTooClose,
-                    file->path + ": " + file->NameOf(second - 1) + " and " + file->NameOf(second) +
-                        " coincide: no tolerance can follow from a spacing of zero");
-    }
-    before = after;
+  for (WPoint& point : points) point.w = cap;
+  auto const limit = [&](std::size_t i, std::size_t k) {
+    double const most = kShareOfSpacing * Distance(points[i], points[k]);
+    if (!(most > 0.0)) RefuseCoinciding(*file, i, k);
+    points[i].w = std::min(points[i].w, most);
+    points[k].w = std::min(points[k].w, most);
+  };
+  for (std::size_t i = 1; i < points.size(); ++i) limit(i - 1, i);
+  if (!isClosed) return;
+  WPoint& first = points.front();
+  WPoint& last = points.back();
+  if (RepeatsFirst(points)) {
+    first.w = last.w = std::min(first.w, last.w);
+  } else {
+    limit(points.size() - 1, 0);
   }
 }
 
@@ -51,9 +68,9 @@ bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file) {
   return choice.same || choice.column || choice.cap || file.hasTolerances || file.tolerance;
 }
 
-std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file) {
+std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, bool isClosed) {
   if (choice.cap) {
-    AssignBySpacing(*choice.cap, file);
+    AssignBySpacing(*choice.cap, isClosed, file);
     return "0.3 of the spacing, at most " + FormatShort(*choice.cap);
   }
   if (choice.same) {
@@ -69,6 +86,13 @@ std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file) {
                 "no tolerance: give --tolerance T, --tolerance-column NAME or "
                 "--tolerance-per-point CAP (" +
                     file->path + " has no column 'w' and no comment '# tolerance T')");
+}
+
+std::string OptionsFor(ToleranceChoice const& choice) {
+  if (choice.cap) return "--tolerance-per-point " + FormatShort(*choice.cap, kDigits);
+  if (choice.same) return "-t " + FormatShort(*choice.same, kDigits);
+  if (choice.column) return "--tolerance-column " + ShellQuoted(*choice.column);
+  return "";
 }
 
 }  // namespace Vorn::Cli

@@ -28,8 +28,12 @@ bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file);
 /// An option goes before what the file holds; without one a column `w` goes before a comment
 /// `# tolerance T`.
 ///
+/// @param isClosed the first and the last point are neighbours as well
 /// @throws Failure (ExitCode::Usage) when nobody gives a tolerance, or (PointsTooClose) when a
 ///         tolerance by spacing would be zero because neighbours coincide.
-std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file);
+std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, bool isClosed = false);
+
+/// The choice as options for another command line; empty when there is none.
+std::string OptionsFor(ToleranceChoice const& choice);
 
 }  // namespace Vorn::Cli

@@ -2,18 +2,17 @@
 
 #include <CLI/CLI.hpp>
 #include <cstdio>
+#include <limits>
 #include <memory>
 #include <ostream>
 #include <utility>
 
-#include "cli/Fit.h"
+#include "cli/ContourFit.h"
 #include "cli/Json.h"
 #include "cli/Numbers.h"
 #include "cli/Progress.h"
 #include "cli/Report.h"
-#include "cli/Spacing.h"
 #include "cli/Table.h"
-#include "cli/Tolerances.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
@@ -35,6 +34,15 @@ Tolerance: at most one of the three options. Without one, the column w of the fi
 without that its comment "# tolerance T". Neighbouring points must be more than 1.5 times the
 sum of their tolerances apart (strategies mixed and cells).
 
+Closed contours: with --closed auto a contour is closed when its last point is the first one
+again, or when its ends are no more than 1.5 times as far apart as the five points next to
+either end and the contour does not turn back between them (by more than 135 degrees). A thin
+body that is open at one end and a contour with its seam in a very sharp corner look alike, and
+so do a closed contour and one that is open by a single step: then say --closed yes or no. The
+contour is cut open at --start or else where it turns most, fitted all the way round, and both
+ends are moved to one common point where that keeps every point within its tolerance; otherwise
+the gap is reported. A full circle comes out as two half circles.
+
 Deviations are multiples of the tolerance of the point: up to 1 is within tolerance. They are
 printed as the fit reports them, and as measured again by the program over every point. Up to
 1 + 1e-9 counts as within, for the rounding of the second measurement. Points are counted from
@@ -55,13 +63,22 @@ Output files are written whole or not at all.
 Examples:
   contour fit part.csv --tolerance 0.02 --svg part.svg
   contour fit part.csv --tolerance-per-point 0.05 --strategy cells --json part.json
+  contour fit outline.csv -t 0.01 --closed yes --start 120
 )";
 
 struct Options {
   PointsInput points;
   Strategy strategy = Strategy::Mixed;
+  ClosedChoice closed = ClosedChoice::Auto;
+  std::optional<int> start;
   std::string json;
   std::string svg;
+
+  FitChoice Choice() const {
+    FitChoice choice = {points.tolerance, strategy, closed, {}};
+    if (start) choice.start = static_cast<std::size_t>(*start);
+    return choice;
+  }
 
   std::vector<NamedFile> Written() const {
     std::vector<NamedFile> files;
@@ -70,25 +87,6 @@ struct Options {
     return files;
   }
 };
-
-FitAnswer FitWithProgress(Options const& options, PointFile const& file) {
-  ProgressBar progress(stderr);
-  return Fit(file.points, options.strategy, &progress);
-}
-
-void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
-  if (answer.code == ErrorCode::PointsTooClose) {
-    if (std::optional<ClosePair> const pair = FindClosePair(file.points)) {
-      throw Failure(ExitCode::PointsTooClose, DescribeClosePair(file, *pair));
-    }
-  }
-  if (answer.code != ErrorCode::Ok) {
-    throw Failure(ExitCode::NoFit, file.path + ": no fit (code " + Describe(answer.code) + ")");
-  }
-  if (answer.contour.size() < 2) {
-    throw Failure(ExitCode::NoFit, file.path + ": no fit (the contour has no pieces)");
-  }
-}
 
 std::string Complaint(Report const& report) {
   PointFile const& file = report.file;
@@ -113,14 +111,15 @@ void WriteResults(Options const& options, Report const& report, Console const& c
   }
 }
 
+Report FitWithProgress(Options const& options, Console const& console) {
+  PointFile file = ReadPointsInput(options.points, console);
+  ProgressBar progress(stderr);
+  return FitContour(std::move(file), options.Choice(), &progress);
+}
+
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  PointFile file = ReadPointsInput(options.points, console);
-  std::string toleranceSource = AssignTolerances(options.points.tolerance, &file);
-  FitAnswer answer = FitWithProgress(options, file);
-  RefuseFailedFit(file, answer);
-  Report const report =
-      MakeReport(std::move(file), std::move(toleranceSource), options.strategy, std::move(answer));
+  Report const report = FitWithProgress(options, console);
   WriteResults(options, report, console);
   if (report.verdict != Verdict::WithinTolerance) {
     console.err << "contour: " << Complaint(report) << '\n';
@@ -135,6 +134,13 @@ void AddOptions(CLI::App& app, Options* options) {
       {{"mixed", Strategy::Mixed}, {"cells", Strategy::MixedCells}, {"arc", Strategy::SingleArc}},
       "mixed: lines and arcs compared run by run (default); cells: lines first, arcs between "
       "them; arc: one arc for all points");
+  AddChoice<ClosedChoice>(
+      app, "--closed", &options->closed,
+      {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
+      "Whether the contour runs back to its start; auto (default): see below");
+  AddWholeNumber(app, "--start", &options->start, 0, std::numeric_limits<int>::max(), "INDEX",
+                 "Cut a closed contour open at this point, counted from 0; without it, at its "
+                 "sharpest corner");
   app.add_option("--json", options->json, "Write the contour and its deviations to this file")
       ->type_name("FILE");
   app.add_option("--svg", options->svg, "Write a drawing to this file")->type_name("FILE");

@@ -71,6 +71,14 @@ TEST(Quoted, CutsLongTextAndHidesControlCharacters) {
   EXPECT_EQ(Quoted("\xC3\xA4"), "'\xC3\xA4'");
 }
 
+TEST(ShellQuoted, QuotesOnlyWhatAShellWouldTakeApart) {
+  EXPECT_EQ(ShellQuoted("scans/part-1.csv"), "scans/part-1.csv");
+  EXPECT_EQ(ShellQuoted("my part.csv"), "'my part.csv'");
+  EXPECT_EQ(ShellQuoted("it's"), "'it'\\''s'");
+  EXPECT_EQ(ShellQuoted("$HOME"), "'$HOME'");
+  EXPECT_EQ(ShellQuoted(""), "''");
+}
+
 TEST(Counted, KnowsThePlural) {
   EXPECT_EQ(Counted(0, "arc"), "0 arcs");
   EXPECT_EQ(Counted(1, "arc"), "1 arc");

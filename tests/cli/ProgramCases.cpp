@@ -30,7 +30,9 @@ TEST_F(Program, TwoPointsGiveOneLine) {
             "points      2\n"
             "tolerance   0.1 (given by --tolerance)\n"
             "strategy    mixed\n"
+            "closed      no (the last point is not the first)\n"
             "pieces      1: 1 line, 0 arcs\n"
+            "compression 2.0 points a piece, 50.0 % of the points\n"
             "reported    0.000000 of the tolerance, exact by construction\n"
             "re-measured 0.000000 of the tolerance at point 0 (line 1), 0 from piece 1\n"
             "result      within tolerance\n");
@@ -129,8 +131,10 @@ TEST_F(Program, ExitCode4PointsTooClose) {
   ExpectRefusal("fit p.csv --tolerance 0.25 --svg p.svg", 4,
                 "p.csv: point 1 (line 3) and point 2 (line 4) are too close: distance 0.5, needed "
                 "more than 0.75 (1.5 times the sum of their tolerances)\n"
-                "the largest single tolerance that would pass for this file is 0.166666; "
-                "--tolerance-per-point CAP adapts it to the spacing");
+                "the largest single tolerance that would pass for this file is 0.166666\n"
+                "see: contour info p.csv -t 0.25\n"
+                "ways out: --tolerance 0.166666, or --tolerance-per-point CAP to follow the "
+                "spacing, or leave points out: contour simplify p.csv -t 0.25 --drop-close");
   EXPECT_EQ(Files(), std::vector<std::string>{"p.csv"});
   EXPECT_EQ(Run("fit p.csv --tolerance 0.166666").code, 0) << "the tolerance named must pass";
 }
@@ -142,7 +146,8 @@ TEST_F(Program, ExitCode4CoincidingPoints) {
   EXPECT_NE(ended.err.find("no tolerance would pass"), std::string::npos) << ended.err;
   ExpectRefusal("fit p.csv --tolerance-per-point 0.1", 4,
                 "p.csv: point 1 (line 2) and point 2 (line 3) coincide: no tolerance can follow "
-                "from a spacing of zero");
+                "from a spacing of zero\n"
+                "to leave one of them out: contour simplify p.csv --drop-close");
 }
 
 TEST_F(Program, ExitCode5NoFit) {

@@ -25,6 +25,7 @@ TEST(FindClosePair, NamesTheFirstPairAndWhatItNeeds) {
   std::vector<WPoint> const points = {{0, 0, 1}, {10, 0, 1}, {13, 4, 3}, {13, 5, 1}};
   std::optional<ClosePair> const pair = FindClosePair(points);
   ASSERT_TRUE(pair.has_value());
+  EXPECT_EQ(pair->first, 1u);
   EXPECT_EQ(pair->second, 2u);
   EXPECT_EQ(pair->distance, 5.0);
   EXPECT_EQ(pair->needed, 6.0);
@@ -69,21 +70,28 @@ TEST(DescribeClosePair, SaysWhichPairAndWhatToDo) {
   file.lines = {2, 3, 5};
   std::optional<ClosePair> const pair = FindClosePair(file.points);
   ASSERT_TRUE(pair.has_value());
-  EXPECT_EQ(DescribeClosePair(file, *pair),
+  EXPECT_EQ(DescribeClosePair(file, *pair, LargestSingleTolerance(file.points), "-t 0.25"),
             "part.csv: point 1 (line 3) and point 2 (line 5) are too close: distance 0.5, needed "
             "more than 0.75 (1.5 times the sum of their tolerances)\n"
-            "the largest single tolerance that would pass for this file is 0.166666; "
-            "--tolerance-per-point CAP adapts it to the spacing");
+            "the largest single tolerance that would pass for this file is 0.166666\n"
+            "see: contour info part.csv -t 0.25\n"
+            "ways out: --tolerance 0.166666, or --tolerance-per-point CAP to follow the spacing, "
+            "or leave points out: contour simplify part.csv -t 0.25 --drop-close");
 }
 
 TEST(DescribeClosePair, CoincidingPointsHaveNoTolerance) {
   PointFile file;
-  file.path = "part.csv";
+  file.path = "my part.csv";
   file.points = OnAxis({0.0, 0.0}, 0.25);
   file.lines = {1, 2};
   std::optional<ClosePair> const pair = FindClosePair(file.points);
   ASSERT_TRUE(pair.has_value());
-  EXPECT_NE(DescribeClosePair(file, *pair).find("no tolerance would pass"), std::string::npos);
+  EXPECT_EQ(DescribeClosePair(file, *pair, LargestSingleTolerance(file.points), ""),
+            "my part.csv: point 0 (line 1) and point 1 (line 2) are too close: distance 0, needed "
+            "more than 0.75 (1.5 times the sum of their tolerances)\n"
+            "no tolerance would pass: neighbours in this file coincide\n"
+            "see: contour info 'my part.csv'\n"
+            "ways out: contour simplify 'my part.csv' --drop-close");
 }
 
 }  // namespace

@@ -49,7 +49,8 @@ TEST(AssignTolerances, PerPointNamesCoincidingNeighbours) {
             ExitCode::PointsTooClose);
   EXPECT_EQ(message,
             "p.csv: point 1 (line 3) and point 2 (line 4) coincide: no tolerance can follow from "
-            "a spacing of zero");
+            "a spacing of zero\n"
+            "to leave one of them out: contour simplify p.csv --drop-close");
 }
 
 TEST(AssignTolerances, OptionGoesBeforeColumnBeforeComment) {
@@ -69,6 +70,13 @@ TEST(AssignTolerances, NoToleranceAnywhereIsAUsageError) {
   std::string message;
   EXPECT_EQ(CodeOfRefusal({}, FileWith({{0, 0, 0}, {1, 0, 0}}), &message), ExitCode::Usage);
   EXPECT_EQ(message.rfind("no tolerance: give --tolerance T", 0), 0u) << message;
+}
+
+TEST(OptionsFor, SaysWhatWasTyped) {
+  EXPECT_EQ(OptionsFor({0.02, {}, {}}), "-t 0.02");
+  EXPECT_EQ(OptionsFor({{}, "my w", {}}), "--tolerance-column 'my w'");
+  EXPECT_EQ(OptionsFor({{}, {}, 0.0004}), "--tolerance-per-point 0.0004");
+  EXPECT_EQ(OptionsFor({}), "");
 }
 
 TEST(ColumnFor, ReadsAColumnOnlyWhenNoOtherOptionRules) {

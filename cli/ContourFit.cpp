@@ -1,0 +1,121 @@
+#include "cli/ContourFit.h"
+
+#include <chrono>
+#include <limits>
+#include <utility>
+
+#include "cli/Failure.h"
+#include "cli/Fit.h"
+#include "cli/FullCircle.h"
+#include "cli/Spacing.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr std::size_t kLeastClosedPoints = 3;
+
+[[noreturn]] void RefuseTooClose(PointFile const& file, FitChoice const& choice,
+                                 std::vector<WPoint> const& fitted, ClosePair const& pair) {
+  throw Failure(
+      ExitCode::PointsTooClose,
+      DescribeClosePair(file, pair, LargestSingleTolerance(fitted), OptionsFor(choice.tolerance)));
+}
+
+void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
+  if (answer.code != ErrorCode::Ok) {
+    throw Failure(ExitCode::NoFit, file.path + ": no fit (code " + Describe(answer.code) + ")");
+  }
+  if (answer.contour.size() < 2) {
+    throw Failure(ExitCode::NoFit, file.path + ": no fit (the contour has no pieces)");
+  }
+}
+
+Report FitOpen(PointFile file, std::string toleranceSource, Closure const& closure,
+               FitChoice const& choice, ExecutionState* progress) {
+  if (choice.start) {
+    throw Failure(ExitCode::Usage, file.path +
+                                       ": --start is for closed contours, and this one is " +
+                                       "open (" + closure.reason + "); --closed yes closes it");
+  }
+  FitAnswer answer = Fit(file.points, choice.strategy, progress);
+  if (answer.code == ErrorCode::PointsTooClose) {
+    if (auto const pair = FindClosePair(file.points)) {
+      RefuseTooClose(file, choice, file.points, *pair);
+    }
+  }
+  RefuseFailedFit(file, answer);
+  Report report =
+      MakeReport(std::move(file), std::move(toleranceSource), choice.strategy, std::move(answer));
+  report.closure = closure;
+  return report;
+}
+
+std::size_t SeamOf(PointFile const& file, Closure const& closure, FitChoice const& choice) {
+  if (!choice.start) return SharpestCorner(file.points, closure);
+  if (*choice.start >= file.points.size()) {
+    throw Failure(ExitCode::Usage, file.path + ": --start " + std::to_string(*choice.start) +
+                                       ": the points are counted from 0 to " +
+                                       std::to_string(file.points.size() - 1));
+  }
+  return *choice.start;
+}
+
+/// The spacing rule holds between any two neighbours of a closed contour, wherever it is cut.
+void RefuseClosePair(PointFile const& file, FitChoice const& choice, Circuit const& circuit) {
+  if (choice.strategy == GeometryUtils::FittingStrategy::SingleArc) return;
+  std::optional<ClosePair> pair = FindClosePair(circuit.points);
+  if (!pair) return;
+  pair->first = circuit.origin[pair->first];
+  pair->second = circuit.origin[pair->second];
+  RefuseTooClose(file, choice, circuit.points, *pair);
+}
+
+/// The answer that goes with a full circle: what the library says of an arc, if it was asked, does
+/// not hold for it.
+FitAnswer AnswerOfCircle(double seconds) {
+  FitAnswer answer;
+  answer.code = ErrorCode::Ok;
+  answer.deviation = std::numeric_limits<double>::quiet_NaN();
+  answer.seconds = seconds;
+  return answer;
+}
+
+double SecondsSince(std::chrono::steady_clock::time_point begin) {
+  return std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count();
+}
+
+Report FitClosed(PointFile file, std::string toleranceSource, Closure const& closure,
+                 FitChoice const& choice, ExecutionState* progress) {
+  Circuit const circuit = MakeCircuit(file.points, closure, SeamOf(file, closure, choice));
+  RefuseClosePair(file, choice, circuit);
+  auto const begin = std::chrono::steady_clock::now();
+  std::optional<std::vector<Piece>> circle = FitFullCircle(circuit.points);
+  FitAnswer answer;
+  if (!circle) {
+    answer = Fit(circuit.points, choice.strategy, progress);
+    RefuseFailedFit(file, answer);
+    circle = FullCircleOf(PiecesOf(answer.contour), circuit.points);
+  }
+  if (circle) answer = AnswerOfCircle(SecondsSince(begin));
+  return MakeClosedReport(std::move(file), std::move(toleranceSource), choice.strategy,
+                          std::move(answer), closure, circuit, std::move(circle));
+}
+
+void RequirePoints(PointFile const& file, Closure const& closure) {
+  if (file.points.size() < kLeastClosedPoints + (closure.repeatsFirst ? 1 : 0)) {
+    throw Failure(ExitCode::Usage, file.path + ": a closed contour needs three different points");
+  }
+}
+
+}  // namespace
+
+Report FitContour(PointFile file, FitChoice const& choice, ExecutionState* progress) {
+  Closure const closure = FindClosure(file.points, choice.closed);
+  if (closure.isClosed) RequirePoints(file, closure);
+  std::string source = AssignTolerances(choice.tolerance, &file, closure.isClosed);
+  return (closure.isClosed ? FitClosed : FitOpen)(std::move(file), std::move(source), closure,
+                                                  choice, progress);
+}
+
+}  // namespace Vorn::Cli

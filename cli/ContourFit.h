@@ -1,0 +1,33 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+
+#include "cli/Closure.h"
+#include "cli/CsvReader.h"
+#include "cli/Report.h"
+#include "cli/Tolerances.h"
+#include "vorn/GeometryUtils.h"
+
+namespace Vorn::Cli {
+
+/// How measured points become a contour.
+struct FitChoice {
+  ToleranceChoice tolerance;
+  GeometryUtils::FittingStrategy strategy = GeometryUtils::FittingStrategy::Mixed;
+  ClosedChoice closed = ClosedChoice::Auto;
+  std::optional<std::size_t> start;  ///< the seam of a closed contour, as counted in the file
+};
+
+/// Finds out whether the points are closed, gives them their tolerances, fits and measures them.
+///
+/// A closed contour is cut open at the point asked for or else at its sharpest corner, fitted all
+/// the way round, and closed again. One that is a circle comes out as two half circles.
+///
+/// @param progress may be null
+/// @throws Failure (ExitCode::PointsTooClose) naming the pair and the ways out, (NoFit) when the
+///         library finds no contour, (Usage) when there is no tolerance, `start` does not fit the
+///         points, or a contour said to be closed has less than three points.
+Report FitContour(PointFile file, FitChoice const& choice, ExecutionState* progress);
+
+}  // namespace Vorn::Cli
