@@ -7,17 +7,19 @@
 #include "cli/Assignment.h"
 #include "cli/Remeasure.h"
 #include "cli/Report.h"
+#include "cli/formats/Shapes.h"
 
 namespace Vorn::Cli {
 
 namespace {
 
-using Point = GeometryUtils::Point;
-
 /// A crossing further from the seam than this many of its tolerances would be a spike.
 constexpr double kFarthestCrossing = 4.0;
 
 constexpr int kMostNewtonSteps = 30;
+
+/// A step this small, measured in the distance from the origin, is rounding.
+constexpr double kSettled = 1e-14;
 
 /// An end this near to the circle, measured in radii, is on it.
 constexpr double kOnCircle = 1e-14;
@@ -29,7 +31,7 @@ struct Offset {
   double dy = 0.0;
 };
 
-Offset OffsetFrom(Piece const& piece, Point const& at) {
+Offset OffsetFrom(Piece const& piece, XY const& at) {
   if (piece.IsArc()) {
     double const x = at.x - piece.center.x;
     double const y = at.y - piece.center.y;
@@ -43,17 +45,17 @@ Offset OffsetFrom(Piece const& piece, Point const& at) {
 
 /// Where the carriers of both pieces cross, by Newton's method from a point nearby. Nothing when
 /// the steps do not settle, as with carriers that touch or do not meet.
-std::optional<Point> CrossingNear(Piece const& a, Piece const& b, Point at, double farthest) {
-  Point const begin = at;
+std::optional<XY> CrossingNear(Piece const& a, Piece const& b, XY at, double farthest) {
+  XY const begin = at;
   for (int step = 0; step < kMostNewtonSteps; ++step) {
     Offset const f = OffsetFrom(a, at);
     Offset const g = OffsetFrom(b, at);
     double const determinant = f.dx * g.dy - f.dy * g.dx;
     double const x = (f.value * g.dy - g.value * f.dy) / determinant;
     double const y = (g.value * f.dx - f.value * g.dx) / determinant;
-    Point const next = {at.x - x, at.y - y};
+    XY const next = {at.x - x, at.y - y};
     if (!(std::hypot(next.x - begin.x, next.y - begin.y) <= farthest)) return {};
-    bool const isSettled = std::hypot(x, y) <= 1e-15 * std::hypot(next.x, next.y);
+    bool const isSettled = std::hypot(x, y) <= kSettled * std::hypot(next.x, next.y);
     at = next;
     if (isSettled) return at;
   }
@@ -61,16 +63,16 @@ std::optional<Point> CrossingNear(Piece const& a, Piece const& b, Point at, doub
 }
 
 /// The arc from `start` to `end` through the middle of `old`; on the old circle when both are.
-Piece MovedArc(Piece const& old, Point const& start, Point const& end) {
-  auto const isOnCircle = [&](Point const& p) {
+Piece MovedArc(Piece const& old, XY const& start, XY const& end) {
+  auto const isOnCircle = [&](XY const& p) {
     double const r = std::hypot(p.x - old.center.x, p.y - old.center.y);
     return std::fabs(r - old.radius) <= kOnCircle * old.radius;
   };
   if (isOnCircle(start) && isOnCircle(end)) {
-    return ArcPiece(start, end, old.center, old.radius, old.counterClockwise);
+    return MakeArc(start, end, old.center, old.radius, old.counterClockwise);
   }
   // Relative to the middle, where nothing cancels that matters.
-  Point const middle = PointOnArc(old, 0.5 * old.sweep);
+  XY const middle = PointOnArc(old, 0.5 * old.sweep);
   double const ax = start.x - middle.x;
   double const ay = start.y - middle.y;
   double const bx = end.x - middle.x;
@@ -80,12 +82,12 @@ Piece MovedArc(Piece const& old, Point const& start, Point const& end) {
   double const twiceCross = 2.0 * (ax * by - ay * bx);
   double const cx = (a2 * by - b2 * ay) / twiceCross;
   double const cy = (b2 * ax - a2 * bx) / twiceCross;
-  return ArcPiece(start, end, {middle.x + cx, middle.y + cy}, std::hypot(cx, cy),
-                  old.counterClockwise);
+  return MakeArc(start, end, {middle.x + cx, middle.y + cy}, std::hypot(cx, cy),
+                 old.counterClockwise);
 }
 
-Piece Moved(Piece const& old, Point const& start, Point const& end) {
-  return old.IsArc() ? MovedArc(old, start, end) : LinePiece(start, end);
+Piece Moved(Piece const& old, XY const& start, XY const& end) {
+  return old.IsArc() ? MovedArc(old, start, end) : MakeLine(start, end);
 }
 
 /// Whether the arc is the old one but for a little: a new end on the wrong side of the old start
@@ -95,11 +97,11 @@ bool IsAlike(Piece const& piece, Piece const& old) {
   return std::isfinite(piece.radius) && std::fabs(piece.sweep - old.sweep) < 0.5 * old.sweep;
 }
 
-std::vector<Point> PlacesToTry(WPoint const& seam, Piece const& first, Piece const& last) {
-  Point const& start = first.start;
-  Point const& end = last.end;
-  Point const middle = {0.5 * (start.x + end.x), 0.5 * (start.y + end.y)};
-  std::vector<Point> places = {{seam.x, seam.y}, start, end, middle};
+std::vector<XY> PlacesToTry(WPoint const& seam, Piece const& first, Piece const& last) {
+  XY const& start = first.start;
+  XY const& end = last.end;
+  XY const middle = {0.5 * (start.x + end.x), 0.5 * (start.y + end.y)};
+  std::vector<XY> places = {{seam.x, seam.y}, start, end, middle};
   if (auto const crossing =
           CrossingNear(first, last, {seam.x, seam.y}, kFarthestCrossing * seam.w)) {
     places.insert(places.begin(), *crossing);
@@ -136,7 +138,7 @@ bool CloseExactly(std::vector<WPoint> const& points, std::vector<Piece>* pieces)
   std::vector<Piece> const ends = {pieces->front(), pieces->back()};
   double least = std::max(kLargestRelative, WorstOf(near, ends));
   std::optional<std::vector<Piece>> best;
-  for (Point const& place : PlacesToTry(points.front(), ends.front(), ends.back())) {
+  for (XY const& place : PlacesToTry(points.front(), ends.front(), ends.back())) {
     std::vector<Piece> const moved = {Moved(ends.front(), place, ends.front().end),
                                       Moved(ends.back(), ends.back().start, place)};
     if (!IsAlike(moved.front(), ends.front()) || !IsAlike(moved.back(), ends.back())) continue;
@@ -152,8 +154,8 @@ bool CloseExactly(std::vector<WPoint> const& points, std::vector<Piece>* pieces)
 }
 
 double GapOf(std::vector<Piece> const& pieces) {
-  Point const& start = pieces.front().start;
-  Point const& end = pieces.back().end;
+  XY const& start = pieces.front().start;
+  XY const& end = pieces.back().end;
   return std::hypot(end.x - start.x, end.y - start.y);
 }
 

@@ -6,20 +6,20 @@
 
 #include "cli/Remeasure.h"
 #include "cli/Report.h"
+#include "cli/formats/Shapes.h"
 
 namespace Vorn::Cli {
 
 namespace {
 
 using std::numbers::pi;
-using Point = GeometryUtils::Point;
 
 constexpr double kLargestStep = 30.0 / 180.0 * pi;
 constexpr int kMostSteps = 20;
 constexpr double kSettled = 1e-15;
 
 struct Circle {
-  Point center;
+  XY center;
   double radius = 0.0;
 };
 
@@ -89,7 +89,7 @@ Circle LeastSquares(std::vector<WPoint> const& points) {
   return circle;
 }
 
-double TurnFrom(Point const& center, WPoint const& a, WPoint const& b) {
+double TurnFrom(XY const& center, WPoint const& a, WPoint const& b) {
   double const ax = a.x - center.x;
   double const ay = a.y - center.y;
   double const bx = b.x - center.x;
@@ -98,7 +98,7 @@ double TurnFrom(Point const& center, WPoint const& a, WPoint const& b) {
 }
 
 /// +1 or -1 for points that go round the centre once in steps that are small enough; 0 otherwise.
-int RoundsAbout(Point const& center, std::vector<WPoint> const& points) {
+int RoundsAbout(XY const& center, std::vector<WPoint> const& points) {
   double turned = 0.0;
   for (std::size_t i = 1; i < points.size(); ++i) {
     double const step = TurnFrom(center, points[i - 1], points[i]);
@@ -112,10 +112,8 @@ std::vector<Piece> HalfCircles(Circle const& circle, WPoint const& seam, bool co
   double const x = seam.x - circle.center.x;
   double const y = seam.y - circle.center.y;
   double const scale = circle.radius / std::hypot(x, y);
-  Point const start = {circle.center.x + scale * x, circle.center.y + scale * y};
-  Point const opposite = {circle.center.x - scale * x, circle.center.y - scale * y};
-  return {ArcPiece(start, opposite, circle.center, circle.radius, counterClockwise),
-          ArcPiece(opposite, start, circle.center, circle.radius, counterClockwise)};
+  XY const start = {circle.center.x + scale * x, circle.center.y + scale * y};
+  return MakeCircle(start, circle.center, circle.radius, counterClockwise);
 }
 
 std::optional<std::vector<Piece>> Checked(Circle const& circle, std::vector<WPoint> const& points) {

@@ -16,7 +16,15 @@ double Sweep(double startAngle, double endAngle, bool counterClockwise) {
   return turned < 0.0 ? turned + 2.0 * pi : turned;
 }
 
-Piece ArcOf(GeometryUtils::Point const& start, GeometryUtils::Elem const& elem) {
+Piece LinePiece(GeometryUtils::Point const& start, GeometryUtils::Elem const& elem) {
+  Piece piece;
+  piece.start = start;
+  piece.end = elem.end;
+  piece.length = std::hypot(elem.end.x - start.x, elem.end.y - start.y);
+  return piece;
+}
+
+Piece ArcPiece(GeometryUtils::Point const& start, GeometryUtils::Elem const& elem) {
   Piece piece;
   piece.kind = Piece::Kind::Arc;
   piece.start = start;
@@ -31,32 +39,7 @@ Piece ArcOf(GeometryUtils::Point const& start, GeometryUtils::Elem const& elem) 
   return piece;
 }
 
-double PolarAngle(GeometryUtils::Point const& center, GeometryUtils::Point const& point) {
-  return std::atan2(point.y - center.y, point.x - center.x);
-}
-
 }  // namespace
-
-Piece LinePiece(GeometryUtils::Point const& start, GeometryUtils::Point const& end) {
-  Piece piece;
-  piece.start = start;
-  piece.end = end;
-  piece.length = std::hypot(end.x - start.x, end.y - start.y);
-  return piece;
-}
-
-Piece ArcPiece(GeometryUtils::Point const& start, GeometryUtils::Point const& end,
-               GeometryUtils::Point const& center, double radius, bool counterClockwise) {
-  GeometryUtils::Elem elem;
-  elem.type = GeometryUtils::ElemType::Arc;
-  elem.end = end;
-  elem.center = center;
-  elem.radius = radius;
-  elem.direction = counterClockwise ? 1.0 : -1.0;
-  elem.startAngle = PolarAngle(center, start);
-  elem.endAngle = PolarAngle(center, end);
-  return ArcOf(start, elem);
-}
 
 std::vector<Piece> PiecesOf(std::vector<GeometryUtils::Elem> const& contour) {
   std::vector<Piece> pieces;
@@ -64,10 +47,10 @@ std::vector<Piece> PiecesOf(std::vector<GeometryUtils::Elem> const& contour) {
     GeometryUtils::Point const& start = contour[i - 1].end;
     switch (contour[i].type) {
       case GeometryUtils::ElemType::Segment:
-        pieces.push_back(LinePiece(start, contour[i].end));
+        pieces.push_back(LinePiece(start, contour[i]));
         break;
       case GeometryUtils::ElemType::Arc:
-        pieces.push_back(ArcOf(start, contour[i]));
+        pieces.push_back(ArcPiece(start, contour[i]));
         break;
       default:
         throw Failure(ExitCode::Internal,

@@ -27,12 +27,6 @@ struct Piece {
   bool IsArc() const { return kind == Kind::Arc; }
 };
 
-Piece LinePiece(GeometryUtils::Point const& start, GeometryUtils::Point const& end);
-
-/// The angles follow from the points; an arc whose angles are equal has no sweep.
-Piece ArcPiece(GeometryUtils::Point const& start, GeometryUtils::Point const& end,
-               GeometryUtils::Point const& center, double radius, bool counterClockwise);
-
 /// The pieces of a contour; its first element only places the start. An arc with equal angles has
 /// no sweep.
 /// @throws Failure (ExitCode::Internal) for an element that is neither segment nor arc.

@@ -19,7 +19,11 @@ constexpr double kLargestFixed = 1e9;
 /// columns of a readable width.
 class LengthFormat {
  public:
-  explicit LengthFormat(Report const& report) {
+  LengthFormat(Report const& report, std::optional<int> wanted) {
+    if (wanted) {
+      decimals_ = *wanted;
+      return;
+    }
     double const digits = 2.0 - std::floor(std::log10(report.SmallestTolerance()));
     decimals_ = static_cast<int>(std::clamp(digits, 0.0, static_cast<double>(kMostDecimals)));
     isFixed_ = digits <= kMostDecimals;
@@ -138,8 +142,8 @@ std::string Summary(Report const& report) {
 
 }  // namespace
 
-std::string ToTable(Report const& report) {
-  LengthFormat const length(report);
+std::string ToTable(Report const& report, std::optional<int> digits) {
+  LengthFormat const length(report, digits);
   std::vector<Row> rows = {Header()};
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {
     rows.push_back(PieceRow(report, i, length));

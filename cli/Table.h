@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 
 #include "cli/Report.h"
@@ -7,6 +8,9 @@
 namespace Vorn::Cli {
 
 /// The table of the pieces and the summary below it, for reading.
-std::string ToTable(Report const& report);
+///
+/// @param digits after the point of coordinates and lengths; nothing: a hundredth of the smallest
+///        tolerance, as far as columns stay readable
+std::string ToTable(Report const& report, std::optional<int> digits = {});
 
 }  // namespace Vorn::Cli

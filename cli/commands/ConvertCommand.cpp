@@ -8,6 +8,7 @@
 
 #include "cli/Numbers.h"
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourOutput.h"
 #include "cli/commands/Outputs.h"
 #include "cli/formats/Format.h"
 
@@ -114,7 +115,6 @@ void AddFormat(CLI::App& app, std::string const& name, std::optional<Format>* fo
 }
 
 void AddOptions(CLI::App& app, Options* options) {
-  constexpr int kMostDecimals = 9;
   app.add_option("CONTOUR", options->input, "File with the contour; - is the standard input")
       ->required()
       ->type_name("FILE");
@@ -130,12 +130,7 @@ void AddOptions(CLI::App& app, Options* options) {
   app.add_option("--units", options->units,
                  "The units of the coordinates, for example mm; goes before what the file says")
       ->type_name("NAME");
-  app.add_flag("--dxf-entities", options->write.dxfEntities,
-               "DXF: a LINE or an ARC for each piece in place of one POLYLINE");
-  AddPositiveNumber(app, "--feed", &options->write.feed, "F",
-                    "G-code: the feed in units a minute; without it there is no F word");
-  AddWholeNumber(app, "--gcode-decimals", &options->write.gcodeDecimals, 0, kMostDecimals, "N",
-                 "G-code: digits after the point; 4 unless the units are inches, then 5");
+  AddWriteOptions(app, &options->write);
   app.footer(kFooter);
 }
 

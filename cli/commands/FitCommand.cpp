@@ -14,9 +14,11 @@
 #include "cli/Report.h"
 #include "cli/Table.h"
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourOutput.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/drawing/Drawing.h"
+#include "cli/formats/Format.h"
 
 namespace Vorn::Cli {
 
@@ -26,7 +28,7 @@ using Strategy = GeometryUtils::FittingStrategy;
 
 constexpr char const* kText =
     "Fit a contour of lines and arcs to measured points, so that it passes every point within\n"
-    "its tolerance. Prints a table of the pieces and a summary; writes JSON and a drawing.";
+    "its tolerance. Prints a table of the pieces and a summary, or writes the contour to files.";
 
 constexpr char const* kFooter =
     R"(
@@ -48,6 +50,12 @@ printed as the fit reports them, and as measured again by the program over every
 1 + 1e-9 counts as within, for the rounding of the second measurement. Points are counted from
 0. The strategy arc reports its deviation as a length, and no point.
 
+Outputs: the ending of a file tells its format: .json (the contour with deviations and all),
+.csv, .dxf, .nc or .gcode, .wkt (the contour; see 'contour convert --help' for what each keeps),
+.svg, .png (a drawing). --format tells it for - and for other endings. Numbers are written so
+that they read back as the same doubles, but for G-code, which is rounded. With -o - the table
+is not printed.
+
 Exit codes:
   0   every point is within its tolerance
   1   the contour leaves the tolerance of a point (table and files are written)
@@ -61,16 +69,31 @@ Exit codes:
 Output files are written whole or not at all.
 
 Examples:
-  contour fit part.csv --tolerance 0.02 --svg part.svg
-  contour fit part.csv --tolerance-per-point 0.05 --strategy cells --json part.json
+  contour fit part.csv -t 0.02
+  contour fit part.csv -t 0.02 -o part.dxf -o part.svg -o part.json
+  contour fit part.csv -t 0.02 -o part.nc --feed 600
+  contour fit - -t 0.02 -o - --format dxf < part.csv > part.dxf
+  contour fit part.csv --tolerance-per-point 0.05 --strategy cells -o part.json
   contour fit outline.csv -t 0.01 --closed yes --start 120
 )";
+
+constexpr int kMostDigits = 15;
+
+/// A file to write, and as what.
+struct Target {
+  NamedFile file;
+  Format format = Format::Json;
+};
 
 struct Options {
   PointsInput points;
   Strategy strategy = Strategy::Mixed;
   ClosedChoice closed = ClosedChoice::Auto;
   std::optional<int> start;
+  std::vector<std::string> outputs;
+  std::optional<Format> format;
+  WriteOptions write;
+  std::optional<int> digits;
   std::string json;
   std::string svg;
 
@@ -80,10 +103,27 @@ struct Options {
     return choice;
   }
 
+  std::vector<Target> Targets() const {
+    std::vector<Target> targets;
+    for (std::string const& path : outputs) {
+      targets.push_back({{"--output", path}, FormatFor(path)});
+    }
+    if (!json.empty()) targets.push_back({{"--json", json}, Format::Json});
+    if (!svg.empty()) targets.push_back({{"--svg", svg}, Format::Svg});
+    return targets;
+  }
+
+  Format FormatFor(std::string const& path) const {
+    Format const found = OutputFormat(path, format, "--format");
+    if (found == Format::Html) {
+      throw Failure(ExitCode::Usage, path + ": a fit is not written as HTML");
+    }
+    return found;
+  }
+
   std::vector<NamedFile> Written() const {
     std::vector<NamedFile> files;
-    if (!json.empty()) files.push_back({"--json", json});
-    if (!svg.empty()) files.push_back({"--svg", svg});
+    for (Target const& target : Targets()) files.push_back(target.file);
     return files;
   }
 };
@@ -100,12 +140,33 @@ std::string Complaint(Report const& report) {
          FormatShort(report.remeasured.Worst().relative) + ")";
 }
 
+ContourFile ContourOf(Report const& report) {
+  return {report.file.path, report.pieces, report.closure.isClosed, report.file.units};
+}
+
+std::string TextOf(Report const& report, Format format, WriteOptions const& options) {
+  switch (format) {
+    case Format::Json:
+      return ToJson(report);
+    case Format::Svg:
+      return ToSvg(DrawingOf(report));
+    case Format::Png:
+      return ToPng(DrawingOf(report), {});
+    default:
+      return ToText(ContourOf(report), format, options);
+  }
+}
+
 void WriteResults(Options const& options, Report const& report, Console const& console) {
   Outputs outputs;
-  if (!options.json.empty()) outputs.Add(options.json, ToJson(report));
-  if (!options.svg.empty()) outputs.Add(options.svg, ToSvg(DrawingOf(report)));
+  bool isOutTaken = false;
+  for (Target const& target : options.Targets()) {
+    outputs.Add(target.file.path, TextOf(report, target.format, options.write));
+    isOutTaken = isOutTaken || target.file.path == "-";
+  }
   outputs.Write(console);
-  console.out << ToTable(report);
+  if (isOutTaken) return;
+  console.out << ToTable(report, options.digits);
   for (NamedFile const& file : options.Written()) {
     console.out << "wrote       " << file.path << '\n';
   }
@@ -141,9 +202,21 @@ void AddOptions(CLI::App& app, Options* options) {
   AddWholeNumber(app, "--start", &options->start, 0, std::numeric_limits<int>::max(), "INDEX",
                  "Cut a closed contour open at this point, counted from 0; without it, at its "
                  "sharpest corner");
-  app.add_option("--json", options->json, "Write the contour and its deviations to this file")
+  app.add_option("-o,--output", options->outputs,
+                 "Write the contour to this file, in the format that its ending names; may be "
+                 "given several times; - is the standard output")
+      ->expected(1)
+      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
       ->type_name("FILE");
-  app.add_option("--svg", options->svg, "Write a drawing to this file")->type_name("FILE");
+  AddWord(
+      app, "--format", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png"},
+      [options](std::string const& word) { options->format = FormatNamed(word); },
+      "The format of outputs whose name does not tell, such as -");
+  AddWriteOptions(app, &options->write);
+  AddWholeNumber(app, "--digits", &options->digits, 0, kMostDigits, "N",
+                 "Digits after the point of lengths in the table; files always hold every digit");
+  app.add_option("--json", options->json, "The same as -o, always as JSON")->type_name("FILE");
+  app.add_option("--svg", options->svg, "The same as -o, always as SVG")->type_name("FILE");
   app.footer(std::string(kPointsFileText) + kFooter);
 }
 

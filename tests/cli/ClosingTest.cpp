@@ -6,20 +6,20 @@
 #include "cli/Closing.h"
 #include "cli/FullCircle.h"
 #include "cli/Remeasure.h"
+#include "cli/formats/Shapes.h"
 
 namespace Vorn::Cli {
 namespace {
 
 using std::numbers::pi;
-using Point = GeometryUtils::Point;
 
 /// Checks what must hold of any arc handed on: ends on the circle, angles and sweep to match.
 void ExpectConsistent(Piece const& arc) {
-  for (Point const& end : {arc.start, arc.end}) {
+  for (XY const& end : {arc.start, arc.end}) {
     EXPECT_NEAR(std::hypot(end.x - arc.center.x, end.y - arc.center.y), arc.radius,
                 1e-12 * arc.radius);
   }
-  Point const turned = PointOnArc(arc, arc.sweep);
+  XY const turned = PointOnArc(arc, arc.sweep);
   EXPECT_NEAR(turned.x, arc.end.x, 1e-12 * arc.radius);
   EXPECT_NEAR(turned.y, arc.end.y, 1e-12 * arc.radius);
   EXPECT_NEAR(arc.length, arc.radius * arc.sweep, 1e-12 * arc.radius);
@@ -27,7 +27,7 @@ void ExpectConsistent(Piece const& arc) {
 
 /// A triangle of lines with a gap of (dx, dy) at its seam (0, 0).
 std::vector<Piece> Triangle(double dx, double dy) {
-  return {LinePiece({0, 0}, {4, 0}), LinePiece({4, 0}, {4, 3}), LinePiece({4, 3}, {dx, dy})};
+  return {MakeLine({0, 0}, {4, 0}), MakeLine({4, 0}, {4, 3}), MakeLine({4, 3}, {dx, dy})};
 }
 
 std::vector<WPoint> TrianglePoints(double w) {
@@ -47,8 +47,8 @@ TEST(CloseExactly, LinesMeetInOnePoint) {
 
 TEST(CloseExactly, CrossingIsTakenWhereItFitsBest) {
   // Both lines are right but stop short of the corner.
-  std::vector<Piece> pieces = {LinePiece({0.03, 0}, {4, 0}), LinePiece({4, 0}, {4, 3}),
-                               LinePiece({4, 3}, {0.04, 0.03})};
+  std::vector<Piece> pieces = {MakeLine({0.03, 0}, {4, 0}), MakeLine({4, 0}, {4, 3}),
+                               MakeLine({4, 3}, {0.04, 0.03})};
   ASSERT_TRUE(CloseExactly(TrianglePoints(0.05), &pieces));
   EXPECT_NEAR(pieces[0].start.x, 0.0, 1e-15);
   EXPECT_NEAR(pieces[0].start.y, 0.0, 1e-15);
@@ -58,8 +58,8 @@ TEST(CloseExactly, GapStaysWhereNoCommonPointKeepsTheTolerance) {
   // The contour leaves at (0, 0) and comes back to (0, 1), a tolerance of 0.1 around both.
   std::vector<WPoint> const points = {{0, 0, 0.1}, {2, 0, 0.1}, {4, 0, 0.1},
                                       {4, 1, 0.1}, {2, 1, 0.1}, {0, 1, 0.1}};
-  std::vector<Piece> pieces = {LinePiece({0, 0}, {4, 0}), LinePiece({4, 0}, {4, 1}),
-                               LinePiece({4, 1}, {0, 1})};
+  std::vector<Piece> pieces = {MakeLine({0, 0}, {4, 0}), MakeLine({4, 0}, {4, 1}),
+                               MakeLine({4, 1}, {0, 1})};
   EXPECT_FALSE(CloseExactly(points, &pieces));
   EXPECT_EQ(GapOf(pieces), 1.0);
   EXPECT_EQ(pieces[2].end.y, 1.0);
@@ -67,9 +67,9 @@ TEST(CloseExactly, GapStaysWhereNoCommonPointKeepsTheTolerance) {
 
 TEST(CloseExactly, ArcsKeepTheirMiddleAndStayCircles) {
   // A lens of two arcs through (0, 0) and (2, 0), whose second stops off the seam.
-  auto const arc = [](Point const& from, Point const& to, double centerY) {
+  auto const arc = [](XY const& from, XY const& to, double centerY) {
     double const radius = std::hypot(from.x - 1.0, from.y - centerY);
-    return ArcPiece(from, to, {1.0, centerY}, radius, true);
+    return MakeArc(from, to, {1.0, centerY}, radius, true);
   };
   double const radius = std::hypot(1.0, 2.0);
   double const angle = std::atan2(2.0, -1.0) + 0.004;
@@ -80,7 +80,7 @@ TEST(CloseExactly, ArcsKeepTheirMiddleAndStayCircles) {
   std::vector<WPoint> points = {{0, 0, w}};
   for (Piece const& piece : pieces) {
     for (int i = 1; i <= 8; ++i) {
-      Point const p = PointOnArc(piece, piece.sweep * i / 8.0);
+      XY const p = PointOnArc(piece, piece.sweep * i / 8.0);
       points.push_back({p.x, p.y, w});
     }
   }
@@ -94,8 +94,8 @@ TEST(CloseExactly, ArcsKeepTheirMiddleAndStayCircles) {
 
 TEST(CloseExactly, SmoothSeamIsClosedWithoutASpike) {
   // Two half circles of slightly different size meet tangentially, off by 0.004.
-  std::vector<Piece> pieces = {ArcPiece({1, 0}, {-1, 0}, {0, 0}, 1.0, true),
-                               ArcPiece({-1, 0}, {1.004, 0}, {0.002, 0}, 1.002, true)};
+  std::vector<Piece> pieces = {MakeArc({1, 0}, {-1, 0}, {0, 0}, 1.0, true),
+                               MakeArc({-1, 0}, {1.004, 0}, {0.002, 0}, 1.002, true)};
   std::vector<WPoint> points;
   for (int i = 0; i <= 40; ++i) {
     points.push_back({std::cos(i * pi / 20.0), std::sin(i * pi / 20.0), 0.01});
@@ -118,7 +118,7 @@ TEST(CloseExactly, PointsAlreadyOutsideMayNotGetWorse) {
 }
 
 TEST(CloseExactly, ContourOfOnePieceStaysOpen) {
-  std::vector<Piece> pieces = {LinePiece({0, 0}, {4, 0})};
+  std::vector<Piece> pieces = {MakeLine({0, 0}, {4, 0})};
   EXPECT_FALSE(CloseExactly({{0, 0, 1}, {4, 0, 1}, {0, 0, 1}}, &pieces));
 }
 
@@ -163,15 +163,15 @@ TEST(FitFullCircle, RefusesWhatIsNotOneCircle) {
 
 TEST(FullCircleOf, TakesTheCircleOfTheWidestArc) {
   std::vector<WPoint> const points = CirclePoints(60, 1.0, 0.001, 0.002);
-  Point const start = {points.front().x, points.front().y};
-  Point const end = {points[50].x, points[50].y};
-  Piece const wide = ArcPiece(start, end, {5.0, -3.0}, 2.0005, true);
-  auto const arcs = FullCircleOf({wide, LinePiece(end, start)}, points);
+  XY const start = {points.front().x, points.front().y};
+  XY const end = {points[50].x, points[50].y};
+  Piece const wide = MakeArc(start, end, {5.0, -3.0}, 2.0005, true);
+  auto const arcs = FullCircleOf({wide, MakeLine(end, start)}, points);
   ASSERT_TRUE(arcs.has_value());
   EXPECT_EQ(arcs->front().radius, 2.0005);
-  EXPECT_FALSE(FullCircleOf({LinePiece(end, start)}, points));
-  Piece const small = ArcPiece(start, end, {5.0, -3.0}, 2.0005, false);
-  EXPECT_FALSE(FullCircleOf({small, LinePiece(end, start)}, points));
+  EXPECT_FALSE(FullCircleOf({MakeLine(end, start)}, points));
+  Piece const small = MakeArc(start, end, {5.0, -3.0}, 2.0005, false);
+  EXPECT_FALSE(FullCircleOf({small, MakeLine(end, start)}, points));
 }
 
 }  // namespace

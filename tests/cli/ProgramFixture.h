@@ -43,10 +43,11 @@ class Program : public testing::Test {
     std::ofstream(folder_ / name, std::ios::binary) << text;
   }
 
-  /// `arguments` as typed into a shell after the name of the program.
-  Ended Run(std::string const& arguments, std::string const& before = "") const {
+  /// `arguments` as typed into a shell after the name of the program, `before` what goes before it.
+  Ended Run(std::string const& arguments, std::string const& before = "",
+            std::string const& in = "/dev/null") const {
     std::string const command = "cd '" + folder_.string() + "' && " + before + " '" +
-                                CONTOUR_PROGRAM + "' " + arguments + " >.out 2>.err </dev/null";
+                                CONTOUR_PROGRAM + "' " + arguments + " >.out 2>.err <'" + in + "'";
     int const status = std::system(command.c_str());
     Ended ended;
     ended.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;

@@ -1,0 +1,23 @@
+#pragma once
+
+#include <optional>
+#include <string>
+
+#include "cli/formats/Format.h"
+
+namespace CLI {
+class App;
+}
+
+namespace Vorn::Cli {
+
+/// Adds the options that say how a contour is written: --dxf-entities, --feed, --gcode-decimals.
+void AddWriteOptions(CLI::App& app, WriteOptions* options);
+
+/// The format of a file to write: by its ending, else `otherwise`.
+/// @param option what to give when neither tells, for the message
+/// @throws Failure (ExitCode::Usage) when neither tells.
+Format OutputFormat(std::string const& path, std::optional<Format> otherwise,
+                    std::string const& option);
+
+}  // namespace Vorn::Cli
