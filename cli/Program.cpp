@@ -5,6 +5,7 @@
 #include <ostream>
 #include <sstream>
 
+#include "cli/commands/CheckCommand.h"
 #include "cli/commands/Command.h"
 #include "cli/commands/ConvertCommand.h"
 #include "cli/commands/FitCommand.h"
@@ -23,6 +24,7 @@ constexpr char const* kFooter =
 /// In the order in which --help lists them.
 constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
     AddFitCommand,
+    AddCheckCommand,
     AddInfoCommand,
     AddConvertCommand,
     AddSimplifyCommand,

@@ -5,8 +5,9 @@
 
 #include <algorithm>
 #include <cmath>
-#include <limits>
 #include <numbers>
+
+#include "cli/PieceIndex.h"
 
 namespace Vorn::Cli {
 
@@ -50,21 +51,6 @@ bool IsLeftOf(Piece const& piece, double x, double y) {
          (piece.end.y - piece.start.y) * (x - piece.start.x);
 }
 
-PointDeviation DeviationOf(WPoint const& point, std::vector<Piece> const& pieces) {
-  PointDeviation nearest;
-  nearest.distance = std::numeric_limits<double>::infinity();
-  for (std::size_t i = 0; i < pieces.size(); ++i) {
-    double const distance = DistanceTo(pieces[i], point.x, point.y);
-    if (distance < nearest.distance) {
-      nearest.distance = distance;
-      nearest.piece = i;
-    }
-  }
-  nearest.relative = nearest.distance / point.w;
-  nearest.isLeft = IsLeftOf(pieces[nearest.piece], point.x, point.y);
-  return nearest;
-}
-
 }  // namespace
 
 double DistanceTo(Piece const& piece, double x, double y) {
@@ -72,9 +58,16 @@ double DistanceTo(Piece const& piece, double x, double y) {
 }
 
 Remeasured Remeasure(std::vector<WPoint> const& points, std::vector<Piece> const& pieces) {
+  PieceIndex const index(pieces);
   Remeasured result;
+  result.points.reserve(points.size());
+  std::size_t piece = 0;
   for (WPoint const& point : points) {
-    result.points.push_back(DeviationOf(point, pieces));
+    // Points come in the order of the contour: the piece of the one before is a good guess.
+    PieceIndex::Nearest const nearest = index.Find(point.x, point.y, piece);
+    piece = nearest.piece;
+    result.points.push_back({nearest.distance, nearest.distance / point.w,
+                             IsLeftOf(pieces[piece], point.x, point.y), piece});
     if (result.points.back().relative > result.Worst().relative) {
       result.worst = result.points.size() - 1;
     }

@@ -27,7 +27,8 @@ struct Remeasured {
 /// Distance of (x, y) from the nearest place of the piece.
 double DistanceTo(Piece const& piece, double x, double y);
 
-/// Measures every point against every piece. Needs at least one of each.
+/// Measures every point against every piece, as far as the answer is concerned: see PieceIndex.
+/// Needs at least one of each.
 Remeasured Remeasure(std::vector<WPoint> const& points, std::vector<Piece> const& pieces);
 
 }  // namespace Vorn::Cli

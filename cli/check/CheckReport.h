@@ -1,0 +1,48 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "cli/CsvReader.h"
+#include "cli/Failure.h"
+#include "cli/Remeasure.h"
+#include "cli/check/Crossing.h"
+#include "cli/formats/ContourFile.h"
+
+namespace Vorn::Cli {
+
+/// What `contour check` finds when it measures points against a contour from a file.
+struct CheckReport {
+  PointFile file;
+  ContourFile contour;
+  std::string toleranceSource;  ///< empty: nobody states a tolerance, and `relative` means nothing
+  std::vector<PointDeviation> deviations;
+  std::size_t furthest = 0;          ///< index of the largest distance; the first of several
+  std::size_t worst = 0;             ///< index of the largest relative deviation; likewise
+  std::vector<std::size_t> outside;  ///< indices of the points beyond their tolerance
+  std::vector<Gap> gaps;
+  Crossing crossing = Crossing::NotTestable;
+  std::optional<Enclosed> enclosed;
+
+  bool HasTolerances() const { return !toleranceSource.empty(); }
+  ExitCode Code() const { return outside.empty() ? ExitCode::Ok : ExitCode::OutsideTolerance; }
+
+  /// All indices, the worst point first: by relative deviation where there are tolerances, else by
+  /// distance.
+  std::vector<std::size_t> WorstFirst() const;
+};
+
+/// Measures; the points carry their tolerances unless the source is empty.
+CheckReport MakeCheckReport(PointFile file, std::string toleranceSource, ContourFile contour);
+
+/// For people: a summary, then a table of the first `rows` of the points in this order.
+std::string ToText(CheckReport const& report, std::vector<std::size_t> const& order,
+                   std::size_t rows);
+
+/// Every point in a line of CSV, with all digits. Deviations to the left of the contour's sense of
+/// travel are positive.
+std::string ToCsv(CheckReport const& report);
+
+}  // namespace Vorn::Cli

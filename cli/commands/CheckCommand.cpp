@@ -1,0 +1,138 @@
+#include "cli/commands/CheckCommand.h"
+
+#include <CLI/CLI.hpp>
+#include <memory>
+#include <numeric>
+#include <ostream>
+#include <utility>
+
+#include "cli/Numbers.h"
+#include "cli/TextFile.h"
+#include "cli/Tolerances.h"
+#include "cli/check/CheckReport.h"
+#include "cli/commands/CommonOptions.h"
+#include "cli/commands/Outputs.h"
+#include "cli/commands/PointsInput.h"
+#include "cli/formats/Format.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr std::size_t kWorstRows = 10;
+
+constexpr char const* kText =
+    "Measure points against a contour from a file: how far each lies from the nearest piece, "
+    "whether\n"
+    "that is within its tolerance, whether the pieces meet, and whether they cross.";
+
+constexpr char const* kFooter =
+    R"(
+The contour is read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
+by the content. Every point is measured against every piece as drawn, clipped at its ends. A
+relative deviation counts as within tolerance up to 1 + 1e-9, for rounding. Without any tolerance
+deviations are lengths, and none is judged.
+
+Deviations to the left of the contour's sense of travel are positive in the tables. Points are
+counted from 0, pieces from 1. Pieces cross where two of them that are not neighbours have a point
+in common; gaps are bridged by straight lines for this test and for the area.
+
+Exit codes:
+  0   every point is within its tolerance, or none is given
+  1   a point is outside its tolerance
+  2   wrong usage
+  3   a file cannot be read or written, or a line of it is wrong
+  4   a tolerance by spacing was asked for, but neighbours coincide
+  70  internal error
+
+Examples:
+  contour check part.csv part.dxf --tolerance 0.02
+  contour check part.csv part.nc --tolerance 0.02 --table deviations.csv
+)";
+
+struct Options {
+  PointsInput points;
+  std::string contour;
+  std::optional<Format> from;
+  std::string table;
+  bool all = false;
+
+  std::vector<NamedFile> Written() const {
+    if (table.empty()) return {};
+    return {{"--table", table}};
+  }
+};
+
+void WarnOfUnits(CheckReport const& report, Console const& console) {
+  std::string const& ofPoints = report.file.units;
+  std::string const& ofContour = report.contour.units;
+  bool const differ =
+      !ofPoints.empty() && !ofContour.empty() && LowerCase(ofPoints) != LowerCase(ofContour);
+  if (!differ) return;
+  console.err << "contour: the points are in " << ofPoints << ", the contour in " << ofContour
+              << ": nothing is converted\n";
+}
+
+std::string TextFor(Options const& options, CheckReport const& report) {
+  if (!options.all) return ToText(report, report.WorstFirst(), kWorstRows);
+  std::vector<std::size_t> order(report.deviations.size());
+  std::iota(order.begin(), order.end(), std::size_t{0});
+  return ToText(report, order, order.size());
+}
+
+ExitCode Run(Options const& options, Console const& console) {
+  RequireWritable(options.Written());
+  PointFile file = ReadPointsInput(options.points, console);
+  ContourFile contour = ReadContour(options.contour, console, options.from);
+  std::string source;
+  if (IsToleranceStated(options.points.tolerance, file)) {
+    source = AssignTolerances(options.points.tolerance, &file);
+  }
+  CheckReport const report =
+      MakeCheckReport(std::move(file), std::move(source), std::move(contour));
+  WarnOfUnits(report, console);
+  Outputs outputs;
+  if (!options.table.empty()) outputs.Add(options.table, ToCsv(report));
+  outputs.Write(console);
+  if (options.table != "-") console.out << TextFor(options, report);
+  return report.Code();
+}
+
+void AddOptions(CLI::App& app, Options* options) {
+  AddPointsInput(app, &options->points);
+  app.add_option("CONTOUR", options->contour, "File with the contour; - is the standard input")
+      ->required()
+      ->type_name("FILE");
+  AddWord(
+      app, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      [options](std::string const& word) { options->from = FormatNamed(word); },
+      "Read the contour as this");
+  app.add_option("--table", options->table,
+                 "Write every point's deviation to this CSV file; - is the standard output, which "
+                 "then holds nothing else")
+      ->type_name("FILE");
+  app.add_flag("--all", options->all, "List every point, not just the ten worst");
+  app.footer(std::string(kPointsFileText) + kFooter);
+}
+
+void RefuseBadFiles(Options const& options) {
+  if (options.points.path == kStandardInput && options.contour == kStandardInput) {
+    throw Failure(ExitCode::Usage, "POINTS and CONTOUR cannot both be the standard input");
+  }
+  RefuseSharedFiles({{"POINTS", options.points.path}, {"CONTOUR", options.contour}},
+                    options.Written());
+}
+
+}  // namespace
+
+void AddCheckCommand(CLI::App& program, Action* action) {
+  CLI::App* const app = program.add_subcommand("check", kText);
+  auto const options = std::make_shared<Options>();
+  AddOptions(*app, options.get());
+  app->callback([options, action] {
+    RefuseBadFiles(*options);
+    *action = [options](Console const& console) { return Run(*options, console); };
+  });
+}
+
+}  // namespace Vorn::Cli

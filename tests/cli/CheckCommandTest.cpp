@@ -1,0 +1,245 @@
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <filesystem>
+#include <fstream>
+#include <limits>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+#include "cli/RunInProcess.h"
+#include "cli/TextFile.h"
+#include "support/SharedData.h"
+
+namespace Vorn::Cli {
+namespace {
+
+namespace fs = std::filesystem;
+
+/// A folder of its own for every test.
+class CheckCommand : public testing::Test {
+ protected:
+  CheckCommand() {
+    std::string name = (fs::temp_directory_path() / "contour-check-XXXXXX").string();
+    folder_ = mkdtemp(name.data());
+  }
+
+  ~CheckCommand() override { fs::remove_all(folder_); }
+
+  std::string Write(std::string const& name, std::string const& text) const {
+    std::ofstream(folder_ / name, std::ios::binary) << text;
+    return PathOf(name);
+  }
+
+  std::string PathOf(std::string const& name) const { return (folder_ / name).string(); }
+
+  fs::path folder_;
+};
+
+std::string Contents(std::string const& path) {
+  std::istringstream none;
+  return ReadTextFile(path, none);
+}
+
+/// A corner, then a half circle of radius 1 about (4, 4).
+constexpr char const* kContour =
+    "type,start_x,start_y,end_x,end_y,center_x,center_y,radius,direction\n"
+    "line,0,0,5,0,,,,\n"
+    "line,5,0,5,4,,,,\n"
+    "arc,5,4,3,4,4,4,1,ccw\n";
+
+constexpr char const* kPoints = "# units mm\nx,y\n0,0\n2,0.25\n5,2\n4,4.5\n3,4\n";
+
+TEST_F(CheckCommand, WithoutAToleranceGivesLengthsAndExitCode0) {
+  std::string const contour = Write("c.csv", kContour);
+  RunResult const run = RunInProcess({"check", "-", contour}, kPoints);
+  EXPECT_EQ(run.code, ExitCode::Ok);
+  EXPECT_EQ(run.err, "");
+  EXPECT_EQ(run.out, "standard input against " + contour +
+                         ", lengths in mm\n"
+                         "\n"
+                         "points      5\n"
+                         "pieces      3: 2 lines, 1 arc, 12.1416 long, open\n"
+                         "tolerance   none given: deviations are lengths\n"
+                         "largest     0.5 at point 3 (line 6), to the left of piece 3\n"
+                         "joints      the pieces meet\n"
+                         "crossing    the contour does not cross itself\n"
+                         "area        none: the contour is open\n"
+                         "result      measured\n"
+                         "\n"
+                         "point  line  x     y  deviation  piece\n"
+                         "    3     6  4   4.5        0.5      3\n"
+                         "    1     4  2  0.25       0.25      1\n"
+                         "    0     3  0     0          0      1\n"
+                         "    2     5  5     2          0      2\n"
+                         "    4     7  3     4          0      3\n");
+}
+
+TEST_F(CheckCommand, WithAToleranceJudges) {
+  std::string const contour = Write("c.csv", kContour);
+  RunResult const outside = RunInProcess({"check", "-", contour, "-t", "0.25"}, kPoints);
+  EXPECT_EQ(outside.code, ExitCode::OutsideTolerance);
+  EXPECT_NE(outside.out.find("relative    2.000000 of the tolerance at point 3 (line 6)"),
+            std::string::npos)
+      << outside.out;
+  EXPECT_NE(outside.out.find("outside     1 of 5 points\n"), std::string::npos);
+  EXPECT_NE(outside.out.find("result      OUTSIDE TOLERANCE\n"), std::string::npos);
+  RunResult const within = RunInProcess({"check", "-", contour, "-t", "0.5"}, kPoints);
+  EXPECT_EQ(within.code, ExitCode::Ok) << "as far as the tolerance is within";
+  EXPECT_NE(within.out.find("outside     none of 5 points\n"), std::string::npos) << within.out;
+}
+
+TEST_F(CheckCommand, EachPointMayHaveATolerance) {
+  std::string const contour = Write("c.csv", kContour);
+  RunResult const run =
+      RunInProcess({"check", "-", contour}, "x,y,w\n2,0.25,0.125\n4,4.5,4\n3,4,1\n");
+  EXPECT_EQ(run.code, ExitCode::OutsideTolerance);
+  EXPECT_NE(run.out.find("largest     0.5 at point 1 (line 3)"), std::string::npos) << run.out;
+  EXPECT_NE(run.out.find("relative    2.000000 of the tolerance at point 0 (line 2)"),
+            std::string::npos);
+}
+
+TEST_F(CheckCommand, TableHoldsEveryPointWithAllDigits) {
+  std::string const contour = Write("c.csv", kContour);
+  RunResult const lengths = RunInProcess({"check", "-", contour, "--table", "-"}, kPoints);
+  EXPECT_EQ(lengths.out,
+            "point,line,x,y,deviation,piece\n"
+            "0,3,0,0,0,1\n1,4,2,0.25,0.25,1\n2,5,5,2,0,2\n3,6,4,4.5,0.5,3\n4,7,3,4,0,3\n");
+  std::string const table = PathOf("t.csv");
+  RunResult const judged =
+      RunInProcess({"check", "-", contour, "-t", "0.25", "--table", table}, kPoints);
+  EXPECT_NE(judged.out.find("result      "), std::string::npos);
+  EXPECT_NE(Contents(table).find("\n3,6,4,4.5,0.5,3,0.25,2\n"), std::string::npos);
+}
+
+TEST_F(CheckCommand, AllListsThePointsInTheirOrder) {
+  std::string const contour = Write("c.csv", kContour);
+  std::string points;
+  for (int i = 0; i <= 20; ++i) points += std::to_string(0.25 * i) + ",0.125\n";
+  RunResult const worst = RunInProcess({"check", "-", contour}, points);
+  RunResult const all = RunInProcess({"check", "-", contour, "--all"}, points);
+  auto const lines = [](std::string const& text) {
+    return std::count(text.begin(), text.end(), '\n');
+  };
+  EXPECT_EQ(lines(all.out) - lines(worst.out), 11);
+  EXPECT_LT(all.out.find("\n    0     1 "), all.out.find("\n   20    21 "));
+}
+
+TEST_F(CheckCommand, ReportsGapsCrossingsAndArea) {
+  std::string const gaps =
+      Write("g.csv",
+            "type,start_x,start_y,end_x,end_y\nline,0,0,4,0\nline,4.5,0,4.5,3\nline,4.5,3,0,3\n");
+  EXPECT_NE(
+      RunInProcess({"check", "-", gaps}, kPoints)
+          .out.find("joints      1 gap\n            pieces 1 and 2 do not meet: the gap is 0.5\n"),
+      std::string::npos);
+  std::string const square =
+      Write("s.csv",
+            "# closed yes\ntype,start_x,start_y,end_x,end_y\nline,0,0,4,0\nline,4,0,4,3\n"
+            "line,4,3,0,3\nline,0,3,0,0\n");
+  EXPECT_NE(RunInProcess({"check", "-", square}, kPoints)
+                .out.find("area        12, counter-clockwise (y up)\n"),
+            std::string::npos);
+  std::string const bow =
+      Write("b.csv",
+            "# closed yes\ntype,start_x,start_y,end_x,end_y\nline,0,0,4,3\nline,4,3,4,0\n"
+            "line,4,0,0,3\nline,0,3,0,0\n");
+  std::string const out = RunInProcess({"check", "-", bow}, kPoints).out;
+  EXPECT_NE(out.find("crossing    THE CONTOUR CROSSES OR TOUCHES ITSELF\n"), std::string::npos);
+  EXPECT_NE(out.find("area        not known"), std::string::npos);
+}
+
+TEST_F(CheckCommand, SaysWhenTheUnitsDiffer) {
+  std::string const contour = Write("c.csv", std::string("# units inch\n") + kContour);
+  EXPECT_EQ(RunInProcess({"check", "-", contour}, kPoints).err,
+            "contour: the points are in mm, the contour in inch: nothing is converted\n");
+}
+
+TEST_F(CheckCommand, RefusesWhatItCannotRead) {
+  std::string const contour = Write("c.csv", kContour);
+  std::string const points = Write("p.csv", kPoints);
+  EXPECT_EQ(RunInProcess({"check", "-", "-"}, kPoints).code, ExitCode::Usage);
+  EXPECT_EQ(RunInProcess({"check", points}).code, ExitCode::Usage);
+  EXPECT_EQ(RunInProcess({"check", points, contour, "--table", points}).code, ExitCode::Usage);
+  EXPECT_EQ(RunInProcess({"check", PathOf("none.csv"), contour}).code, ExitCode::File);
+  EXPECT_EQ(RunInProcess({"check", points, PathOf("none.csv")}).code, ExitCode::File);
+  EXPECT_EQ(RunInProcess({"check", points, points}).code, ExitCode::File);
+  EXPECT_EQ(RunInProcess({"check", points, Write("e.csv", "")}).code, ExitCode::File);
+}
+
+TEST_F(CheckCommand, ContourMayComeFromStandardInputWithItsFormatSaid) {
+  std::string const points = Write("p.csv", kPoints);
+  RunResult const run = RunInProcess({"check", points, "-", "--from", "csv"}, kContour);
+  EXPECT_EQ(run.code, ExitCode::Ok) << run.err;
+}
+
+struct SharedFit {
+  char const* name;
+  char const* option;
+  char const* tolerance;
+};
+
+class CheckOfSharedData : public CheckCommand, public testing::WithParamInterface<SharedFit> {};
+
+double WorstRelative(std::string const& table) {
+  std::istringstream lines(table);
+  std::string line;
+  std::getline(lines, line);
+  double worst = 0.0;
+  while (std::getline(lines, line)) {
+    worst = std::max(worst, std::stod(line.substr(line.rfind(',') + 1)));
+  }
+  return worst;
+}
+
+double LargestRadius(nlohmann::json const& document) {
+  double largest = 0.0;
+  for (auto const& element : document.at("elements")) {
+    largest = std::max(largest, element.value("radius", 0.0));
+  }
+  return largest;
+}
+
+TEST_P(CheckOfSharedData, AgreesWithTheDeviationOfTheFit) {
+  std::optional<std::string> const data = Vorn::Testing::SharedDataFolder();
+  if (!data) GTEST_SKIP() << "VORN_DATA_DIR is not set";
+  SharedFit const& fit = GetParam();
+  std::string const points = *data + "/" + fit.name + ".csv";
+  std::string const contour = PathOf("c.json");
+  RunResult const fitted =
+      RunInProcess({"fit", points, fit.option, fit.tolerance, "--json", contour});
+  ASSERT_EQ(fitted.code, ExitCode::Ok) << fitted.err;
+  auto const document = nlohmann::json::parse(Contents(contour));
+  auto const& deviation = document.at("deviation");
+  double const remeasured = deviation.at("remeasured").at("value").get<double>();
+  RunResult const checked =
+      RunInProcess({"check", points, contour, fit.option, fit.tolerance, "--table", "-"});
+  EXPECT_EQ(checked.code, ExitCode::Ok) << checked.err;
+  double const worst = WorstRelative(checked.out);
+  EXPECT_NEAR(worst, remeasured, 1e-9) << "the JSON file holds the contour exactly";
+  auto const& reported = deviation.at("reported").at("value");
+  if (reported.is_null()) return;  // a full circle, which the program fits by itself
+  // Both measure arcs from their centres, with the rounding of the radius.
+  double const rounding = 4.0 * std::numeric_limits<double>::epsilon() * LargestRadius(document) /
+                          std::stod(fit.tolerance);
+  // A point may lie nearer to a neighbour of the piece that the fit measured it against.
+  EXPECT_LE(worst, reported.get<double>() + 1e-9 + rounding);
+  EXPECT_GT(worst, 0.5 * reported.get<double>());
+}
+
+INSTANTIATE_TEST_SUITE_P(CheckCommand, CheckOfSharedData,
+                         testing::Values(SharedFit{"rail_head_known_arcs", "--tolerance", "0.01"},
+                                         SharedFit{"wheel_worn_a", "--tolerance", "0.03"},
+                                         SharedFit{"rail_worn_low", "--tolerance", "0.025"},
+                                         SharedFit{"mirror_sphere_83m", "--tolerance", "0.00005"},
+                                         SharedFit{"hatch_boundary", "--tolerance", "0.002"},
+                                         SharedFit{"glyph_five", "--tolerance-per-point", "2.0"},
+                                         SharedFit{"test_track_centreline", "--tolerance-per-point",
+                                                   "0.03"},
+                                         SharedFit{"gcode_letter_d", "--tolerance", "0.015"},
+                                         SharedFit{"airfoil_clark_y", "--tolerance", "0.0004"},
+                                         SharedFit{"circle_r3", "--tolerance", "0.001"}),
+                         [](auto const& instance) { return std::string(instance.param.name); });
+
+}  // namespace
+}  // namespace Vorn::Cli
