@@ -27,7 +27,7 @@ What a format keeps:
   json   everything: doubles to the last bit, gaps, units, closed or not
   csv    the same, but for what follows from ends, centre and radius
   dxf    R12; one POLYLINE with bulges, or with --dxf-entities LINE and ARC; units in a comment.
-         Arcs read back to about 1e-14 of the largest coordinate or radius
+         Arcs read back to 2e-15 of the largest coordinate or radius
   gcode  rounded to --gcode-decimals; mm or inch. G1, G2 and G3 with incremental I and J, G0 over
          gaps. Arcs are worked out from the rounded numbers, so that the radii at both ends agree
          within 0.002 mm

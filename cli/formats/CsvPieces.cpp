@@ -126,15 +126,18 @@ class Reader {
   }
 
   void TakeArc() {
-    Piece const arc = MakeArc(PointAt("start"), PointAt("end"), PointAt("center"), Number("radius"),
-                              IsCounterClockwise());
-    if (auto const fault = FaultOf(arc)) Refuse("is no arc: " + *fault);
-    if (!AreEqual(arc.start, arc.end)) {
+    XY const start = PointAt("start");
+    XY const end = PointAt("end");
+    XY const center = PointAt("center");
+    double const radius = Number("radius");
+    bool const isCounterClockwise = IsCounterClockwise();
+    std::vector<Piece> const arcs =
+        AreEqual(start, end)
+            ? MakeCircle(start, center, radius, isCounterClockwise)
+            : std::vector<Piece>{MakeArc(start, end, center, radius, isCounterClockwise)};
+    for (Piece const& arc : arcs) {
+      if (auto const fault = FaultOf(arc)) Refuse("is no arc: " + *fault);
       contour_.pieces.push_back(arc);
-      return;
-    }
-    for (Piece const& half : MakeCircle(arc.start, arc.center, arc.radius, arc.counterClockwise)) {
-      contour_.pieces.push_back(half);
     }
   }
 

@@ -15,7 +15,7 @@ enum class DxfStyle {
 /// The contour as DXF R12 (AC1009). A gap ends one POLYLINE and begins another; the closed flag is
 /// theirs (70 = 1) and lost with separate entities unless the ends meet. Units stand in a comment
 /// (999), since R12 has no other place for them. Bulges and degrees are rounded once more than the
-/// coordinates, so arcs read back to about 1e-14 of the largest coordinate or radius. Arcs of more
+/// coordinates, so arcs read back to 2e-15 of the largest coordinate or radius. Arcs of more
 /// than 315 degrees are written in two halves.
 std::string ToDxf(ContourFile const& contour, DxfStyle style = DxfStyle::Polyline);
 

@@ -116,11 +116,10 @@ Stretch LightPolylineOf(Entity const& entity) {
     if (group.code == 20) vertices.back().at.y = entity.NumberOf(group);
     if (group.code == 42) vertices.back().bulge = entity.NumberOf(group);
   }
-  auto const stated = static_cast<std::size_t>(
-      entity.FlagsOr(90, static_cast<int>(std::min<std::size_t>(vertices.size(), 32767))));
-  if (stated != vertices.size() && vertices.size() <= 32767) {
-    entity.Refuse("has " + Counted(vertices.size(), "vertex") + " and says " +
-                  std::to_string(stated));
+  auto const count = static_cast<double>(vertices.size());
+  double const stated = entity.NumberOr(90, count);
+  if (stated != count) {
+    entity.Refuse("has " + FormatExact(count) + " vertices and says " + FormatExact(stated));
   }
   return PolylineOf(entity, vertices, (entity.FlagsOr(70, 0) & kIsClosed) != 0);
 }

@@ -120,6 +120,7 @@ class ToolPath {
     if (rise < step_ / 2.0) return false;
     XY const way = WayToCenter(arc, to);
     double const radius = std::hypot(way.x, way.y);
+    if (radius == 0.0) return false;
     Piece const written =
         MakeArc(at_, to, {at_.x + way.x, at_.y + way.y}, radius, arc.counterClockwise);
     // Rounding can carry the end of a tiny arc past its start, and the machine would go all the

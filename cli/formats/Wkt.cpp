@@ -50,14 +50,15 @@ std::string CurveOf(std::vector<Piece> const& run, XY const& end) {
   return text + ")";
 }
 
-/// The arc through three points. The bulge follows from the angle under which the middle one sees
-/// the other two.
-Piece ThroughPoints(XY const& start, XY const& middle, XY const& end) {
+/// The arc through three points; nothing when the middle one lies in a row with the ends, but not
+/// between them. The bulge follows from the angle under which it sees them.
+std::optional<Piece> ThroughPoints(XY const& start, XY const& middle, XY const& end) {
   XY const a = {start.x - middle.x, start.y - middle.y};
   XY const b = {end.x - middle.x, end.y - middle.y};
   double const cross = a.x * b.y - a.y * b.x;
   double const dot = a.x * b.x + a.y * b.y;
   double const lengths = Distance(start, middle) * Distance(end, middle);
+  if (cross == 0.0 && dot > 0.0) return {};
   return MakeBulge(start, end, -cross / (lengths - dot));
 }
 
@@ -236,7 +237,11 @@ class Reader {
   /// An arc that ends where it starts is a full circle with the middle point opposite.
   void TakeArc(XY const& start, XY const& middle, XY const& end) {
     if (!AreEqual(start, end)) {
-      pieces_.push_back(ThroughPoints(start, middle, end));
+      std::optional<Piece> const arc = ThroughPoints(start, middle, end);
+      if (!arc) {
+        RefuseList("the middle point of an arc lies in a row with its ends, but not between them");
+      }
+      pieces_.push_back(*arc);
       return;
     }
     if (AreEqual(start, middle)) RefuseList("the three points of an arc are one");
