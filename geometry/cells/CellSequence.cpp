@@ -1,8 +1,10 @@
 #include "geometry/cells/CellSequence.h"
 
+#include <algorithm>
 #include <bit>
 #include <cmath>
 #include <cstring>
+#include <utility>
 
 #include "geometry/cells/SequenceSum.h"
 #include "geometry/cells/TriangleCentre.h"
@@ -20,17 +22,18 @@ bool AreIdentical(Triangle const& a, Triangle const& b) {
   return std::memcmp(&a, &b, sizeof(Triangle)) == 0;
 }
 
-/// Multiplies and folds the words of a triangle; by the constant of Fibonacci hashing, 2^64 over
-/// the golden ratio.
-std::size_t HashOf(Triangle const& triangle) {
-  std::uint64_t hash = 0;
-  for (Point const& p : triangle.pts) {
-    for (double const coordinate : {p.x, p.y}) {
-      hash = (std::rotl(hash, 5) ^ std::bit_cast<std::uint64_t>(coordinate)) *
-             std::uint64_t{0x9E3779B97F4A7C15};
-    }
-  }
-  return static_cast<std::size_t>(hash ^ (hash >> 32));
+/// Multiplies and folds the words of a triangle, each by itself so that no product waits for the
+/// one before; the odd constants are arbitrary.
+std::uint32_t HashOf(Triangle const& triangle) {
+  auto const word = [](double coordinate, std::uint64_t factor) {
+    return std::bit_cast<std::uint64_t>(coordinate) * factor;
+  };
+  Point const* const pts = triangle.pts;
+  std::uint64_t const hash =
+      (word(pts[0].x, 0x9E3779B97F4A7C15) ^ word(pts[0].y, 0xC2B2AE3D27D4EB4F)) +
+      (word(pts[1].x, 0x165667B19E3779F9) ^ word(pts[1].y, 0xD6E8FEB86659FD93)) +
+      (word(pts[2].x, 0xA0761D6478BD642F) ^ word(pts[2].y, 0xE7037ED1A0B428DB));
+  return static_cast<std::uint32_t>(hash >> 32);
 }
 
 }  // namespace
@@ -38,9 +41,10 @@ std::size_t HashOf(Triangle const& triangle) {
 class CellSequence::LevelBuilder {
  public:
   /// For the overlaps of a level's letters, each of which occurs as often as `counts` says.
-  explicit LevelBuilder(std::vector<std::size_t> const& counts) : counts_(counts) {
+  explicit LevelBuilder(std::vector<std::size_t> const& counts)
+      : counts_(counts), slots_(std::bit_ceil(kSlotsPerLetter * counts.size())) {
     level_.words.ends.reserve(counts.size());
-    level_.shapes.reserve(2 * counts.size());
+    level_.triangles.reserve(2 * counts.size());
   }
 
   void AddToWord(Triangle const& triangle) {
@@ -59,45 +63,61 @@ class CellSequence::LevelBuilder {
 
  private:
   static constexpr std::uint32_t kFree = UINT32_MAX;
-  static constexpr std::size_t kFirstTableSize = 64;
+  /// Most levels have less than twice as many letters as the one before.
+  static constexpr std::size_t kSlotsPerLetter = 4;
+
+  /// A letter and the hash of its triangle.
+  struct Slot {
+    std::uint32_t letter = kFree;
+    std::uint32_t hash = 0;
+  };
 
   std::uint32_t LetterOf(Triangle const& triangle) {
     // Copies follow each other.
     if (!level_.words.letters.empty()) {
       std::uint32_t const previous = level_.words.letters.back();
-      if (AreIdentical(level_.shapes[previous].triangle, triangle)) return previous;
+      if (AreIdentical(level_.triangles[previous].triangle, triangle)) return previous;
     }
-    if (level_.shapes.size() * 2 >= table_.size()) Enlarge();
-    std::uint32_t& slot = table_[SlotOf(triangle)];
-    if (slot == kFree) {
-      slot = static_cast<std::uint32_t>(level_.shapes.size());
-      level_.shapes.emplace_back(triangle);
+    if (level_.triangles.size() * 2 >= slots_.size()) Enlarge();
+    std::uint32_t const hash = HashOf(triangle);
+    Slot& slot = SlotOf(triangle, hash);
+    if (slot.letter == kFree) {
+      slot = {static_cast<std::uint32_t>(level_.triangles.size()), hash};
+      level_.triangles.emplace_back(triangle);
+      level_.magnitude.Include(triangle);
       level_.counts.push_back(0);
     }
-    return slot;
+    return slot.letter;
   }
 
   /// Where the triangle stands in the table, or where it belongs.
-  std::size_t SlotOf(Triangle const& triangle) const {
-    std::size_t const mask = table_.size() - 1;
-    std::size_t at = HashOf(triangle) & mask;
-    while (table_[at] != kFree && !AreIdentical(level_.shapes[table_[at]].triangle, triangle)) {
+  Slot& SlotOf(Triangle const& triangle, std::uint32_t hash) {
+    std::size_t const mask = slots_.size() - 1;
+    std::size_t at = hash & mask;
+    while (slots_[at].letter != kFree &&
+           !(slots_[at].hash == hash &&
+             AreIdentical(level_.triangles[slots_[at].letter].triangle, triangle))) {
       at = (at + 1) & mask;
     }
-    return at;
+    return slots_[at];
   }
 
   void Enlarge() {
-    table_.assign(table_.empty() ? kFirstTableSize : table_.size() * 2, kFree);
-    for (std::uint32_t letter = 0; letter < level_.shapes.size(); ++letter) {
-      table_[SlotOf(level_.shapes[letter].triangle)] = letter;
+    std::vector<Slot> const old = std::move(slots_);
+    slots_.assign(old.size() * 2, {});
+    std::size_t const mask = slots_.size() - 1;
+    for (Slot const& slot : old) {
+      if (slot.letter == kFree) continue;
+      std::size_t at = slot.hash & mask;
+      while (slots_[at].letter != kFree) at = (at + 1) & mask;
+      slots_[at] = slot;
     }
   }
 
   std::vector<std::size_t> const& counts_;
   Level level_;
-  /// Letters by the hash of their triangle; a power of two of slots, at most half of them taken.
-  std::vector<std::uint32_t> table_;
+  /// Letters by hash; a power of two of slots, at most half of them taken.
+  std::vector<Slot> slots_;
 };
 
 CellSequence::CellSequence(std::span<Triangle const> triangles) {
@@ -110,16 +130,16 @@ CellSequence::CellSequence(std::span<Triangle const> triangles) {
 
 void CellSequence::NarrowBy(std::span<Triangle const> other) {
   if (levels_.empty()) return;
-  std::vector<Shape> otherShapes;
-  otherShapes.reserve(other.size());
-  for (Triangle const& triangle : other) otherShapes.emplace_back(triangle);
-
   Level const& last = levels_.back();
+  std::vector<Cutter> cutters;
+  cutters.reserve(other.size());
+  for (Triangle const& triangle : other) cutters.emplace_back(triangle, last.magnitude);
+
   LevelBuilder builder(last.counts);
   Overlap overlap;
-  for (Shape const& shape : last.shapes) {
-    for (Shape const& otherShape : otherShapes) {
-      FindOverlap(shape, otherShape, &overlap);
+  for (BoxedTriangle const& boxed : last.triangles) {
+    for (Cutter const& cutter : cutters) {
+      cutter.FindOverlapWith(boxed, &overlap);
       for (Triangle const& part : overlap.parts) builder.AddToWord(part);
     }
     builder.EndWord();
@@ -127,12 +147,26 @@ void CellSequence::NarrowBy(std::span<Triangle const> other) {
   levels_.push_back(builder.Take());
 }
 
+bool CellSequence::Overlaps(std::span<Triangle const> other) const {
+  if (levels_.empty()) return false;
+  Level const& last = levels_.back();
+  Overlap overlap;
+  for (Triangle const& triangle : other) {
+    Cutter const cutter(triangle, last.magnitude);
+    for (BoxedTriangle const& boxed : last.triangles) {
+      cutter.FindOverlapWith(boxed, &overlap);
+      if (!overlap.parts.empty()) return true;
+    }
+  }
+  return false;
+}
+
 /// What GetOverlapping gives for a candidate and this cell, as a further level.
 CellSequence::Level CellSequence::OverlapWith(Shape const& candidate) const {
   LevelBuilder builder(levels_.back().counts);
   Overlap overlap;
-  for (Shape const& shape : levels_.back().shapes) {
-    FindOverlap(candidate, shape, &overlap);
+  for (BoxedTriangle const& boxed : levels_.back().triangles) {
+    FindOverlap(candidate, Shape(boxed.triangle), &overlap);
     for (Triangle const& part : overlap.parts) builder.AddToWord(part);
     builder.EndWord();
   }
@@ -143,11 +177,11 @@ bool CellSequence::BoundingRect(double* rect) const {
   if (empty()) return false;
   // Letters stand in the order in which they first occur, so the first of equal extremes is the
   // same as in a run over all copies.
-  std::vector<Shape> const& shapes = levels_.back().shapes;
-  Point const& first = shapes.front().triangle.pts[0];
+  std::vector<BoxedTriangle> const& triangles = levels_.back().triangles;
+  Point const& first = triangles.front().triangle.pts[0];
   rect[0] = rect[2] = first.x;
   rect[1] = rect[3] = first.y;
-  for (Shape const& shape : shapes) ExtendRect(shape.triangle, rect);
+  for (BoxedTriangle const& boxed : triangles) ExtendRect(boxed.triangle, rect);
   return true;
 }
 
@@ -166,7 +200,7 @@ bool CellSequence::CenterWith(Level const* last, Point* center) const {
   if (last != nullptr) chain.push_back(&last->words);
   Level const& leaves = last != nullptr ? *last : levels_.back();
 
-  std::size_t const letters = leaves.shapes.size();
+  std::size_t const letters = leaves.triangles.size();
   std::vector<double> areas(letters);
   std::vector<double> weightedX(letters);
   std::vector<double> weightedY(letters);
@@ -177,7 +211,7 @@ bool CellSequence::CenterWith(Level const* last, Point* center) const {
   std::size_t degenerateCount = 0;
   bool isAnyProper = false;
   for (std::size_t letter = 0; letter < letters; ++letter) {
-    TriangleCentre const own(leaves.shapes[letter].triangle);
+    TriangleCentre const own(leaves.triangles[letter].triangle);
     areas[letter] = own.area;
     ownX[letter] = own.center.x;
     ownY[letter] = own.center.y;
@@ -219,7 +253,7 @@ std::vector<Triangle> CellSequence::Expand() const {
   std::vector<Triangle> triangles;
   triangles.reserve(letters.size());
   for (std::uint32_t const letter : letters) {
-    triangles.push_back(levels_.back().shapes[letter].triangle);
+    triangles.push_back(levels_.back().triangles[letter].triangle);
   }
   return triangles;
 }

@@ -5,7 +5,7 @@
 #include <span>
 #include <vector>
 
-#include "geometry/cells/TriangleOverlap.h"
+#include "geometry/cells/Cutter.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn::Cells {
@@ -38,6 +38,9 @@ class CellSequence {
   /// Replaces every triangle by its overlaps with the triangles of another cell, in order.
   void NarrowBy(std::span<GeometryUtils::Triangle const> other);
 
+  /// Whether narrowing by another cell would leave anything.
+  bool Overlaps(std::span<GeometryUtils::Triangle const> other) const;
+
   /// How often the cell has been narrowed, plus one.
   std::size_t Depth() const { return levels_.size(); }
 
@@ -68,7 +71,8 @@ class CellSequence {
  private:
   struct Level {
     Words words;
-    std::vector<Shape> shapes;
+    std::vector<BoxedTriangle> triangles;
+    Magnitude magnitude;
     /// How often each letter occurs in the sequence.
     std::vector<std::size_t> counts;
     std::size_t size = 0;

@@ -101,37 +101,6 @@ Intersections::SegmentPair PairOfSides(Side const& side, Side const& other) {
           other.start.x, other.start.y, other.end.x, other.end.y};
 }
 
-/// Appends what lies on side i of the first triangle.
-void CollectOnSide(Side const& side, int i, Shape const& first, Shape const& second,
-                   Cells::CrossingPoints* points) {
-  auto const distance2 = DistanceFromStartOf(side);
-  bool const areOrdered = first.isOrdered && second.isOrdered;
-  std::optional<CrossingPoint> held;
-  for (int j = 0; j < 3; ++j) {
-    if (areOrdered && !MayMeet(first, i, second, j)) continue;
-    Side const other{second.triangle.pts[j], second.triangle.pts[(j + 1) % 3]};
-    CrossingPoint found{{}, i, j};
-    SegmentsRelPosition const relation =
-        Intersections::IntersectSegments(PairOfSides(side, other), &found.pt.x, &found.pt.y);
-    if (relation == SegmentsRelPosition::Intersecting) {
-      if (held) {
-        AppendByDistance(*held, found, distance2, points);
-        held.reset();
-      } else {
-        held = found;
-      }
-    } else if (relation == SegmentsRelPosition::Collinear) {
-      if (std::optional<Stretch> const shared = SharedStretch(side, other)) {
-        AppendByDistance(CrossingPoint{shared->low, i, j}, CrossingPoint{shared->high, i, j},
-                         distance2, points);
-        // Deliberate: the ends of the stretch stand for the point that was held.
-        held.reset();
-      }
-    }
-  }
-  if (held) points->push_back(*held);
-}
-
 /// Of the records from `begin` on, more than a line can cross since sides that touch at vertices
 /// report them twice, keeps the two points farthest apart.
 void KeepFarthestTwo(Side const& side, int i, std::size_t begin, Cells::CrossingPoints* points) {
@@ -156,6 +125,53 @@ void KeepFarthestTwo(Side const& side, int i, std::size_t begin, Cells::Crossing
   points->resize(begin);
   AppendByDistance(fromM, fromN, DistanceFromStartOf(side), points);
 }
+
+/// Collects what lies on side i of the first triangle.
+class SideCollector {
+ public:
+  SideCollector(Triangle const& first, int i, Triangle const& second, Cells::CrossingPoints* points)
+      : side_{first.pts[i], first.pts[(i + 1) % 3]},
+        i_(i),
+        second_(second),
+        points_(*points),
+        begin_(points->size()) {}
+
+  /// Takes side j of the second triangle.
+  void Take(int j) {
+    Side const other{second_.pts[j], second_.pts[(j + 1) % 3]};
+    CrossingPoint found{{}, i_, j};
+    SegmentsRelPosition const relation =
+        Intersections::IntersectSegments(PairOfSides(side_, other), &found.pt.x, &found.pt.y);
+    if (relation == SegmentsRelPosition::Intersecting) {
+      if (held_) {
+        AppendByDistance(*held_, found, DistanceFromStartOf(side_), &points_);
+        held_.reset();
+      } else {
+        held_ = found;
+      }
+    } else if (relation == SegmentsRelPosition::Collinear) {
+      if (std::optional<Stretch> const shared = SharedStretch(side_, other)) {
+        AppendByDistance(CrossingPoint{shared->low, i_, j}, CrossingPoint{shared->high, i_, j},
+                         DistanceFromStartOf(side_), &points_);
+        // Deliberate: the ends of the stretch stand for the point that was held.
+        held_.reset();
+      }
+    }
+  }
+
+  void Finish() {
+    if (held_) points_.push_back(*held_);
+    if (points_.size() - begin_ >= 3) KeepFarthestTwo(side_, i_, begin_, &points_);
+  }
+
+ private:
+  Side const side_;
+  int const i_;
+  Triangle const& second_;
+  Cells::CrossingPoints& points_;
+  std::size_t const begin_;
+  std::optional<CrossingPoint> held_;
+};
 
 }  // namespace
 
@@ -190,11 +206,26 @@ bool GeometryUtils::GetCrossingPoints(Triangle const& first, int startSide, Tria
 }
 
 void Cells::FindCrossingPoints(Shape const& first, Shape const& second, CrossingPoints* points) {
+  bool const areOrdered = first.isOrdered && second.isOrdered;
   for (int i = 0; i < 3; ++i) {
-    Side const side{first.triangle.pts[i], first.triangle.pts[(i + 1) % 3]};
-    std::size_t const begin = points->size();
-    CollectOnSide(side, i, first, second, points);
-    if (points->size() - begin >= 3) KeepFarthestTwo(side, i, begin, points);
+    SideCollector collector(first.triangle, i, second.triangle, points);
+    for (int j = 0; j < 3; ++j) {
+      if (!areOrdered || MayMeet(first, i, second, j)) collector.Take(j);
+    }
+    collector.Finish();
+  }
+}
+
+void Cells::FindCrossingPoints(Triangle const& first, Triangle const& second, unsigned mayCross,
+                               CrossingPoints* points) {
+  for (int i = 0; i < 3; ++i) {
+    unsigned const sides = mayCross >> (3 * i) & 7U;
+    if (sides == 0) continue;
+    SideCollector collector(first, i, second, points);
+    for (int j = 0; j < 3; ++j) {
+      if ((sides >> j & 1U) != 0) collector.Take(j);
+    }
+    collector.Finish();
   }
 }
 

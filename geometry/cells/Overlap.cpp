@@ -13,7 +13,6 @@
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
-
 namespace {
 
 using Cells::CrossingPoints;
@@ -130,7 +129,7 @@ class BoundaryWalk {
 };
 
 /// The overlap of two triangles whose sides do not cross: one of them, or nothing.
-void FindContained(Shape const& first, Shape const& second, VertexStatuses const& statuses,
+void FindContained(Triangle const& first, Triangle const& second, VertexStatuses const& statuses,
                    Cells::Overlap* overlap) {
   int const firstIn = CountInOrOn(statuses[0]);
   int const secondIn = CountInOrOn(statuses[1]);
@@ -140,8 +139,24 @@ void FindContained(Shape const& first, Shape const& second, VertexStatuses const
     return;
   }
   // Deliberate: three copies. They weigh in the centre of the cell and in its size.
-  Triangle const& contained = firstIn == 3 ? first.triangle : second.triangle;
+  Triangle const& contained = firstIn == 3 ? first : second;
   for (int copy = 0; copy < 3; ++copy) overlap->parts.push_back(contained);
+  overlap->status = OverlappingStatus::Overlap;
+}
+
+/// The overlap of two triangles whose boxes meet.
+void FindCommonPart(Triangle const& first, Triangle const& second, VertexStatuses const& statuses,
+                    CrossingPoints const& crossings, Cells::Overlap* overlap) {
+  if (crossings.empty()) {
+    FindContained(first, second, statuses, overlap);
+    return;
+  }
+  std::array<Triangle const*, 2> const triangles = {&first, &second};
+  BoundaryWalk walk(triangles, statuses, crossings);
+  Polygon& polygon = walk.Walk();
+  if (polygon.size() < 3) return;
+  Cells::CutEars(polygon.data(), static_cast<int>(polygon.size()),
+                 [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });
   overlap->status = OverlappingStatus::Overlap;
 }
 
@@ -164,17 +179,28 @@ void Cells::FindOverlap(Shape const& first, Shape const& second, Overlap* overla
   }
   CrossingPoints crossings;
   FindCrossingPoints(first, second, &crossings);
-  if (crossings.empty()) {
-    FindContained(first, second, statuses, overlap);
+  FindCommonPart(first.triangle, second.triangle, statuses, crossings, overlap);
+}
+
+void Cells::FindOverlap(BoxedTriangle const& first, Shape const& second, Sight const& sight,
+                        Overlap* overlap) {
+  overlap->status = OverlappingStatus::NoOverlap;
+  overlap->parts.clear();
+  VertexStatuses statuses;
+  for (std::size_t v = 0; v < 3; ++v) {
+    bool const isInside = (sight.inside >> v & 1U) != 0;
+    statuses[0][v] = isInside ? PointStatus::Inside : PointStatus::Outside;
+    Point const& vertex = second.triangle.pts[v];
+    statuses[1][v] =
+        first.IsOutOfBox(vertex) ? PointStatus::Outside : Shape(first.triangle).StatusOf(vertex);
+  }
+  if (HasUndefined(statuses)) {
+    overlap->status = OverlappingStatus::OverlapFailed;
     return;
   }
-  std::array<Triangle const*, 2> const triangles = {&first.triangle, &second.triangle};
-  BoundaryWalk walk(triangles, statuses, crossings);
-  Polygon& polygon = walk.Walk();
-  if (polygon.size() < 3) return;
-  CutEars(polygon.data(), static_cast<int>(polygon.size()),
-          [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });
-  overlap->status = OverlappingStatus::Overlap;
+  CrossingPoints crossings;
+  FindCrossingPoints(first.triangle, second.triangle, sight.mayCross, &crossings);
+  FindCommonPart(first.triangle, second.triangle, statuses, crossings, overlap);
 }
 
 GeometryUtils::OverlappingStatus GeometryUtils::GetOverlapping(Triangle const& first,

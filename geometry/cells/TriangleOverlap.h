@@ -35,6 +35,19 @@ class InlineVector {
   std::size_t size_ = 0;
 };
 
+/// A triangle with its box.
+struct BoxedTriangle {
+  explicit BoxedTriangle(GeometryUtils::Triangle const& from);
+
+  /// Whether a point is beyond the box. False when a coordinate is not a number.
+  bool IsOutOfBox(GeometryUtils::Point const& p) const {
+    return (xMin > p.x) | (p.x > xMax) | (yMin > p.y) | (p.y > yMax);
+  }
+
+  GeometryUtils::Triangle triangle;
+  double xMin, yMin, xMax, yMax;
+};
+
 /// A triangle with what every overlap asks of it.
 struct Shape {
   explicit Shape(GeometryUtils::Triangle const& from);
@@ -69,15 +82,31 @@ struct Shape {
                                              double const* areas) const;
 };
 
-/// What two triangles have in common. A walk takes at most four points on each of three sides,
-/// twelve in all, and those make at most ten triangles.
+/// How many triangles an overlap can have: a walk takes at most four points on each of three sides,
+/// and twelve points make ten triangles.
+inline constexpr std::size_t kMostParts = 10;
+
+/// What two triangles have in common.
 struct Overlap {
   GeometryUtils::OverlappingStatus status = GeometryUtils::OverlappingStatus::NoOverlap;
-  InlineVector<GeometryUtils::Triangle, 10> parts;
+  InlineVector<GeometryUtils::Triangle, kMostParts> parts;
+};
+
+/// What is known beforehand of two triangles: each vertex of the first is inside or outside the
+/// second, and which sides may cross.
+struct Sight {
+  /// Bit v: vertex v of the first triangle is inside the second one, otherwise outside.
+  unsigned inside = 0;
+  /// Bit 3 i + j: side i of the first may cross side j of the second; the other sides do not.
+  unsigned mayCross = 0;
 };
 
 /// The same triangles in the same order as GetOverlapping.
 void FindOverlap(Shape const& first, Shape const& second, Overlap* overlap);
+
+/// The same, with less left to find out.
+void FindOverlap(BoxedTriangle const& first, Shape const& second, Sight const& sight,
+                 Overlap* overlap);
 
 /// On one side at most three crossings and three shared stretches of two ends each are found, of
 /// which two stay.
@@ -86,5 +115,9 @@ using CrossingPoints = InlineVector<GeometryUtils::CrossingPoint, 12>;
 /// Where the sides of one triangle cross those of another, by side of the first and along a side
 /// by distance from its start: at most two points a side.
 void FindCrossingPoints(Shape const& first, Shape const& second, CrossingPoints* points);
+
+/// The same when only sides with a bit in `mayCross` need be looked at.
+void FindCrossingPoints(GeometryUtils::Triangle const& first, GeometryUtils::Triangle const& second,
+                        unsigned mayCross, CrossingPoints* points);
 
 }  // namespace Vorn::Cells

@@ -99,6 +99,11 @@ Cells::Shape::Shape(Triangle const& from) : triangle(from) {
   isOrdered = !std::isnan(sum);
 }
 
+Cells::BoxedTriangle::BoxedTriangle(Triangle const& from) : triangle(from) {
+  Span(from.pts[0].x, from.pts[1].x, from.pts[2].x, &xMin, &xMax);
+  Span(from.pts[0].y, from.pts[1].y, from.pts[2].y, &yMin, &yMax);
+}
+
 PointStatus Cells::Shape::StatusOf(Point const& p) const {
   if (xMin > p.x || p.x > xMax || yMin > p.y || p.y > yMax) return PointStatus::Outside;
   double fromVertex[3];

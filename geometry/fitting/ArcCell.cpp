@@ -9,9 +9,56 @@ namespace Vorn {
 using Fitting::At;
 using Fitting::ToPoint;
 
-ArcCellBuilder::ArcCellBuilder(Fitting::ArcRun const& run, bool ccw,
+namespace {
+
+bool IsOversized(std::size_t cellSize) {
+  return Fitting::IsOversized(cellSize, Fitting::kArcCellWeight);
+}
+
+}  // namespace
+
+/// A leading triple, if any, then the triples of every step and their mirror images, but for those
+/// whose samples have all been used before.
+class ArcCellBuilder::Triples {
+ public:
+  Triples(std::size_t sampleCount, bool isLed)
+      : size_(static_cast<int>(sampleCount)), used_(sampleCount), isLeading_(isLed) {}
+
+  /// Goes on to the next triple. False when there is none.
+  bool Next() {
+    if (isLeading_) {
+      isLeading_ = false;
+      triple_ = {0, (size_ - 1) / 2, size_ - 1};
+      used_.Mark(triple_);
+      return true;
+    }
+    for (;;) {
+      if (mirror_ == 1) ++step_;
+      mirror_ = 1 - mirror_;
+      if (step_ > (size_ - 1) / 2) return false;
+      GeometryUtils::GetTriPointIndices(step_, size_, mirror_, &triple_.i0, &triple_.i1,
+                                        &triple_.i2);
+      if (used_.Mark(triple_)) return true;
+    }
+  }
+
+  Fitting::Triple const& Current() const { return triple_; }
+
+  /// Zero for a leading triple.
+  int Step() const { return step_; }
+
+ private:
+  int const size_;
+  Fitting::UsedSamples used_;
+  bool isLeading_;
+  int step_ = 0;
+  int mirror_ = 1;
+  Fitting::Triple triple_{};
+};
+
+ArcCellBuilder::ArcCellBuilder(Fitting::ArcRun const& run, bool ccw, AfterFailure afterFailure,
                                std::vector<IndexedPoint>* samples, Cells::CellSequence* cell)
-    : run_(run), ccw_(ccw), samples_(*samples), cell_(*cell) {}
+    : run_(run), ccw_(ccw), afterFailure_(afterFailure), samples_(*samples), cell_(*cell) {}
 
 void ArcCellBuilder::CollectSamples() {
   if (samples_.empty()) {
@@ -42,29 +89,42 @@ ArcCellBuilder::IndexedPoint ArcCellBuilder::SampleOf(std::int32_t index) const 
 
 ErrorCode ArcCellBuilder::RunPass(bool isLed, bool isGuarded, bool* hasThinned) {
   cell_.clear();
-  bool isFirstCell = true;
-  int const size = static_cast<int>(samples_.size());
-  Fitting::UsedSamples used(samples_.size());
-  if (isLed) {
-    Fitting::Triple const spanning{0, (size - 1) / 2, size - 1};
-    used.Mark(spanning);
-    ErrorCode const code = NarrowBy(spanning, &isFirstCell);
-    if (code != ErrorCode::Ok) return code;
-  }
-  for (int step = 1; step <= (size - 1) / 2; ++step) {
-    for (int mirror = 0; mirror < 2; ++mirror) {
-      Fitting::Triple triple{};
-      GeometryUtils::GetTriPointIndices(step, size, mirror, &triple.i0, &triple.i1, &triple.i2);
-      if (!used.Mark(triple)) continue;
-      ErrorCode const code = NarrowBy(triple, &isFirstCell);
-      if (code != ErrorCode::Ok) return code;
-      if (isGuarded && Fitting::IsOversized(cell_.size(), Fitting::kArcCellWeight)) {
-        *hasThinned = true;
-        return Thin(step);
-      }
+  Triples triples(samples_.size(), isLed);
+  if (!triples.Next()) return ErrorCode::Ok;
+  std::vector<Triangle> tripleCell;
+  ErrorCode code = CellOf(triples.Current(), &tripleCell);
+  if (code != ErrorCode::Ok) return code;
+
+  // Always one cell ahead: most tries over points that hardly bend end at a triple without a cell,
+  // and there the narrowing before, the most expensive one, would be in vain.
+  std::vector<Triangle> nextCell;
+  for (bool isFirst = true;; isFirst = false) {
+    int const step = triples.Step();
+    bool const isLast = !triples.Next();
+    nextCell.clear();
+    if (!isLast) code = CellOf(triples.Current(), &nextCell);
+    if (isFirst) {
+      cell_ = Cells::CellSequence(tripleCell);
+    } else {
+      bool const endsHere = code != ErrorCode::Ok && afterFailure_ == AfterFailure::NoCell;
+      if (endsHere && StaysUsable(tripleCell, isGuarded)) return code;
+      cell_.NarrowBy(tripleCell);
+      if (cell_.empty()) return ErrorCode::NoFit;
     }
+    bool const isLeading = step == 0;
+    if (!isLeading && isGuarded && IsOversized(cell_.size())) {
+      *hasThinned = true;
+      return Thin(step);
+    }
+    if (isLast || code != ErrorCode::Ok) return code;
+    tripleCell.swap(nextCell);
   }
-  return ErrorCode::Ok;
+}
+
+bool ArcCellBuilder::StaysUsable(std::vector<Triangle> const& tripleCell, bool isGuarded) const {
+  std::size_t const mostTriangles = cell_.size() * tripleCell.size() * Cells::kMostParts;
+  bool const staysSmall = !isGuarded || !IsOversized(mostTriangles);
+  return staysSmall && cell_.Overlaps(tripleCell);
 }
 
 ErrorCode ArcCellBuilder::Thin(int steps) {
@@ -73,19 +133,6 @@ ErrorCode ArcCellBuilder::Thin(int steps) {
   ErrorCode const code = Fitting::ThinSamples(run_, centre, steps, ccw_, &samples_);
   if (code == ErrorCode::Ok) cell_.clear();
   return code;
-}
-
-ErrorCode ArcCellBuilder::NarrowBy(Fitting::Triple const& triple, bool* isFirstCell) {
-  tripleCell_.clear();
-  ErrorCode const code = CellOf(triple, &tripleCell_);
-  if (code != ErrorCode::Ok) return code;
-  if (*isFirstCell) {
-    *isFirstCell = false;
-    cell_ = Cells::CellSequence(tripleCell_);
-    return ErrorCode::Ok;
-  }
-  cell_.NarrowBy(tripleCell_);
-  return cell_.empty() ? ErrorCode::NoFit : ErrorCode::Ok;
 }
 
 ErrorCode ArcCellBuilder::CellOf(Fitting::Triple const& triple, std::vector<Triangle>* cell) const {

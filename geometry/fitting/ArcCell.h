@@ -20,8 +20,11 @@ class ArcCellBuilder {
   using IndexedPoint = GeometryUtils::IndexedPoint;
   using Triangle = GeometryUtils::Triangle;
 
-  ArcCellBuilder(Fitting::ArcRun const& run, bool ccw, std::vector<IndexedPoint>* samples,
-                 Cells::CellSequence* cell);
+  /// What is asked for when no cell comes about: what the cell was until then, or nothing of it.
+  enum class AfterFailure { KeepCell, NoCell };
+
+  ArcCellBuilder(Fitting::ArcRun const& run, bool ccw, AfterFailure afterFailure,
+                 std::vector<IndexedPoint>* samples, Cells::CellSequence* cell);
 
   /// Takes up every point of the run, or, when the samples of a shorter run over the same start are
   /// at hand, these with the new ends.
@@ -34,19 +37,22 @@ class ArcCellBuilder {
   ErrorCode Build();
 
  private:
+  /// The triples of one pass, in order.
+  class Triples;
+
   IndexedPoint SampleOf(std::int32_t index) const;
   ErrorCode RunPass(bool isLed, bool isGuarded, bool* hasThinned);
   ErrorCode Thin(int steps);
-  /// Overlaps the cell with that of one triple.
-  ErrorCode NarrowBy(Fitting::Triple const& triple, bool* isFirstCell);
+  /// Whether the cell, overlapped with that of one triple, surely is neither empty nor oversized.
+  bool StaysUsable(std::vector<Triangle> const& tripleCell, bool isGuarded) const;
   ErrorCode CellOf(Fitting::Triple const& triple, std::vector<Triangle>* cell) const;
   double ToleranceAt(int position) const;
 
   Fitting::ArcRun const& run_;
   bool const ccw_;
+  AfterFailure const afterFailure_;
   std::vector<IndexedPoint>& samples_;
   Cells::CellSequence& cell_;
-  std::vector<Triangle> tripleCell_;
 };
 
 }  // namespace Vorn

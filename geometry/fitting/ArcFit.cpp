@@ -7,7 +7,6 @@
 #include <cmath>
 #include <cstddef>
 
-#include "geometry/fitting/ArcCell.h"
 #include "geometry/fitting/Runs.h"
 
 namespace Vorn {
@@ -30,7 +29,7 @@ ErrorCode ArcFit::Fit(Fitting::ArcRun const& run, std::vector<GeometryUtils::Ind
     return ErrorCode::Failed;
   }
   hasBuiltCell_ = true;
-  ArcCellBuilder builder(run, found.ccw, samples, cell);
+  ArcCellBuilder builder(run, found.ccw, afterFailure_, samples, cell);
   builder.CollectSamples();
   ErrorCode const built = builder.Build();
   if (built != ErrorCode::Ok) return built;
@@ -109,7 +108,7 @@ ErrorCode GeometryUtils::GetFittingCircleO(std::vector<WPoint> const& points, st
                                            Point* centre, double* radius, bool* ccw,
                                            double* deviation, std::int32_t* deviationIndex) {
   *deviationIndex = -1;
-  ArcFit fit;
+  ArcFit fit(cells != nullptr ? ArcFit::AfterFailure::KeepCell : ArcFit::AfterFailure::NoCell);
   ArcFit::Arc arc;
   Cells::CellSequence cell;
   ErrorCode const code = fit.Fit({points, first, count, startFixed, *start, endFixed, *end},

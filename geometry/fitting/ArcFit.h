@@ -4,6 +4,7 @@
 #include <vector>
 
 #include "geometry/cells/CellSequence.h"
+#include "geometry/fitting/ArcCell.h"
 #include "geometry/fitting/SampleThinning.h"
 #include "vorn/GeometryUtils.h"
 
@@ -13,6 +14,9 @@ namespace Vorn {
 class ArcFit {
  public:
   using Point = GeometryUtils::Point;
+  using AfterFailure = ArcCellBuilder::AfterFailure;
+
+  explicit ArcFit(AfterFailure afterFailure) : afterFailure_(afterFailure) {}
 
   /// What a successful fit hands out.
   struct Arc {
@@ -41,6 +45,7 @@ class ArcFit {
   /// The largest relative deviation, and the first point that has it.
   void MeasureDeviation(Fitting::ArcRun const& run, Arc* arc) const;
 
+  AfterFailure const afterFailure_;
   bool hasBuiltCell_ = false;
   double minRadius_ = 0.0;
   double maxRadius_ = 0.0;

@@ -50,7 +50,11 @@ class ArcSearch {
   };
 
   ArcSearch(Run const& run, Outputs const& out, ProgressBase const& progress)
-      : run_(run), out_(out), progress_(progress), workingEnd_(*out.end) {}
+      : run_(run),
+        out_(out),
+        progress_(progress),
+        fit_(out.cells != nullptr ? ArcFit::AfterFailure::KeepCell : ArcFit::AfterFailure::NoCell),
+        workingEnd_(*out.end) {}
 
   ErrorCode Search() {
     ErrorCode code = ErrorCode::NoFit;

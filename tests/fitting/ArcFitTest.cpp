@@ -3,6 +3,7 @@
 
 #include "gtest/gtest.h"
 #include "support/Bits.h"
+#include "support/CellInputs.h"
 #include "support/FittingCalls.h"
 #include "support/Profiles.h"
 #include "support/ReferenceFitting.h"
@@ -405,6 +406,36 @@ TEST(GetFittingCircle2, AgreesWithTheReference) {
   }
   EXPECT_GT(fitted, 50);
   EXPECT_GT(partly, 20);
+}
+
+TEST(GetFittingCircle2, NullCellsChangeNothingElse) {
+  // Without cells to hand out, tries that end without one are cut short.
+  constexpr std::uint64_t kSeed = 5309;
+  SCOPED_TRACE(kSeed);
+  RandomGeometry random(kSeed);
+  int stretched = 0;
+  for (int i = 0; i < 60; ++i) {
+    SCOPED_TRACE(i);
+    std::vector<WPoint> const points =
+        NoisyArc(random, 60, random.Uniform(8, 60), random.Uniform(0.01, 0.1));
+    auto const count = static_cast<std::int32_t>(points.size());
+    std::vector<Triangle> cells;
+    std::vector<Triangle>* const handedOut[] = {&cells, nullptr};
+    std::string transcripts[2];
+    for (int k = 0; k < 2; ++k) {
+      ArcFitOutput out;
+      ProgressRecorder state;
+      out.code = GeometryUtils::GetFittingCircle2(points, 0, count, 3, false, &out.start, false,
+                                                  &out.end, handedOut[k], &out.count, &out.centre,
+                                                  &out.radius, &out.ccw, &out.deviation,
+                                                  &out.deviationIndex, {&state, 100, count});
+      out.progress = state.percents;
+      stretched += out.count > 10 ? 1 : 0;
+      transcripts[k] = Transcribe(out);
+    }
+    EXPECT_EQ(transcripts[0], transcripts[1]);
+  }
+  EXPECT_GT(stretched, 20);
 }
 
 // --- GetFittingCircle1 --------------------------------------------------------------------------

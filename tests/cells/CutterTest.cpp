@@ -1,0 +1,222 @@
+#include <cmath>
+#include <cstdint>
+#include <utility>
+
+#include "geometry/cells/Cutter.h"
+#include "gtest/gtest.h"
+#include "support/Bits.h"
+#include "support/CellInputs.h"
+#include "support/RandomGeometry.h"
+
+// Where a cutter answers at once, it must answer what the full overlap answers, bit by bit.
+
+namespace Vorn::Testing {
+namespace {
+
+using Cells::BoxedTriangle;
+using Cells::Cutter;
+using Cells::Magnitude;
+using Cells::Overlap;
+using Cells::Shape;
+using Cells::Sight;
+using Point = GeometryUtils::Point;
+using Triangle = GeometryUtils::Triangle;
+
+/// Knows the size of both triangles, as in a cell of one triangle.
+Cutter CutterFor(Triangle const& other, Triangle const& cutter) {
+  Magnitude magnitude;
+  magnitude.Include(other);
+  return Cutter(cutter, magnitude);
+}
+
+Cutter::Place PlaceOf(Triangle const& other, Triangle const& cutter) {
+  Sight sight;
+  return CutterFor(other, cutter).PlaceOf(BoxedTriangle(other), &sight);
+}
+
+void ExpectSameOverlap(Triangle const& other, Triangle const& cutter) {
+  Overlap plain;
+  Cells::FindOverlap(Shape(other), Shape(cutter), &plain);
+  Overlap fast;
+  CutterFor(other, cutter).FindOverlapWith(BoxedTriangle(other), &fast);
+  Cell const expected(plain.parts.begin(), plain.parts.end());
+  Cell const actual(fast.parts.begin(), fast.parts.end());
+  EXPECT_EQ(fast.status, plain.status);
+  EXPECT_TRUE(SameCell(expected, actual)) << Describe(other) << " cut by " << Describe(cutter);
+}
+
+/// How often each answer was given.
+struct Tally {
+  int within = 0;
+  int apart = 0;
+  int crossing = 0;
+  int unclear = 0;
+
+  void Count(Cutter::Place place) {
+    within += place == Cutter::Place::Within ? 1 : 0;
+    apart += place == Cutter::Place::Apart ? 1 : 0;
+    crossing += place == Cutter::Place::Crossing ? 1 : 0;
+    unclear += place == Cutter::Place::Unclear ? 1 : 0;
+  }
+};
+
+template <typename Make>
+Tally CompareOnRandomPairs(std::uint64_t seed, int count, Make const& make) {
+  RandomGeometry random(seed);
+  Tally tally;
+  for (int i = 0; i < count; ++i) {
+    SCOPED_TRACE(testing::Message() << "seed " << seed << ", pair " << i);
+    TrianglePair const pair = make(random);
+    ExpectSameOverlap(pair.first, pair.second);
+    ExpectSameOverlap(pair.second, pair.first);
+    tally.Count(PlaceOf(pair.first, pair.second));
+    if (testing::Test::HasFailure()) break;
+  }
+  return tally;
+}
+
+Triangle Moved(Triangle triangle, Point const& by) {
+  for (Point& p : triangle.pts) p = {p.x + by.x, p.y + by.y};
+  return triangle;
+}
+
+Triangle const kLarge{{{0, 0}, {4, 0}, {0, 4}}};
+
+TEST(Cutter, SeesWhatIsClearlyWithin) {
+  Triangle const inside{{{1, 1}, {1.5, 1.25}, {1.125, 1.75}}};
+  EXPECT_EQ(PlaceOf(inside, kLarge), Cutter::Place::Within);
+  EXPECT_EQ(PlaceOf(Reversed(inside), kLarge), Cutter::Place::Within);
+  EXPECT_EQ(PlaceOf(inside, Reversed(kLarge)), Cutter::Place::Within);
+  ExpectSameOverlap(inside, kLarge);
+  ExpectSameOverlap(inside, Reversed(kLarge));
+}
+
+TEST(Cutter, SeesWhatIsClearlyBeyondASide) {
+  // Beyond the long side, with boxes that meet.
+  Triangle const beyond{{{3, 2}, {2.25, 3}, {3.25, 3.5}}};
+  EXPECT_EQ(PlaceOf(beyond, kLarge), Cutter::Place::Apart);
+  EXPECT_EQ(PlaceOf(beyond, Reversed(kLarge)), Cutter::Place::Apart);
+  ExpectSameOverlap(beyond, kLarge);
+}
+
+TEST(Cutter, LeavesCrossingSidesToTheFullOverlap) {
+  EXPECT_EQ(PlaceOf({{{1, 1}, {5, 1.5}, {1.25, 2}}}, kLarge), Cutter::Place::Crossing);
+}
+
+TEST(Cutter, LeavesAVertexOnALineToTheFullOverlap) {
+  Triangle const touching{{{1, 0}, {2, 1}, {1, 1.5}}};
+  EXPECT_EQ(PlaceOf(touching, kLarge), Cutter::Place::Unclear);
+  Triangle almost = touching;
+  for (double const y : {1e-15, -1e-15, 5e-324, -5e-324}) {
+    almost.pts[0].y = y;
+    EXPECT_EQ(PlaceOf(almost, kLarge), Cutter::Place::Unclear) << y;
+    ExpectSameOverlap(almost, kLarge);
+  }
+}
+
+TEST(Cutter, LeavesParallelSidesToTheFullOverlap) {
+  // A side within, parallel to the lower one.
+  EXPECT_EQ(PlaceOf({{{1, 1}, {2, 1}, {1.25, 1.5}}}, kLarge), Cutter::Place::Unclear);
+}
+
+TEST(Cutter, ASideOfNoLengthIsParallelToNothing) {
+  EXPECT_EQ(PlaceOf({{{1, 1}, {1.5, 1.75}, {1.5, 1.75}}}, kLarge), Cutter::Place::Within);
+  EXPECT_EQ(PlaceOf({{{1, 1.25}, {1, 1.25}, {1, 1.25}}}, kLarge), Cutter::Place::Within);
+  ExpectSameOverlap({{{1, 1}, {1.5, 1.75}, {1.5, 1.75}}}, kLarge);
+  ExpectSameOverlap({{{1, 1.25}, {1, 1.25}, {1, 1.25}}}, kLarge);
+}
+
+TEST(Cutter, ATriangleAroundTheCutterIsNotWithin) {
+  Triangle const around{{{-9, -8}, {30, -9}, {-7, 31}}};
+  EXPECT_EQ(PlaceOf(around, kLarge), Cutter::Place::Crossing);
+  ExpectSameOverlap(around, kLarge);
+}
+
+TEST(Cutter, KnowsNothingOfCoordinatesThatAreNotFinite) {
+  for (double const value : {kNaN, kInf, -kInf}) {
+    Triangle odd{{{1, 1}, {1.5, 1}, {1, value}}};
+    EXPECT_EQ(PlaceOf(odd, kLarge), Cutter::Place::Unclear);
+    EXPECT_EQ(PlaceOf(kLarge, odd), Cutter::Place::Unclear);
+    ExpectSameOverlap(odd, kLarge);
+    ExpectSameOverlap(kLarge, odd);
+  }
+}
+
+TEST(Cutter, KnowsNothingWhereProductsUnderflowOrOverflow) {
+  Triangle const inside{{{1, 1}, {1.5, 1.25}, {1.125, 1.75}}};
+  ASSERT_EQ(PlaceOf(inside, kLarge), Cutter::Place::Within);
+  for (double const scale : {1e-160, 1e-130, 1e155, 1e300}) {
+    EXPECT_EQ(PlaceOf(Scaled(inside, scale), Scaled(kLarge, scale)), Cutter::Place::Unclear);
+    ExpectSameOverlap(Scaled(inside, scale), Scaled(kLarge, scale));
+  }
+}
+
+TEST(Cutter, ADegenerateCutterKnowsNothing) {
+  Triangle const flat{{{0, 0}, {4, 4}, {4, 4}}};
+  EXPECT_EQ(PlaceOf({{{1, 2}, {2, 3}, {1, 3}}}, flat), Cutter::Place::Unclear);
+}
+
+TEST(Cutter, AgreesWithTheFullOverlapOnEveryFamilyOfPairs) {
+  for (PairKind const kind : kAllPairKinds) {
+    SCOPED_TRACE(static_cast<int>(kind));
+    CompareOnRandomPairs(4201 + static_cast<std::uint64_t>(kind), 3000,
+                         [kind](RandomGeometry& random) { return MakePair(random, kind); });
+  }
+}
+
+TEST(Cutter, AgreesWithTheFullOverlapFarFromTheOrigin) {
+  for (double const distance : {1e2, 1e5, 1e8, 1e12}) {
+    SCOPED_TRACE(distance);
+    Tally const tally = CompareOnRandomPairs(4220, 4000, [distance](RandomGeometry& random) {
+      TrianglePair pair =
+          MakePair(random, random.Flip() ? PairKind::kRandom : PairKind::kContained);
+      Point const by{distance * random.Uniform(-1.0, 1.0), distance * random.Uniform(-1.0, 1.0)};
+      return TrianglePair{Moved(pair.first, by), Moved(pair.second, by)};
+    });
+    if (distance < 1e6) {
+      EXPECT_GT(tally.within, 100);
+      EXPECT_GT(tally.apart, 100);
+      EXPECT_GT(tally.crossing, 100);
+    }
+    if (distance > 1e11) {
+      EXPECT_EQ(tally.unclear, 4000);
+    }
+  }
+}
+
+TEST(Cutter, AgreesWithTheFullOverlapNextToSidesAndVertices) {
+  // Vertices off the lines of the cutter by next to nothing up to clearly, and sides that are
+  // nearly parallel to it.
+  Tally const tally = CompareOnRandomPairs(4230, 40000, [](RandomGeometry& random) {
+    Triangle const cutter = random.TriangleIn(-1.0, 1.0);
+    Triangle other;
+    for (Point& p : other.pts) {
+      p = RelatedPoint(random, cutter);
+      double const off = std::pow(10.0, random.Uniform(-17.0, -1.0));
+      p = {p.x + off * random.Uniform(-1.0, 1.0), p.y + off * random.Uniform(-1.0, 1.0)};
+    }
+    return TrianglePair{other, cutter};
+  });
+  EXPECT_GT(tally.unclear, 1000);
+  EXPECT_GT(tally.crossing, 1000);
+  EXPECT_GT(tally.apart, 100);
+  EXPECT_GT(tally.within, 100);
+}
+
+TEST(Cutter, AgreesWithTheFullOverlapOnThinTriangles) {
+  Tally const tally = CompareOnRandomPairs(4240, 40000, [](RandomGeometry& random) {
+    auto const thin = [&random] {
+      Point const p = random.PointIn(-1.0, 1.0);
+      Point const q = random.PointIn(-1.0, 1.0);
+      Point const r = Lerp(p, q, random.Uniform(-0.2, 1.2));
+      double const side = std::pow(10.0, random.Uniform(-13.0, -1.0)) * (random.Flip() ? 1 : -1);
+      return Triangle{{p, q, {r.x - (q.y - p.y) * side, r.y + (q.x - p.x) * side}}};
+    };
+    return TrianglePair{thin(), thin()};
+  });
+  EXPECT_GT(tally.crossing, 1000);
+  EXPECT_GT(tally.apart, 1000);
+}
+
+}  // namespace
+}  // namespace Vorn::Testing
