@@ -10,6 +10,7 @@
 #include "cli/commands/ConvertCommand.h"
 #include "cli/commands/FitCommand.h"
 #include "cli/commands/InfoCommand.h"
+#include "cli/commands/PlotCommand.h"
 #include "cli/commands/SimplifyCommand.h"
 
 namespace Vorn::Cli {
@@ -23,11 +24,8 @@ constexpr char const* kFooter =
 
 /// In the order in which --help lists them.
 constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
-    AddFitCommand,
-    AddCheckCommand,
-    AddInfoCommand,
-    AddConvertCommand,
-    AddSimplifyCommand,
+    AddFitCommand,  AddCheckCommand,   AddInfoCommand,
+    AddPlotCommand, AddConvertCommand, AddSimplifyCommand,
 };
 
 [[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {

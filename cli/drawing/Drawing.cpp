@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "cli/Numbers.h"
+#include "cli/formats/ContourFile.h"
 
 namespace Vorn::Cli {
 
@@ -37,12 +38,7 @@ std::size_t Drawing::ArcCount() const {
                                                 [](Piece const& piece) { return piece.IsArc(); }));
 }
 
-bool Drawing::IsClosed() const {
-  if (pieces.empty()) return false;
-  GeometryUtils::Point const& start = pieces.front().start;
-  GeometryUtils::Point const& end = pieces.back().end;
-  return start.x == end.x && start.y == end.y;
-}
+bool Drawing::IsClosed() const { return HasContour() && ReturnsToStart(pieces); }
 
 std::size_t Drawing::Worst() const {
   bool const isRelative = HasTolerances();

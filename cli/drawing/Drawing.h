@@ -64,4 +64,8 @@ struct PngSize {
 /// @throws Failure (ExitCode::Usage) when the picture would be larger than can be drawn.
 std::string ToPng(Drawing const& drawing, PngSize const& size);
 
+/// One file that needs nothing else: pans and zooms, tells about the point under the cursor and
+/// lists the pieces.
+std::string ToHtml(Drawing const& drawing);
+
 }  // namespace Vorn::Cli

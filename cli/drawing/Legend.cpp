@@ -76,7 +76,7 @@ void AddPoints(Scene const& scene, Legend* legend) {
   legend->AddCircle(2.0, "fill=\"" + kPointColor + "\"",
                     scene.HasContour() ? "point, deviation" + Times(scene) : "measured point");
   if (!scene.HasContour()) {
-    legend->AddShape("M-7,0H3M8,0L2,3L2-3Z",
+    legend->AddShape("M-7,0H1M7,0L1,3L1-3Z",
                      "fill=\"" + kStartColor + "\" stroke=\"" + kStartColor + "\"", "order");
   }
   if (scene.AnyOutside()) {

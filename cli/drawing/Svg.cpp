@@ -98,8 +98,8 @@ std::string ToSvg(Drawing const& drawing) {
          "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"297mm\" height=\"210mm\" "
          "viewBox=\"0 0 " +
          Px(kPageWidth) + " " + Px(kPageHeight) + "\">\n" + kStyle +
-         "<rect width=\"100%\" height=\"100%\" fill=\"white\"/>\n<g fill=\"" + kTextColor +
-         "\">\n" + Title(drawing) + ContourPlot(scene) +
+         "<rect x=\"-9\" y=\"-9\" width=\"110%\" height=\"110%\" fill=\"white\"/>\n<g fill=\"" +
+         kTextColor + "\">\n" + Title(drawing) + ContourPlot(scene) +
          LegendRow(scene, scene.view.Frame().Bottom() + kLegendDrop) + Diagram(scene) +
          "</g>\n</svg>\n";
 }

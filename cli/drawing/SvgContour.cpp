@@ -93,16 +93,22 @@ std::map<int, std::string> BandPaths(Scene const& scene) {
   View const& view = scene.view;
   std::map<int, std::string> paths;
   std::optional<int> drawn;
+  std::string pen;
   for (BandSection const& section :
        BandSections(scene.drawing, scene.feet, kLeastBandSection / view.Scale())) {
     double const width = 2.0 * scene.magnify * section.tolerance * view.Scale();
     int const step = std::max(1, static_cast<int>(std::lround(width / kBandStep)));
     std::string& data = paths[step];
     Piece const& piece = scene.drawing.pieces[section.piece];
-    GeometryUtils::Point const start = PlaceOn(piece, section.from);
-    if (drawn != step) data += "M" + Px(view(start.x, start.y));
+    GeometryUtils::Point const start =
+        section.from == 0.0 ? piece.start : PlaceOn(piece, section.from);
+    std::string const at = Px(view(start.x, start.y));
+    if (drawn != step || at != pen) data += "M" + at;
     data += StretchData(piece, section.from, section.to, view);
     drawn = step;
+    GeometryUtils::Point const end =
+        section.to == piece.length ? piece.end : PlaceOn(piece, section.to);
+    pen = Px(view(end.x, end.y));
   }
   return paths;
 }
@@ -226,20 +232,14 @@ std::string SinglePieces(Scene const& scene) {
 }
 
 std::string MergedPieces(Scene const& scene) {
+  std::vector<Piece> lines;
+  std::vector<Piece> arcs;
+  for (Piece const& piece : scene.drawing.pieces) (piece.IsArc() ? arcs : lines).push_back(piece);
   std::string svg;
-  for (Piece::Kind const kind : {Piece::Kind::Line, Piece::Kind::Arc}) {
-    std::string data;
-    Piece const* before = nullptr;
-    for (Piece const& piece : scene.drawing.pieces) {
-      bool const isContinued = before != nullptr && before->kind == kind;
-      before = &piece;
-      if (piece.kind != kind) continue;
-      if (!isContinued) data += "M" + Px(scene.view(piece.start.x, piece.start.y));
-      data += PieceData(piece, scene.view);
+  for (std::vector<Piece> const& pieces : {lines, arcs}) {
+    if (!pieces.empty()) {
+      svg += PathElement(PathData(pieces, scene.view), StrokeOf(pieces.front()));
     }
-    Piece sample;
-    sample.kind = kind;
-    svg += PathElement(data, StrokeOf(sample));
   }
   return svg;
 }
@@ -386,9 +386,15 @@ std::string StretchData(Piece const& piece, double from, double to, View const& 
 }
 
 std::string PathData(std::vector<Piece> const& pieces, View const& view) {
-  GeometryUtils::Point const& start = pieces.front().start;
-  std::string data = "M" + Px(view(start.x, start.y));
-  for (Piece const& piece : pieces) data += PieceData(piece, view);
+  std::string data;
+  std::string pen;
+  for (Piece const& piece : pieces) {
+    // Pieces of a file need not meet: a gap is not drawn over.
+    std::string const start = Px(view(piece.start.x, piece.start.y));
+    if (start != pen) data += "M" + start;
+    data += PieceData(piece, view);
+    pen = Px(view(piece.end.x, piece.end.y));
+  }
   return data;
 }
 

@@ -132,8 +132,9 @@ std::string Joints(Chart const& chart) {
     data += "M" + Px(Pixel{x, frame.top - kStripHeight}) + "V" + Px(frame.Bottom());
     before = x;
   }
-  return PathElement(data, "class=\"joint-lines\" fill=\"none\" stroke=\"" + kFrameColor +
-                               "\" stroke-width=\"0.7\" stroke-dasharray=\"2 2.5\"");
+  return PathElement(
+      data, "class=\"joint-lines\" fill=\"none\" stroke=\"" + kFrameColor + "\" stroke-width=\"" +
+                (chart.Starts().size() > 60 ? "0.35" : "0.7") + "\" stroke-dasharray=\"2 2.5\"");
 }
 
 /// Lines from zero to each deviation, where there are few enough to tell them apart.

@@ -1,0 +1,220 @@
+#include "cli/commands/PlotCommand.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <cmath>
+#include <filesystem>
+#include <memory>
+#include <ostream>
+#include <utility>
+
+#include "cli/Numbers.h"
+#include "cli/Tolerances.h"
+#include "cli/commands/CommonOptions.h"
+#include "cli/commands/Outputs.h"
+#include "cli/commands/PointsInput.h"
+#include "cli/drawing/Drawing.h"
+#include "cli/formats/ContourFile.h"
+#include "cli/formats/Format.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr char const* kText =
+    "Draw measured points, and a contour with their deviations from it, as SVG, PNG or a page of\n"
+    "HTML that pans and zooms.";
+
+constexpr char const* kFooter =
+    R"(
+The ending of a file tells its format: .svg, .png, .html. For - and other names --to says it.
+
+With CONTOUR (JSON, CSV, DXF, G-code or WKT) the drawing shows its lines and arcs with their joints
+true to scale, and each point moved away from the contour until it is K times as far from it as it
+is; the tolerance is drawn K times as wide. Below are the deviations along the contour, positive to
+the left of the direction of travel. Without CONTOUR the drawing shows the points and their order.
+
+A tolerance is drawn when one of the three options or the file states it, as for 'contour fit', and
+only then is the contour judged. Points that fall on the same place of the page are drawn once.
+
+Exit codes:
+  0   the drawings are written, whatever they show
+  2   wrong usage
+  3   a file cannot be read or written
+  4   a tolerance by spacing was asked for, but neighbours coincide
+  70  internal error
+  130 interrupted
+
+Output files are written whole or not at all.
+
+Examples:
+  contour plot part.csv -o points.svg
+  contour plot part.csv part.json --tolerance 0.02 -o part.html -o part.png --dpi 300
+  contour plot part.csv part.dxf --magnify 50 -o part.svg
+)";
+
+struct Options {
+  PointsInput points;
+  std::string contour;
+  std::vector<std::string> outputs;
+  std::optional<Format> to;
+  std::optional<double> magnify;
+  std::optional<double> dpi;
+  std::optional<int> width;
+
+  std::vector<NamedFile> Read() const {
+    std::vector<NamedFile> files = {{"POINTS", points.path}};
+    if (!contour.empty()) files.push_back({"CONTOUR", contour});
+    return files;
+  }
+
+  std::vector<NamedFile> Written() const {
+    std::vector<NamedFile> files;
+    for (std::string const& path : outputs) files.push_back({"--output", path});
+    return files;
+  }
+};
+
+Format FormatFor(Options const& options, std::string const& path) {
+  std::optional<Format> const format = options.to ? options.to : FormatOf(path);
+  if (!format) {
+    std::string const what = path == "-" ? "the standard output" : path;
+    throw Failure(ExitCode::Usage, what + ": --to must say which format to write");
+  }
+  if (HoldsContour(*format)) {
+    throw Failure(ExitCode::Usage,
+                  path + ": not a drawing; 'contour convert' writes " + NameOf(*format));
+  }
+  return *format;
+}
+
+void RefuseSharedInput(Options const& options) {
+  if (options.points.path == "-" && options.contour == "-") {
+    throw Failure(ExitCode::Usage, "POINTS and CONTOUR cannot both be the standard input");
+  }
+}
+
+std::string NameOfFile(std::string const& path) {
+  return path == "-" ? "standard input" : std::filesystem::path(path).filename().string();
+}
+
+Drawing ReadDrawing(Options const& options, Console const& console) {
+  PointFile file = ReadPointsInput(options.points, console);
+  if (IsToleranceStated(options.points.tolerance, file)) {
+    AssignTolerances(options.points.tolerance, &file);
+  }
+  ContourFile contour;
+  if (!options.contour.empty()) {
+    contour = ReadContour(options.contour, console);
+    for (Gap const& gap : FindGaps(contour)) {
+      console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
+    }
+  }
+  Drawing drawing = MakeDrawing(std::move(file.points), std::move(contour.pieces));
+  drawing.units = file.units.empty() ? contour.units : file.units;
+  drawing.title = NameOfFile(options.points.path);
+  drawing.facts = {DescribeTolerance(drawing)};
+  if (!options.contour.empty()) drawing.facts.push_back("contour " + NameOfFile(options.contour));
+  drawing.magnify = options.magnify;
+  return drawing;
+}
+
+std::string Drawn(Options const& options, Drawing const& drawing, Format format) {
+  if (format == Format::Html) return ToHtml(drawing);
+  if (format == Format::Svg) return ToSvg(drawing);
+  PngSize size;
+  if (options.dpi) size.dpi = *options.dpi;
+  size.width = options.width;
+  return ToPng(drawing, size);
+}
+
+std::string Summary(Drawing const& drawing) {
+  std::string text = "points      " + std::to_string(drawing.points.size()) + '\n';
+  if (!drawing.HasContour()) return text;
+  PointDeviation const& worst = drawing.deviations[drawing.Worst()];
+  text += "pieces      " + Counted(drawing.pieces.size() - drawing.ArcCount(), "line") + ", " +
+          Counted(drawing.ArcCount(), "arc") + '\n';
+  text += "deviation   " + FormatShort(worst.distance);
+  if (!drawing.units.empty()) text += " " + drawing.units;
+  if (drawing.HasTolerances()) text += ", " + FormatShort(worst.relative) + " of the tolerance,";
+  text += " at point " + std::to_string(drawing.Worst()) + '\n';
+  if (drawing.verdict) text += "result      " + Describe(*drawing.verdict) + '\n';
+  return text;
+}
+
+ExitCode Run(Options const& options, Console const& console) {
+  RequireWritable(options.Written());
+  Drawing const drawing = ReadDrawing(options, console);
+  Outputs outputs;
+  for (std::string const& path : options.outputs) {
+    outputs.Add(path, Drawn(options, drawing, FormatFor(options, path)));
+  }
+  outputs.Write(console);
+  bool const isOutTaken =
+      std::find(options.outputs.begin(), options.outputs.end(), "-") != options.outputs.end();
+  if (isOutTaken) return ExitCode::Ok;
+  console.out << Summary(drawing);
+  for (std::string const& path : options.outputs) console.out << "wrote       " << path << '\n';
+  return ExitCode::Ok;
+}
+
+/// A number above zero, or the word for choosing one.
+void AddMagnify(CLI::App& app, std::optional<double>* magnify) {
+  auto const isGood = [](std::string const& text) {
+    std::optional<double> const value = ParseNumber(text);
+    return text == "auto" || (value && std::isfinite(*value) && *value > 0.0);
+  };
+  app.add_option_function<std::string>(
+         "--magnify",
+         [magnify](std::string const& text) {
+           *magnify = text == "auto" ? std::optional<double>() : ParseNumber(text);
+         },
+         "Draw deviations and tolerance K times as large as they are; auto (the default): a round "
+         "number that makes the largest tolerance readable")
+      ->check(CLI::Validator(
+          [isGood](std::string& text) -> std::string {
+            return isGood(text) ? "" : Quoted(text) + " is neither auto nor a number above 0";
+          },
+          ""))
+      ->type_name("K");
+}
+
+void AddOptions(CLI::App& app, Options* options) {
+  constexpr int kMostPixels = 30000;
+  AddPointsInput(app, &options->points);
+  app.add_option("CONTOUR", options->contour, "File with a contour; - is the standard input")
+      ->type_name("FILE");
+  app.add_option("-o,--output", options->outputs,
+                 "Write the drawing to this file; may be given several times; - is the standard "
+                 "output")
+      ->required()
+      ->expected(1)
+      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
+      ->type_name("FILE");
+  AddWord(
+      app, "--to", {"svg", "png", "html"},
+      [options](std::string const& word) { options->to = FormatNamed(word); },
+      "Write the outputs as this");
+  AddMagnify(app, &options->magnify);
+  CLI::Option* const dpi = AddPositiveNumber(app, "--dpi", &options->dpi, "N",
+                                             "PNG: pixels to the inch on A4; 150 if not said");
+  AddWholeNumber(app, "--width", &options->width, 1, kMostPixels, "N", "PNG: width in pixels")
+      ->excludes(dpi);
+  app.footer(std::string(kPointsFileText) + kFooter);
+}
+
+}  // namespace
+
+void AddPlotCommand(CLI::App& program, Action* action) {
+  CLI::App* const app = program.add_subcommand("plot", kText);
+  auto const options = std::make_shared<Options>();
+  AddOptions(*app, options.get());
+  app->callback([options, action] {
+    RefuseSharedInput(*options);
+    RefuseSharedFiles(options->Read(), options->Written());
+    for (std::string const& path : options->outputs) FormatFor(*options, path);
+    *action = [options](Console const& console) { return Run(*options, console); };
+  });
+}
+
+}  // namespace Vorn::Cli

@@ -1,0 +1,447 @@
+// The drawing of the contour: true to scale, deviations and tolerance magnified.
+
+const BAND_STEP = 0.5;        // pixels: bands that differ by less are drawn alike
+const FEW_POINTS = 4000;      // so many may have true shapes and whiskers
+const LEAST_LABEL_ROOM = 34;  // pixels of a piece with its number beside it
+
+class ContourDrawing {
+  constructor(canvas, scene, state) {
+    this.scene = scene;
+    this.state = state;
+    this.view = new View();
+    this.isFresh = true;
+    this.surface = new Surface(canvas, (...page) => this.paint(...page));
+  }
+
+  showAll() {
+    this.view.fit(this.scene.box(), 34);
+    this.isUntouched = true;
+    this.surface.schedule();
+  }
+
+  showPiece(index) {
+    const box = boxOf(this.scene.pieces[index]);
+    this.isUntouched = false;
+    this.view.fit(box, Math.min(120, 0.25 * Math.min(this.view.width, this.view.height)));
+    this.surface.schedule();
+  }
+
+  zoom(px, py, factor) {
+    this.isUntouched = false;
+    this.view.zoomAt(px, py, factor);
+    this.surface.schedule();
+  }
+
+  pan(dx, dy) {
+    this.isUntouched = false;
+    this.view.pan(dx, dy);
+    this.surface.schedule();
+  }
+
+  /** Pixel of a point as drawn. */
+  pixelOf(i) { return [this.view.px(this.scene.x[i]), this.view.py(this.scene.y[i])]; }
+
+  pointAt(px, py, reach) {
+    const view = this.view;
+    return this.scene.grid.nearest(view.planeX(px), view.planeY(py), reach / view.scale);
+  }
+
+  pieceAt(px, py, reach) {
+    const view = this.view;
+    return this.scene.pieceNear(view.planeX(px), view.planeY(py), reach / view.scale);
+  }
+
+  paint(context, width, height, colors) {
+    [this.view.width, this.view.height] = [width, height];
+    if (this.isFresh || this.isUntouched) this.view.fit(this.scene.box(), 34);
+    if (this.isFresh) this.isUntouched = true;
+    this.isFresh = false;
+    [this.context, this.colors] = [context, colors];
+    context.fillStyle = colors.paper;
+    context.fillRect(0, 0, width, height);
+    this.paintGrid();
+    if (this.scene.hasTolerances) this.paintBand();
+    if (this.scene.hasContour) this.paintPieces();
+    else this.paintOrder();
+    this.paintPoints();
+    this.paintEnds();
+    if (this.scene.hasContour) {
+      this.paintWorst();
+      this.paintNumbers();
+    }
+    this.paintHovered();
+    this.paintAxisLabels();
+  }
+
+  paintGrid() {
+    const {context, view} = this;
+    this.columns = ticksBetween(view.planeX(0), view.planeX(view.width), 90 / view.scale);
+    this.rows = ticksBetween(view.planeY(view.height), view.planeY(0), 70 / view.scale);
+    context.strokeStyle = this.colors.grid;
+    context.lineWidth = 1;
+    context.beginPath();
+    for (const {value} of this.columns) {
+      context.moveTo(view.px(value), 0);
+      context.lineTo(view.px(value), view.height);
+    }
+    for (const {value} of this.rows) {
+      context.moveTo(0, view.py(value));
+      context.lineTo(view.width, view.py(value));
+    }
+    context.stroke();
+  }
+
+  paintAxisLabels() {
+    const {context, view} = this;
+    context.font = '11px system-ui, "DejaVu Sans", sans-serif';
+    const halo = (text, x, y) => {
+      context.lineWidth = 3;
+      context.strokeStyle = this.colors.paper;
+      context.lineJoin = 'round';
+      context.strokeText(text, x, y);
+      context.fillStyle = this.colors.soft;
+      context.fillText(text, x, y);
+    };
+    context.textAlign = 'center';
+    for (const {value, label} of this.columns) {
+      const x = view.px(value);
+      if (x > 50 && x < view.width - 20) halo(label, x, view.height - 6);
+    }
+    context.textAlign = 'left';
+    for (const {value, label} of this.rows) {
+      const y = view.py(value);
+      if (y > 14 && y < view.height - 22) halo(label, 6, y + 4);
+    }
+  }
+
+  /** The band as path data by its width on the canvas. */
+  bandPaths() {
+    const {scene, view} = this;
+    const widthOf = (w) => Math.min(20000, 2 * scene.times * w * view.scale);
+    const margin = 0.5 * widthOf(scene.largestTolerance) + 4;
+    const paths = new Map();
+    const pathOf = (width) => {
+      if (!paths.has(width)) {
+        const path = new Path2D();
+        paths.set(width, {path, tracer: new Tracer(view, path, margin)});
+      }
+      return paths.get(width).tracer;
+    };
+    if (scene.isToleranceUniform) {
+      const tracer = pathOf(widthOf(scene.largestTolerance));
+      for (const piece of scene.pieces) tracer.trace(piece);
+      return paths;
+    }
+    const {piece, from, to, tolerance} = scene.band;
+    const least = 0.5 / view.scale;
+    for (let i = 0; i < piece.length; ++i) {
+      // Sections too short to be seen are drawn together, with the largest of their tolerances.
+      const first = i;
+      let largest = tolerance[i];
+      while (to[i] - from[first] < least && piece[i + 1] === piece[first]) {
+        ++i;
+        largest = Math.max(largest, tolerance[i]);
+      }
+      const width = Math.max(1, Math.round(widthOf(largest) / BAND_STEP)) * BAND_STEP;
+      pathOf(width).trace(scene.pieces[piece[first]], from[first], to[i]);
+    }
+    return paths;
+  }
+
+  paintBand() {
+    const {context, scene, view, colors} = this;
+    if (2 * scene.times * scene.largestTolerance * view.scale < 1) return;
+    if (!scene.hasContour) {
+      this.paintDiscs();
+      return;
+    }
+    const paths = this.bandPaths();
+    context.lineJoin = 'round';
+    context.lineCap = 'butt';
+    for (const [extra, color] of [[1.6, colors['band-edge']], [0, colors.band]]) {
+      context.strokeStyle = color;
+      for (const [width, {path}] of paths) {
+        context.lineWidth = width + extra;
+        context.stroke(path);
+      }
+    }
+  }
+
+  /** Without a contour the tolerance is a disc about each point. */
+  paintDiscs() {
+    const {context, scene, view, colors} = this;
+    const free = new Occupancy(view.width, view.height, 0.5);
+    const discs = [];
+    for (let i = 0; i < scene.count; ++i) {
+      const [x, y] = this.pixelOf(i);
+      if (free.take(x, y)) discs.push([x, y, scene.tolerance(i) * view.scale]);
+    }
+    for (const [extra, color] of [[0.8, colors['band-edge']], [0, colors.band]]) {
+      context.fillStyle = color;
+      context.beginPath();
+      for (const [x, y, radius] of discs) {
+        context.moveTo(x + radius + extra, y);
+        context.arc(x, y, radius + extra, 0, 2 * Math.PI);
+      }
+      context.fill();
+    }
+  }
+
+  paintPieces() {
+    const {context, scene, view, colors, state} = this;
+    context.lineCap = 'butt';
+    context.lineJoin = 'round';
+    const stroke = (index, color, width, dashes) => {
+      const path = new Path2D();
+      const tracer = new Tracer(view, path, 30);
+      tracer.trace(scene.pieces[index]);
+      context.strokeStyle = color;
+      context.lineWidth = width;
+      context.setLineDash(dashes);
+      // Dashes stay where they are on the piece while the view moves.
+      context.lineDashOffset = tracer.skipped;
+      context.stroke(path);
+    };
+    for (const index of [state.chosen, state.hoveredPiece]) {
+      if (index >= 0) stroke(index, colors.chosen, 9, []);
+    }
+    scene.pieces.forEach((piece, i) => {
+      const isArc = piece.kind === 'arc';
+      stroke(i, isArc ? colors.arc : colors.line, 2, isArc ? [10, 2.5] : []);
+    });
+    context.setLineDash([]);
+  }
+
+  /** The points on the canvas that are not hidden behind others. */
+  visiblePoints() {
+    const {scene, view} = this;
+    const free = new Occupancy(view.width, view.height, scene.count > FEW_POINTS ? 1 : 0.25);
+    const visible = [];
+    for (let i = 0; i < scene.count; ++i) {
+      if (free.take(view.px(scene.x[i]), view.py(scene.y[i]))) visible.push(i);
+    }
+    return visible;
+  }
+
+  /** As large as the distance of neighbours allows. */
+  dotSize(visible) {
+    const {scene, view} = this;
+    const gaps = [];
+    const step = Math.max(1, Math.floor(visible.length / 200));
+    for (let k = 0; k < visible.length; k += step) {
+      const i = visible[k];
+      if (i + 1 >= scene.count) continue;
+      gaps.push(Math.hypot(scene.x[i + 1] - scene.x[i], scene.y[i + 1] - scene.y[i]) * view.scale);
+    }
+    gaps.sort((a, b) => a - b);
+    return Math.min(6, Math.max(2.4, 0.65 * (gaps[gaps.length >> 1] ?? 10)));
+  }
+
+  paintPoints() {
+    const {context, scene, colors} = this;
+    const visible = this.visiblePoints();
+    if (scene.times !== 1) this.paintWhiskers(visible);
+    const size = this.dotSize(visible);
+    const isCoarse = visible.length > FEW_POINTS;
+    const outside = [];
+    context.fillStyle = colors.point;
+    context.beginPath();
+    for (const i of visible) {
+      if (scene.hasContour && scene.isOutside(i)) {
+        outside.push(i);
+        continue;
+      }
+      const [x, y] = this.pixelOf(i);
+      if (isCoarse || scene.isOnArc(i)) {
+        const side = 0.88 * size;
+        context.rect(x - 0.5 * side, y - 0.5 * side, side, side);
+      } else {
+        context.moveTo(x + 0.5 * size, y);
+        context.arc(x, y, 0.5 * size, 0, 2 * Math.PI);
+      }
+    }
+    context.fill();
+    this.paintJoints();
+    this.paintCrosses(outside);
+  }
+
+  paintCrosses(points) {
+    const {context} = this;
+    context.strokeStyle = this.colors.outside;
+    context.lineWidth = 1.3;
+    context.beginPath();
+    for (const i of points) {
+      const [x, y] = this.pixelOf(i);
+      context.moveTo(x - 3.5, y - 3.5);
+      context.lineTo(x + 3.5, y + 3.5);
+      context.moveTo(x + 3.5, y - 3.5);
+      context.lineTo(x - 3.5, y + 3.5);
+    }
+    context.stroke();
+  }
+
+  /** Thin lines from the contour to the magnified points. */
+  paintWhiskers(visible) {
+    const {context, scene, view} = this;
+    const cell = visible.length > FEW_POINTS ? 2 : 0.5;
+    const sides = [new Occupancy(view.width, view.height, cell),
+                   new Occupancy(view.width, view.height, cell)];
+    context.strokeStyle = this.colors.whisker;
+    context.lineWidth = 0.7;
+    context.beginPath();
+    for (const i of visible) {
+      const x = view.px(scene.footX[i]), y = view.py(scene.footY[i]);
+      if (!sides[scene.deviation(i) > 0 ? 1 : 0].take(x, y)) continue;
+      context.moveTo(x, y);
+      context.lineTo(...this.pixelOf(i));
+    }
+    context.stroke();
+  }
+
+  paintJoints() {
+    const {context, scene, view, colors} = this;
+    const free = new Occupancy(view.width, view.height, 1);
+    const radius = scene.pieces.length > 60 ? 2.6 : 3.6;
+    context.fillStyle = colors.paper;
+    context.strokeStyle = colors.text;
+    context.lineWidth = 1.1;
+    context.beginPath();
+    for (const piece of scene.pieces.slice(1)) {
+      const x = view.px(piece.start[0]), y = view.py(piece.start[1]);
+      if (!free.take(x, y)) continue;
+      context.moveTo(x + radius, y);
+      context.arc(x, y, radius, 0, 2 * Math.PI);
+    }
+    context.fill();
+    context.stroke();
+  }
+
+  /** A triangle at the start that points ahead, a square at the end. */
+  paintEnds() {
+    const {scene, view} = this;
+    const last = scene.count - 1;
+    let start = [scene.x[0], scene.y[0]];
+    let end = [scene.x[last], scene.y[last]];
+    let ahead = null;
+    if (scene.hasContour) {
+      const first = scene.pieces[0];
+      start = first.start;
+      end = scene.pieces.at(-1).end;
+      ahead = placeOn(first, Math.min(first.length, 11 / view.scale));
+    } else {
+      ahead = this.placeAhead(0, 11);
+    }
+    if (!scene.isClosed) this.square(view.px(end[0]), view.py(end[1]), 8);
+    const x = view.px(start[0]), y = view.py(start[1]);
+    this.arrow(x, y, view.px(ahead[0]) - x, view.py(ahead[1]) - y, 12, true);
+  }
+
+  /** The first point that is some pixels away from point i. */
+  placeAhead(i, distance) {
+    const {scene, view} = this;
+    const x = scene.x[i], y = scene.y[i];
+    let k = i + 1;
+    while (k < scene.count - 1 &&
+           Math.hypot(scene.x[k] - x, scene.y[k] - y) * view.scale < distance) ++k;
+    return [scene.x[Math.min(k, scene.count - 1)], scene.y[Math.min(k, scene.count - 1)]];
+  }
+
+  square(x, y, size) {
+    const {context, colors} = this;
+    context.fillStyle = colors.paper;
+    context.strokeStyle = colors.text;
+    context.lineWidth = 1.2;
+    context.fillRect(x - 0.5 * size, y - 0.5 * size, size, size);
+    context.strokeRect(x - 0.5 * size, y - 0.5 * size, size, size);
+  }
+
+  /** A triangle that starts at (x, y) and points along (dx, dy). */
+  arrow(x, y, dx, dy, size, isOutlined) {
+    const length = Math.hypot(dx, dy);
+    if (!(length > 0)) return;
+    const ux = size * dx / length, uy = size * dy / length;
+    const {context, colors} = this;
+    context.beginPath();
+    context.moveTo(x + ux, y + uy);
+    context.lineTo(x - 0.5 * uy, y + 0.5 * ux);
+    context.lineTo(x + 0.5 * uy, y - 0.5 * ux);
+    context.closePath();
+    context.fillStyle = colors.start;
+    context.fill();
+    if (!isOutlined) return;
+    context.strokeStyle = colors.text;
+    context.lineWidth = 1.1;
+    context.stroke();
+  }
+
+  /** Small arrows to the right of the points' sense of travel: nothing joins the points. */
+  paintOrder() {
+    const {context, scene, view, colors} = this;
+    const drawn = [];
+    const step = Math.max(1, Math.floor(scene.count / 400));
+    for (let i = 0; i + 1 < scene.count; i += step) {
+      const [x, y] = this.pixelOf(i);
+      if (x < 0 || y < 0 || x > view.width || y > view.height) continue;
+      if (drawn.some((other) => Math.hypot(other[0] - x, other[1] - y) < 90)) continue;
+      const ahead = this.placeAhead(i, 16);
+      const dx = view.px(ahead[0]) - x, dy = view.py(ahead[1]) - y;
+      const length = Math.hypot(dx, dy);
+      if (length < 8) continue;
+      drawn.push([x, y]);
+      const tailX = x - 12 * dy / length, tailY = y + 12 * dx / length;
+      context.strokeStyle = colors.start;
+      context.lineWidth = 1.3;
+      context.beginPath();
+      context.moveTo(tailX, tailY);
+      context.lineTo(tailX + 12 * dx / length, tailY + 12 * dy / length);
+      context.stroke();
+      this.arrow(tailX + 11 * dx / length, tailY + 11 * dy / length, dx, dy, 7, false);
+    }
+  }
+
+  ring(i, radius, color, width) {
+    const {context} = this;
+    const [x, y] = this.pixelOf(i);
+    context.strokeStyle = color;
+    context.lineWidth = width;
+    context.beginPath();
+    context.arc(x, y, radius, 0, 2 * Math.PI);
+    context.stroke();
+  }
+
+  paintWorst() { this.ring(this.scene.worst, 8, this.colors.worst, 2); }
+
+  /** The number of each piece beside its middle, where there is room. */
+  paintNumbers() {
+    const {context, scene, view, colors} = this;
+    const taken = [];
+    const band = scene.hasTolerances ? scene.times * scene.largestTolerance * view.scale : 0;
+    const aside = 13 + Math.min(band, 60);
+    context.font = '600 11px system-ui, "DejaVu Sans", sans-serif';
+    context.textAlign = 'center';
+    scene.pieces.forEach((piece, i) => {
+      if (piece.length * view.scale < LEAST_LABEL_ROOM) return;
+      const at = placeOn(piece, 0.5 * piece.length);
+      const next = placeOn(piece, 0.5 * piece.length + 1e-3 * piece.length);
+      const dx = next[0] - at[0], dy = next[1] - at[1];
+      const length = Math.hypot(dx, dy) || 1;
+      // To the left of travel, but outside an arc.
+      const side = piece.kind === 'arc' && piece.ccw ? -1 : 1;
+      const x = view.px(at[0]) - side * aside * dy / length;
+      const y = view.py(at[1]) - side * aside * dx / length;
+      if (taken.some((other) => Math.abs(other[0] - x) < 22 && Math.abs(other[1] - y) < 14)) return;
+      taken.push([x, y]);
+      context.lineWidth = 3;
+      context.strokeStyle = colors.paper;
+      context.strokeText(String(i + 1), x, y + 4);
+      context.fillStyle = piece.kind === 'arc' ? colors.arc : colors.line;
+      context.fillText(String(i + 1), x, y + 4);
+    });
+  }
+
+  paintHovered() {
+    const i = this.state.hovered;
+    if (i < 0) return;
+    this.ring(i, 5, this.colors.text, 2);
+  }
+}

@@ -1,0 +1,304 @@
+// Puts the page together.
+
+const scene = new Scene(JSON.parse(document.getElementById('data').textContent));
+const state = {hovered: -1, hoveredPiece: -1, chosen: -1};
+const byId = (id) => document.getElementById(id);
+const units = scene.units ? ` ${scene.units}` : '';
+
+const contour = new ContourDrawing(byId('contour'), scene, state);
+const diagram = scene.hasContour ? new Diagram(byId('diagram'), scene, state) : null;
+const table = scene.hasContour
+    ? new PieceTable(scene, {hover: (i) => hoverPiece(i), choose: choosePiece}) : null;
+
+function redraw() {
+  contour.surface.schedule();
+  diagram?.surface.schedule();
+  table?.mark(state);
+}
+
+// Summary
+
+function fillSummary() {
+  byId('facts').textContent = scene.facts.join(', ');
+  const verdict = byId('verdict');
+  if (scene.verdict) {
+    verdict.hidden = false;
+    verdict.textContent = scene.verdict.text;
+    verdict.className = scene.verdict.isGood ? 'good' : 'bad';
+  }
+  const entries = [['points', String(scene.count)]];
+  if (scene.hasContour) {
+    const arcs = scene.pieces.filter((piece) => piece.kind === 'arc').length;
+    const worst = scene.worst;
+    entries.push(
+        ['pieces', String(scene.pieces.length)],
+        ['lines', String(scene.pieces.length - arcs)],
+        ['arcs', String(arcs)],
+        ['length', short(scene.length) + units],
+        ['largest deviation', short(Math.abs(scene.deviation(worst)), 4) + units],
+        ['at point', String(worst)]);
+    if (scene.hasTolerances) {
+      entries.push(['of its tolerance', short(Math.abs(scene.relative(worst)), 4)]);
+    }
+  }
+  for (const [name, value] of entries) {
+    const entry = element('div');
+    entry.append(element('dt', name), element('dd', value));
+    byId('summary').append(entry);
+  }
+}
+
+// Hovering and choosing
+
+function describePoint(i) {
+  const rows = ['x', 'y'].map((axis) => [axis, short(scene.points[axis][i], 12) + units]);
+  if (scene.tolerance(i) !== null) rows.push(['tolerance', short(scene.tolerance(i)) + units]);
+  if (scene.hasContour) {
+    const deviation = scene.deviation(i);
+    const side = deviation > 0 ? 'left' : 'right';
+    rows.push(['deviation', short(Math.abs(deviation), 5) + units + (deviation ? ` ${side}` : '')]);
+    if (scene.hasTolerances) rows.push(['of tolerance', short(Math.abs(scene.relative(i)), 5)]);
+    const number = scene.pieceOf(i) + 1;
+    rows.push(['piece', `${number} (${scene.pieces[number - 1].kind})`]);
+  }
+  return rows;
+}
+
+function describePiece(index) {
+  const piece = scene.pieces[index];
+  const rows = [['length', short(piece.length) + units]];
+  if (piece.kind === 'arc') {
+    rows.push(['radius', short(piece.radius) + units], ['sweep', table.sweep(piece)]);
+  }
+  rows.push(['points', String(piece.points)]);
+  return rows;
+}
+
+/** The box with what is under the cursor, beside the place but inside the stage. */
+function showTip(title, rows, [x, y]) {
+  const tip = byId('tip');
+  const list = element('table');
+  for (const [name, value] of rows) {
+    const row = element('tr');
+    row.append(element('td', name), element('td', value));
+    list.append(row);
+  }
+  tip.replaceChildren(element('b', title), list);
+  tip.hidden = false;
+  const stage = byId('contour-stage');
+  const left = x + 18 + tip.offsetWidth > stage.clientWidth ? x - 18 - tip.offsetWidth : x + 18;
+  const top = Math.min(Math.max(4, y + 14), stage.clientHeight - tip.offsetHeight - 4);
+  tip.style.transform = `translate(${Math.max(4, left)}px, ${top}px)`;
+}
+
+function hideTip() { byId('tip').hidden = true; }
+
+function hoverPoint(i) {
+  state.hovered = i;
+  state.hoveredPiece = scene.hasContour ? scene.pieceOf(i) : -1;
+  showTip(`Point ${i}`, describePoint(i), contour.pixelOf(i));
+  redraw();
+}
+
+function hoverPiece(index, at = null) {
+  state.hovered = -1;
+  state.hoveredPiece = index;
+  if (index >= 0 && at) {
+    showTip(`Piece ${index + 1}: ${scene.pieces[index].kind}`, describePiece(index), at);
+  } else {
+    hideTip();
+  }
+  redraw();
+}
+
+function choosePiece(index) {
+  state.chosen = state.chosen === index ? -1 : index;
+  if (state.chosen >= 0) {
+    contour.showPiece(index);
+    diagram.showPiece(index);
+  } else {
+    showAll();
+  }
+  redraw();
+}
+
+function showAll() {
+  contour.showAll();
+  diagram?.showAll();
+}
+
+/** The point under the cursor, or else the piece. */
+function hoverContour(x, y) {
+  const point = contour.pointAt(x, y, 12);
+  if (point >= 0) hoverPoint(point);
+  else hoverPiece(contour.pieceAt(x, y, 7), [x, y]);
+  table?.scrollTo(state.hoveredPiece);
+}
+
+function hoverDiagram(x, y) {
+  const point = diagram.pointAt(x, y, 12);
+  if (point >= 0) hoverPoint(point);
+  else hoverPiece(diagram.pieceAt(x));
+  table.scrollTo(state.hoveredPiece);
+}
+
+/** The point before or after, brought into view. */
+function stepPoint(by) {
+  const next = state.hovered < 0 ? 0 : Math.min(scene.count - 1, Math.max(0, state.hovered + by));
+  const [x, y] = contour.pixelOf(next);
+  const {width, height} = contour.view;
+  const isInside = x >= 20 && y >= 20 && x <= width - 20 && y <= height - 20;
+  if (!isInside) contour.pan(0.5 * width - x, 0.5 * height - y);
+  hoverPoint(next);
+}
+
+listenToGestures(byId('contour'), {
+  pan: (dx, dy) => { hideTip(); contour.pan(dx, dy); },
+  zoom: (x, y, factor) => contour.zoom(x, y, factor),
+  reset: showAll,
+  hover: hoverContour,
+  leave: () => hoverPiece(-1),
+  tap: hoverContour,
+  step: stepPoint,
+});
+if (diagram) {
+  listenToGestures(byId('diagram'), {
+    pan: (dx) => diagram.pan(dx),
+    zoom: (x, y, factor) => diagram.zoom(x, y, factor),
+    reset: () => diagram.showAll(),
+    hover: hoverDiagram,
+    leave: () => hoverPiece(-1),
+    tap: hoverDiagram,
+    step: stepPoint,
+  });
+}
+
+// Controls
+
+function zoomMiddle(factor) {
+  contour.zoom(0.5 * contour.view.width, 0.5 * contour.view.height, factor);
+}
+
+byId('zoom-in').addEventListener('click', () => zoomMiddle(1.5));
+byId('zoom-out').addEventListener('click', () => zoomMiddle(1 / 1.5));
+byId('reset').addEventListener('click', showAll);
+
+/** Round magnifications up to ten times the one given, which is among them. */
+function magnifications() {
+  const steps = new Set([1, scene.magnify]);
+  for (let power = 1; power <= 10 * scene.magnify; power *= 10) {
+    for (const factor of [1, 2, 5]) {
+      if (factor * power <= 10 * scene.magnify) steps.add(factor * power);
+    }
+  }
+  return [...steps].sort((a, b) => a - b);
+}
+
+function setUpMagnify() {
+  const steps = magnifications();
+  const slider = byId('magnify');
+  slider.max = steps.length - 1;
+  slider.value = steps.indexOf(scene.magnify);
+  const apply = () => {
+    const times = steps[Number(slider.value)];
+    byId('magnify-value').textContent = `\u00d7${short(times)}`;
+    scene.setMagnify(times);
+    fillLegend();
+    hideTip();
+    contour.surface.schedule();
+  };
+  slider.addEventListener('input', apply);
+  apply();
+}
+
+function fillLegend() {
+  const times = scene.times === 1 ? '' : ` \u00d7${short(scene.times)}`;
+  const stroke = (color, dashes) => `<line x1="0" y1="7" x2="26" y2="7" stroke="var(--${color})" ` +
+      `stroke-width="2.5" ${dashes ? 'stroke-dasharray="9 2.5"' : ''}/>`;
+  const outline = 'stroke="var(--text)" stroke-width="1.1"';
+  const entries = [];
+  const hasKind = (kind) => scene.pieces.some((piece) => piece.kind === kind);
+  const isAnyOutside = () => scene.pieces.some((piece) => piece.worst >= 0 &&
+                                                          scene.isOutside(piece.worst));
+  if (scene.hasContour) {
+    if (hasKind('line')) entries.push([stroke('line'), 'line']);
+    if (hasKind('arc')) entries.push([stroke('arc', true), 'arc']);
+    entries.push([`<circle cx="13" cy="7" r="3.6" fill="var(--paper)" ${outline}/>`, 'joint']);
+  }
+  entries.push([`<path d="M8 1.5L20 7L8 12.5z" fill="var(--start)" ${outline}/>`,
+                scene.isClosed ? 'start and end' : 'start']);
+  if (!scene.isClosed) {
+    entries.push([`<rect x="9" y="3" width="8" height="8" fill="var(--paper)" ${outline}/>`,
+                  'end']);
+  }
+  if (scene.hasContour) {
+    entries.push(['<circle cx="7" cy="7" r="2.5" fill="var(--point)"/>' +
+                  '<rect x="16" y="4.8" width="4.4" height="4.4" fill="var(--point)"/>',
+                  `point of a line, of an arc: deviation${times}`],
+                 ['<circle cx="13" cy="7" r="6" fill="none" stroke="var(--worst)" ' +
+                  'stroke-width="2"/>',
+                  'largest deviation']);
+  } else {
+    entries.push(['<circle cx="13" cy="7" r="2.5" fill="var(--point)"/>', 'measured point'],
+                 ['<path d="M3 7h12M14 3.5L21 7L14 10.5z" fill="var(--start)" ' +
+                  'stroke="var(--start)"/>',
+                  'order']);
+  }
+  if (scene.hasTolerances) {
+    entries.push(['<rect x="4" y="1.5" width="18" height="11" fill="var(--band)" ' +
+                  'stroke="var(--band-edge)" stroke-width="1.2"/>', `tolerance${times}`]);
+    if (scene.hasContour && isAnyOutside()) {
+      entries.push(['<path d="M9.5 3.5l7 7m0-7l-7 7" stroke="var(--outside)" stroke-width="1.4"/>',
+                    'outside tolerance']);
+    }
+  }
+  byId('legend').replaceChildren(...entries.map(([markup, words]) => {
+    const entry = element('li');
+    entry.append(swatch(markup, 26, 14), words);
+    return entry;
+  }));
+}
+
+function setUpDiagram() {
+  const title = () => {
+    byId('diagram-title').textContent = diagram.isRelative
+        ? "Deviation as a multiple of the point's tolerance"
+        : `Deviation${scene.units ? ` [${scene.units}]` : ''}`;
+  };
+  const choice = byId('diagram-unit');
+  choice.value = diagram.isRelative ? 'relative' : 'length';
+  byId('diagram-unit-control').hidden = !scene.hasTolerances;
+  choice.addEventListener('change', () => {
+    diagram.setRelative(choice.value === 'relative');
+    title();
+  });
+  title();
+}
+
+fillSummary();
+if (scene.hasContour) {
+  setUpMagnify();
+  setUpDiagram();
+} else {
+  byId('magnify-control').hidden = true;
+  byId('diagram-part').hidden = true;
+  byId('pieces').hidden = true;
+  byId('contour').classList.add('alone');
+  fillLegend();
+}
+
+matchMedia('(prefers-color-scheme: dark)').addEventListener('change', redraw);
+const drawForPaper = () => {
+  contour.surface.draw();
+  diagram?.surface.draw();
+};
+matchMedia('print').addEventListener('change', drawForPaper);
+addEventListener('beforeprint', drawForPaper);
+addEventListener('afterprint', redraw);
+
+/** For scripts that drive this page: where a point is, in pixels of its canvas. */
+globalThis.contourReport = {
+  pixelOf: (i) => contour.pixelOf(i),
+  diagramPixelOf: (i) => diagram.pixelOf(i),
+  hovered: () => state.hovered,
+};
