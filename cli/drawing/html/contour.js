@@ -10,7 +10,7 @@ class ContourDrawing {
     this.state = state;
     this.view = new View();
     this.isFresh = true;
-    this.surface = new Surface(canvas, (...page) => this.paint(...page));
+    this.surface = new Surface(canvas, scene.hasContour ? 325 : 529, (...page) => this.paint(...page));
   }
 
   showAll() {

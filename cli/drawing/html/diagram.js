@@ -12,7 +12,7 @@ class Diagram {
     this.alongs = Float64Array.from({length: scene.count}, (_, i) => scene.along(i));
     [this.from, this.to] = [0, scene.length];
     this.setRelative(this.isRelative);
-    this.surface = new Surface(canvas, (...page) => this.paint(...page));
+    this.surface = new Surface(canvas, 174, (...page) => this.paint(...page));
   }
 
   setRelative(isRelative) {

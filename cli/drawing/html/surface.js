@@ -1,8 +1,13 @@
 // A canvas as sharp as the screen, and the gestures that every drawing understands.
 
+/** What is between the margins of A4 across, in pixels. */
+const PAPER_WIDTH = 1032;
+
 class Surface {
-  constructor(canvas, paint) {
+  /** @param paperHeight height on paper in pixels, as the style sheet has it in millimetres */
+  constructor(canvas, paperHeight, paint) {
     this.canvas = canvas;
+    this.paperHeight = paperHeight;
     this.paint = paint;
     this.isScheduled = false;
     this.resolution = 0;
@@ -18,13 +23,11 @@ class Surface {
     });
   }
 
-  /** Draws at once; on paper with more pixels, and in the size that the screen had. */
+  /** Draws at once; on paper in its size and with more pixels. */
   draw() {
     const canvas = this.canvas;
-    if (!isPrinting() || !this.width) {
-      this.width = canvas.clientWidth;
-      this.height = canvas.clientHeight;
-    }
+    this.width = isPrinting() ? PAPER_WIDTH : canvas.clientWidth;
+    this.height = isPrinting() ? this.paperHeight : canvas.clientHeight;
     const resolution = isPrinting() ? 3 : devicePixelRatio || 1;
     const width = Math.max(1, Math.round(this.width * resolution));
     const height = Math.max(1, Math.round(this.height * resolution));
