@@ -166,7 +166,7 @@ class Reader {
 
 std::string ToCsv(ContourFile const& contour) {
   std::string text;
-  if (!contour.units.empty()) text += "# units " + contour.units + "\n";
+  if (!contour.units.empty()) text += "# units " + OneLine(contour.units) + "\n";
   text += contour.isClosed ? "# closed yes\n" : "# closed no\n";
   text += kHeader;
   for (Piece const& piece : contour.pieces) text += Row(piece);

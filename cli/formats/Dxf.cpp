@@ -52,14 +52,6 @@ class Writer {
   std::string text_;
 };
 
-/// A line break in the units would be read as a group of its own.
-std::string OneLine(std::string text) {
-  for (char& c : text) {
-    if (c == '\n' || c == '\r') c = ' ';
-  }
-  return text;
-}
-
 void WriteHeader(ContourFile const& contour, Writer* dxf) {
   if (!contour.units.empty()) dxf->Group(999, "units " + OneLine(contour.units));
   Extent const extent = ExtentOf(contour.pieces);

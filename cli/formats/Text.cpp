@@ -60,6 +60,12 @@ std::string FormatPlain(double value) {
   return text.find('.') == std::string::npos ? text + ".0" : text;
 }
 
+std::string OneLine(std::string text) {
+  std::replace_if(
+      text.begin(), text.end(), [](char c) { return c == '\n' || c == '\r'; }, ' ');
+  return text;
+}
+
 std::string PlaceOf(std::string_view text, std::size_t offset) {
   std::string_view const before = text.substr(0, offset);
   auto const line = std::count(before.begin(), before.end(), '\n') + 1;

@@ -40,6 +40,9 @@ double RequireNumber(std::string_view text, std::string const& what, std::string
 /// readers of older formats want it: "0.00001", "5.0".
 std::string FormatPlain(double value);
 
+/// With blanks in place of line breaks, so that a comment stays one.
+std::string OneLine(std::string text);
+
 /// Line and column of a place in the text, both counted from 1: "3:17".
 std::string PlaceOf(std::string_view text, std::size_t offset);
 
