@@ -23,6 +23,12 @@ TEST(ToCsv, WritesAPieceALine) {
                                 "line,5,-1,0,0,,,,\n");
 }
 
+TEST(ToCsv, ALineBreakInTheUnitsBreaksNothing) {
+  ContourFile contour = Wedge();
+  contour.units = "mm\nspline";
+  EXPECT_EQ(ParseCsvPieces(ToCsv(contour), "p.csv").units, "mm spline");
+}
+
 TEST(ParseCsvPieces, FindsColumnsByNameInAnyOrder) {
   ContourFile const contour = ParseCsvPieces(
       "\xEF\xBB\xBF# units: mm\r\n"
