@@ -27,6 +27,13 @@ std::vector<std::size_t> KeepSpaced(std::vector<WPoint> const& points, TooClose 
   return kept;
 }
 
+void DropCloseToFirst(std::vector<WPoint> const& points, TooClose const& tooClose,
+                      std::vector<std::size_t>* kept) {
+  while (kept->size() > 1 && tooClose(points[kept->back()], points[kept->front()])) {
+    kept->pop_back();
+  }
+}
+
 std::vector<std::size_t> Others(std::vector<std::size_t> const& kept, std::size_t count) {
   std::vector<std::size_t> others;
   others.reserve(count - kept.size());

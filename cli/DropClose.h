@@ -28,6 +28,10 @@ TooClose RuleOfSpacing(double cap);
 /// first and the last point cannot be neighbours. O(n).
 std::vector<std::size_t> KeepSpaced(std::vector<WPoint> const& points, TooClose const& tooClose);
 
+/// Of a closed contour: takes those away at the end that are too close to the first point.
+void DropCloseToFirst(std::vector<WPoint> const& points, TooClose const& tooClose,
+                      std::vector<std::size_t>* kept);
+
 /// The indices from 0 to count - 1 that are not in the ascending list.
 std::vector<std::size_t> Others(std::vector<std::size_t> const& kept, std::size_t count);
 

@@ -19,8 +19,8 @@ Json PointName(PointFile const& file, std::size_t point) {
   return {{"point", point}, {"line", file.lines[point]}};
 }
 
-Json PairNames(PointFile const& file, std::size_t second) {
-  return Json::array({PointName(file, second - 1), PointName(file, second)});
+Json PairNames(PointFile const& file, std::size_t first, std::size_t second) {
+  return Json::array({PointName(file, first), PointName(file, second)});
 }
 
 Json ExtentJson(PointsBox const& box) {
@@ -31,10 +31,12 @@ Json SpacingJson(InfoReport const& report) {
   SpacingFacts const& spacing = report.info.spacing;
   return {
       {"least",
-       {{"distance", spacing.least}, {"between", PairNames(report.file, spacing.leastSecond)}}},
+       {{"distance", spacing.least},
+        {"between", PairNames(report.file, spacing.leastSecond - 1, spacing.leastSecond)}}},
       {"median", spacing.median},
       {"most",
-       {{"distance", spacing.most}, {"between", PairNames(report.file, spacing.mostSecond)}}},
+       {{"distance", spacing.most},
+        {"between", PairNames(report.file, spacing.mostSecond - 1, spacing.mostSecond)}}},
   };
 }
 
@@ -63,8 +65,8 @@ Json CornersJson(InfoReport const& report) {
 Json RuleJson(InfoReport const& report) {
   if (!report.rule) return nullptr;
   Json broken = Json::array();
-  for (BrokenPair const& pair : report.rule->broken) {
-    broken.push_back({{"between", PairNames(report.file, pair.second)},
+  for (ClosePair const& pair : report.rule->broken) {
+    broken.push_back({{"between", PairNames(report.file, pair.first, pair.second)},
                       {"distance", pair.distance},
                       {"needed", pair.needed}});
   }
@@ -97,7 +99,10 @@ std::string ToJson(InfoReport const& report) {
       {"length", info.spacing.length},
       {"spacing", SpacingJson(report)},
       {"duplicates", DuplicatesJson(report)},
-      {"closed", {{"isClosed", info.isClosed}, {"gap", info.closingGap}}},
+      {"closed",
+       {{"isClosed", info.closure.isClosed},
+        {"reason", info.closure.reason},
+        {"gap", info.closure.gap}}},
       {"corners", CornersJson(report)},
       {"largestTolerance", OrNull(info.largestTolerance)},
       {"tolerance", RuleJson(report)},

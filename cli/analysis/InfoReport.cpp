@@ -5,10 +5,10 @@
 
 namespace Vorn::Cli {
 
-RuleCheck CheckRule(std::vector<WPoint> const& points, std::string source) {
+RuleCheck CheckRule(std::vector<WPoint> const& points, Closure const& closure, std::string source) {
   auto const [smallest, largest] = std::minmax_element(
       points.begin(), points.end(), [](WPoint const& a, WPoint const& b) { return a.w < b.w; });
-  return {std::move(source), smallest->w, largest->w, FindBrokenPairs(points)};
+  return {std::move(source), smallest->w, largest->w, FindClosePairs(points, closure)};
 }
 
 }  // namespace Vorn::Cli

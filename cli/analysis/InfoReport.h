@@ -14,7 +14,7 @@ struct RuleCheck {
   std::string source;  ///< where the tolerances come from
   double smallest = 0.0;
   double largest = 0.0;
-  std::vector<BrokenPair> broken;
+  std::vector<ClosePair> broken;
 };
 
 /// What `contour info` tells about one file.
@@ -25,7 +25,7 @@ struct InfoReport {
 };
 
 /// Checks the tolerances that the points of the file carry.
-RuleCheck CheckRule(std::vector<WPoint> const& points, std::string source);
+RuleCheck CheckRule(std::vector<WPoint> const& points, Closure const& closure, std::string source);
 
 /// For people: one fact a line, of long lists the first few.
 std::string ToText(InfoReport const& report);

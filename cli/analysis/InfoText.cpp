@@ -35,8 +35,8 @@ std::string Range(double low, double high) {
   return FormatShort(low) + " to " + FormatShort(high) + " (" + FormatShort(high - low) + ")";
 }
 
-std::string PairName(PointFile const& file, std::size_t second) {
-  return file.NameOf(second - 1) + " and " + file.NameOf(second);
+std::string PairName(PointFile const& file, std::size_t first, std::size_t second) {
+  return file.NameOf(first) + " and " + file.NameOf(second);
 }
 
 void AddSize(InfoReport const& report, FactList* facts) {
@@ -49,10 +49,10 @@ void AddSize(InfoReport const& report, FactList* facts) {
 void AddSpacing(InfoReport const& report, FactList* facts) {
   SpacingFacts const& spacing = report.info.spacing;
   facts->Add("spacing", "least " + FormatShort(spacing.least) + " between " +
-                            PairName(report.file, spacing.leastSecond));
+                            PairName(report.file, spacing.leastSecond - 1, spacing.leastSecond));
   facts->GoOn("median " + FormatShort(spacing.median));
   facts->GoOn("most " + FormatShort(spacing.most) + " between " +
-              PairName(report.file, spacing.mostSecond));
+              PairName(report.file, spacing.mostSecond - 1, spacing.mostSecond));
 }
 
 void AddDuplicates(InfoReport const& report, FactList* facts) {
@@ -65,6 +65,12 @@ void AddDuplicates(InfoReport const& report, FactList* facts) {
   facts->AddRest(duplicates.size());
 }
 
+std::size_t PairCount(InfoReport const& report) {
+  Closure const& closure = report.info.closure;
+  std::size_t const count = report.file.points.size();
+  return closure.isClosed && !closure.repeatsFirst ? count : count - 1;
+}
+
 void AddRule(InfoReport const& report, FactList* facts) {
   std::optional<double> const& largest = report.info.largestTolerance;
   facts->Add("limit", largest ? FormatShort(*largest) +
@@ -74,7 +80,7 @@ void AddRule(InfoReport const& report, FactList* facts) {
   RuleCheck const& rule = *report.rule;
   std::string tolerance = FormatShort(rule.smallest);
   if (rule.smallest != rule.largest) tolerance += " to " + FormatShort(rule.largest);
-  std::string const pairs = Counted(report.file.points.size() - 1, "pair");
+  std::string const pairs = Counted(PairCount(report), "pair");
   facts->Add(
       "tolerance",
       tolerance + " (" + rule.source + "): " +
@@ -82,9 +88,9 @@ void AddRule(InfoReport const& report, FactList* facts) {
                                : std::to_string(rule.broken.size()) + " of " + pairs +
                                      (rule.broken.size() == 1 ? " is" : " are") + " too close"));
   for (std::size_t i = 0; i < std::min(rule.broken.size(), kMostListed); ++i) {
-    BrokenPair const& pair = rule.broken[i];
-    facts->GoOn(PairName(report.file, pair.second) + ": distance " + FormatShort(pair.distance) +
-                ", needed more than " + FormatShort(pair.needed));
+    ClosePair const& pair = rule.broken[i];
+    facts->GoOn(PairName(report.file, pair.first, pair.second) + ": distance " +
+                FormatShort(pair.distance) + ", needed more than " + FormatShort(pair.needed));
   }
   facts->AddRest(rule.broken.size());
 }
@@ -107,9 +113,9 @@ void AddCorners(InfoReport const& report, FactList* facts) {
 }
 
 void AddClosing(InfoReport const& report, FactList* facts) {
-  PointsInfo const& info = report.info;
-  facts->Add("closed", std::string(info.isClosed ? "yes" : "no") + ": the ends are " +
-                           FormatShort(info.closingGap) + " apart");
+  Closure const& closure = report.info.closure;
+  facts->Add("closed", std::string(closure.isClosed ? "yes" : "no") + " (" + closure.reason +
+                           "): the gap is " + FormatShort(closure.gap));
 }
 
 std::string SuggestionText(Suggestion const& suggestion) {

@@ -39,15 +39,25 @@ Suggestion ToleranceForShape(PointsBox const& box) {
   return {Suggestion::Way::Same, forSize, "a ten-thousandth of the size"};
 }
 
+/// The points, and the first one again where it is the neighbour of the last.
+std::vector<WPoint> WithClosingPair(std::vector<WPoint> points, Closure const& closure) {
+  if (closure.isClosed && !closure.repeatsFirst) points.push_back(WPoint(points.front()));
+  return points;
+}
+
 }  // namespace
 
-std::vector<BrokenPair> FindBrokenPairs(std::vector<WPoint> const& points) {
-  std::vector<BrokenPair> pairs;
-  for (std::size_t i = 1; i < points.size(); ++i) {
-    WPoint const& a = points[i - 1];
-    WPoint const& b = points[i];
-    if (AreTooClose(a, b)) pairs.push_back({i, Distance(a, b), NeededDistance(a, b)});
-  }
+std::vector<ClosePair> FindClosePairs(std::vector<WPoint> const& points, Closure const& closure) {
+  std::vector<ClosePair> pairs;
+  auto const test = [&](std::size_t first, std::size_t second) {
+    WPoint const& a = points[first];
+    WPoint const& b = points[second];
+    if (AreTooClose(a, b)) {
+      pairs.push_back({first, second, Distance(a, b), NeededDistance(a, b)});
+    }
+  };
+  for (std::size_t i = 1; i < points.size(); ++i) test(i - 1, i);
+  if (closure.isClosed && !closure.repeatsFirst) test(points.size() - 1, 0);
   return pairs;
 }
 
@@ -70,13 +80,13 @@ Suggestion SuggestTolerance(PointsInfo const& info) {
           reason + "; the spacing allows no single tolerance that large"};
 }
 
-PointsInfo Analyse(std::vector<WPoint> const& points) {
+PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed) {
   PointsInfo info;
   info.box = BoxOf(points);
   info.spacing = SpacingOf(points);
   info.duplicates = FindDuplicates(points);
-  info.closingGap = Distance(points.back(), points.front());
-  info.largestTolerance = LargestSingleTolerance(points);
+  info.closure = FindClosure(points, closed);
+  info.largestTolerance = LargestSingleTolerance(WithClosingPair(points, info.closure));
   info.noise = EstimateNoise(points);
   info.corners = FindCorners(points, ReachForNoise(info.noise.value_or(0.0)));
   info.suggestion = SuggestTolerance(info);

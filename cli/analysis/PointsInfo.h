@@ -5,21 +5,16 @@
 #include <string>
 #include <vector>
 
-#include "cli/CsvReader.h"
+#include "cli/Closure.h"
+#include "cli/Spacing.h"
 #include "cli/analysis/Corners.h"
 #include "cli/analysis/PathFacts.h"
 
 namespace Vorn::Cli {
 
-/// Neighbours that break the spacing rule.
-struct BrokenPair {
-  std::size_t second = 0;  ///< index of the later point
-  double distance = 0.0;
-  double needed = 0.0;  ///< the distance must be above this
-};
-
-/// Every pair of neighbours that is too close for its tolerances, in the order of the points.
-std::vector<BrokenPair> FindBrokenPairs(std::vector<WPoint> const& points);
+/// Every pair of neighbours that is too close for its tolerances, in the order of the points. Of a
+/// closed contour that does not repeat its first point, the last and the first are neighbours.
+std::vector<ClosePair> FindClosePairs(std::vector<WPoint> const& points, Closure const& closure);
 
 /// A tolerance that suits the points, and why.
 struct Suggestion {
@@ -34,9 +29,7 @@ struct PointsInfo {
   PointsBox box;
   SpacingFacts spacing;
   std::vector<Duplicate> duplicates;
-  double closingGap = 0.0;  ///< distance of the last point from the first
-  bool isClosed = false;
-  std::string closedReason;
+  Closure closure;
   std::optional<double> largestTolerance;  ///< see LargestSingleTolerance
   std::vector<Corner> corners;
   std::optional<double> noise;  ///< see EstimateNoise
@@ -44,7 +37,7 @@ struct PointsInfo {
 };
 
 /// Looks at the points alone, not at their tolerances.
-PointsInfo Analyse(std::vector<WPoint> const& points);
+PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed);
 
 /// Five times the noise, or what the shape asks for where that is more: a ten-thousandth of the
 /// size, of a flat profile at most a hundredth of its height. For all points where the spacing

@@ -52,6 +52,7 @@ Examples:
 
 struct Options {
   PointsInput points;
+  ClosedChoice closed = ClosedChoice::Auto;
   std::string contour;
   std::optional<Format> from;
   std::string table;
@@ -86,7 +87,8 @@ ExitCode Run(Options const& options, Console const& console) {
   ContourFile contour = ReadContour(options.contour, console, options.from);
   std::string source;
   if (IsToleranceStated(options.points.tolerance, file)) {
-    source = AssignTolerances(options.points.tolerance, &file);
+    bool const isClosed = FindClosure(file.points, options.closed).isClosed;
+    source = AssignTolerances(options.points.tolerance, &file, isClosed);
   }
   CheckReport const report =
       MakeCheckReport(std::move(file), std::move(source), std::move(contour));
@@ -103,6 +105,7 @@ void AddOptions(CLI::App& app, Options* options) {
   app.add_option("CONTOUR", options->contour, "File with the contour; - is the standard input")
       ->required()
       ->type_name("FILE");
+  AddClosedChoice(app, &options->closed);
   AddWord(
       app, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
       [options](std::string const& word) { options->from = FormatNamed(word); },

@@ -40,16 +40,18 @@ Examples:
 
 struct Options {
   PointsInput points;
+  ClosedChoice closed = ClosedChoice::Auto;
   bool asJson = false;
 };
 
 ExitCode Run(Options const& options, Console const& console) {
   InfoReport report;
   report.file = ReadPointsInput(options.points, console);
-  report.info = Analyse(report.file.points);
+  report.info = Analyse(report.file.points, options.closed);
   if (IsToleranceStated(options.points.tolerance, report.file)) {
-    std::string source = AssignTolerances(options.points.tolerance, &report.file);
-    report.rule = CheckRule(report.file.points, std::move(source));
+    Closure const& closure = report.info.closure;
+    std::string source = AssignTolerances(options.points.tolerance, &report.file, closure.isClosed);
+    report.rule = CheckRule(report.file.points, closure, std::move(source));
   }
   console.out << (options.asJson ? ToJson(report) : ToText(report));
   return ExitCode::Ok;
@@ -61,6 +63,7 @@ void AddInfoCommand(CLI::App& program, Action* action) {
   CLI::App* const app = program.add_subcommand("info", kText);
   auto const options = std::make_shared<Options>();
   AddPointsInput(*app, &options->points);
+  AddClosedChoice(*app, &options->closed);
   app->add_flag("--json", options->asJson, "Write the facts as JSON, long lists whole");
   app->footer(std::string(kPointsFileText) + kFooter);
   app->callback([options, action] {

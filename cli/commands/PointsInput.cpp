@@ -58,6 +58,14 @@ void AddPointsInput(CLI::App& app, PointsInput* input) {
       ->type_name("NAME");
 }
 
+void AddClosedChoice(CLI::App& app, ClosedChoice* choice) {
+  AddChoice<ClosedChoice>(
+      app, "--closed", choice,
+      {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
+      "Whether the contour runs back to its start; auto (default) judges by the ends as "
+      "'contour fit' does");
+}
+
 PointFile ReadPointsInput(PointsInput const& input, Console const& console) {
   PointFile file = ReadPoints(input.path, console.in, ColumnFor(input.tolerance), input.columns);
   if (!input.units.empty()) file.units = input.units;

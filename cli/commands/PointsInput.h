@@ -2,6 +2,7 @@
 
 #include <string>
 
+#include "cli/Closure.h"
 #include "cli/CsvReader.h"
 #include "cli/Tolerances.h"
 #include "cli/commands/Command.h"
@@ -22,6 +23,9 @@ struct PointsInput {
 
 /// Adds the positional POINTS and the options for tolerances, columns and units.
 void AddPointsInput(CLI::App& app, PointsInput* input);
+
+/// Adds --closed, for commands to which the neighbourhood of the last and the first point matters.
+void AddClosedChoice(CLI::App& app, ClosedChoice* choice);
 
 /// Reads the points. Tolerances that come from options are not assigned yet, see AssignTolerances.
 /// @throws Failure as ReadPoints does.

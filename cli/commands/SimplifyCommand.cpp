@@ -25,7 +25,8 @@ constexpr char const* kText =
 constexpr char const* kFooter =
     R"(
 --drop-close keeps the first point, then always the next one that is more than 1.5 times the sum of
-their tolerances away from the one kept before, and the last point. With --tolerance-per-point
+their tolerances away from the one kept before, and the last point; in a closed contour that does
+not repeat its first point, the last one must be that far from the first as well. With --tolerance-per-point
 tolerances follow the spacing, so that only points in one place are left out; so it is without any
 tolerance.
 
@@ -43,6 +44,7 @@ Examples:
 
 struct Options {
   PointsInput points;
+  ClosedChoice closed = ClosedChoice::Auto;
   bool dropClose = false;
   std::string output = kStandardInput;  // "-", which is standard output here
   std::string dropped;
@@ -68,6 +70,8 @@ TooClose RuleFor(ToleranceChoice const& choice, PointFile* file) {
 std::vector<std::size_t> KeptPoints(Options const& options, PointFile* file) {
   TooClose const rule = RuleFor(options.points.tolerance, file);
   std::vector<std::size_t> kept = KeepSpaced(file->points, rule);
+  Closure const closure = FindClosure(file->points, options.closed);
+  if (closure.isClosed && !closure.repeatsFirst) DropCloseToFirst(file->points, rule, &kept);
   if (kept.size() < 2) {
     throw Failure(ExitCode::PointsTooClose,
                   file->path + ": fewer than two points would be left: all lie too close to " +
@@ -124,6 +128,7 @@ void AddSimplifyCommand(CLI::App& program, Action* action) {
   CLI::App* const app = program.add_subcommand("simplify", kText);
   auto const options = std::make_shared<Options>();
   AddPointsInput(*app, &options->points);
+  AddClosedChoice(*app, &options->closed);
   app->add_flag("--drop-close", options->dropClose,
                 "Leave out points that are too close to the one before")
       ->required();

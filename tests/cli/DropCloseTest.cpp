@@ -126,6 +126,15 @@ TEST(KeepSpaced, LeavesPointsThatTakeTheirTolerancesFromTheSpacing) {
   }
 }
 
+TEST(DropCloseToFirst, TakesPointsAwayAtTheEnd) {
+  std::vector<WPoint> const points = {{0, 0, 1}, {4, 0, 1}, {4, 4, 1}, {0, 4, 1}, {0, 3, 1}};
+  Indices kept = {0, 1, 2, 4};
+  DropCloseToFirst(points, RuleOfTolerances(), &kept);
+  EXPECT_EQ(kept, (Indices{0, 1, 2}));
+  DropCloseToFirst(points, RuleOfTolerances(), &kept);
+  EXPECT_EQ(kept, (Indices{0, 1, 2}));
+}
+
 TEST(Others, AreTheIndicesThatAreNotKept) {
   EXPECT_EQ(Others({0, 3, 4}, 6), (Indices{1, 2, 5}));
   EXPECT_EQ(Others({0, 1}, 2), Indices{});

@@ -26,7 +26,7 @@ TEST(InfoCommand, TellsTheFactsOnStandardOutput) {
             "            most 4 between point 0 (line 3) and point 1 (line 4)\n"
             "duplicates  1\n"
             "            point 3 (line 6) repeats point 2 (line 5)\n"
-            "closed      no: the ends are 1 apart\n"
+            "closed      no (the last point is not the first): the gap is 1\n"
             "corners     2 of 30 degrees or more, the sharpest first\n"
             "            point 1 (line 4): 90.0 degrees to the left\n"
             "            point 2 (line 5): 90.0 degrees to the left\n"

@@ -10,9 +10,9 @@
 namespace Vorn::Cli {
 namespace {
 
-TEST(FindBrokenPairs, ListsEveryPairTheSpacingRuleRefuses) {
+TEST(FindClosePairs, ListsEveryPairTheSpacingRuleRefuses) {
   std::vector<WPoint> const points = {{0, 0, 1}, {3, 0, 1}, {9, 0, 1}, {9, 1, .5}, {9, 9, .5}};
-  std::vector<BrokenPair> const pairs = FindBrokenPairs(points);
+  std::vector<ClosePair> const pairs = FindClosePairs(points, {});
   ASSERT_EQ(pairs.size(), 2u);
   EXPECT_EQ(pairs[0].second, 1u);
   EXPECT_EQ(pairs[0].distance, 3.0);
@@ -21,7 +21,28 @@ TEST(FindBrokenPairs, ListsEveryPairTheSpacingRuleRefuses) {
   EXPECT_EQ(pairs[1].needed, 2.25);
 }
 
-TEST(FindBrokenPairs, AgreesWithTheLibraryToTheLastBit) {
+TEST(FindClosePairs, TakesTheLastAndTheFirstOfAClosedContour) {
+  std::vector<WPoint> const points = {{0, 0, 1}, {9, 0, 1}, {9, 9, 1}, {0, 2, 1}};
+  Closure closure;
+  EXPECT_TRUE(FindClosePairs(points, closure).empty());
+  closure.isClosed = true;
+  std::vector<ClosePair> const pairs = FindClosePairs(points, closure);
+  ASSERT_EQ(pairs.size(), 1u);
+  EXPECT_EQ(pairs[0].first, 3u);
+  EXPECT_EQ(pairs[0].second, 0u);
+  closure.repeatsFirst = true;
+  EXPECT_TRUE(FindClosePairs(points, closure).empty());
+}
+
+TEST(Analyse, CountsTheClosingPairOfAClosedContour) {
+  std::vector<WPoint> const points = {{0, 0, 0}, {9, 0, 0}, {9, 9, 0}, {0, 3, 0}};
+  double const open = Analyse(points, ClosedChoice::No).largestTolerance.value();
+  double const closed = Analyse(points, ClosedChoice::Yes).largestTolerance.value();
+  EXPECT_NEAR(open, 3.0, 1e-4);
+  EXPECT_NEAR(closed, 1.0, 1e-4);
+}
+
+TEST(FindClosePairs, AgreesWithTheLibraryToTheLastBit) {
   constexpr std::uint64_t kSeed = 5;
   SCOPED_TRACE(kSeed);
   std::mt19937_64 engine(kSeed);
@@ -33,7 +54,7 @@ TEST(FindBrokenPairs, AgreesWithTheLibraryToTheLastBit) {
     // On the edge of the rule, a few bits to this or that side.
     b.w = Distance(a, b) / 1.5 - a.w;
     for (auto steps = engine() % 4; steps > 0; --steps) b.w = std::nextafter(b.w, 9.0);
-    bool const isBroken = !FindBrokenPairs({a, b}).empty();
+    bool const isBroken = !FindClosePairs({a, b}, {}).empty();
     EXPECT_EQ(isBroken, !GeometryUtils::IsPointValidToFit(a, b)) << i;
     broken += isBroken ? 1 : 0;
   }
@@ -85,15 +106,15 @@ TEST(SuggestTolerance, IsNoneWhereNeighboursCoincide) {
 }
 
 TEST(Analyse, TakesTwoPoints) {
-  PointsInfo const info = Analyse({{0, 0, 0}, {3, 4, 0}});
+  PointsInfo const info = Analyse({{0, 0, 0}, {3, 4, 0}}, ClosedChoice::Auto);
   EXPECT_EQ(info.spacing.length, 5.0);
-  EXPECT_EQ(info.closingGap, 5.0);
+  EXPECT_EQ(info.closure.gap, 5.0);
   EXPECT_FALSE(info.noise.has_value());
   EXPECT_TRUE(info.corners.empty());
 }
 
 TEST(Analyse, TakesCoincidingPoints) {
-  PointsInfo const info = Analyse(std::vector<WPoint>(20, WPoint{1, 1, 0}));
+  PointsInfo const info = Analyse(std::vector<WPoint>(20, WPoint{1, 1, 0}), ClosedChoice::Auto);
   EXPECT_EQ(info.duplicates.size(), 19u);
   EXPECT_FALSE(info.largestTolerance.has_value());
   EXPECT_EQ(info.suggestion.way, Suggestion::Way::None);

@@ -60,6 +60,14 @@ TEST(SimplifyCommand, RefusesToLeaveASinglePoint) {
             "point 0 (line 1)\n");
 }
 
+TEST(SimplifyCommand, AClosedContourKeepsItsEndsApart) {
+  std::string const text = "0,0\n4,0\n4,4\n0,4\n0,1\n";
+  EXPECT_EQ(RunInProcess({"simplify", "-", "--drop-close", "-t", ".5"}, text).out, text);
+  EXPECT_EQ(
+      RunInProcess({"simplify", "-", "--drop-close", "-t", ".5", "--closed", "yes"}, text).out,
+      "0,0\n4,0\n4,4\n0,4\n");
+}
+
 TEST(SimplifyCommand, AsksHow) {
   EXPECT_EQ(RunInProcess({"simplify", "-"}, kText).code, ExitCode::Usage);
   EXPECT_EQ(RunInProcess({"simplify", "p.csv", "--drop-close", "-o", "p.csv"}).code,
