@@ -1,6 +1,6 @@
 #include "geometry/cells/CellSequence.h"
 
-#include <algorithm>
+#include <array>
 #include <bit>
 #include <cmath>
 #include <cstring>
@@ -34,6 +34,63 @@ std::uint32_t HashOf(Triangle const& triangle) {
       (word(pts[1].x, 0x165667B19E3779F9) ^ word(pts[1].y, 0xD6E8FEB86659FD93)) +
       (word(pts[2].x, 0xA0761D6478BD642F) ^ word(pts[2].y, 0xE7037ED1A0B428DB));
   return static_cast<std::uint32_t>(hash >> 32);
+}
+
+using WordChain = std::vector<CellSequence::Words const*>;
+using Sums = std::array<double, 3>;
+
+/// What a letter adds to three sums, if anything.
+struct Summand {
+  Sums terms;
+  bool isSkipped;
+};
+
+/// How many letters of an expansion are run through in the time that the shortcuts take for one
+/// letter of the words (measured; they look at it once for every binade that the sums pass).
+constexpr std::size_t kShortcutCost = 20;
+
+/// The sums over the sequence, each taken term by term in order.
+Sums RunThrough(WordChain const& chain, std::vector<Summand> const& summands) {
+  // Up to the letters that the last words replace.
+  std::vector<std::uint32_t> letters = {0};
+  std::vector<std::uint32_t> next;
+  for (std::size_t level = 0; level + 1 < chain.size(); ++level) {
+    next.clear();
+    for (std::uint32_t const letter : letters) {
+      std::span<std::uint32_t const> const word = chain[level]->Of(letter);
+      next.insert(next.end(), word.begin(), word.end());
+    }
+    letters.swap(next);
+  }
+  Sums sums{};
+  for (std::uint32_t const letter : letters) {
+    for (std::uint32_t const leaf : chain.back()->Of(letter)) {
+      Summand const& summand = summands[leaf];
+      if (summand.isSkipped) continue;
+      for (std::size_t i = 0; i < sums.size(); ++i) sums[i] += summand.terms[i];
+    }
+  }
+  return sums;
+}
+
+/// `length` is the number of letters in the expansions of all levels.
+Sums SumOver(WordChain const& chain, std::size_t length, std::vector<Summand> const& summands) {
+  std::size_t wordLetters = 0;
+  for (CellSequence::Words const* words : chain) wordLetters += words->letters.size();
+  if (length <= kShortcutCost * wordLetters) return RunThrough(chain, summands);
+
+  SequenceSum sequence(chain);
+  std::vector<double> terms(summands.size());
+  std::vector<bool> isSkipped(summands.size());
+  Sums sums{};
+  for (std::size_t i = 0; i < sums.size(); ++i) {
+    for (std::size_t letter = 0; letter < summands.size(); ++letter) {
+      terms[letter] = summands[letter].terms[i];
+      isSkipped[letter] = summands[letter].isSkipped;
+    }
+    sums[i] = sequence.Sum(terms, isSkipped);
+  }
+  return sums;
 }
 
 }  // namespace
@@ -194,47 +251,46 @@ bool CellSequence::CenterOfOverlapWith(Triangle const& candidate, Point* center)
 }
 
 bool CellSequence::CenterWith(Level const* last, Point* center) const {
-  std::vector<Words const*> chain;
+  WordChain chain;
   chain.reserve(levels_.size() + 1);
-  for (Level const& level : levels_) chain.push_back(&level.words);
-  if (last != nullptr) chain.push_back(&last->words);
+  std::size_t length = 0;
+  auto const append = [&](Level const& level) {
+    chain.push_back(&level.words);
+    length += level.size;
+  };
+  for (Level const& level : levels_) append(level);
+  if (last != nullptr) append(*last);
   Level const& leaves = last != nullptr ? *last : levels_.back();
 
-  std::size_t const letters = leaves.triangles.size();
-  std::vector<double> areas(letters);
-  std::vector<double> weightedX(letters);
-  std::vector<double> weightedY(letters);
-  std::vector<double> ownX(letters);
-  std::vector<double> ownY(letters);
-  std::vector<bool> isDegenerate(letters);
-  std::vector<bool> isProper(letters);
+  std::vector<Summand> weighted;
+  std::vector<Summand> own;
+  weighted.reserve(leaves.triangles.size());
+  own.reserve(leaves.triangles.size());
   std::size_t degenerateCount = 0;
   bool isAnyProper = false;
-  for (std::size_t letter = 0; letter < letters; ++letter) {
-    TriangleCentre const own(leaves.triangles[letter].triangle);
-    areas[letter] = own.area;
-    ownX[letter] = own.center.x;
-    ownY[letter] = own.center.y;
-    weightedX[letter] = own.center.x * own.area;
-    weightedY[letter] = own.center.y * own.area;
-    isDegenerate[letter] = Numeric::IsZero(own.area);
-    isProper[letter] = !isDegenerate[letter];
-    if (isDegenerate[letter]) {
+  for (std::size_t letter = 0; letter < leaves.triangles.size(); ++letter) {
+    TriangleCentre const centre(leaves.triangles[letter].triangle);
+    auto const& [x, y] = centre.center;
+    bool const isDegenerate = Numeric::IsZero(centre.area);
+    weighted.push_back({{centre.area, x * centre.area, y * centre.area}, isDegenerate});
+    own.push_back({{0.0, x, y}, !isDegenerate});
+    if (isDegenerate) {
       degenerateCount += leaves.counts[letter];
     } else {
       isAnyProper = true;
     }
   }
-  SequenceSum sequence(chain);
-  double const totalArea = isAnyProper ? sequence.Sum(areas, isDegenerate) : 0.0;
+  Sums proper{};
+  if (isAnyProper) proper = SumOver(chain, length, weighted);
+  double const totalArea = proper[0];
   if (totalArea >= Numeric::kZero) {
-    *center = {sequence.Sum(weightedX, isDegenerate) / totalArea,
-               sequence.Sum(weightedY, isDegenerate) / totalArea};
+    *center = {proper[1] / totalArea, proper[2] / totalArea};
   } else if (degenerateCount > 0) {
+    Sums const degenerate = SumOver(chain, length, own);
     auto const count = static_cast<double>(degenerateCount);
-    *center = {sequence.Sum(ownX, isProper) / count, sequence.Sum(ownY, isProper) / count};
+    *center = {degenerate[1] / count, degenerate[2] / count};
   } else {
-    *center = {sequence.Sum(weightedX, isDegenerate), sequence.Sum(weightedY, isDegenerate)};
+    *center = {proper[1], proper[2]};
   }
   return true;
 }
