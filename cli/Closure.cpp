@@ -137,13 +137,14 @@ Circuit MakeCircuit(std::vector<WPoint> const& points, Closure const& closure, s
   return circuit;
 }
 
-std::size_t SharpestCorner(std::vector<WPoint> const& points, Closure const& closure) {
+std::optional<std::size_t> SharpestCorner(std::vector<WPoint> const& points,
+                                          Closure const& closure) {
   Walk const walk(points, DistinctCount(points, closure));
   double const stretch = std::min(kStretchInTolerances * MedianTolerance(points),
                                   kLargestShareOfLength * walk.Length());
   std::vector<double> const turns = walk.Turns(stretch);
   auto const sharpest = std::max_element(turns.begin(), turns.end());
-  if (*sharpest <= kLeastCorner) return 0;
+  if (*sharpest <= kLeastCorner) return {};
   return static_cast<std::size_t>(sharpest - turns.begin());
 }
 

@@ -44,7 +44,8 @@ Circuit MakeCircuit(std::vector<WPoint> const& points, Closure const& closure, s
 /// Where to cut a closed contour open: the point where it turns most, compared over a stretch of
 /// 20 median tolerances before and after (at that length the tolerance moves a direction by not
 /// more than some six degrees), but at least a step and at most a twentieth of the way round.
-/// The first point of the file when nothing turns by more than 20 degrees.
-std::size_t SharpestCorner(std::vector<WPoint> const& points, Closure const& closure);
+/// Nothing when no point turns by more than 20 degrees.
+std::optional<std::size_t> SharpestCorner(std::vector<WPoint> const& points,
+                                          Closure const& closure);
 
 }  // namespace Vorn::Cli

@@ -1,12 +1,14 @@
 #include "cli/ContourFit.h"
 
 #include <chrono>
+#include <cstdint>
 #include <limits>
 #include <utility>
 
 #include "cli/Failure.h"
 #include "cli/Fit.h"
 #include "cli/FullCircle.h"
+#include "cli/Progress.h"
 #include "cli/Spacing.h"
 
 namespace Vorn::Cli {
@@ -51,7 +53,8 @@ Report FitOpen(PointFile file, std::string toleranceSource, Closure const& closu
   return report;
 }
 
-std::size_t SeamOf(PointFile const& file, Closure const& closure, FitChoice const& choice) {
+std::optional<std::size_t> SeamOf(PointFile const& file, Closure const& closure,
+                                  FitChoice const& choice) {
   if (!choice.start) return SharpestCorner(file.points, closure);
   if (*choice.start >= file.points.size()) {
     throw Failure(ExitCode::Usage, file.path + ": --start " + std::to_string(*choice.start) +
@@ -85,9 +88,9 @@ double SecondsSince(std::chrono::steady_clock::time_point begin) {
   return std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count();
 }
 
-Report FitClosed(PointFile file, std::string toleranceSource, Closure const& closure,
-                 FitChoice const& choice, ExecutionState* progress) {
-  Circuit const circuit = MakeCircuit(file.points, closure, SeamOf(file, closure, choice));
+Report FitFrom(std::size_t seam, PointFile file, std::string toleranceSource,
+               Closure const& closure, FitChoice const& choice, ExecutionState* progress) {
+  Circuit const circuit = MakeCircuit(file.points, closure, seam);
   RefuseClosePair(file, choice, circuit);
   auto const begin = std::chrono::steady_clock::now();
   std::optional<std::vector<Piece>> circle = FitFullCircle(circuit.points);
@@ -100,6 +103,59 @@ Report FitClosed(PointFile file, std::string toleranceSource, Closure const& clo
   if (circle) answer = AnswerOfCircle(SecondsSince(begin));
   return MakeClosedReport(std::move(file), std::move(toleranceSource), choice.strategy,
                           std::move(answer), closure, circuit, std::move(circle));
+}
+
+/// One of two halves of the progress.
+class Half final : public ExecutionState {
+ public:
+  Half(ExecutionState* whole, std::int32_t before) : whole_(whole), before_(before) {}
+
+  void SetProgress(std::int32_t percent) override {
+    if (whole_ != nullptr) whole_->SetProgress(before_ + percent / 2);
+  }
+
+ private:
+  ExecutionState* whole_;
+  std::int32_t before_;
+};
+
+/// The last point of the first piece: a place where two pieces meet.
+std::optional<std::size_t> JointOf(Report const& report) {
+  if (report.isFullCircle || !report.ranges || report.ranges->front().count < 2) return {};
+  std::size_t const count = report.file.points.size() - (report.closure.repeatsFirst ? 1 : 0);
+  return (report.seam + report.ranges->front().count - 1) % count;
+}
+
+bool IsBetter(Report const& a, Report const& b) {
+  return a.verdict == Verdict::WithinTolerance && a.Gap() <= b.Gap() &&
+         a.pieces.size() < b.pieces.size();
+}
+
+/// A contour without a corner. Cut open at its first point it would in most cases have a piece too
+/// many, so it is fitted again from a joint that the first attempt found.
+Report FitSmooth(PointFile const& file, std::string const& toleranceSource, Closure const& closure,
+                 FitChoice const& choice, ExecutionState* progress) {
+  Half firstHalf(progress, 0);
+  Half secondHalf(progress, ProgressBar::kFull / 2);
+  Report first = FitFrom(0, file, toleranceSource, closure, choice, &firstHalf);
+  std::optional<std::size_t> const joint = JointOf(first);
+  if (!joint) return first;
+  try {
+    Report second = FitFrom(*joint, file, toleranceSource, closure, choice, &secondHalf);
+    double const seconds = first.fit.seconds + second.fit.seconds;
+    Report& best = IsBetter(second, first) ? second : first;
+    best.fit.seconds = seconds;
+    return std::move(best);
+  } catch (Failure const&) {
+    return first;
+  }
+}
+
+Report FitClosed(PointFile file, std::string toleranceSource, Closure const& closure,
+                 FitChoice const& choice, ExecutionState* progress) {
+  std::optional<std::size_t> const seam = SeamOf(file, closure, choice);
+  if (!seam) return FitSmooth(file, toleranceSource, closure, choice, progress);
+  return FitFrom(*seam, std::move(file), std::move(toleranceSource), closure, choice, progress);
 }
 
 void RequirePoints(PointFile const& file, Closure const& closure) {

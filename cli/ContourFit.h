@@ -22,7 +22,9 @@ struct FitChoice {
 /// Finds out whether the points are closed, gives them their tolerances, fits and measures them.
 ///
 /// A closed contour is cut open at the point asked for or else at its sharpest corner, fitted all
-/// the way round, and closed again. One that is a circle comes out as two half circles.
+/// the way round, and closed again. One without a corner is fitted twice, from its first point and
+/// from the first joint found so; the one of fewer pieces counts. One that is a circle comes out as
+/// two half circles.
 ///
 /// @param progress may be null
 /// @throws Failure (ExitCode::PointsTooClose) naming the pair and the ways out, (NoFit) when the

@@ -41,8 +41,8 @@ again, or when its ends are no more than 1.5 times as far apart as the five poin
 either end and the contour does not turn back between them (by more than 135 degrees). A thin
 body that is open at one end and a contour with its seam in a very sharp corner look alike, and
 so do a closed contour and one that is open by a single step: then say --closed yes or no. The
-contour is cut open at --start or else where it turns most, fitted all the way round, and both
-ends are moved to one common point where that keeps every point within its tolerance; otherwise
+contour is cut open at --start or else where it turns most (without a corner: where two pieces
+meet), fitted all the way round, and both ends are moved to one common point where that keeps every point within its tolerance; otherwise
 the gap is reported. A full circle comes out as two half circles.
 
 Deviations are multiples of the tolerance of the point: up to 1 is within tolerance. They are

@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <nlohmann/json.hpp>
+#include <sstream>
 
 #include "cli/Closing.h"
 #include "cli/ContourFit.h"
@@ -66,6 +67,48 @@ TEST(FitContour, SeamIsTheFirstOfTheSharpestCornersOrTheOneGiven) {
   EXPECT_EQ(report.seam, 0u);
   EXPECT_EQ(report.pieces.size(), 5u) << "one side is cut in two";
   EXPECT_EQ(report.Gap(), 0.0);
+}
+
+PointFile Cam() {
+  std::istringstream nothing;
+  return ReadPoints(std::string(CONTOUR_EXAMPLES) + "/cam.csv", nothing,
+                    {ToleranceColumn::Use::IfPresent, "w"}, {});
+}
+
+TEST(FitContour, SmoothContourIsCutOpenAtAJoint) {
+  // The file of the cam begins in the middle of an arc.
+  auto const fit = [](std::optional<std::size_t> start) {
+    FitChoice choice;
+    choice.start = start;
+    return FitContour(Cam(), choice, nullptr);
+  };
+  Report const found = fit({});
+  Report const fromFirst = fit(0);
+  EXPECT_NE(found.seam, 0u);
+  EXPECT_LT(found.pieces.size(), fromFirst.pieces.size());
+  for (Report const* report : {&found, &fromFirst}) {
+    EXPECT_EQ(report->verdict, Verdict::WithinTolerance);
+    EXPECT_EQ(report->Gap(), 0.0);
+  }
+}
+
+/// Keeps what it is told.
+class Percents final : public ExecutionState {
+ public:
+  void SetProgress(std::int32_t percent) override { seen.push_back(percent); }
+  std::vector<std::int32_t> seen;
+};
+
+TEST(FitContour, ProgressOfTwoAttemptsIsOneBar) {
+  FitChoice choice;
+  Percents percents;
+  FitContour(Cam(), choice, &percents);
+  ASSERT_FALSE(percents.seen.empty());
+  // Within an attempt the library takes back a few percent where a piece ends up shorter.
+  for (std::size_t i = 1; i < percents.seen.size(); ++i) {
+    EXPECT_GT(percents.seen[i], percents.seen[i - 1] - 10) << i;
+  }
+  EXPECT_EQ(percents.seen.back(), 100);
 }
 
 TEST(FitContour, RangesCountPointsAsTheFileDoes) {
