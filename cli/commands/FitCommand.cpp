@@ -52,7 +52,7 @@ printed as the fit reports them, and as measured again by the program over every
 
 Outputs: the ending of a file tells its format: .json (the contour with deviations and all),
 .csv, .dxf, .nc or .gcode, .wkt (the contour; see 'contour convert --help' for what each keeps),
-.svg, .png (a drawing). --format tells it for - and for other endings. Numbers are written so
+.svg, .png, .html (drawings). --format tells it for - and for other endings. Numbers are written so
 that they read back as the same doubles, but for G-code, which is rounded. With -o - the table
 is not printed.
 
@@ -113,13 +113,7 @@ struct Options {
     return targets;
   }
 
-  Format FormatFor(std::string const& path) const {
-    Format const found = OutputFormat(path, format, "--format");
-    if (found == Format::Html) {
-      throw Failure(ExitCode::Usage, path + ": a fit is not written as HTML");
-    }
-    return found;
-  }
+  Format FormatFor(std::string const& path) const { return OutputFormat(path, format, "--format"); }
 
   std::vector<NamedFile> Written() const {
     std::vector<NamedFile> files;
@@ -150,6 +144,8 @@ std::string TextOf(Report const& report, Format format, WriteOptions const& opti
       return ToJson(report);
     case Format::Svg:
       return ToSvg(DrawingOf(report));
+    case Format::Html:
+      return ToHtml(DrawingOf(report));
     case Format::Png:
       return ToPng(DrawingOf(report), {});
     default:
@@ -209,7 +205,7 @@ void AddOptions(CLI::App& app, Options* options) {
       ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
       ->type_name("FILE");
   AddWord(
-      app, "--format", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png"},
+      app, "--format", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png", "html"},
       [options](std::string const& word) { options->format = FormatNamed(word); },
       "The format of outputs whose name does not tell, such as -");
   AddWriteOptions(app, &options->write);

@@ -119,7 +119,8 @@ std::string LegendRow(Scene const& scene, double y) {
   AddEnds(scene.drawing.IsClosed(), &legend);
   AddPoints(scene, &legend);
   AddTolerance(scene, &legend);
-  return "<g id=\"legend\" font-size=\"11\">\n" + legend.Svg() + ScaleBar(scene, y) + "</g>\n";
+  return "<g id=\"legend\" font-size=\"11\">\n" + legend.Svg() +
+         ScaleBar(scene, scene.view.Frame().top - 7.0) + "</g>\n";
 }
 
 }  // namespace Vorn::Cli::Svg

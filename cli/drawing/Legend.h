@@ -6,7 +6,7 @@
 
 namespace Vorn::Cli::Svg {
 
-/// What the marks of the drawing mean, one row at this height of the page, and at its right end a
+/// What the marks of the drawing mean, one row at this height of the page, and above the frame a
 /// length to compare with.
 std::string LegendRow(Scene const& scene, double y);
 

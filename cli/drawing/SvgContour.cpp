@@ -371,8 +371,12 @@ std::string WorstPoint(Scene const& scene) {
 }
 
 std::string FittedContour(Scene const& scene) {
-  return Pieces(scene) + Whiskers(scene) + MeasuredPoints(scene) + Joints(scene) +
-         ContourEnds(scene) + OutsidePoints(scene) + WorstPoint(scene) + PieceLabels(scene);
+  // So many points would hide the contour.
+  bool const areMany = scene.drawing.points.size() > kMostExactDots;
+  std::string const pieces = Pieces(scene);
+  std::string const points = Whiskers(scene) + MeasuredPoints(scene);
+  return (areMany ? points + pieces : pieces + points) + Joints(scene) + ContourEnds(scene) +
+         OutsidePoints(scene) + WorstPoint(scene) + PieceLabels(scene);
 }
 
 }  // namespace

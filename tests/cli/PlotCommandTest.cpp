@@ -103,6 +103,12 @@ TEST_F(PlotCommand, StandardOutputHoldsTheDrawingAlone) {
             std::string::npos);
 }
 
+TEST_F(PlotCommand, FitWritesTheSamePage) {
+  RunResult const result = RunInProcess({"fit", "-", "-t", "0.5", "-o", At("f.html")}, kPoints);
+  EXPECT_EQ(result.code, ExitCode::Ok);
+  EXPECT_EQ(Contents(At("f.html")).substr(0, 15), "<!DOCTYPE html>");
+}
+
 TEST_F(PlotCommand, PngSizeIsInPixels) {
   ASSERT_EQ(Plot({"-o", At("p.png"), "--width", "300"}).code, ExitCode::Ok);
   std::string const png = Contents(At("p.png"));

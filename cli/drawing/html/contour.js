@@ -61,9 +61,13 @@ class ContourDrawing {
     context.fillRect(0, 0, width, height);
     this.paintGrid();
     if (this.scene.hasTolerances) this.paintBand();
-    if (this.scene.hasContour) this.paintPieces();
-    else this.paintOrder();
+    if (!this.scene.hasContour) this.paintOrder();
+    // So many points would hide the contour.
+    const areMany = this.scene.count > FEW_POINTS;
+    if (!areMany) this.paintPieces();
     this.paintPoints();
+    if (areMany) this.paintPieces();
+    this.paintJoints();
     this.paintEnds();
     if (this.scene.hasContour) {
       this.paintWorst();
@@ -261,7 +265,6 @@ class ContourDrawing {
       }
     }
     context.fill();
-    this.paintJoints();
     this.paintCrosses(outside);
   }
 
