@@ -219,11 +219,13 @@ bool CellSequence::Overlaps(std::span<Triangle const> other) const {
 }
 
 /// What GetOverlapping gives for a candidate and this cell, as a further level.
-CellSequence::Level CellSequence::OverlapWith(Shape const& candidate) const {
-  LevelBuilder builder(levels_.back().counts);
+CellSequence::Level CellSequence::OverlapWith(Triangle const& candidate) const {
+  Level const& last = levels_.back();
+  ChordCutter const cutter(candidate, last.magnitude);
+  LevelBuilder builder(last.counts);
   Overlap overlap;
-  for (BoxedTriangle const& boxed : levels_.back().triangles) {
-    FindOverlap(candidate, Shape(boxed.triangle), &overlap);
+  for (BoxedTriangle const& boxed : last.triangles) {
+    cutter.FindOverlapWith(boxed, &overlap);
     for (Triangle const& part : overlap.parts) builder.AddToWord(part);
     builder.EndWord();
   }
@@ -246,7 +248,7 @@ bool CellSequence::Center(Point* center) const { return !empty() && CenterWith(n
 
 bool CellSequence::CenterOfOverlapWith(Triangle const& candidate, Point* center) const {
   if (empty()) return false;
-  Level const overlap = OverlapWith(Shape(candidate));
+  Level const overlap = OverlapWith(candidate);
   return overlap.size > 0 && CenterWith(&overlap, center);
 }
 

@@ -81,7 +81,7 @@ class CellSequence {
   /// Collects the words of a new level and numbers its letters.
   class LevelBuilder;
 
-  Level OverlapWith(Shape const& candidate) const;
+  Level OverlapWith(GeometryUtils::Triangle const& candidate) const;
   bool CenterWith(Level const* last, GeometryUtils::Point* center) const;
 
   std::vector<Level> levels_;

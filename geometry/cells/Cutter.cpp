@@ -17,6 +17,8 @@
 //   offset of det m or more beyond the line, and the same point of the other not above 6 E G, with
 //   m the least and G the largest distance; but a side that does cross the line of another one has
 //   det > 2048 E.
+// - A triangle whose vertices are clearly on one side of a chord does not cross it, by the same
+//   argument as for one side; the side (P2, P2) has no length and is out of its box.
 #include "geometry/cells/Cutter.h"
 
 #include <algorithm>
@@ -122,12 +124,31 @@ struct OffsetsFrom {
   Pair o0, o1, o2;
 };
 
+/// Whether a side counts as parallel to one of a triangle. A side of no length does not: it is a
+/// point, and clearly on no line.
+bool IsParallelToASide(Shape::Side const& side, Triangle const& triangle) {
+  for (int i = 0; i < 3; ++i) {
+    double const dx = triangle.pts[(i + 1) % 3].x - triangle.pts[i].x;
+    double const dy = triangle.pts[(i + 1) % 3].y - triangle.pts[i].y;
+    bool const isPoint = dx == 0.0 && dy == 0.0;
+    if (!isPoint && Numeric::IsZeroMagnitude(side.dy * dx - dy * side.dx)) return true;
+  }
+  return false;
+}
+
+/// The bound of rounding errors, or infinity where that is not the only thing to fear.
+double ErrorBound(Triangle const& triangle, Magnitude const& ofOthers) {
+  Magnitude whole = ofOthers;
+  whole.Include(triangle);
+  double const error = kErrorBound * whole.x * whole.y + whole.doubt;
+  bool const isUsable = error > kLeastError && error < kLargestError;
+  return isUsable ? error : std::numeric_limits<double>::infinity();
+}
+
 }  // namespace
 
 Cutter::Cutter(Triangle const& triangle, Magnitude const& magnitude) : shape_(triangle) {
-  Magnitude whole = magnitude;
-  whole.Include(triangle);
-  double const error = kErrorBound * whole.x * whole.y + whole.doubt;
+  double const error = ErrorBound(triangle, magnitude);
   double const turn = shape_.sense < 0 ? -1.0 : 1.0;
   for (int pair = 0; pair < 2; ++pair) {
     for (int lane = 0; lane < 2; ++lane) {
@@ -141,8 +162,8 @@ Cutter::Cutter(Triangle const& triangle, Magnitude const& magnitude) : shape_(tr
   area2_ = lines_[0].OffsetsOf(triangle.pts[2])[0];
   clear_ = kClearance * error;
   skew_ = kSkewness * error;
-  bool const isUsable = error > kLeastError && error < kLargestError && area2_ > clear_;
-  if (!isUsable) clear_ = std::numeric_limits<double>::infinity();
+  bool const isProper = area2_ > clear_;
+  if (!isProper) clear_ = std::numeric_limits<double>::infinity();
 }
 
 void Cutter::FindOverlapWith(BoxedTriangle const& other, Overlap* overlap) const {
@@ -186,18 +207,10 @@ Cutter::Place Cutter::PlaceOf(BoxedTriangle const& other, Sight* sight) const {
   return isApart ? Place::Apart : Place::Crossing;
 }
 
-/// Whether a side of the other triangle counts as parallel to one of this one. A side of no length
-/// does not: it is a point, and clearly on no line.
+/// Whether a side of the other triangle counts as parallel to one of this one.
 bool Cutter::HasSideParallelTo(Triangle const& other) const {
-  for (int i = 0; i < 3; ++i) {
-    double const dx = other.pts[(i + 1) % 3].x - other.pts[i].x;
-    double const dy = other.pts[(i + 1) % 3].y - other.pts[i].y;
-    if (dx == 0.0 && dy == 0.0) continue;
-    for (Shape::Side const& side : shape_.sides) {
-      if (Numeric::IsZeroMagnitude(side.dy * dx - dy * side.dx)) return true;
-    }
-  }
-  return false;
+  return std::any_of(std::begin(shape_.sides), std::end(shape_.sides),
+                     [&other](Shape::Side const& side) { return IsParallelToASide(side, other); });
 }
 
 /// Whether vertices beyond a line are not much nearer to it than any vertex is.
@@ -216,6 +229,37 @@ bool Cutter::IsFarBeyond(int line, BoxedTriangle const& other) const {
 bool Cutter::IsOutOfBoxOf(BoxedTriangle const& other) const {
   Point const* const pts = shape_.triangle.pts;
   return other.IsOutOfBox(pts[0]) && other.IsOutOfBox(pts[1]) && other.IsOutOfBox(pts[2]);
+}
+
+ChordCutter::ChordCutter(Triangle const& chord, Magnitude const& magnitude) : shape_(chord) {
+  Point const* const pts = chord.pts;
+  bool const isChord = pts[1].x == pts[2].x && pts[1].y == pts[2].y;
+  clear_ =
+      isChord ? kClearance * ErrorBound(chord, magnitude) : std::numeric_limits<double>::infinity();
+}
+
+void ChordCutter::FindOverlapWith(BoxedTriangle const& other, Overlap* overlap) const {
+  if (IsClearlyApartFrom(other)) {
+    overlap->status = GeometryUtils::OverlappingStatus::NoOverlap;
+    overlap->parts.clear();
+  } else {
+    FindOverlap(shape_, Shape(other.triangle), overlap);
+  }
+}
+
+bool ChordCutter::IsClearlyApartFrom(BoxedTriangle const& other) const {
+  Point const& start = shape_.triangle.pts[0];
+  Shape::Side const& along = shape_.sides[0];
+  auto const offsetOf = [&](Point const& p) {
+    return (p.x - start.x) * along.dy - (p.y - start.y) * along.dx;
+  };
+  double const o0 = offsetOf(other.triangle.pts[0]);
+  double const o1 = offsetOf(other.triangle.pts[1]);
+  double const o2 = offsetOf(other.triangle.pts[2]);
+  bool const isClear = ((o0 > clear_) & (o1 > clear_) & (o2 > clear_)) |
+                       ((o0 < -clear_) & (o1 < -clear_) & (o2 < -clear_));
+  return isClear && other.IsOutOfBox(start) && other.IsOutOfBox(shape_.triangle.pts[1]) &&
+         !IsParallelToASide(along, other.triangle);
 }
 
 }  // namespace Vorn::Cells

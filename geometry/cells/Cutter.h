@@ -77,4 +77,22 @@ class Cutter {
   double skew_ = 0.0;
 };
 
+/// A chord, that is a triangle (P1, P2, P2), that is overlapped with others one after another. Most
+/// of them lie wholly on one side of it.
+class ChordCutter {
+ public:
+  /// `magnitude` is that of the triangles to come. Takes any triangle, but is fast for chords only.
+  ChordCutter(GeometryUtils::Triangle const& chord, Magnitude const& magnitude);
+
+  /// As FindOverlap of the chord with the other triangle.
+  void FindOverlapWith(BoxedTriangle const& other, Overlap* overlap) const;
+
+ private:
+  bool IsClearlyApartFrom(BoxedTriangle const& other) const;
+
+  Shape shape_;
+  /// An offset above this is clear; infinite when none is.
+  double clear_ = 0.0;
+};
+
 }  // namespace Vorn::Cells

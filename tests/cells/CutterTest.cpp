@@ -218,5 +218,58 @@ TEST(Cutter, AgreesWithTheFullOverlapOnThinTriangles) {
   EXPECT_GT(tally.apart, 1000);
 }
 
+Cells::ChordCutter ChordCutterFor(Triangle const& chord, Triangle const& other) {
+  Magnitude magnitude;
+  magnitude.Include(other);
+  return Cells::ChordCutter(chord, magnitude);
+}
+
+void ExpectSameChordOverlap(Triangle const& chord, Triangle const& other) {
+  Overlap plain;
+  Cells::FindOverlap(Shape(chord), Shape(other), &plain);
+  Overlap fast;
+  ChordCutterFor(chord, other).FindOverlapWith(BoxedTriangle(other), &fast);
+  Cell const expected(plain.parts.begin(), plain.parts.end());
+  Cell const actual(fast.parts.begin(), fast.parts.end());
+  EXPECT_EQ(fast.status, plain.status);
+  EXPECT_TRUE(SameCell(expected, actual)) << Describe(chord) << " across " << Describe(other);
+}
+
+TEST(ChordCutter, SeesWhatLiesOnOneSide) {
+  Triangle const chord{{{-5, 1}, {9, 6}, {9, 6}}};
+  Triangle const below{{{0, 0}, {4, 1}, {1, -3}}};
+  EXPECT_TRUE(ChordCutterFor(chord, below).IsClearlyApartFrom(BoxedTriangle(below)));
+  ExpectSameChordOverlap(chord, below);
+  Triangle const crossed{{{0, 0}, {4, 1}, {1, 8}}};
+  EXPECT_FALSE(ChordCutterFor(chord, crossed).IsClearlyApartFrom(BoxedTriangle(crossed)));
+  ExpectSameChordOverlap(chord, crossed);
+}
+
+TEST(ChordCutter, LeavesAnEndInTheBoxToTheFullOverlap) {
+  Triangle const chord{{{-5, 1}, {2, 3.5}, {2, 3.5}}};
+  Triangle const below{{{-1, 0}, {4, 1}, {6, 4.5}}};
+  EXPECT_FALSE(ChordCutterFor(chord, below).IsClearlyApartFrom(BoxedTriangle(below)));
+  ExpectSameChordOverlap(chord, below);
+}
+
+TEST(ChordCutter, AgreesWithTheFullOverlap) {
+  RandomGeometry random(4250);
+  int apart = 0;
+  for (int i = 0; i < 40000 && !testing::Test::HasFailure(); ++i) {
+    SCOPED_TRACE(i);
+    PairKind const kind = kAllPairKinds[static_cast<std::size_t>(i) % kAllPairKinds.size()];
+    TrianglePair pair = MakePair(random, kind);
+    if (random.Flip()) {
+      double const off = std::pow(10.0, random.Uniform(-17.0, 1.0));
+      for (Point& p : pair.first.pts) p = {p.x + off, p.y - off};
+    }
+    // Mostly chords, and some that are not.
+    if (random.Integer(0, 9) != 0) pair.first.pts[1] = pair.first.pts[2];
+    ExpectSameChordOverlap(pair.first, pair.second);
+    apart += ChordCutterFor(pair.first, pair.second).IsClearlyApartFrom(BoxedTriangle(pair.second));
+  }
+  EXPECT_GT(apart, 3000);
+}
+
 }  // namespace
 }  // namespace Vorn::Testing
