@@ -42,8 +42,9 @@ either end and the contour does not turn back between them (by more than 135 deg
 body that is open at one end and a contour with its seam in a very sharp corner look alike, and
 so do a closed contour and one that is open by a single step: then say --closed yes or no. The
 contour is cut open at --start or else where it turns most (without a corner: where two pieces
-meet), fitted all the way round, and both ends are moved to one common point where that keeps every point within its tolerance; otherwise
-the gap is reported. A full circle comes out as two half circles.
+meet) and fitted all the way round. Both ends are moved to one common point where that keeps
+every point within its tolerance; otherwise the gap is reported. A full circle comes out as two
+half circles.
 
 Deviations are multiples of the tolerance of the point: up to 1 is within tolerance. They are
 printed as the fit reports them, and as measured again by the program over every point. Up to
