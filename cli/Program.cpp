@@ -5,6 +5,7 @@
 #include <ostream>
 #include <sstream>
 
+#include "cli/commands/AreaCommand.h"
 #include "cli/commands/CheckCommand.h"
 #include "cli/commands/Command.h"
 #include "cli/commands/ConvertCommand.h"
@@ -24,8 +25,8 @@ constexpr char const* kFooter =
 
 /// In the order in which --help lists them.
 constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
-    AddFitCommand,  AddCheckCommand,   AddInfoCommand,
-    AddPlotCommand, AddConvertCommand, AddSimplifyCommand,
+    AddFitCommand,  AddCheckCommand,   AddInfoCommand,     AddPlotCommand,
+    AddAreaCommand, AddConvertCommand, AddSimplifyCommand,
 };
 
 [[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {

@@ -28,6 +28,17 @@ tab or blanks; decimal commas are read where the separator is none. What follows
 comment; "# tolerance T" and "# units mm" are read.
 )";
 
+CLI::Option* AddColumns(CLI::App& app, ColumnChoice* columns) {
+  return app
+      .add_option_function<std::string>(
+          "--columns",
+          [columns](std::string const& text) { *columns = ParseColumnChoice(text).value(); },
+          "The columns that hold x, y and, if there is a third, the tolerance: names from the "
+          "header or numbers counted from 1")
+      ->check(Columns())
+      ->type_name("X,Y[,W]");
+}
+
 void AddPointsInput(CLI::App& app, PointsInput* input) {
   app.add_option("POINTS", input->path,
                  "CSV file with the measured points; - is the standard input")
@@ -46,13 +57,7 @@ void AddPointsInput(CLI::App& app, PointsInput* input) {
       "Give each point the smaller of CAP and 0.3 times the distance to its nearer neighbour");
   same->excludes(column)->excludes(cap);
   column->excludes(cap);
-  app.add_option_function<std::string>(
-         "--columns",
-         [input](std::string const& text) { input->columns = ParseColumnChoice(text).value(); },
-         "The columns that hold x, y and, if there is a third, the tolerance: names from the "
-         "header or numbers counted from 1")
-      ->check(Columns())
-      ->type_name("X,Y[,W]");
+  AddColumns(app, &input->columns);
   app.add_option("--units", input->units,
                  "The units of the coordinates, for example mm; goes before what the file says")
       ->type_name("NAME");

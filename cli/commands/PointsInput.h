@@ -9,7 +9,8 @@
 
 namespace CLI {
 class App;
-}
+class Option;
+}  // namespace CLI
 
 namespace Vorn::Cli {
 
@@ -20,6 +21,9 @@ struct PointsInput {
   ColumnChoice columns;
   std::string units;  ///< --units; empty: what the file says
 };
+
+/// Adds the option --columns.
+CLI::Option* AddColumns(CLI::App& app, ColumnChoice* columns);
 
 /// Adds the positional POINTS and the options for tolerances, columns and units.
 void AddPointsInput(CLI::App& app, PointsInput* input);

@@ -1,0 +1,141 @@
+#include "cli/commands/AreaCommand.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <memory>
+#include <ostream>
+#include <utility>
+
+#include "cli/CsvReader.h"
+#include "cli/Numbers.h"
+#include "cli/TextFile.h"
+#include "cli/commands/CommonOptions.h"
+#include "cli/commands/PointsInput.h"
+#include "cli/formats/Format.h"
+#include "cli/measure/ContourArea.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr char const* kText = "Measure closed contours: area, sense, perimeter, centroid and box.";
+
+constexpr char const* kFooter =
+    R"(
+Contours are read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
+by the content. With --points the files hold measured points instead, and the contour is the
+polygon through them, closed from the last point to the first.
+
+The area is that of lines and true arcs. Where neighbouring pieces do not meet, a straight line
+bridges the gap, and the gap is listed. Where a contour crosses or touches itself, the area is the
+sum of its loops, each positive where it runs counter-clockwise, and there is no centroid.
+
+Exit codes:
+  0   every contour is measured
+  2   wrong usage, or a contour is open and --close is not given
+  3   a file cannot be read, or holds no contour
+  70  internal error
+  130 interrupted
+
+Examples:
+  contour area part.json
+  contour area part.dxf part.nc --json
+  contour area part.csv --points
+)";
+
+struct Options {
+  std::vector<std::string> paths;
+  std::optional<Format> from;
+  bool arePoints = false;
+  ColumnChoice columns;
+  std::string units;
+  bool doClose = false;
+  bool asJson = false;
+};
+
+ContourFile PolygonThrough(PointFile const& file) {
+  ContourFile contour;
+  contour.path = file.path;
+  contour.units = file.units;
+  for (std::size_t i = 1; i < file.points.size(); ++i) {
+    WPoint const& from = file.points[i - 1];
+    WPoint const& to = file.points[i];
+    contour.pieces.push_back(MakeLine({from.x, from.y}, {to.x, to.y}));
+  }
+  return Closed(std::move(contour));
+}
+
+ContourFile ReadClosed(Options const& options, std::string const& path, Console const& console) {
+  if (options.arePoints) {
+    return PolygonThrough(
+        ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns));
+  }
+  ContourFile contour = ReadContour(path, console, options.from);
+  if (options.doClose) return Closed(std::move(contour));
+  if (!IsClosed(contour)) {
+    double const gap = Distance(contour.pieces.back().end, contour.pieces.front().start);
+    throw Failure(ExitCode::Usage, contour.path + ": the contour is open, its ends are " +
+                                       FormatShort(gap) +
+                                       " apart; --close measures it with a line between them");
+  }
+  return contour;
+}
+
+ExitCode Run(Options const& options, Console const& console) {
+  std::vector<ContourArea> areas;
+  for (std::string const& path : options.paths) {
+    ContourFile contour = ReadClosed(options, path, console);
+    if (!options.units.empty()) contour.units = options.units;
+    areas.push_back(MeasureArea(std::move(contour)));
+  }
+  if (options.asJson) {
+    console.out << ToJson(areas);
+    return ExitCode::Ok;
+  }
+  for (ContourArea const& area : areas) {
+    console.out << (&area == &areas.front() ? "" : "\n") << ToText(area);
+  }
+  return ExitCode::Ok;
+}
+
+void AddOptions(CLI::App& app, Options* options) {
+  app.add_option("CONTOUR", options->paths, "Files with contours; - is the standard input")
+      ->required()
+      ->type_name("FILE");
+  CLI::Option* const from = AddWord(
+      app, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      [options](std::string const& word) { options->from = FormatNamed(word); },
+      "Read the contours as this");
+  CLI::Option* const points =
+      app.add_flag("--points", options->arePoints,
+                   "The files hold points; measure the polygon through them")
+          ->excludes(from);
+  AddColumns(app, &options->columns)->needs(points);
+  app.add_option("--units", options->units,
+                 "The units of the coordinates, for example mm; goes before what the file says")
+      ->type_name("NAME");
+  app.add_flag("--close", options->doClose,
+               "Close an open contour with a line from its end to its start");
+  app.add_flag("--json", options->asJson, "Write the measures as JSON, with every digit");
+  app.footer(kFooter);
+}
+
+void RefuseSharedInput(std::vector<std::string> const& paths) {
+  if (std::count(paths.begin(), paths.end(), kStandardInput) > 1) {
+    throw Failure(ExitCode::Usage, "the standard input can be read only once");
+  }
+}
+
+}  // namespace
+
+void AddAreaCommand(CLI::App& program, Action* action) {
+  CLI::App* const app = program.add_subcommand("area", kText);
+  auto const options = std::make_shared<Options>();
+  AddOptions(*app, options.get());
+  app->callback([options, action] {
+    RefuseSharedInput(options->paths);
+    *action = [options](Console const& console) { return Run(*options, console); };
+  });
+}
+
+}  // namespace Vorn::Cli
