@@ -1,0 +1,121 @@
+#include "cli/commands/IntersectCommand.h"
+
+#include <CLI/CLI.hpp>
+#include <memory>
+#include <ostream>
+
+#include "cli/TextFile.h"
+#include "cli/commands/CommonOptions.h"
+#include "cli/commands/Outputs.h"
+#include "cli/formats/Format.h"
+#include "cli/intersect/Intersections.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr char const* kText =
+    "List the points where two contours meet, or where one contour meets itself.";
+
+constexpr char const* kFooter =
+    R"(
+Contours are read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
+by the content. Gaps between pieces are not bridged.
+
+Kinds: crossing, each passes to the other side of the other; touching, they stay on one side, run in
+one direction there, or one of them ends there; overlap, they share a stretch, told for each pair of
+pieces. What is no further apart than 1e-9 of the largest coordinate touches. Joints of neighbouring
+pieces are no intersections of a contour with itself.
+
+The points are sorted along A. Pieces are counted from 1; "at" is the length from the start of the
+contour. With -o - the table is not printed.
+
+Exit codes:
+  0   the question is answered, whether there are intersections or not
+  1   there are some, and --fail-if-any is given
+  2   wrong usage
+  3   a file cannot be read or written, or holds no contour
+  70  internal error
+  130 interrupted
+
+Examples:
+  contour intersect part.json tool.dxf
+  contour intersect part.dxf --fail-if-any
+  contour intersect part.json tool.dxf -o points.csv
+)";
+
+struct Options {
+  std::string a;
+  std::string b;  ///< empty: the first with itself
+  std::optional<Format> from;
+  std::string output;
+  bool asJson = false;
+  bool failIfAny = false;
+
+  std::vector<NamedFile> Read() const {
+    std::vector<NamedFile> files = {{"A", a}};
+    if (!b.empty()) files.push_back({"B", b});
+    return files;
+  }
+
+  std::vector<NamedFile> Written() const {
+    if (output.empty()) return {};
+    return {{"--output", output}};
+  }
+};
+
+ExitCode Run(Options const& options, Console const& console) {
+  RequireWritable(options.Written());
+  ContourFile const a = ReadContour(options.a, console, options.from);
+  std::optional<ContourFile> other;
+  if (!options.b.empty()) other = ReadContour(options.b, console, options.from);
+  ContourFile const* const b = other ? &*other : nullptr;
+  std::vector<Intersection> const found =
+      b == nullptr ? SelfIntersectionsOf(a) : IntersectionsOf(a, *b);
+  Outputs outputs;
+  if (!options.output.empty()) outputs.Add(options.output, ToCsv(found, a, b));
+  outputs.Write(console);
+  if (options.output != "-") {
+    console.out << (options.asJson ? ToJson(found, a, b) : ToText(found, a, b));
+  }
+  return options.failIfAny && !found.empty() ? ExitCode::OutsideTolerance : ExitCode::Ok;
+}
+
+void AddOptions(CLI::App& app, Options* options) {
+  app.add_option("A", options->a, "File with a contour; - is the standard input")
+      ->required()
+      ->type_name("FILE");
+  app.add_option("B", options->b, "File with another contour; without it, A meets itself")
+      ->type_name("FILE");
+  AddWord(
+      app, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      [options](std::string const& word) { options->from = FormatNamed(word); },
+      "Read the contours as this");
+  app.add_option("-o,--output", options->output,
+                 "Write the points to this CSV file; - is the standard output")
+      ->type_name("FILE");
+  app.add_flag("--json", options->asJson, "Write the points as JSON, with every digit");
+  app.add_flag("--fail-if-any", options->failIfAny, "Exit with 1 when there are intersections");
+  app.footer(kFooter);
+}
+
+void RefuseBadFiles(Options const& options) {
+  if (options.a == kStandardInput && options.b == kStandardInput) {
+    throw Failure(ExitCode::Usage, "A and B cannot both be the standard input");
+  }
+  RefuseSharedFiles(options.Read(), options.Written());
+}
+
+}  // namespace
+
+void AddIntersectCommand(CLI::App& program, Action* action) {
+  CLI::App* const app = program.add_subcommand("intersect", kText);
+  auto const options = std::make_shared<Options>();
+  AddOptions(*app, options.get());
+  app->callback([options, action] {
+    RefuseBadFiles(*options);
+    *action = [options](Console const& console) { return Run(*options, console); };
+  });
+}
+
+}  // namespace Vorn::Cli
