@@ -11,6 +11,7 @@
 #include "cli/commands/ConvertCommand.h"
 #include "cli/commands/FitCommand.h"
 #include "cli/commands/InfoCommand.h"
+#include "cli/commands/IntersectCommand.h"
 #include "cli/commands/PlotCommand.h"
 #include "cli/commands/SimplifyCommand.h"
 
@@ -25,8 +26,8 @@ constexpr char const* kFooter =
 
 /// In the order in which --help lists them.
 constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
-    AddFitCommand,  AddCheckCommand,   AddInfoCommand,     AddPlotCommand,
-    AddAreaCommand, AddConvertCommand, AddSimplifyCommand,
+    AddFitCommand,  AddCheckCommand,     AddInfoCommand,    AddPlotCommand,
+    AddAreaCommand, AddIntersectCommand, AddConvertCommand, AddSimplifyCommand,
 };
 
 [[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {

@@ -30,8 +30,7 @@ struct Path {
       }
       length += piece.length;
     }
-    isClosed = !pieces.empty() &&
-               Distance(pieces.back().end, pieces.front().start) <= tolerance;
+    isClosed = !pieces.empty() && Distance(pieces.back().end, pieces.front().start) <= tolerance;
   }
 
   /// The piece that begins where this one ends.
