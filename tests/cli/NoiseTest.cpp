@@ -25,15 +25,15 @@ WPoint OnWave(double place) { return {place, 3.0 * std::sin(place / 10.0), 0.0};
 std::vector<WPoint> Sampled(Curve const& curve, int count, double unevenness, double sigma,
                             std::uint64_t seed) {
   std::mt19937_64 engine(seed);
-  std::normal_distribution<double> noise(0.0, sigma);
+  std::normal_distribution<double> noise;
   std::uniform_real_distribution<double> step(1.0 - unevenness, 1.0 + unevenness);
   std::vector<WPoint> points;
   double place = 0.0;
   for (int i = 0; i < count; ++i) {
     WPoint point = curve(place);
     if (sigma > 0.0) {
-      point.x += noise(engine);
-      point.y += noise(engine);
+      point.x += sigma * noise(engine);
+      point.y += sigma * noise(engine);
     }
     points.push_back(point);
     place += step(engine);
