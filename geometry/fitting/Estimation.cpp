@@ -7,6 +7,7 @@
 #include <cstdint>
 #include <vector>
 
+#include "geometry/fitting/PointSpread.h"
 #include "geometry/fitting/Runs.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
@@ -25,13 +26,6 @@ constexpr double kSpacingShare = 3.0;
 /// a limit of zero equals its product and shows up as such.
 constexpr double kGuardFactor = 0.99;
 
-struct Spread {
-  std::int32_t i = 0;
-  std::int32_t j = 1;
-  double largest2 = 0.0;
-  double smallest2 = 0.0;
-};
-
 }  // namespace
 
 bool GeometryUtils::GetEstimatedCircle(std::vector<WPoint> const& points, Point* first,
@@ -43,19 +37,7 @@ bool GeometryUtils::GetEstimatedCircle(std::vector<WPoint> const& points, Point*
   auto const distance2 = [&points](std::int32_t i, std::int32_t j) {
     return GetDist2(ToPoint(At(points, i)), ToPoint(At(points, j)));
   };
-  Spread spread;
-  spread.largest2 = spread.smallest2 = distance2(0, 1);
-  for (std::int32_t i = 0; i < n; ++i) {
-    for (std::int32_t j = i + 1; j < n; ++j) {
-      double const pair2 = distance2(i, j);
-      if (pair2 > spread.largest2) {
-        spread.largest2 = pair2;
-        spread.i = i;
-        spread.j = j;
-      }
-      if (pair2 < spread.smallest2) spread.smallest2 = pair2;
-    }
-  }
+  Fitting::PointSpread const spread = Fitting::FindSpread(points);
 
   std::int32_t nearestBisector = -1;
   double smallestOffset = 0.0;
