@@ -70,6 +70,7 @@ class SpreadSearch {
 
   PointSpread Find() {
     spread_.largest2 = spread_.smallest2 = Distance2(points_[0], points_[1]);
+    FindFarGroups();
     // From group to itself, then to its neighbour and so on: the nearest pair is found early.
     for (std::size_t apart = 0; apart < groups_.size(); ++apart) {
       for (std::size_t g = 0; g + apart < groups_.size(); ++g) {
@@ -81,6 +82,16 @@ class SpreadSearch {
   }
 
  private:
+  /// One point of each group gives a distance that few pairs of groups can exceed.
+  void FindFarGroups() {
+    for (std::size_t g = 0; g < groups_.size(); ++g) {
+      for (std::size_t h = g + 1; h < groups_.size(); ++h) {
+        double const distance2 = Distance2(points_[groups_[g].begin], points_[groups_[h].begin]);
+        spread_.largest2 = std::max(spread_.largest2, distance2);
+      }
+    }
+  }
+
   void Compare(Group const& first, Group const& second) {
     bool const canBeFarther = first.MostDistance2(second) > spread_.largest2;
     bool const canBeNearer = first.LeastDistance2(second) < spread_.smallest2;
