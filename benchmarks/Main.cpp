@@ -54,6 +54,9 @@ void RegisterAll(Scale scale) {
   RegisterSelfIntersectionOfOthers(scale);
 #endif
   RegisterFitting(scale);
+#if defined(VORN_BENCHMARK_PROGRAM)
+  RegisterProgram(scale);
+#endif
 }
 
 }  // namespace

@@ -12,6 +12,11 @@ void RegisterIntersections();
 void RegisterSolver();
 void RegisterRotation();
 
+#if defined(VORN_BENCHMARK_PROGRAM)
+/// The program's own work on large files.
+void RegisterProgram(Scale scale);
+#endif
+
 #if defined(VORN_BENCHMARK_COMPARISONS)
 /// Other libraries on the same data.
 void RegisterSelfIntersectionOfOthers(Scale scale);

@@ -48,6 +48,11 @@ SHORT_CALLS = (
      "BM_EigenTimesVector/random_rotations"),
 )
 
+PROGRAM = (
+    ("read points, x and y with all digits", "BM_ReadPoints"),
+    ("measure points against a polygon of 1,000 sides", "BM_MeasurePoints"),
+)
+
 OUTLINES = ("ring", "teeth", "needles")
 
 CHECKS = (
@@ -210,6 +215,13 @@ def short_call_rows(cases):
                time_text(cases[other].per_item) if other in cases else ""]
 
 
+def program_rows(cases):
+    for title, function in PROGRAM:
+        for case in cases.values():
+            if case.function == function and case.per_item is not None:
+                yield [title, f"{case.size:,}", time_text(case.per_item), time_text(case.total)]
+
+
 def command_output(*command):
     try:
         return subprocess.run(command, capture_output=True, text=True, check=True).stdout.strip()
@@ -267,6 +279,10 @@ def write_table(results, cases, build, path):
     text += "\n## Short calls\n\n"
     text += table(["what", "function", "time per call", "pairs that meet", "Eigen"],
                   short_call_rows(cases))
+    program = list(program_rows(cases))
+    if program:
+        text += "\n## The program on large files\n\n"
+        text += table(["what", "N", "time per point", "whole"], program)
     path.write_text(text)
 
 
