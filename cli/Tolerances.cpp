@@ -32,12 +32,13 @@ bool RepeatsFirst(std::vector<WPoint> const& points) {
   return points.front().x == points.back().x && points.front().y == points.back().y;
 }
 
-void AssignBySpacing(double cap, bool isClosed, PointFile* file) {
+void AssignBySpacing(double cap, bool isClosed, Coinciding coinciding, PointFile* file) {
   std::vector<WPoint>& points = file->points;
   for (WPoint& point : points) point.w = cap;
   auto const limit = [&](std::size_t i, std::size_t k) {
     double const most = kShareOfSpacing * Distance(points[i], points[k]);
-    if (!(most > 0.0)) RefuseCoinciding(*file, i, k);
+    bool const isGood = most > 0.0 || coinciding == Coinciding::GivenZero;
+    if (!isGood) RefuseCoinciding(*file, i, k);
     points[i].w = std::min(points[i].w, most);
     points[k].w = std::min(points[k].w, most);
   };
@@ -68,9 +69,10 @@ bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file) {
   return choice.same || choice.column || choice.cap || file.hasTolerances || file.tolerance;
 }
 
-std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, bool isClosed) {
+std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, bool isClosed,
+                             Coinciding coinciding) {
   if (choice.cap) {
-    AssignBySpacing(*choice.cap, isClosed, file);
+    AssignBySpacing(*choice.cap, isClosed, coinciding, file);
     return "0.3 of the spacing, at most " + FormatShort(*choice.cap);
   }
   if (choice.same) {

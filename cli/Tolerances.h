@@ -23,6 +23,12 @@ double ToleranceForSpacing(double cap, double spacing);
 /// Whether AssignTolerances finds a tolerance, in the options or in the file.
 bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file);
 
+/// What becomes of neighbours in one place when tolerances follow the spacing.
+enum class Coinciding {
+  Refused,    ///< no tolerance above zero can follow
+  GivenZero,  ///< for commands that only look
+};
+
 /// Gives every point of the file its tolerance and says in words where it came from.
 ///
 /// An option goes before what the file holds; without one a column `w` goes before a comment
@@ -30,8 +36,9 @@ bool IsToleranceStated(ToleranceChoice const& choice, PointFile const& file);
 ///
 /// @param isClosed the first and the last point are neighbours as well
 /// @throws Failure (ExitCode::Usage) when nobody gives a tolerance, or (PointsTooClose) when a
-///         tolerance by spacing would be zero because neighbours coincide.
-std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, bool isClosed = false);
+///         tolerance by spacing would be zero because neighbours coincide and this is refused.
+std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, bool isClosed = false,
+                             Coinciding coinciding = Coinciding::Refused);
 
 /// The choice as options for another command line; empty when there is none.
 std::string OptionsFor(ToleranceChoice const& choice);

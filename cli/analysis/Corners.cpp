@@ -1,5 +1,6 @@
 #include "cli/analysis/Corners.h"
 
+#include <algorithm>
 #include <cmath>
 #include <numbers>
 
@@ -31,39 +32,14 @@ Corner CornerAt(std::vector<WPoint> const& points, std::size_t before, std::size
   return {at, std::fabs(turn) * 180.0 / std::numbers::pi, turn > 0.0};
 }
 
-/// Collects corners and keeps the sharpest of those that are one and the same.
-class Collector {
- public:
-  Collector(std::vector<double> const& places, double reach) : places_(places), reach_(reach) {}
-
-  void Add(Corner const& corner) {
-    bool const isNew = corners_.empty() || places_[corner.point] - places_[latest_] > reach_;
-    latest_ = corner.point;
-    if (isNew) {
-      corners_.push_back(corner);
-    } else if (corner.degrees > corners_.back().degrees) {
-      corners_.back() = corner;
-    }
-  }
-
-  std::vector<Corner> Take() { return std::move(corners_); }
-
- private:
-  std::vector<double> const& places_;
-  double reach_;
-  std::size_t latest_ = 0;
-  std::vector<Corner> corners_;
-};
-
-}  // namespace
-
-std::vector<Corner> FindCorners(std::vector<WPoint> const& points, double reach) {
-  std::vector<double> const places = PlacesAlong(points);
+/// Every point with a turn of a corner, however near to the next such point.
+std::vector<Corner> SharpTurns(std::vector<WPoint> const& points, std::vector<double> const& places,
+                               double reach) {
+  std::vector<Corner> turns;
   auto const isFar = [&](std::size_t from, std::size_t to) {
     double const distance = places[to] - places[from];
     return distance >= reach && distance > 0.0;
   };
-  Collector corners(places, reach);
   std::size_t before = 0;
   std::size_t after = 0;
   for (std::size_t at = 0; at < points.size(); ++at) {
@@ -73,10 +49,69 @@ std::vector<Corner> FindCorners(std::vector<WPoint> const& points, double reach)
     if (!isFar(before, at)) continue;
     // Of points in one place the first stands for all.
     if (places[at] == places[at - 1]) continue;
-    Corner const corner = CornerAt(points, before, at, after);
-    if (corner.degrees >= kLeastCorner) corners.Add(corner);
+    Corner const turn = CornerAt(points, before, at, after);
+    if (turn.degrees >= kLeastCorner) turns.push_back(turn);
   }
-  return corners.Take();
+  return turns;
+}
+
+/// Of turns that follow each other within the reach the sharpest.
+std::vector<Corner> Merged(std::vector<Corner> const& turns, std::vector<double> const& places,
+                           double reach) {
+  std::vector<Corner> corners;
+  for (std::size_t i = 0; i < turns.size(); ++i) {
+    bool const isNew = i == 0 || places[turns[i].point] - places[turns[i - 1].point] > reach;
+    if (isNew) {
+      corners.push_back(turns[i]);
+    } else if (turns[i].degrees > corners.back().degrees) {
+      corners.back() = turns[i];
+    }
+  }
+  return corners;
+}
+
+/// The turns of the middle one of three rounds, from one on that is not within the reach of the one
+/// before: what belongs together must not be torn apart where the round begins.
+std::vector<Corner> TurnsOfOneRound(std::vector<Corner> const& turns,
+                                    std::vector<double> const& places, double reach,
+                                    std::size_t round) {
+  std::vector<Corner> chosen;
+  for (Corner const& turn : turns) {
+    if (turn.point >= round && turn.point < 2 * round) chosen.push_back(turn);
+  }
+  auto const apart =
+      std::adjacent_find(chosen.begin(), chosen.end(), [&](Corner const& turn, Corner const& next) {
+        return places[next.point] - places[turn.point] > reach;
+      });
+  if (apart == chosen.end()) return chosen;
+  for (auto turn = chosen.begin(); turn <= apart; ++turn) turn->point += round;
+  std::rotate(chosen.begin(), apart + 1, chosen.end());
+  return chosen;
+}
+
+std::vector<Corner> CornersOfRound(std::vector<WPoint> points, double reach) {
+  bool const repeatsFirst =
+      points.front().x == points.back().x && points.front().y == points.back().y;
+  if (repeatsFirst) points.pop_back();
+  std::size_t const round = points.size();
+  points.reserve(3 * round);
+  for (std::size_t i = 0; i < 2 * round; ++i) points.push_back(WPoint(points[i]));
+  std::vector<double> const places = PlacesAlong(points);
+  if (round == 0 || !(places[round] > 2.0 * reach)) return {};
+  std::vector<Corner> corners = Merged(
+      TurnsOfOneRound(SharpTurns(points, places, reach), places, reach, round), places, reach);
+  for (Corner& corner : corners) corner.point %= round;
+  std::sort(corners.begin(), corners.end(),
+            [](Corner const& a, Corner const& b) { return a.point < b.point; });
+  return corners;
+}
+
+}  // namespace
+
+std::vector<Corner> FindCorners(std::vector<WPoint> const& points, double reach, bool isClosed) {
+  if (isClosed) return CornersOfRound(points, reach);
+  std::vector<double> const places = PlacesAlong(points);
+  return Merged(SharpTurns(points, places, reach), places, reach);
 }
 
 double ReachForNoise(double noise) { return kReachPerNoise * noise; }

@@ -26,9 +26,13 @@ struct Corner {
 ///
 /// The turn at a point is that between the chord from the last point that lies at least `reach`
 /// before it along the path and the chord to the first one as far behind it; 0 takes the points
-/// next to it. Of corners that follow each other within `reach` the sharpest is named. The ends of
-/// the path have no turn. O(n).
-std::vector<Corner> FindCorners(std::vector<WPoint> const& points, double reach);
+/// next to it. Of corners that follow each other within `reach` the sharpest is named. O(n).
+///
+/// The ends of an open path have no turn. A closed one goes on from its last point to its first,
+/// which may be the same point twice and then counts as the first; it has no corners when it is not
+/// longer than two reaches.
+std::vector<Corner> FindCorners(std::vector<WPoint> const& points, double reach,
+                                bool isClosed = false);
 
 /// How far to reach so that noise of this size alone makes no corners: the directions of both
 /// chords are then good to some degrees.

@@ -89,8 +89,12 @@ void AddRule(InfoReport const& report, FactList* facts) {
                                      (rule.broken.size() == 1 ? " is" : " are") + " too close"));
   for (std::size_t i = 0; i < std::min(rule.broken.size(), kMostListed); ++i) {
     ClosePair const& pair = rule.broken[i];
-    facts->GoOn(PairName(report.file, pair.first, pair.second) + ": distance " +
-                FormatShort(pair.distance) + ", needed more than " + FormatShort(pair.needed));
+    std::string const name = PairName(report.file, pair.first, pair.second);
+    // Where the tolerance follows the spacing, there is none in one place.
+    facts->GoOn(pair.needed > 0.0
+                    ? name + ": distance " + FormatShort(pair.distance) + ", needed more than " +
+                          FormatShort(pair.needed)
+                    : name + " coincide: no tolerance can follow from a spacing of zero");
   }
   facts->AddRest(rule.broken.size());
 }

@@ -88,7 +88,8 @@ PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed) {
   info.closure = FindClosure(points, closed);
   info.largestTolerance = LargestSingleTolerance(WithClosingPair(points, info.closure));
   info.noise = EstimateNoise(points);
-  info.corners = FindCorners(points, ReachForNoise(info.noise.value_or(0.0)));
+  info.corners =
+      FindCorners(points, ReachForNoise(info.noise.value_or(0.0)), info.closure.isClosed);
   info.suggestion = SuggestTolerance(info);
   return info;
 }

@@ -21,7 +21,8 @@ constexpr char const* kFooter =
 Spacing: neighbouring points must be more than 1.5 times the sum of their tolerances apart. With a
 tolerance given, the pairs that break this rule are listed; without one, none is needed.
 
-Corners: turns of 30 degrees or more, measured over chords long enough for the noise not to matter.
+Corners: turns of 30 degrees or more, measured over chords long enough for the noise not to matter;
+of a closed contour the turn from its end to its start is one of them.
 Noise: what differs from point to point, not a ripple that many neighbours share. The suggestion is
 five times the noise or a ten-thousandth of the size, whichever is more.
 
@@ -29,7 +30,6 @@ Points are counted from 0. Exit codes:
   0   the points are described, whatever there is to say about them
   2   wrong usage
   3   the file cannot be read, or one of its lines is wrong
-  4   a tolerance by spacing was asked for, but neighbours coincide
   70  internal error
 
 Examples:
@@ -50,7 +50,8 @@ ExitCode Run(Options const& options, Console const& console) {
   report.info = Analyse(report.file.points, options.closed);
   if (IsToleranceStated(options.points.tolerance, report.file)) {
     Closure const& closure = report.info.closure;
-    std::string source = AssignTolerances(options.points.tolerance, &report.file, closure.isClosed);
+    std::string source = AssignTolerances(options.points.tolerance, &report.file, closure.isClosed,
+                                          Coinciding::GivenZero);
     report.rule = CheckRule(report.file.points, closure, std::move(source));
   }
   console.out << (options.asJson ? ToJson(report) : ToText(report));

@@ -54,6 +54,41 @@ TEST(FindCorners, FewOrCoincidingPointsHaveNone) {
   EXPECT_TRUE(FindCorners({{0, 0, 0}, {1, 0, 0}, {1, 1, 0}}, 5.0).empty()) << "beyond the reach";
 }
 
+/// Round a square of side 4 with a step of 1, from any place.
+std::vector<WPoint> Square(std::size_t start, bool repeatsFirst) {
+  std::vector<WPoint> round;
+  for (double i = 0; i < 4; ++i) round.push_back({i, 0, 0});
+  for (double i = 0; i < 4; ++i) round.push_back({4, i, 0});
+  for (double i = 0; i < 4; ++i) round.push_back({4 - i, 4, 0});
+  for (double i = 0; i < 4; ++i) round.push_back({0, 4 - i, 0});
+  std::rotate(round.begin(), round.begin() + static_cast<std::ptrdiff_t>(start), round.end());
+  if (repeatsFirst) round.push_back(WPoint(round.front()));
+  return round;
+}
+
+TEST(FindCorners, OfAClosedPathCountTheOneAtTheSeam) {
+  for (std::size_t start = 0; start < 16; ++start) {
+    for (bool const repeatsFirst : {false, true}) {
+      for (double const reach : {0.0, 1.0, 1.5}) {
+        std::vector<Corner> const corners = FindCorners(Square(start, repeatsFirst), reach, true);
+        ASSERT_EQ(corners.size(), 4u) << start << ", reach " << reach;
+        for (std::size_t i = 0; i < 4; ++i) {
+          EXPECT_EQ(corners[i].point, (16 - start) % 4 + 4 * i) << start << ", reach " << reach;
+          EXPECT_NEAR(corners[i].degrees, 90.0, 1e-12);
+          EXPECT_TRUE(corners[i].isLeft);
+        }
+      }
+    }
+  }
+  EXPECT_EQ(FindCorners(Square(0, true), 0.0).size(), 3u) << "an open path has none at its ends";
+}
+
+TEST(FindCorners, OfAClosedPathEndWhereTwoReachesGoAllTheWayRound) {
+  EXPECT_TRUE(FindCorners(Square(0, false), 8.0, true).empty());
+  EXPECT_TRUE(FindCorners(std::vector<WPoint>(50, WPoint{3, 4, 0}), 0.0, true).empty());
+  EXPECT_TRUE(FindCorners({{0, 0, 0}, {0, 0, 0}}, 0.0, true).empty());
+}
+
 /// Along x, then up, `perSide` points a unit each way.
 std::vector<WPoint> NoisyCorner(int perUnit, double sigma, std::uint64_t seed) {
   std::mt19937_64 engine(seed);

@@ -50,6 +50,31 @@ TEST(InfoCommand, ListsThePairsThatBreakTheRule) {
             std::string::npos);
 }
 
+TEST(InfoCommand, AnswersWhereNoToleranceCanFollowFromTheSpacing) {
+  RunResult const run = RunInProcess({"info", "-", "--tolerance-per-point", "0.5"}, kSmall);
+  EXPECT_EQ(run.code, ExitCode::Ok);
+  EXPECT_EQ(run.err, "");
+  EXPECT_NE(run.out.find("tolerance   0 to 0.5 (0.3 of the spacing, at most 0.5): 1 of 4 pairs is "
+                         "too close\n"
+                         "            point 2 (line 5) and point 3 (line 6) coincide: no tolerance "
+                         "can follow from a spacing of zero\n"),
+            std::string::npos)
+      << run.out;
+  auto const json = nlohmann::json::parse(
+      RunInProcess({"info", "-", "--tolerance-per-point", "0.5", "--json"}, kSmall).out);
+  EXPECT_EQ(json.at("tolerance").at("smallest"), 0.0);
+  EXPECT_EQ(json.at("tolerance").at("tooClose").size(), 1u);
+}
+
+TEST(InfoCommand, ATurnAtTheSeamOfAClosedContourIsACorner) {
+  std::string const square = "0,0\n2,0\n4,0\n4,2\n4,4\n2,4\n0,4\n0,2\n0,0\n";
+  EXPECT_NE(RunInProcess({"info", "-"}, square).out.find("corners     4 of 30 degrees or more"),
+            std::string::npos);
+  EXPECT_NE(RunInProcess({"info", "-", "--closed", "no"}, square)
+                .out.find("corners     3 of 30 degrees or more"),
+            std::string::npos);
+}
+
 TEST(InfoCommand, CutsLongListsAndCountsTheRest) {
   std::string text;
   for (int i = 0; i < 30; ++i) text += "1,1\n";
