@@ -45,6 +45,10 @@ std::vector<std::size_t> CheckReport::WorstFirst() const {
   return order;
 }
 
+double SignedDistance(PointDeviation const& deviation) {
+  return deviation.isLeft ? deviation.distance : 0.0 - deviation.distance;
+}
+
 CheckReport MakeCheckReport(PointFile file, std::string toleranceSource, ContourFile contour) {
   CheckReport report;
   report.file = std::move(file);

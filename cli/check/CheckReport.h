@@ -41,8 +41,14 @@ CheckReport MakeCheckReport(PointFile file, std::string toleranceSource, Contour
 std::string ToText(CheckReport const& report, std::vector<std::size_t> const& order,
                    std::size_t rows);
 
-/// Every point in a line of CSV, with all digits. Deviations to the left of the contour's sense of
-/// travel are positive.
+/// To the left of the contour's sense of travel is positive; on it there is no minus sign.
+double SignedDistance(PointDeviation const& deviation);
+
+/// Every point in a line of CSV, with all digits, deviations signed.
 std::string ToCsv(CheckReport const& report);
+
+/// For programs: everything, with all digits, as a JSON document that ends with a line end. Points
+/// are counted from 0, pieces and lines of the file from 1; what is not known is null.
+std::string ToJson(CheckReport const& report);
 
 }  // namespace Vorn::Cli

@@ -96,11 +96,6 @@ Row Header(CheckReport const& report) {
   return row;
 }
 
-/// To the left of the contour's sense of travel is positive; on it there is no minus sign.
-double SignedDistance(PointDeviation const& deviation) {
-  return deviation.isLeft ? deviation.distance : 0.0 - deviation.distance;
-}
-
 Row PointRow(CheckReport const& report, std::size_t point) {
   WPoint const& measured = report.file.points[point];
   PointDeviation const& deviation = report.deviations[point];

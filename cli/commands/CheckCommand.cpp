@@ -48,6 +48,7 @@ Exit codes:
 Examples:
   contour check part.csv part.dxf --tolerance 0.02
   contour check part.csv part.nc --tolerance 0.02 --table deviations.csv
+  contour check part.csv part.json --tolerance 0.02 --json - | jq .relative
 )";
 
 struct Options {
@@ -56,11 +57,14 @@ struct Options {
   std::string contour;
   std::optional<Format> from;
   std::string table;
+  std::string json;
   bool all = false;
 
   std::vector<NamedFile> Written() const {
-    if (table.empty()) return {};
-    return {{"--table", table}};
+    std::vector<NamedFile> files;
+    if (!table.empty()) files.push_back({"--table", table});
+    if (!json.empty()) files.push_back({"--json", json});
+    return files;
   }
 };
 
@@ -95,8 +99,10 @@ ExitCode Run(Options const& options, Console const& console) {
   WarnOfUnits(report, console);
   Outputs outputs;
   if (!options.table.empty()) outputs.Add(options.table, ToCsv(report));
+  if (!options.json.empty()) outputs.Add(options.json, ToJson(report));
   outputs.Write(console);
-  if (options.table != "-") console.out << TextFor(options, report);
+  bool const isOutTaken = options.table == "-" || options.json == "-";
+  if (!isOutTaken) console.out << TextFor(options, report);
   return report.Code();
 }
 
@@ -113,6 +119,10 @@ void AddOptions(CLI::App& app, Options* options) {
   app.add_option("--table", options->table,
                  "Write every point's deviation to this CSV file; - is the standard output, which "
                  "then holds nothing else")
+      ->type_name("FILE");
+  app.add_option("--json", options->json,
+                 "Write all that is found to this JSON file, with all digits; - is the standard "
+                 "output, which then holds nothing else")
       ->type_name("FILE");
   app.add_flag("--all", options->all, "List every point, not just the ten worst");
   app.footer(std::string(kPointsFileText) + kFooter);

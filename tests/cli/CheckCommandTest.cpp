@@ -112,6 +112,52 @@ TEST_F(CheckCommand, TableHoldsEveryPointWithAllDigits) {
   EXPECT_NE(Contents(table).find("\n3,6,4,4.5,0.5,3,0.25,2\n"), std::string::npos);
 }
 
+TEST_F(CheckCommand, JsonHoldsEveryFactExactly) {
+  std::string const contour = Write("c.csv", kContour);
+  RunResult const judged = RunInProcess({"check", "-", contour, "-t", "0.1", "--json", "-"},
+                                        "# units mm\nx,y\n0,0\n0.1,0.3\n4,5.05\n3,4\n");
+  EXPECT_EQ(judged.code, ExitCode::OutsideTolerance);
+  auto const json = nlohmann::json::parse(judged.out);
+  EXPECT_EQ(json.at("schemaVersion"), 1);
+  EXPECT_EQ(json.at("points"),
+            nlohmann::json::parse(R"({"file": "standard input", "count": 4, "units": "mm"})"));
+  EXPECT_EQ(json.at("contour").at("lines"), 2);
+  EXPECT_EQ(json.at("contour").at("arcs"), 1);
+  EXPECT_EQ(json.at("contour").at("closed"), false);
+  EXPECT_TRUE(json.at("contour").at("units").is_null());
+  EXPECT_EQ(json.at("tolerance").at("smallest"), 0.1);
+  EXPECT_EQ(json.at("result"), "outside tolerance");
+  EXPECT_EQ(json.at("largest").at("point"), 1);
+  EXPECT_EQ(json.at("largest").at("line"), 4);
+  EXPECT_EQ(json.at("largest").at("x"), 0.1);
+  EXPECT_EQ(json.at("largest").at("deviation"), 0.3);
+  EXPECT_EQ(json.at("relative").at("relative"), 0.3 / 0.1);
+  EXPECT_EQ(json.at("outside"), nlohmann::json::parse("[1]"));
+  EXPECT_TRUE(json.at("gaps").empty());
+  EXPECT_EQ(json.at("crosses"), false);
+  EXPECT_TRUE(json.at("area").is_null());
+  EXPECT_EQ(json.at("deviations").size(), 4u);
+}
+
+TEST_F(CheckCommand, JsonLeavesOutWhatIsNotKnown) {
+  std::string const square =
+      Write("s.csv",
+            "# closed yes\ntype,start_x,start_y,end_x,end_y\nline,0,0,4,0\nline,4.5,0,4,3\n"
+            "line,4,3,0,3\nline,0,3,0,0\n");
+  std::string const path = PathOf("r.json");
+  RunResult const run = RunInProcess({"check", "-", square, "--json", path}, kPoints);
+  EXPECT_EQ(run.code, ExitCode::Ok);
+  EXPECT_NE(run.out.find("result      measured\n"), std::string::npos) << "the text comes as well";
+  auto const json = nlohmann::json::parse(Contents(path));
+  EXPECT_TRUE(json.at("tolerance").is_null());
+  EXPECT_TRUE(json.at("relative").is_null());
+  EXPECT_TRUE(json.at("outside").is_null());
+  EXPECT_FALSE(json.at("largest").contains("relative"));
+  EXPECT_EQ(json.at("gaps"), nlohmann::json::parse(R"([{"before": 1, "after": 2, "size": 0.5}])"));
+  EXPECT_EQ(json.at("area").at("direction"), "ccw");
+  EXPECT_EQ(json.at("area").at("value"), 12.75);
+}
+
 TEST_F(CheckCommand, AllListsThePointsInTheirOrder) {
   std::string const contour = Write("c.csv", kContour);
   std::string points;
@@ -161,6 +207,9 @@ TEST_F(CheckCommand, RefusesWhatItCannotRead) {
   EXPECT_EQ(RunInProcess({"check", "-", "-"}, kPoints).code, ExitCode::Usage);
   EXPECT_EQ(RunInProcess({"check", points}).code, ExitCode::Usage);
   EXPECT_EQ(RunInProcess({"check", points, contour, "--table", points}).code, ExitCode::Usage);
+  EXPECT_EQ(RunInProcess({"check", points, contour, "--json", contour}).code, ExitCode::Usage);
+  EXPECT_EQ(RunInProcess({"check", points, contour, "--table", "-", "--json", "-"}).code,
+            ExitCode::Usage);
   EXPECT_EQ(RunInProcess({"check", PathOf("none.csv"), contour}).code, ExitCode::File);
   EXPECT_EQ(RunInProcess({"check", points, PathOf("none.csv")}).code, ExitCode::File);
   EXPECT_EQ(RunInProcess({"check", points, points}).code, ExitCode::File);
