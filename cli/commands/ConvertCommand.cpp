@@ -10,18 +10,21 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
 #include "cli/commands/Outputs.h"
+#include "cli/drawing/Drawing.h"
 #include "cli/formats/Format.h"
 
 namespace Vorn::Cli {
 
 namespace {
 
-constexpr char const* kText = "Write a contour in another format: JSON, CSV, DXF, G-code or WKT.";
+constexpr char const* kText =
+    "Write a contour in another format: JSON, CSV, DXF, G-code or WKT, or draw it as SVG, PNG or\n"
+    "HTML.";
 
 constexpr char const* kFooter =
     R"(
-The ending of a file tells its format: .json, .csv, .dxf, .nc or .gcode, .wkt. For - and other
-names --from and --to say it; without --from the content tells.
+The ending of a file tells its format: .json, .csv, .dxf, .nc or .gcode, .wkt, and for drawings
+.svg, .png, .html. For - and other names --from and --to say it; without --from the content tells.
 
 What a format keeps:
   json   everything: doubles to the last bit, gaps, units, closed or not
@@ -32,6 +35,8 @@ What a format keeps:
          gaps. Arcs are worked out from the rounded numbers, so that the radii at both ends agree
          within 0.002 mm
   wkt    LINESTRING, CIRCULARSTRING or COMPOUNDCURVE, a MULTICURVE over gaps; no units
+Drawings show the pieces, their joints and their order; they cannot be read back. With measured
+points 'contour plot' draws the deviations as well.
 DXF, G-code and WKT hold arcs of more than 315 degrees as two halves. Where pieces do not meet, the
 gap is kept and reported.
 
@@ -47,6 +52,7 @@ Output files are written whole or not at all.
 Examples:
   contour convert part.json -o part.dxf -o part.nc --feed 600
   contour convert part.dxf -o - --to csv
+  contour convert part.nc -o part.svg
 )";
 
 struct Options {
@@ -68,9 +74,6 @@ Format FormatFor(Options const& options, std::string const& path) {
   std::optional<Format> const format = options.to ? options.to : FormatOf(path);
   std::string const what = path == "-" ? "the standard output" : path;
   if (!format) throw Failure(ExitCode::Usage, what + ": --to must say which format to write");
-  if (!HoldsContour(*format)) {
-    throw Failure(ExitCode::Usage, what + ": a drawing is made by 'contour plot'");
-  }
   return *format;
 }
 
@@ -100,18 +103,19 @@ ExitCode Run(Options const& options, Console const& console) {
   if (!options.units.empty()) contour.units = options.units;
   Outputs outputs;
   for (std::string const& path : options.outputs) {
-    outputs.Add(path, ToText(contour, FormatFor(options, path), options.write));
+    Format const format = FormatFor(options, path);
+    outputs.Add(path, HoldsContour(format) ? ToText(contour, format, options.write)
+                                           : Drawn(DrawingOf(contour), format));
   }
   outputs.Write(console);
   Report(options, contour, console);
   return ExitCode::Ok;
 }
 
-void AddFormat(CLI::App& app, std::string const& name, std::optional<Format>* format,
-               std::string const& help) {
+void AddFormat(CLI::App& app, std::string const& name, std::vector<std::string> const& words,
+               std::optional<Format>* format, std::string const& help) {
   AddWord(
-      app, name, {"json", "csv", "dxf", "gcode", "wkt"},
-      [format](std::string const& word) { *format = FormatNamed(word); }, help);
+      app, name, words, [format](std::string const& word) { *format = FormatNamed(word); }, help);
 }
 
 void AddOptions(CLI::App& app, Options* options) {
@@ -125,8 +129,10 @@ void AddOptions(CLI::App& app, Options* options) {
       ->expected(1)
       ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
       ->type_name("FILE");
-  AddFormat(app, "--from", &options->from, "Read the input as this");
-  AddFormat(app, "--to", &options->to, "Write the outputs as this");
+  AddFormat(app, "--from", {"json", "csv", "dxf", "gcode", "wkt"}, &options->from,
+            "Read the input as this");
+  AddFormat(app, "--to", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png", "html"}, &options->to,
+            "Write the outputs as this");
   app.add_option("--units", options->units,
                  "The units of the coordinates, for example mm; goes before what the file says")
       ->type_name("NAME");

@@ -22,8 +22,9 @@ namespace Vorn::Cli {
 namespace {
 
 constexpr char const* kText =
-    "Draw measured points, and a contour with their deviations from it, as SVG, PNG or a page of\n"
-    "HTML that pans and zooms.";
+    "Draw measured points, or a contour, or a contour with the deviations of the points from it, "
+    "as\n"
+    "SVG, PNG or a page of HTML that pans and zooms.";
 
 constexpr char const* kFooter =
     R"(
@@ -33,6 +34,7 @@ With CONTOUR (JSON, CSV, DXF, G-code or WKT) the drawing shows its lines and arc
 true to scale, and each point moved away from the contour until it is K times as far from it as it
 is; the tolerance is drawn K times as wide. Below are the deviations along the contour, positive to
 the left of the direction of travel. Without CONTOUR the drawing shows the points and their order.
+A single file called .json, .dxf, .nc, .gcode or .wkt is a contour, which is drawn by itself.
 
 A tolerance is drawn when one of the three options or the file states it, as for 'contour fit', and
 only then is the contour judged. Points that fall on the same place of the page are drawn once.
@@ -49,6 +51,7 @@ Output files are written whole or not at all.
 
 Examples:
   contour plot part.csv -o points.svg
+  contour plot part.dxf -o part.svg
   contour plot part.csv part.json --tolerance 0.02 -o part.html -o part.png --dpi 300
   contour plot part.csv part.dxf --magnify 50 -o part.svg
 )";
@@ -63,9 +66,17 @@ struct Options {
   std::optional<int> width;
 
   std::vector<NamedFile> Read() const {
-    std::vector<NamedFile> files = {{"POINTS", points.path}};
+    std::vector<NamedFile> files;
+    if (!points.path.empty()) files.push_back({"POINTS", points.path});
     if (!contour.empty()) files.push_back({"CONTOUR", contour});
     return files;
+  }
+
+  /// Whether an option speaks of measured points.
+  bool IsAboutPoints() const {
+    ToleranceChoice const& tolerance = points.tolerance;
+    return tolerance.same || tolerance.column || tolerance.cap || points.columns.IsGiven() ||
+           magnify;
   }
 
   std::vector<NamedFile> Written() const {
@@ -88,6 +99,20 @@ Format FormatFor(Options const& options, std::string const& path) {
   return *format;
 }
 
+/// A single file in a format that holds no points is the contour.
+void TellContourFromPoints(Options* options) {
+  if (!options->contour.empty()) return;
+  std::optional<Format> const format = FormatOf(options->points.path);
+  if (!format || !HoldsContour(*format) || *format == Format::Csv) return;
+  if (options->IsAboutPoints()) {
+    throw Failure(ExitCode::Usage,
+                  options->points.path +
+                      ": a contour alone has nothing to judge or to magnify; POINTS is missing");
+  }
+  options->contour = std::move(options->points.path);
+  options->points.path.clear();
+}
+
 void RefuseSharedInput(Options const& options) {
   if (options.points.path == "-" && options.contour == "-") {
     throw Failure(ExitCode::Usage, "POINTS and CONTOUR cannot both be the standard input");
@@ -98,18 +123,26 @@ std::string NameOfFile(std::string const& path) {
   return path == "-" ? "standard input" : std::filesystem::path(path).filename().string();
 }
 
+ContourFile ReadDrawnContour(std::string const& path, Console const& console) {
+  ContourFile contour = ReadContour(path, console);
+  for (Gap const& gap : FindGaps(contour)) {
+    console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
+  }
+  return contour;
+}
+
 Drawing ReadDrawing(Options const& options, Console const& console) {
+  if (options.points.path.empty()) {
+    ContourFile contour = ReadDrawnContour(options.contour, console);
+    if (!options.points.units.empty()) contour.units = options.points.units;
+    return DrawingOf(contour);
+  }
   PointFile file = ReadPointsInput(options.points, console);
   if (IsToleranceStated(options.points.tolerance, file)) {
     AssignTolerances(options.points.tolerance, &file);
   }
   ContourFile contour;
-  if (!options.contour.empty()) {
-    contour = ReadContour(options.contour, console);
-    for (Gap const& gap : FindGaps(contour)) {
-      console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
-    }
-  }
+  if (!options.contour.empty()) contour = ReadDrawnContour(options.contour, console);
   Drawing drawing = MakeDrawing(std::move(file.points), std::move(contour.pieces));
   drawing.units = file.units.empty() ? contour.units : file.units;
   drawing.title = NameOfFile(options.points.path);
@@ -120,20 +153,22 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
 }
 
 std::string Drawn(Options const& options, Drawing const& drawing, Format format) {
-  if (format == Format::Html) return ToHtml(drawing);
-  if (format == Format::Svg) return ToSvg(drawing);
   PngSize size;
   if (options.dpi) size.dpi = *options.dpi;
   size.width = options.width;
-  return ToPng(drawing, size);
+  return Drawn(drawing, format, size);
 }
 
 std::string Summary(Drawing const& drawing) {
-  std::string text = "points      " + std::to_string(drawing.points.size()) + '\n';
+  std::string text;
+  if (!drawing.points.empty()) {
+    text = "points      " + std::to_string(drawing.points.size()) + '\n';
+  }
   if (!drawing.HasContour()) return text;
-  PointDeviation const& worst = drawing.deviations[drawing.Worst()];
   text += "pieces      " + Counted(drawing.pieces.size() - drawing.ArcCount(), "line") + ", " +
           Counted(drawing.ArcCount(), "arc") + '\n';
+  if (!drawing.IsMeasured()) return text;
+  PointDeviation const& worst = drawing.deviations[drawing.Worst()];
   text += "deviation   " + FormatShort(worst.distance);
   if (!drawing.units.empty()) text += " " + drawing.units;
   if (drawing.HasTolerances()) text += ", " + FormatShort(worst.relative) + " of the tolerance,";
@@ -210,6 +245,7 @@ void AddPlotCommand(CLI::App& program, Action* action) {
   auto const options = std::make_shared<Options>();
   AddOptions(*app, options.get());
   app->callback([options, action] {
+    TellContourFromPoints(options.get());
     RefuseSharedInput(*options);
     RefuseSharedFiles(options->Read(), options->Written());
     for (std::string const& path : options->outputs) FormatFor(*options, path);

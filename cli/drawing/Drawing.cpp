@@ -4,8 +4,11 @@
 #include <filesystem>
 #include <utility>
 
+#include "cli/CsvReader.h"
 #include "cli/Numbers.h"
+#include "cli/TextFile.h"
 #include "cli/formats/ContourFile.h"
+#include "cli/formats/Format.h"
 
 namespace Vorn::Cli {
 
@@ -20,7 +23,8 @@ std::string WithUnits(std::string text, Drawing const& drawing) {
 }  // namespace
 
 bool Drawing::HasTolerances() const {
-  return std::all_of(points.begin(), points.end(), [](WPoint const& point) { return point.w > 0; });
+  return !points.empty() &&
+         std::all_of(points.begin(), points.end(), [](WPoint const& point) { return point.w > 0; });
 }
 
 bool Drawing::IsToleranceUniform() const { return SmallestTolerance() == LargestTolerance(); }
@@ -61,18 +65,32 @@ Drawing DrawingOf(Report const& report) {
   return drawing;
 }
 
+Drawing DrawingOf(ContourFile const& contour) {
+  Drawing drawing = MakeDrawing({}, contour.pieces);
+  drawing.title = contour.path == kStandardInput
+                      ? kStandardInputName
+                      : std::filesystem::path(contour.path).filename().string();
+  drawing.units = contour.units;
+  return drawing;
+}
+
 Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece> pieces) {
   Drawing drawing;
   drawing.points = std::move(points);
   drawing.pieces = std::move(pieces);
   if (drawing.HasTolerances()) drawing.facts = {DescribeTolerance(drawing)};
-  if (!drawing.HasContour()) return drawing;
+  if (drawing.points.empty() || !drawing.HasContour()) return drawing;
   drawing.deviations = Remeasure(drawing.points, drawing.pieces).points;
   if (drawing.HasTolerances()) {
     bool const isWithin = drawing.deviations[drawing.Worst()].relative <= kLargestRelative;
     drawing.verdict = isWithin ? Verdict::WithinTolerance : Verdict::OutsideTolerance;
   }
   return drawing;
+}
+
+std::string Drawn(Drawing const& drawing, Format format, PngSize const& size) {
+  if (format == Format::Html) return ToHtml(drawing);
+  return format == Format::Png ? ToPng(drawing, size) : ToSvg(drawing);
 }
 
 std::string DescribeTolerance(Drawing const& drawing) {

@@ -12,15 +12,19 @@
 
 namespace Vorn::Cli {
 
-/// What is to be drawn, wherever it comes from: measured points, and when there is a contour its
-/// pieces with the deviation of every point.
+struct ContourFile;
+enum class Format;
+
+/// What is to be drawn, wherever it comes from: measured points, or the pieces of a contour, or
+/// both with the deviation of every point.
 struct Drawing {
   std::string title;
   std::vector<std::string> facts;  ///< short phrases for the line below the title
   std::string units;               ///< of all lengths; may be empty
-  std::vector<WPoint> points;      ///< at least one; `w` is 0 where there is no tolerance
+  std::vector<WPoint> points;      ///< `w` is 0 where there is no tolerance; empty: pieces alone
   std::vector<Piece> pieces;       ///< empty: the points alone
-  /// One for each point when there are pieces; `relative` counts only where there is a tolerance.
+  /// One for each point when there are pieces, else none; `relative` counts only where there is a
+  /// tolerance.
   std::vector<PointDeviation> deviations;
   std::optional<Verdict> verdict;  ///< nothing: there was nothing to judge
   /// How many times larger than true deviations and tolerances are drawn. Nothing: a round number
@@ -28,7 +32,9 @@ struct Drawing {
   std::optional<double> magnify;
 
   bool HasContour() const { return !pieces.empty(); }
-  /// Whether every point has a tolerance.
+  /// Whether there are points and a contour that they were measured against.
+  bool IsMeasured() const { return !deviations.empty(); }
+  /// Whether there are points and every one has a tolerance; the next three need that.
   bool HasTolerances() const;
   bool IsToleranceUniform() const;
   double LargestTolerance() const;
@@ -36,16 +42,19 @@ struct Drawing {
   std::size_t ArcCount() const;
   /// The contour ends where it starts.
   bool IsClosed() const;
-  /// Index of the point with the largest deviation, over its tolerance where all have one. Needs a
-  /// contour.
+  /// Index of the point with the largest deviation, over its tolerance where all have one. Only if
+  /// something is measured.
   std::size_t Worst() const;
 };
 
 /// The drawing of a fit.
 Drawing DrawingOf(Report const& report);
 
+/// The drawing of a contour without measured points.
+Drawing DrawingOf(ContourFile const& contour);
+
 /// The drawing of points against a contour: measures every point, and judges when every point has
-/// a tolerance. Without pieces nothing is measured.
+/// a tolerance. Without points or without pieces nothing is measured.
 Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece> pieces);
 
 /// "tolerance 0.02 mm", "tolerance 0.01 to 0.03 mm"; nothing without tolerances.
@@ -67,5 +76,8 @@ std::string ToPng(Drawing const& drawing, PngSize const& size);
 /// One file that needs nothing else: pans and zooms, tells about the point under the cursor and
 /// lists the pieces.
 std::string ToHtml(Drawing const& drawing);
+
+/// The drawing in a format that holds no contour.
+std::string Drawn(Drawing const& drawing, Format format, PngSize const& size = {});
 
 }  // namespace Vorn::Cli

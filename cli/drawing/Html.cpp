@@ -119,10 +119,11 @@ Json DataJson(Drawing const& drawing) {
   json["verdict"] = VerdictJson(drawing);
   if (!drawing.HasContour()) return json;
   for (Piece const& piece : drawing.pieces) json["pieces"].push_back(PieceJson(piece));
+  json["isClosed"] = drawing.IsClosed();
+  if (!drawing.IsMeasured()) return json;
   std::vector<Foot> const feet = FeetOf(drawing);
   json["deviations"] = DeviationsJson(drawing, feet);
   json["band"] = BandJson(drawing, feet);
-  json["isClosed"] = drawing.IsClosed();
   json["worst"] = drawing.Worst();
   json["magnify"] = MagnifyOnScreen(drawing);
   return json;

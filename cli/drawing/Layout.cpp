@@ -30,6 +30,24 @@ int Exponent(double value) { return static_cast<int>(std::floor(std::log10(value
 /// An extent that can be divided by, also for points on one horizontal or vertical line.
 double Positive(double extent) { return extent > 0.0 && std::isfinite(extent) ? extent : 0.0; }
 
+/// Places on a piece that tell its extent well enough: the ends, and some of an arc between.
+std::vector<GeometryUtils::Point> Samples(Piece const& piece) {
+  std::vector<GeometryUtils::Point> places = {piece.start, piece.end};
+  for (int i = 1; piece.IsArc() && i < kArcSamples; ++i) {
+    places.push_back(PointOnArc(piece, piece.sweep * i / kArcSamples));
+  }
+  return places;
+}
+
+Box BoxAround(std::vector<Piece> const& pieces) {
+  GeometryUtils::Point const& first = pieces.front().start;
+  Box box{first.x, first.x, first.y, first.y};
+  for (Piece const& piece : pieces) {
+    for (GeometryUtils::Point const& place : Samples(piece)) box.Include(place.x, place.y);
+  }
+  return box;
+}
+
 }  // namespace
 
 void Box::Include(double x, double y) {
@@ -114,6 +132,7 @@ Box View::Visible() const {
 }
 
 Box BoxAround(Drawing const& drawing, std::vector<GeometryUtils::Point> const& others) {
+  if (drawing.points.empty()) return BoxAround(drawing.pieces);
   WPoint const& first = drawing.points.front();
   Box box{first.x, first.x, first.y, first.y};
   for (WPoint const& point : drawing.points) box.Include(point.x, point.y);
@@ -126,18 +145,14 @@ Box BoxAround(Drawing const& drawing, std::vector<GeometryUtils::Point> const& o
                 std::clamp(point.y, limit.yMin, limit.yMax));
   };
   for (Piece const& piece : drawing.pieces) {
-    include(piece.start);
-    include(piece.end);
-    for (int i = 1; piece.IsArc() && i < kArcSamples; ++i) {
-      include(PointOnArc(piece, piece.sweep * i / kArcSamples));
-    }
+    for (GeometryUtils::Point const& place : Samples(piece)) include(place);
   }
   for (GeometryUtils::Point const& point : others) include(point);
   return box;
 }
 
 double ReadableMagnification(Drawing const& drawing, double scale) {
-  if (!drawing.HasContour()) return 1.0;
+  if (!drawing.IsMeasured()) return 1.0;
   double const deviation = drawing.deviations[drawing.Worst()].distance;
   double const tolerance = drawing.HasTolerances() ? drawing.LargestTolerance() : deviation;
   double const most =

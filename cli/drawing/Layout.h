@@ -77,7 +77,8 @@ class View {
   double yMiddle_ = 0.0;
 };
 
-/// A box around points and, as far as they stay near them, the contour and other places.
+/// A box around points and, as far as they stay near them, the contour and other places; without
+/// points around the contour.
 Box BoxAround(Drawing const& drawing, std::vector<GeometryUtils::Point> const& others = {});
 
 /// A round number that draws the largest tolerance some millimetres wide where a unit is `scale`

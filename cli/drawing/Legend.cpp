@@ -73,6 +73,7 @@ void AddEnds(bool isClosed, Legend* legend) {
 }
 
 void AddPoints(Scene const& scene, Legend* legend) {
+  if (scene.drawing.points.empty()) return;
   legend->AddCircle(2.0, "fill=\"" + kPointColor + "\"",
                     scene.HasContour() ? "point, deviation" + Times(scene) : "measured point");
   if (!scene.HasContour()) {

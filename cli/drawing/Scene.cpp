@@ -53,7 +53,7 @@ Scene MakeScene(Drawing const& drawing, Rect const& least, double mostHeight) {
   // The magnification follows from the scale, and what it moves outward asks for room in turn.
   View const first = ViewOf(BoxAround(drawing), least, mostHeight);
   double const magnify =
-      drawing.HasContour() ? drawing.magnify.value_or(ReadableMagnification(drawing, first.Scale()))
+      drawing.IsMeasured() ? drawing.magnify.value_or(ReadableMagnification(drawing, first.Scale()))
                            : 1.0;
   std::vector<Foot> feet = FeetOf(drawing);
   std::vector<GeometryUtils::Point> const points = MagnifiedPoints(drawing, feet, magnify);

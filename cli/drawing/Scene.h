@@ -13,11 +13,12 @@ struct Scene {
   Drawing const& drawing;
   View view;
   double magnify = 1.0;
-  std::vector<Foot> feet;        ///< of each point; empty without a contour
+  std::vector<Foot> feet;        ///< of each point; empty if nothing is measured
   std::vector<Pixel> feetAt;     ///< the same on the page
   std::vector<Pixel> magnified;  ///< each point as drawn: moved away from its foot
 
   bool HasContour() const { return drawing.HasContour(); }
+  bool IsMeasured() const { return drawing.IsMeasured(); }
   /// Whether the tolerance is wide enough on the page to be seen at all.
   bool IsBandVisible() const;
   /// Whether there is a tolerance and the point lies beyond it.

@@ -33,9 +33,11 @@ constexpr char const* kStyle =
     "stroke-linejoin: round; }</style>\n";
 
 std::string Counts(Drawing const& drawing) {
-  std::string counts = Counted(drawing.points.size(), "point");
+  std::string counts;
+  if (!drawing.points.empty()) counts = Counted(drawing.points.size(), "point");
   if (drawing.HasContour()) {
-    counts += ", " + Counted(drawing.pieces.size() - drawing.ArcCount(), "line") + " and " +
+    if (!counts.empty()) counts += ", ";
+    counts += Counted(drawing.pieces.size() - drawing.ArcCount(), "line") + " and " +
               Counted(drawing.ArcCount(), "arc");
   }
   return counts;
@@ -51,7 +53,7 @@ std::string FactsOf(Drawing const& drawing) {
 }
 
 std::string Judgement(Drawing const& drawing) {
-  if (!drawing.HasContour()) return "";
+  if (!drawing.IsMeasured()) return "";
   std::size_t const index = drawing.Worst();
   PointDeviation const& worst = drawing.deviations[index];
   std::string text =
@@ -75,7 +77,7 @@ std::string Title(Drawing const& drawing) {
 Scene SceneOf(Drawing const& drawing) {
   double const width = kPageWidth - kLeft - kRight;
   double const room = kPageBottom - kContourTop;
-  if (!drawing.HasContour()) {
+  if (!drawing.IsMeasured()) {
     double const height = room - kLegendHeight + 20.0;
     return MakeScene(drawing, {kLeft, kContourTop, width, height}, height);
   }
@@ -85,7 +87,7 @@ Scene SceneOf(Drawing const& drawing) {
 }
 
 std::string Diagram(Scene const& scene) {
-  if (!scene.HasContour()) return "";
+  if (!scene.IsMeasured()) return "";
   double const top = scene.view.Frame().Bottom() + kBetweenFrames;
   return DeviationPlot(scene, {kLeft, top, scene.view.Frame().width, kPageBottom - top});
 }

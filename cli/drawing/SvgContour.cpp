@@ -365,6 +365,7 @@ std::string PieceLabels(Scene const& scene) {
 }
 
 std::string WorstPoint(Scene const& scene) {
+  if (!scene.IsMeasured()) return "";
   return CircleElement(
       scene.magnified[scene.drawing.Worst()], 7.0,
       "class=\"worst\" fill=\"none\" stroke=\"" + kWorstColor + "\" stroke-width=\"1.7\"");

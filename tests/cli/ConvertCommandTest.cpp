@@ -83,6 +83,36 @@ TEST(ConvertCommand, TheInputFormatMayBeTold) {
   EXPECT_EQ(result.err, "contour: standard input:1: the header has no column 'type': 'G0 X0 Y0'\n");
 }
 
+TEST_F(Convert, DrawingsShowThePiecesAndNoPointThatNobodyMeasured) {
+  Write("p.json", ToJson(Wedge()));
+  RunResult const result = RunInProcess(
+      {"convert", Path("p.json"), "-o", Path("p.svg"), "-o", Path("p.png"), "-o", Path("p.html")});
+  ASSERT_EQ(result.code, ExitCode::Ok) << result.err;
+  std::string const svg = Contents("p.svg");
+  for (char const* shown :
+       {"class=\"pieces\"", "class=\"joints\"", "2 lines and 1 arc", "p.json"}) {
+    EXPECT_NE(svg.find(shown), std::string::npos) << shown;
+  }
+  for (char const* absent :
+       {"class=\"points", "class=\"worst", "class=\"whiskers", "deviation", "point", "nan"}) {
+    EXPECT_EQ(svg.find(absent), std::string::npos) << absent;
+  }
+  EXPECT_EQ(Contents("p.png").substr(1, 3), "PNG");
+  EXPECT_GT(Contents("p.png").size(), 5000u);
+  std::string const html = Contents("p.html");
+  EXPECT_NE(html.find("\"points\":{\"x\":[],\"y\":[],\"w\":null}"), std::string::npos);
+  EXPECT_EQ(html.find("\"deviations\":"), std::string::npos);
+}
+
+TEST(ConvertCommand, ADrawingMayGoToTheStandardOutput) {
+  RunResult const result =
+      RunInProcess({"convert", "-", "-o", "-", "--to", "svg"}, ToJson(Wedge()));
+  EXPECT_EQ(result.code, ExitCode::Ok);
+  EXPECT_TRUE(result.out.starts_with("<?xml"));
+  EXPECT_TRUE(result.out.ends_with("</svg>\n"));
+  EXPECT_NE(result.out.find(">standard input<"), std::string::npos);
+}
+
 TEST(ConvertCommand, GapsAreReportedAndKept) {
   RunResult const result =
       RunInProcess({"convert", "-", "-o", "-", "--to", "csv"}, ToJson(WithGap()));

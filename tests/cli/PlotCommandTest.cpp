@@ -197,6 +197,27 @@ TEST(ToHtml, NumbersThatAreNoneBecomeNull) {
   EXPECT_TRUE(nlohmann::json::parse(DataOf(ToHtml(drawing)))["points"]["x"][1].is_null());
 }
 
+TEST_F(PlotCommand, AContourAloneIsDrawnAsConvertDrawsIt) {
+  RunResult const plot = RunInProcess({"plot", At("part.wkt"), "-o", At("p.svg")});
+  EXPECT_EQ(plot.code, ExitCode::Ok) << plot.err;
+  EXPECT_EQ(plot.out, "pieces      1 line, 0 arcs\nwrote       " + At("p.svg") + "\n");
+  ASSERT_EQ(RunInProcess({"convert", At("part.wkt"), "-o", At("c.svg")}).code, ExitCode::Ok);
+  EXPECT_EQ(Contents(At("p.svg")), Contents(At("c.svg")));
+}
+
+TEST_F(PlotCommand, AContourAloneHasNothingToJudge) {
+  for (std::vector<std::string> const& option :
+       {std::vector<std::string>{"-t", "1"}, {"--magnify", "5"}, {"--columns", "1,2"}}) {
+    std::vector<std::string> words = {"plot", At("part.wkt"), "-o", At("p.svg")};
+    words.insert(words.end(), option.begin(), option.end());
+    RunResult const plot = RunInProcess(words);
+    EXPECT_EQ(plot.code, ExitCode::Usage) << option.front();
+    EXPECT_NE(plot.err.find("a contour alone has nothing to judge or to magnify"),
+              std::string::npos)
+        << plot.err;
+  }
+}
+
 TEST(PlotSharedContours, EveryOneIsDrawnInEveryFormat) {
   std::optional<std::string> const data = Testing::SharedDataFolder();
   if (!data) GTEST_SKIP() << "VORN_DATA_DIR is not set";

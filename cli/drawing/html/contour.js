@@ -10,7 +10,7 @@ class ContourDrawing {
     this.state = state;
     this.view = new View();
     this.isFresh = true;
-    this.surface = new Surface(canvas, scene.hasContour ? 325 : 529, (...page) => this.paint(...page));
+    this.surface = new Surface(canvas, scene.isMeasured ? 325 : 529, (...page) => this.paint(...page));
   }
 
   showAll() {
@@ -69,10 +69,8 @@ class ContourDrawing {
     if (areMany) this.paintPieces();
     this.paintJoints();
     this.paintEnds();
-    if (this.scene.hasContour) {
-      this.paintWorst();
-      this.paintNumbers();
-    }
+    if (this.scene.isMeasured) this.paintWorst();
+    if (this.scene.hasContour) this.paintNumbers();
     this.paintHovered();
     this.paintAxisLabels();
   }

@@ -173,6 +173,7 @@ class PointGrid {
     this.y = y;
     const box = [Infinity, Infinity, -Infinity, -Infinity];
     for (let i = 0; i < x.length; ++i) include(box, x[i], y[i]);
+    if (x.length === 0) include(box, 0, 0);
     this.left = box[0];
     this.bottom = box[1];
     const width = box[2] - box[0], height = box[3] - box[1];

@@ -6,7 +6,7 @@ const byId = (id) => document.getElementById(id);
 const units = scene.units ? ` ${scene.units}` : '';
 
 const contour = new ContourDrawing(byId('contour'), scene, state);
-const diagram = scene.hasContour ? new Diagram(byId('diagram'), scene, state) : null;
+const diagram = scene.isMeasured ? new Diagram(byId('diagram'), scene, state) : null;
 const table = scene.hasContour
     ? new PieceTable(scene, {hover: (i) => hoverPiece(i), choose: choosePiece}) : null;
 
@@ -26,15 +26,18 @@ function fillSummary() {
     verdict.textContent = scene.verdict.text;
     verdict.className = scene.verdict.isGood ? 'good' : 'bad';
   }
-  const entries = [['points', String(scene.count)]];
+  const entries = scene.count > 0 ? [['points', String(scene.count)]] : [];
   if (scene.hasContour) {
     const arcs = scene.pieces.filter((piece) => piece.kind === 'arc').length;
-    const worst = scene.worst;
     entries.push(
         ['pieces', String(scene.pieces.length)],
         ['lines', String(scene.pieces.length - arcs)],
         ['arcs', String(arcs)],
-        ['length', short(scene.length) + units],
+        ['length', short(scene.length) + units]);
+  }
+  if (scene.isMeasured) {
+    const worst = scene.worst;
+    entries.push(
         ['largest deviation', short(Math.abs(scene.deviation(worst)), 4) + units],
         ['at point', String(worst)]);
     if (scene.hasTolerances) {
@@ -70,7 +73,7 @@ function describePiece(index) {
   if (piece.kind === 'arc') {
     rows.push(['radius', short(piece.radius) + units], ['sweep', table.sweep(piece)]);
   }
-  rows.push(['points', String(piece.points)]);
+  if (scene.isMeasured) rows.push(['points', String(piece.points)]);
   return rows;
 }
 
@@ -115,7 +118,7 @@ function choosePiece(index) {
   state.chosen = state.chosen === index ? -1 : index;
   if (state.chosen >= 0) {
     contour.showPiece(index);
-    diagram.showPiece(index);
+    diagram?.showPiece(index);
   } else {
     showAll();
   }
@@ -144,6 +147,7 @@ function hoverDiagram(x, y) {
 
 /** The point before or after, brought into view. */
 function stepPoint(by) {
+  if (scene.count === 0) return;
   const next = state.hovered < 0 ? 0 : Math.min(scene.count - 1, Math.max(0, state.hovered + by));
   const [x, y] = contour.pixelOf(next);
   const {width, height} = contour.view;
@@ -231,14 +235,14 @@ function fillLegend() {
     entries.push([`<rect x="9" y="3" width="8" height="8" fill="var(--paper)" ${outline}/>`,
                   'end']);
   }
-  if (scene.hasContour) {
+  if (scene.isMeasured) {
     entries.push(['<circle cx="7" cy="7" r="2.5" fill="var(--point)"/>' +
                   '<rect x="16" y="4.8" width="4.4" height="4.4" fill="var(--point)"/>',
                   `point of a line, of an arc: deviation${times}`],
                  ['<circle cx="13" cy="7" r="6" fill="none" stroke="var(--worst)" ' +
                   'stroke-width="2"/>',
                   'largest deviation']);
-  } else {
+  } else if (scene.count > 0) {
     entries.push(['<circle cx="13" cy="7" r="2.5" fill="var(--point)"/>', 'measured point'],
                  ['<path d="M3 7h12M14 3.5L21 7L14 10.5z" fill="var(--start)" ' +
                   'stroke="var(--start)"/>',
@@ -276,13 +280,13 @@ function setUpDiagram() {
 }
 
 fillSummary();
-if (scene.hasContour) {
+if (scene.isMeasured) {
   setUpMagnify();
   setUpDiagram();
 } else {
   byId('magnify-control').hidden = true;
   byId('diagram-part').hidden = true;
-  byId('pieces').hidden = true;
+  byId('pieces').hidden = !scene.hasContour;
   byId('contour').classList.add('alone');
   fillLegend();
 }

@@ -28,11 +28,13 @@ class Scene {
     Object.assign(this, data);
     this.count = data.points.x.length;
     this.hasContour = data.pieces.length > 0;
+    /** Whether there are points and a contour that they were measured against. */
+    this.isMeasured = this.hasContour && this.count > 0;
     this.hasTolerances = data.points.w !== null;
     this.starts = [0];
     for (const piece of this.pieces) this.starts.push(this.starts.at(-1) + piece.length);
     this.length = this.starts.at(-1);
-    if (this.hasContour) this.findFeet();
+    if (this.isMeasured) this.findFeet();
     this.countPoints();
     this.setMagnify(1);
   }
@@ -71,7 +73,7 @@ class Scene {
   /** How many points each piece has and the worst of them. */
   countPoints() {
     for (const piece of this.pieces) Object.assign(piece, {points: 0, worst: -1});
-    if (!this.hasContour) return;
+    if (!this.isMeasured) return;
     const size = (i) => Math.abs(this.hasTolerances ? this.relative(i) : this.deviation(i));
     for (let i = 0; i < this.count; ++i) {
       const piece = this.pieces[this.pieceOf(i)];
@@ -82,7 +84,7 @@ class Scene {
 
   /** Moves every point away from its foot until it is `times` as far from it. */
   setMagnify(times) {
-    this.times = this.hasContour ? times : 1;
+    this.times = this.isMeasured ? times : 1;
     const {x, y} = this.points;
     this.x = Float64Array.from(x);
     this.y = Float64Array.from(y);
@@ -95,8 +97,16 @@ class Scene {
     this.grid = new PointGrid(this.x, this.y);
   }
 
-  /** A box around everything, without what strays far from the points. */
+  /** A box around everything, without what strays far from the points where there are any. */
   box() {
+    if (this.count === 0) {
+      const box = [Infinity, Infinity, -Infinity, -Infinity];
+      for (const [xMin, yMin, xMax, yMax] of this.pieces.map(boxOf)) {
+        include(box, xMin, yMin);
+        include(box, xMax, yMax);
+      }
+      return box;
+    }
     const points = [Infinity, Infinity, -Infinity, -Infinity];
     for (let i = 0; i < this.count; ++i) include(points, this.points.x[i], this.points.y[i]);
     const reach = 0.5 * Math.max(points[2] - points[0], points[3] - points[1]);

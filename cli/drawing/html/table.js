@@ -6,8 +6,8 @@ class PieceTable {
     this.scene = scene;
     this.actions = actions;
     this.body = document.getElementById('rows');
-    const heads = ['no', 'kind', 'length', 'radius', 'sweep', 'points',
-                   scene.hasTolerances ? 'of tolerance' : 'deviation'];
+    const heads = ['no', 'kind', 'length', 'radius', 'sweep'];
+    if (scene.isMeasured) heads.push('points', scene.hasTolerances ? 'of tolerance' : 'deviation');
     for (const head of heads) document.getElementById('columns').append(element('th', head));
     this.body.append(...scene.pieces.map((piece, i) => this.row(piece, i)));
     this.listen();
@@ -26,8 +26,10 @@ class PieceTable {
                 isArc ? 'arc' : 'line');
     row.append(element('td', String(i + 1)), kind, element('td', short(piece.length)),
                element('td', isArc ? short(piece.radius) : ''),
-               element('td', isArc ? this.sweep(piece) : ''), element('td', String(piece.points)),
-               this.worstCell(piece));
+               element('td', isArc ? this.sweep(piece) : ''));
+    if (this.scene.isMeasured) {
+      row.append(element('td', String(piece.points)), this.worstCell(piece));
+    }
     return row;
   }
 
