@@ -3,13 +3,11 @@
 #include <algorithm>
 #include <filesystem>
 #include <fstream>
-#include <limits>
 #include <nlohmann/json.hpp>
 #include <sstream>
 
 #include "cli/RunInProcess.h"
 #include "cli/TextFile.h"
-#include "support/SharedData.h"
 
 namespace Vorn::Cli {
 namespace {
@@ -221,74 +219,6 @@ TEST_F(CheckCommand, ContourMayComeFromStandardInputWithItsFormatSaid) {
   RunResult const run = RunInProcess({"check", points, "-", "--from", "csv"}, kContour);
   EXPECT_EQ(run.code, ExitCode::Ok) << run.err;
 }
-
-struct SharedFit {
-  char const* name;
-  char const* option;
-  char const* tolerance;
-};
-
-class CheckOfSharedData : public CheckCommand, public testing::WithParamInterface<SharedFit> {};
-
-double WorstRelative(std::string const& table) {
-  std::istringstream lines(table);
-  std::string line;
-  std::getline(lines, line);
-  double worst = 0.0;
-  while (std::getline(lines, line)) {
-    worst = std::max(worst, std::stod(line.substr(line.rfind(',') + 1)));
-  }
-  return worst;
-}
-
-double LargestRadius(nlohmann::json const& document) {
-  double largest = 0.0;
-  for (auto const& element : document.at("elements")) {
-    largest = std::max(largest, element.value("radius", 0.0));
-  }
-  return largest;
-}
-
-TEST_P(CheckOfSharedData, AgreesWithTheDeviationOfTheFit) {
-  std::optional<std::string> const data = Vorn::Testing::SharedDataFolder();
-  if (!data) GTEST_SKIP() << "VORN_DATA_DIR is not set";
-  SharedFit const& fit = GetParam();
-  std::string const points = *data + "/" + fit.name + ".csv";
-  std::string const contour = PathOf("c.json");
-  RunResult const fitted =
-      RunInProcess({"fit", points, fit.option, fit.tolerance, "--json", contour});
-  ASSERT_EQ(fitted.code, ExitCode::Ok) << fitted.err;
-  auto const document = nlohmann::json::parse(Contents(contour));
-  auto const& deviation = document.at("deviation");
-  double const remeasured = deviation.at("remeasured").at("value").get<double>();
-  RunResult const checked =
-      RunInProcess({"check", points, contour, fit.option, fit.tolerance, "--table", "-"});
-  EXPECT_EQ(checked.code, ExitCode::Ok) << checked.err;
-  double const worst = WorstRelative(checked.out);
-  EXPECT_NEAR(worst, remeasured, 1e-9) << "the JSON file holds the contour exactly";
-  auto const& reported = deviation.at("reported").at("value");
-  if (reported.is_null()) return;  // a full circle, which the program fits by itself
-  // Both measure arcs from their centres, with the rounding of the radius.
-  double const rounding = 4.0 * std::numeric_limits<double>::epsilon() * LargestRadius(document) /
-                          std::stod(fit.tolerance);
-  // A point may lie nearer to a neighbour of the piece that the fit measured it against.
-  EXPECT_LE(worst, reported.get<double>() + 1e-9 + rounding);
-  EXPECT_GT(worst, 0.5 * reported.get<double>());
-}
-
-INSTANTIATE_TEST_SUITE_P(CheckCommand, CheckOfSharedData,
-                         testing::Values(SharedFit{"rail_head_known_arcs", "--tolerance", "0.01"},
-                                         SharedFit{"wheel_worn_a", "--tolerance", "0.03"},
-                                         SharedFit{"rail_worn_low", "--tolerance", "0.025"},
-                                         SharedFit{"mirror_sphere_83m", "--tolerance", "0.00005"},
-                                         SharedFit{"hatch_boundary", "--tolerance", "0.002"},
-                                         SharedFit{"glyph_five", "--tolerance-per-point", "2.0"},
-                                         SharedFit{"test_track_centreline", "--tolerance-per-point",
-                                                   "0.03"},
-                                         SharedFit{"gcode_letter_d", "--tolerance", "0.015"},
-                                         SharedFit{"airfoil_clark_y", "--tolerance", "0.0004"},
-                                         SharedFit{"circle_r3", "--tolerance", "0.001"}),
-                         [](auto const& instance) { return std::string(instance.param.name); });
 
 }  // namespace
 }  // namespace Vorn::Cli

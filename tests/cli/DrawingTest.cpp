@@ -1,4 +1,3 @@
-#include <cairo.h>
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -7,6 +6,7 @@
 #include <regex>
 
 #include "cli/Contours.h"
+#include "cli/Picture.h"
 #include "cli/drawing/Band.h"
 #include "cli/drawing/Decimation.h"
 #include "cli/drawing/Feet.h"
@@ -209,61 +209,9 @@ TEST(StreaksOf, JoinsCellsOneAboveTheOther) {
   EXPECT_EQ(runs[1].height, 0.0);
 }
 
-/// A picture in memory that answers what colours it holds.
-class Picture {
- public:
-  explicit Picture(std::string const& png) {
-    Source source{png, 0};
-    surface_ = cairo_image_surface_create_from_png_stream(Read, &source);
-  }
-  Picture(Picture const&) = delete;
-  Picture& operator=(Picture const&) = delete;
-  ~Picture() { cairo_surface_destroy(surface_); }
-
-  int Width() const { return cairo_image_surface_get_width(surface_); }
-  int Height() const { return cairo_image_surface_get_height(surface_); }
-
-  /// Pixels of nearly this colour, "#rrggbb".
-  int Count(std::string const& color) const {
-    int count = 0;
-    for (int y = 0; y < Height(); ++y) {
-      unsigned char const* row =
-          cairo_image_surface_get_data(surface_) + y * cairo_image_surface_get_stride(surface_);
-      for (int x = 0; x < Width(); ++x) count += IsNear(row + 4 * x, color) ? 1 : 0;
-    }
-    return count;
-  }
-
- private:
-  struct Source {
-    std::string const& png;
-    std::size_t at;
-  };
-
-  static cairo_status_t Read(void* closure, unsigned char* data, unsigned int length) {
-    Source& source = *static_cast<Source*>(closure);
-    if (source.png.size() - source.at < length) return CAIRO_STATUS_READ_ERROR;
-    std::copy_n(source.png.begin() + static_cast<std::ptrdiff_t>(source.at), length, data);
-    source.at += length;
-    return CAIRO_STATUS_SUCCESS;
-  }
-
-  /// Bytes of a pixel are blue, green, red.
-  static bool IsNear(unsigned char const* pixel, std::string const& color) {
-    for (int channel = 0; channel < 3; ++channel) {
-      int const wanted =
-          std::stoi(color.substr(1 + 2 * static_cast<std::size_t>(channel), 2), nullptr, 16);
-      if (std::abs(wanted - pixel[2 - channel]) > 12) return false;
-    }
-    return true;
-  }
-
-  cairo_surface_t* surface_;
-};
-
 TEST(ToPng, ShowsEveryKindInItsColour) {
   Drawing drawing = DrawingOf(Contours::LineAndArcReport());
-  Picture const picture(ToPng(drawing, {}));
+  Picture const picture = Picture::FromPng(ToPng(drawing, {}));
   EXPECT_EQ(picture.Width(), 1754);
   EXPECT_EQ(picture.Height(), 1240);
   for (std::string const& color :
@@ -274,7 +222,8 @@ TEST(ToPng, ShowsEveryKindInItsColour) {
 }
 
 TEST(ToPng, WidthOverridesTheResolution) {
-  Picture const picture(ToPng(DrawingOf(Contours::LineAndArcReport()), {300.0, 594}));
+  Picture const picture =
+      Picture::FromPng(ToPng(DrawingOf(Contours::LineAndArcReport()), {300.0, 594}));
   EXPECT_EQ(picture.Width(), 594);
   EXPECT_EQ(picture.Height(), 420);
 }

@@ -8,7 +8,6 @@
 
 #include "cli/RunInProcess.h"
 #include "cli/drawing/Drawing.h"
-#include "support/SharedData.h"
 
 namespace Vorn::Cli {
 namespace {
@@ -216,34 +215,6 @@ TEST_F(PlotCommand, AContourAloneHasNothingToJudge) {
               std::string::npos)
         << plot.err;
   }
-}
-
-TEST(PlotSharedContours, EveryOneIsDrawnInEveryFormat) {
-  std::optional<std::string> const data = Testing::SharedDataFolder();
-  if (!data) GTEST_SKIP() << "VORN_DATA_DIR is not set";
-  std::string name = (fs::temp_directory_path() / "contour-plot-XXXXXX").string();
-  fs::path const folder = mkdtemp(name.data());
-  int count = 0;
-  for (auto const& entry : fs::directory_iterator(*data)) {
-    std::string const points = entry.path().string();
-    if (entry.path().extension() != ".csv" || points.find(".truth.") != std::string::npos) continue;
-    std::string const contour = (folder / "c.json").string();
-    std::vector<std::string> const tolerance = {"--tolerance-per-point", "0.03"};
-    RunResult const fit =
-        RunInProcess({"fit", points, tolerance[0], tolerance[1], "--json", contour});
-    ASSERT_EQ(fit.code, ExitCode::Ok) << points << fit.err;
-    RunResult const plot = RunInProcess(
-        {"plot", points, contour, tolerance[0], tolerance[1], "-o", (folder / "p.svg").string(),
-         "-o", (folder / "p.html").string(), "-o", (folder / "p.png").string(), "--width", "600"});
-    EXPECT_EQ(plot.code, ExitCode::Ok) << points << plot.err;
-    EXPECT_NE(plot.out.find("result      within tolerance"), std::string::npos) << points;
-    EXPECT_EQ(Contents(folder / "p.svg").find("nan"), std::string::npos) << points;
-    EXPECT_TRUE(nlohmann::json::accept(DataOf(Contents(folder / "p.html")))) << points;
-    EXPECT_GT(fs::file_size(folder / "p.png"), 5000u) << points;
-    ++count;
-  }
-  EXPECT_GE(count, 5);
-  fs::remove_all(folder);
 }
 
 }  // namespace
