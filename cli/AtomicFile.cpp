@@ -11,6 +11,7 @@
 #include <filesystem>
 
 #include "cli/Failure.h"
+#include "cli/Interruption.h"
 
 namespace Vorn::Cli {
 
@@ -63,22 +64,36 @@ void RequireWritable(std::string const& path) {
 AtomicFile::AtomicFile(std::string const& path, std::string_view contents)
     : path_(path), target_(Target(path)) {
   RequireWritable(path);
-  std::string name = target_ + ".XXXXXX";
-  int const descriptor = mkstemp(name.data());
-  if (descriptor < 0) Refuse(path_, std::strerror(errno));
-  temporary_ = name;
+  int const descriptor = MakeTemporary();
   try {
     Write(descriptor, contents);
   } catch (...) {
     close(descriptor);
-    unlink(temporary_.c_str());
+    RemoveTemporary();
     throw;
   }
   if (close(descriptor) != 0) {
     int const reason = errno;
-    unlink(temporary_.c_str());
+    RemoveTemporary();
     Refuse(path_, std::strerror(reason));
   }
+}
+
+int AtomicFile::MakeTemporary() {
+  std::string name = target_ + ".XXXXXX";
+  auto const lock = HoldOffInterruption();
+  int const descriptor = mkstemp(name.data());
+  if (descriptor < 0) Refuse(path_, std::strerror(errno));
+  NoteTemporary(name);
+  temporary_ = name;
+  return descriptor;
+}
+
+void AtomicFile::RemoveTemporary() {
+  auto const lock = HoldOffInterruption();
+  unlink(temporary_.c_str());
+  ForgetTemporary(temporary_);
+  temporary_.clear();
 }
 
 void AtomicFile::Write(int descriptor, std::string_view contents) const {
@@ -93,13 +108,15 @@ void AtomicFile::Write(int descriptor, std::string_view contents) const {
 }
 
 AtomicFile::~AtomicFile() {
-  if (!temporary_.empty()) unlink(temporary_.c_str());
+  if (!temporary_.empty()) RemoveTemporary();
 }
 
 void AtomicFile::Commit() {
+  auto const lock = HoldOffInterruption();
   if (std::rename(temporary_.c_str(), target_.c_str()) != 0) {
     Refuse(path_, std::strerror(errno));
   }
+  ForgetTemporary(temporary_);
   temporary_.clear();
 }
 

@@ -23,6 +23,8 @@ class AtomicFile {
   void Commit();
 
  private:
+  int MakeTemporary();
+  void RemoveTemporary();
   void Write(int descriptor, std::string_view contents) const;
 
   std::string path_;       ///< as the user wrote it, for messages

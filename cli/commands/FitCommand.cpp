@@ -97,6 +97,7 @@ struct Options {
   std::optional<int> digits;
   std::string json;
   std::string svg;
+  bool isQuiet = false;
 
   FitChoice Choice() const {
     FitChoice choice = {points.tolerance, strategy, closed, {}};
@@ -171,7 +172,7 @@ void WriteResults(Options const& options, Report const& report, Console const& c
 
 Report FitWithProgress(Options const& options, Console const& console) {
   PointFile file = ReadPointsInput(options.points, console);
-  ProgressBar progress(stderr);
+  ProgressBar progress(stderr, file.points.size(), options.isQuiet);
   return FitContour(std::move(file), options.Choice(), &progress);
 }
 
@@ -214,6 +215,7 @@ void AddOptions(CLI::App& app, Options* options) {
                  "Digits after the point of lengths in the table; files always hold every digit");
   app.add_option("--json", options->json, "The same as -o, always as JSON")->type_name("FILE");
   app.add_option("--svg", options->svg, "The same as -o, always as SVG")->type_name("FILE");
+  app.add_flag("-q,--quiet", options->isQuiet, "Draw no progress bar on the terminal");
   app.footer(std::string(kPointsFileText) + kFooter);
 }
 

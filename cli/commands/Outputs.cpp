@@ -5,6 +5,7 @@
 #include <ostream>
 
 #include "cli/AtomicFile.h"
+#include "cli/Interruption.h"
 
 namespace Vorn::Cli {
 
@@ -25,6 +26,12 @@ bool AreSameFile(std::string const& a, std::string const& b) {
   std::string const what = b.path == "-" ? "the standard output" : "the same file: " + b.path;
   std::string const who = a.option == b.option ? "two " + a.option : a.option + " and " + b.option;
   throw Failure(ExitCode::Usage, who + " name " + what);
+}
+
+/// All of them or, when interrupted, none.
+void Commit(std::vector<std::unique_ptr<AtomicFile>> const& files) {
+  auto const lock = HoldOffInterruption();
+  for (auto const& file : files) file->Commit();
 }
 
 }  // namespace
@@ -56,7 +63,7 @@ void Outputs::Write(Console const& console) const {
   for (auto const& [path, text] : texts_) {
     if (path != "-") files.push_back(std::make_unique<AtomicFile>(path, text));
   }
-  for (auto const& file : files) file->Commit();
+  Commit(files);
   for (auto const& [path, text] : texts_) {
     if (path == "-") console.out << text;
   }

@@ -61,25 +61,29 @@ std::string OnTerminal(Action const& action) {
   return text;
 }
 
-TEST(ProgressBar, DrawsEachValueOnceAndWipesItselfOff) {
+TEST(ProgressBar, DrawsGrowingValuesOnceAndWipesItselfOff) {
   std::string const text = OnTerminal([] {
-    ProgressBar bar(stderr);
-    for (std::int32_t const percent : {50, 50, 50, 100, 200}) bar.SetProgress(percent);
+    ProgressBar bar(stderr, 1000);
+    for (std::int32_t const percent : {50, 50, 20, 50, 100, 200}) bar.SetProgress(percent);
   });
-  std::string const half = std::string(20, '#') + std::string(20, '.');
-  EXPECT_EQ(text,
-            "\rfitting [" + half + "]  50 %\rfitting [" + std::string(40, '#') + "] 100 %\r\x1b[K");
+  std::string const half = std::string(15, '#') + std::string(15, '.');
+  EXPECT_EQ(text, "\rfitting [" + half + "]  50 % \x1b[K\rfitting [" + std::string(30, '#') +
+                      "] 100 % \x1b[K\r\x1b[K");
+}
+
+TEST(ProgressBar, SilentWhereAsked) {
+  EXPECT_EQ(OnTerminal([] { ProgressBar(stderr, 1000, true).SetProgress(50); }), "");
 }
 
 TEST(ProgressBar, UnusedBarWritesNothing) {
-  EXPECT_EQ(OnTerminal([] { ProgressBar const bar(stderr); }), "");
+  EXPECT_EQ(OnTerminal([] { ProgressBar const bar(stderr, 1000); }), "");
 }
 
 TEST(ProgressBar, SilentWithoutATerminal) {
   std::FILE* const file = std::tmpfile();
   ASSERT_NE(file, nullptr);
   {
-    ProgressBar bar(file);
+    ProgressBar bar(file, 1000);
     bar.SetProgress(50);
   }
   EXPECT_EQ(std::ftell(file), 0);
