@@ -1,10 +1,12 @@
 #include "cli/commands/FitCommand.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <cstdio>
 #include <limits>
 #include <memory>
 #include <ostream>
+#include <sstream>
 #include <utility>
 
 #include "cli/ContourFit.h"
@@ -15,6 +17,7 @@
 #include "cli/Table.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
+#include "cli/commands/FitMany.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/drawing/Drawing.h"
@@ -57,6 +60,12 @@ Outputs: the ending of a file tells its format: .json (the contour with deviatio
 that they read back as the same doubles, but for G-code, which is rounded. With -o - the table
 is not printed.
 
+Many files: each is fitted by itself, several at once, and has a line with its points, pieces,
+largest deviation, time and result. Those that fail do not stop the others; their whole messages go
+to standard error. Lines come in the order of the files, and the same files give the same bytes
+whatever --jobs is (--no-time leaves out what differs from run to run). The exit code is the worst
+of all files, in the order 70, 3, 2, 4, 5, 1, 0.
+
 Exit codes:
   0   every point is within its tolerance
   1   the contour leaves the tolerance of a point (table and files are written)
@@ -76,6 +85,7 @@ Examples:
   contour fit - -t 0.02 -o - --format dxf < part.csv > part.dxf
   contour fit part.csv --tolerance-per-point 0.05 --strategy cells -o part.json
   contour fit outline.csv -t 0.01 --closed yes --start 120
+  contour fit scans/*.csv -t 0.02 --out-dir fitted --format json,dxf -j 8
 )";
 
 constexpr int kMostDigits = 15;
@@ -87,17 +97,24 @@ struct Target {
 };
 
 struct Options {
+  std::vector<std::string> paths;
   PointsInput points;
   Strategy strategy = Strategy::Mixed;
   ClosedChoice closed = ClosedChoice::Auto;
   std::optional<int> start;
   std::vector<std::string> outputs;
-  std::optional<Format> format;
+  std::vector<Format> formats;
+  std::string outFolder;
+  std::optional<int> jobs;
+  bool hideTime = false;
   WriteOptions write;
   std::optional<int> digits;
   std::string json;
   std::string svg;
   bool isQuiet = false;
+
+  /// Whether files are fitted side by side, a line for each.
+  bool AreMany() const { return paths.size() > 1 || !outFolder.empty(); }
 
   FitChoice Choice() const {
     FitChoice choice = {points.tolerance, strategy, closed, {}};
@@ -115,7 +132,11 @@ struct Options {
     return targets;
   }
 
-  Format FormatFor(std::string const& path) const { return OutputFormat(path, format, "--format"); }
+  Format FormatFor(std::string const& path) const {
+    std::optional<Format> otherwise;
+    if (!formats.empty()) otherwise = formats.front();
+    return OutputFormat(path, otherwise, "--format");
+  }
 
   std::vector<NamedFile> Written() const {
     std::vector<NamedFile> files;
@@ -176,6 +197,33 @@ Report FitWithProgress(Options const& options, Console const& console) {
   return FitContour(std::move(file), options.Choice(), &progress);
 }
 
+/// Reads from the file alone: a standard input is not among many.
+Report FitOneOfMany(Options const& options, std::string const& path, Console const& console) {
+  PointsInput input = options.points;
+  input.path = path;
+  return FitContour(ReadPointsInput(input, console), options.Choice(), nullptr);
+}
+
+FitMany ManyOf(Options const& options) {
+  FitMany many;
+  many.paths = options.paths;
+  many.outFolder = options.outFolder;
+  many.formats = options.formats.empty() ? std::vector{Format::Json} : options.formats;
+  many.jobs = options.jobs;
+  many.showTime = !options.hideTime;
+  many.render = [&options](Report const& report, Format format) {
+    return TextOf(report, format, options.write);
+  };
+  many.complaint = Complaint;
+  return many;
+}
+
+ExitCode RunMany(Options const& options, Console const& console) {
+  FitMany many = ManyOf(options);
+  many.fit = [&](std::string const& path) { return FitOneOfMany(options, path, console); };
+  return RunFitMany(many, console);
+}
+
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
   Report const report = FitWithProgress(options, console);
@@ -186,8 +234,69 @@ ExitCode Run(Options const& options, Console const& console) {
   return ExitCodeOf(report.verdict);
 }
 
+/// The formats of a list as --format takes it; nothing when a word is none or comes twice.
+std::optional<std::vector<Format>> ParseFormats(std::string const& text) {
+  std::vector<Format> formats;
+  std::istringstream words(text + ",");
+  for (std::string word; std::getline(words, word, ',');) {
+    std::optional<Format> const format = FormatNamed(word);
+    if (!format || std::find(formats.begin(), formats.end(), *format) != formats.end()) return {};
+    formats.push_back(*format);
+  }
+  return formats;
+}
+
+void AddFormats(CLI::App& app, Options* options) {
+  app.add_option_function<std::string>(
+         "--format",
+         [options](std::string const& text) { options->formats = ParseFormats(text).value(); },
+         "The format of outputs whose name does not tell, such as -: json, csv, dxf, gcode, wkt, "
+         "svg, png, html; with --out-dir the formats to write, separated by commas; json if not "
+         "said")
+      ->check(CLI::Validator(
+          [](std::string& text) -> std::string {
+            return ParseFormats(text) ? ""
+                                      : Quoted(text) +
+                                            " names none of json, csv, dxf, gcode, wkt, svg, png, "
+                                            "html, or one of them twice";
+          },
+          ""))
+      ->type_name("NAME[,NAME]...");
+}
+
+void AddManyOptions(CLI::App& app, Options* options) {
+  constexpr int kMostJobs = 1024;
+  app.add_option("--out-dir", options->outFolder,
+                 "Fit one or many files and write the contours into this folder, named after the "
+                 "inputs; it is made if need be")
+      ->type_name("FOLDER");
+  AddWholeNumber(app, "-j,--jobs", &options->jobs, 1, kMostJobs, "N",
+                 "Fit so many files at once; as many as there are processors if not said");
+  app.add_flag("--no-time", options->hideTime, "Leave the times out of the lines of many files");
+}
+
+void RefuseWrongUse(Options const& options) {
+  auto const refuse = [](std::string const& message) { throw Failure(ExitCode::Usage, message); };
+  if (options.AreMany()) {
+    if (!options.outputs.empty() || !options.json.empty() || !options.svg.empty()) {
+      refuse("many files are written with --out-dir and --format, not with -o, --json or --svg");
+    }
+    if (options.digits) refuse("--digits is for the table of a single file");
+    RefuseCollisions(ManyOf(options));
+    return;
+  }
+  if (options.jobs) refuse("--jobs is for many files");
+  if (options.hideTime) refuse("--no-time is for many files");
+  if (options.formats.size() > 1) refuse("--format names one format, unless --out-dir is given");
+  RefuseSharedFiles({{"POINTS", options.points.path}}, options.Written());
+}
+
 void AddOptions(CLI::App& app, Options* options) {
-  AddPointsInput(app, &options->points);
+  app.add_option("POINTS", options->paths,
+                 "CSV files with the measured points, each a contour; - is the standard input")
+      ->required()
+      ->type_name("FILE");
+  AddPointsOptions(app, &options->points);
   AddChoice<Strategy>(
       app, "--strategy", &options->strategy,
       {{"mixed", Strategy::Mixed}, {"cells", Strategy::MixedCells}, {"arc", Strategy::SingleArc}},
@@ -206,10 +315,8 @@ void AddOptions(CLI::App& app, Options* options) {
       ->expected(1)
       ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
       ->type_name("FILE");
-  AddWord(
-      app, "--format", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png", "html"},
-      [options](std::string const& word) { options->format = FormatNamed(word); },
-      "The format of outputs whose name does not tell, such as -");
+  AddFormats(app, options);
+  AddManyOptions(app, options);
   AddWriteOptions(app, &options->write);
   AddWholeNumber(app, "--digits", &options->digits, 0, kMostDigits, "N",
                  "Digits after the point of lengths in the table; files always hold every digit");
@@ -226,8 +333,11 @@ void AddFitCommand(CLI::App& program, Action* action) {
   auto const options = std::make_shared<Options>();
   AddOptions(*app, options.get());
   app->callback([options, action] {
-    RefuseSharedFiles({{"POINTS", options->points.path}}, options->Written());
-    *action = [options](Console const& console) { return Run(*options, console); };
+    options->points.path = options->paths.front();
+    RefuseWrongUse(*options);
+    *action = [options](Console const& console) {
+      return options->AreMany() ? RunMany(*options, console) : Run(*options, console);
+    };
   });
 }
 

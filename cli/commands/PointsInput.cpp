@@ -44,6 +44,10 @@ void AddPointsInput(CLI::App& app, PointsInput* input) {
                  "CSV file with the measured points; - is the standard input")
       ->required()
       ->type_name("FILE");
+  AddPointsOptions(app, input);
+}
+
+void AddPointsOptions(CLI::App& app, PointsInput* input) {
   ToleranceChoice& choice = input->tolerance;
   CLI::Option* const same =
       AddPositiveNumber(app, "-t,--tolerance", &choice.same, "T",

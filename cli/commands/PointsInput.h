@@ -28,6 +28,9 @@ CLI::Option* AddColumns(CLI::App& app, ColumnChoice* columns);
 /// Adds the positional POINTS and the options for tolerances, columns and units.
 void AddPointsInput(CLI::App& app, PointsInput* input);
 
+/// Adds the options alone, for a command that may read many files.
+void AddPointsOptions(CLI::App& app, PointsInput* input);
+
 /// Adds --closed, for commands to which the neighbourhood of the last and the first point matters.
 void AddClosedChoice(CLI::App& app, ClosedChoice* choice);
 

@@ -68,7 +68,7 @@ TEST(FitCommand, ContradictionsAndUnknownsAreUsageErrors) {
   EXPECT_NE(UsageError({}), "");
   EXPECT_NE(UsageError({"fit"}), "");
   EXPECT_NE(UsageError({"bend", "p.csv"}), "");
-  EXPECT_NE(UsageError({"fit", "p.csv", "q.csv"}), "");
+  EXPECT_NE(UsageError({"fit", "p.csv", "q.csv", "-o", "r.json"}), "");
   EXPECT_NE(UsageError({"fit", "p.csv", "--colour", "red"}), "");
   EXPECT_NE(UsageError({"fit", "p.csv", "--tolerance"}), "");
   EXPECT_NE(UsageError({"fit", "p.csv", "--strategy", "spline"}), "");

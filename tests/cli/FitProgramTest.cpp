@@ -166,6 +166,9 @@ TEST_F(FitProgram, ClosedContourIsClosedInTheFilesAsWell) {
 
 TEST_F(FitProgram, ExamplesOfTheHelpWork) {
   Write("part.csv", Contents(std::string(CONTOUR_EXAMPLES) + "/machined_profile.csv"));
+  fs::create_directory(folder_ / "scans");
+  Write("scans/one.csv", Corner());
+  Write("scans/two.csv", Corner());
   std::string outline;
   for (int i = 0; i < 200; ++i) {
     double const angle = i * std::numbers::pi / 100.0;
@@ -184,7 +187,8 @@ TEST_F(FitProgram, ExamplesOfTheHelpWork) {
     EXPECT_EQ(std::system(command.c_str()), 0) << line << '\n' << Contents(folder_ / ".log");
     ++count;
   }
-  EXPECT_EQ(count, 6);
+  EXPECT_EQ(count, 7);
+  EXPECT_TRUE(fs::exists(folder_ / "fitted" / "two.dxf"));
 }
 
 struct Measured {

@@ -1,0 +1,272 @@
+#include "cli/commands/FitMany.h"
+
+#include <tbb/global_control.h>
+#include <tbb/info.h>
+#include <tbb/parallel_pipeline.h>
+#include <tbb/task_arena.h>
+
+#include <algorithm>
+#include <array>
+#include <chrono>
+#include <filesystem>
+#include <map>
+#include <memory>
+#include <ostream>
+#include <utility>
+
+#include "cli/Numbers.h"
+#include "cli/commands/Outputs.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+constexpr char const* kStandardStream = "-";
+constexpr int kDeviationDecimals = 6;
+constexpr int kTimeDecimals = 3;
+
+/// How one file ended.
+struct Outcome {
+  std::string path;
+  ExitCode code = ExitCode::Ok;
+  std::string verdict;
+  std::string message;  ///< for standard error; empty when all is well
+  bool isFitted = false;
+  std::size_t points = 0;
+  std::size_t pieces = 0;
+  double deviation = 0.0;  ///< relative
+  double seconds = 0.0;
+  std::vector<std::pair<std::string, std::string>> texts;  ///< files to write, and their contents
+};
+
+/// Grows from what a file says about itself to what is wrong around it.
+int Severity(ExitCode code) {
+  constexpr std::array kMildestFirst = {ExitCode::Ok,      ExitCode::OutsideTolerance,
+                                        ExitCode::NoFit,   ExitCode::PointsTooClose,
+                                        ExitCode::Usage,   ExitCode::File,
+                                        ExitCode::Internal};
+  return static_cast<int>(std::find(kMildestFirst.begin(), kMildestFirst.end(), code) -
+                          kMildestFirst.begin());
+}
+
+/// The first line of the message, without the name of the file that the line begins with anyway.
+std::string ShortMessage(std::string const& path, std::string const& message) {
+  std::string text = message.substr(0, message.find('\n'));
+  for (std::string const& prefix : {path + ": ", path + ":"}) {
+    if (text.starts_with(prefix)) return text.substr(prefix.size());
+  }
+  return text;
+}
+
+Outcome Failed(std::string const& path, ExitCode code, std::string const& message) {
+  Outcome outcome;
+  outcome.path = path;
+  outcome.code = code;
+  outcome.message = message;
+  outcome.verdict = "failed: " + ShortMessage(path, message);
+  return outcome;
+}
+
+Outcome FitFile(FitMany const& many, std::string const& path) {
+  auto const begin = std::chrono::steady_clock::now();
+  Report const report = many.fit(path);
+  Outcome outcome;
+  outcome.path = path;
+  outcome.code = ExitCodeOf(report.verdict);
+  outcome.verdict = Describe(report.verdict);
+  if (report.verdict != Verdict::WithinTolerance) outcome.message = many.complaint(report);
+  outcome.isFitted = true;
+  outcome.points = report.file.points.size();
+  outcome.pieces = report.pieces.size();
+  outcome.deviation = report.remeasured.Worst().relative;
+  if (!many.outFolder.empty()) {
+    for (Format const format : many.formats) {
+      outcome.texts.emplace_back(OutputOf(many, path, format), many.render(report, format));
+    }
+  }
+  outcome.seconds = std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count();
+  return outcome;
+}
+
+/// Calls it; what it throws becomes the outcome of the file.
+template <typename Step>
+Outcome Guarded(std::string const& path, Step const& step) {
+  try {
+    return step();
+  } catch (Failure const& failure) {
+    return Failed(path, failure.Code(), failure.what());
+  } catch (std::exception const& error) {
+    return Failed(path, ExitCode::Internal, path + ": internal error: " + error.what());
+  }
+}
+
+Outcome Written(Outcome outcome, Console const& console) {
+  Outputs outputs;
+  for (auto& [path, text] : outcome.texts) outputs.Add(path, std::move(text));
+  outputs.Write(console);
+  return outcome;
+}
+
+/// Prints the lines as the outcomes come in, and adds them up.
+class Listing {
+ public:
+  Listing(FitMany const& many, Console const& console) : many_(many), console_(console) {
+    for (std::string const& path : many.paths) width_ = std::max(width_, path.size());
+    width_ = std::max(width_, std::string(kName).size());
+    Print(kName, {"points", "pieces", "deviation", "seconds"}, "result");
+  }
+
+  void Add(Outcome const& outcome) {
+    if (outcome.isFitted) {
+      Print(outcome.path,
+            {std::to_string(outcome.points), std::to_string(outcome.pieces),
+             FormatFixed(outcome.deviation, kDeviationDecimals),
+             FormatFixed(outcome.seconds, kTimeDecimals)},
+            outcome.verdict);
+      points_ += outcome.points;
+      pieces_ += outcome.pieces;
+      if (largest_.empty() || outcome.deviation > deviation_) {
+        deviation_ = outcome.deviation;
+        largest_ = outcome.path;
+      }
+    } else {
+      Print(outcome.path, {"-", "-", "-", "-"}, outcome.verdict);
+    }
+    if (!outcome.message.empty()) console_.err << "contour: " << outcome.message << '\n';
+    ++counts_[outcome.isFitted ? outcome.verdict : "failed"];
+    if (Severity(outcome.code) > Severity(worst_)) worst_ = outcome.code;
+  }
+
+  ExitCode Finish() {
+    std::string text = "\n" + Counted(many_.paths.size(), "file");
+    std::string separator = ": ";
+    for (auto const& [verdict, count] : counts_) {
+      text += separator + std::to_string(count) + " " + verdict;
+      separator = ", ";
+    }
+    text += "; " + Counted(points_, "point") + ", " + Counted(pieces_, "piece");
+    if (!largest_.empty()) {
+      text += "; largest deviation " + FormatFixed(deviation_, kDeviationDecimals) +
+              " of the tolerance in " + largest_;
+    }
+    if (many_.showTime) {
+      std::chrono::duration<double> const taken = std::chrono::steady_clock::now() - begin_;
+      text += "; " + FormatFixed(taken.count(), kTimeDecimals) + " s";
+    }
+    console_.out << text << '\n';
+    return worst_;
+  }
+
+ private:
+  static constexpr char const* kName = "file";
+
+  void Print(std::string const& name, std::array<std::string, 4> const& numbers,
+             std::string const& result) const {
+    std::string line = name + std::string(width_ - name.size(), ' ');
+    for (std::size_t i = 0; i < numbers.size(); ++i) {
+      bool const isTime = i + 1 == numbers.size();
+      if (isTime && !many_.showTime) continue;
+      constexpr std::size_t kWidth = 9;
+      line += "  " + std::string(kWidth - std::min(kWidth, numbers[i].size()), ' ') + numbers[i];
+    }
+    console_.out << line << "  " << result << std::endl;  // at once, for who is waiting
+  }
+
+  FitMany const& many_;
+  Console const& console_;
+  std::size_t width_ = 0;
+  std::size_t points_ = 0;
+  std::size_t pieces_ = 0;
+  double deviation_ = 0.0;
+  std::string largest_;
+  std::map<std::string, std::size_t> counts_;
+  ExitCode worst_ = ExitCode::Ok;
+  std::chrono::steady_clock::time_point begin_ = std::chrono::steady_clock::now();
+};
+
+void MakeFolder(std::string const& folder) {
+  std::error_code error;
+  fs::create_directories(folder, error);
+  if (error || !fs::is_directory(folder)) {
+    throw Failure(ExitCode::File, folder + ": the folder cannot be made: " +
+                                      (error ? error.message() : "a file has this name"));
+  }
+}
+
+/// Paths in one form, so that two that lead to one file are the same.
+std::string WholePath(std::string const& path) {
+  std::error_code error;
+  return fs::weakly_canonical(fs::absolute(path, error), error).string();
+}
+
+}  // namespace
+
+std::string OutputOf(FitMany const& many, std::string const& path, Format format) {
+  std::string const name = fs::path(path).stem().string() + "." + NameOf(format);
+  return (fs::path(many.outFolder) / name).string();
+}
+
+void RefuseCollisions(FitMany const& many) {
+  std::map<std::string, std::string> inputs;
+  for (std::string const& path : many.paths) {
+    if (path == kStandardStream) {
+      throw Failure(ExitCode::Usage, "the standard input cannot be one of many files");
+    }
+    inputs.emplace(WholePath(path), path);
+  }
+  if (many.outFolder.empty()) return;
+  std::map<std::string, std::string> outputs;
+  for (std::string const& path : many.paths) {
+    for (Format const format : many.formats) {
+      std::string const output = OutputOf(many, path, format);
+      std::string const whole = WholePath(output);
+      if (auto const input = inputs.find(whole); input != inputs.end()) {
+        throw Failure(ExitCode::Usage,
+                      "the fit of " + path + " would be written over the input " + input->second);
+      }
+      auto const [other, isNew] = outputs.emplace(whole, path);
+      if (!isNew) {
+        throw Failure(ExitCode::Usage, "the fits of " + other->second + " and " + path +
+                                           " would both be written to " + output);
+      }
+    }
+  }
+}
+
+ExitCode RunFitMany(FitMany const& many, Console const& console) {
+  if (!many.outFolder.empty()) MakeFolder(many.outFolder);
+  int const jobs = many.jobs.value_or(tbb::info::default_concurrency());
+  // With more jobs than processors the arena alone would not get its threads.
+  tbb::global_control const threads(tbb::global_control::max_allowed_parallelism,
+                                    static_cast<std::size_t>(jobs));
+  tbb::task_arena arena(jobs);
+  Listing listing(many, console);
+  std::size_t next = 0;
+  auto const take = [&](tbb::flow_control& control) {
+    if (next == many.paths.size()) control.stop();
+    return next++;
+  };
+  auto const fit = [&](std::size_t i) {
+    std::string const& path = many.paths[i];
+    return std::make_shared<Outcome>(Guarded(path, [&] { return FitFile(many, path); }));
+  };
+  auto const finish = [&](std::shared_ptr<Outcome> const& outcome) {
+    std::string const path = outcome->path;
+    listing.Add(Guarded(path, [&] { return Written(std::move(*outcome), console); }));
+  };
+  // Some more files on the way than threads, for a slow one not to hold up the others.
+  std::size_t const onTheWay = 4 * static_cast<std::size_t>(jobs);
+  arena.execute([&] {
+    tbb::parallel_pipeline(
+        onTheWay, tbb::make_filter<void, std::size_t>(tbb::filter_mode::serial_in_order, take) &
+                      tbb::make_filter<std::size_t, std::shared_ptr<Outcome>>(
+                          tbb::filter_mode::parallel, fit) &
+                      tbb::make_filter<std::shared_ptr<Outcome>, void>(
+                          tbb::filter_mode::serial_in_order, finish));
+  });
+  return listing.Finish();
+}
+
+}  // namespace Vorn::Cli

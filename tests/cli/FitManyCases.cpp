@@ -1,0 +1,151 @@
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <map>
+#include <nlohmann/json.hpp>
+#include <string>
+
+#include "cli/ProgramFixture.h"
+
+/// `contour fit` with many files.
+namespace Vorn::Cli::Testing {
+namespace {
+
+/// A wave of lines and arcs; the more points, the longer its fit takes.
+std::string Wave(int points, double height) {
+  std::string text = "x,y\n";
+  for (int i = 0; i < points; ++i) {
+    text += std::to_string(0.1 * i) + "," + std::to_string(height * std::sin(0.01 * i)) + "\n";
+  }
+  return text;
+}
+
+class ManyFiles : public Program {
+ protected:
+  /// Long ones first, so that later ones are ready earlier when several run at once.
+  void WriteInputs() const {
+    fs::create_directory(folder_ / "in");
+    for (int i = 0; i < 12; ++i) Write(NameOf(i), Wave(4000 - 300 * i, 1.0 + i));
+    Write("in/x_bad.csv", "x,y\n1,2\n3,four\n");
+    Write("in/y_close.csv", "0,0\n1,0\n1.001,0\n");
+  }
+
+  static std::string NameOf(int i) {
+    return "in/w" + std::string(i < 10 ? "0" : "") + std::to_string(i) + ".csv";
+  }
+
+  std::map<std::string, std::string> ContentsOf(std::string const& folder) const {
+    std::map<std::string, std::string> contents;
+    for (auto const& entry : fs::directory_iterator(folder_ / folder)) {
+      contents[entry.path().filename().string()] = Contents(entry.path());
+    }
+    return contents;
+  }
+};
+
+TEST_F(ManyFiles, GiveTheSameBytesForAnyNumberOfJobs) {
+  WriteInputs();
+  std::map<std::string, std::string> expected;
+  Ended first;
+  for (char const* jobs : {"1", "2", "8"}) {
+    std::string const folder = std::string("out") + jobs;
+    Ended const ended = Run("fit in/*.csv -t 0.01 --format json,dxf,svg --no-time -j " +
+                            std::string(jobs) + " --out-dir " + folder);
+    EXPECT_EQ(ended.code, 3) << ended.err;
+    auto const contents = ContentsOf(folder);
+    EXPECT_EQ(contents.size(), 36u) << "twelve of fourteen, in three formats";
+    if (std::string(jobs) == "1") {
+      expected = contents;
+      first = ended;
+      continue;
+    }
+    EXPECT_EQ(ended.out, first.out) << jobs << " jobs";
+    EXPECT_EQ(ended.err, first.err) << jobs << " jobs";
+    EXPECT_EQ(contents, expected) << jobs << " jobs";
+  }
+}
+
+TEST_F(ManyFiles, HaveALineEachInTheOrderOfTheInputs) {
+  WriteInputs();
+  Ended const ended = Run("fit in/*.csv -t 0.01 --no-time -j 4");
+  std::size_t at = ended.out.find("file        ");
+  ASSERT_EQ(at, 0u) << ended.out;
+  for (int i = 0; i < 12; ++i) {
+    std::size_t const next = ended.out.find("\n" + NameOf(i) + " ");
+    ASSERT_NE(next, std::string::npos) << ended.out;
+    EXPECT_GE(next, at) << "line " << i;
+    at = next;
+  }
+  EXPECT_NE(ended.out.find("failed: 3:3: y is not a number: 'four'\n"), std::string::npos)
+      << ended.out;
+  EXPECT_NE(ended.out.find("\n14 files: 2 failed, 12 within tolerance; "), std::string::npos)
+      << ended.out;
+  EXPECT_NE(ended.err.find("contour: in/x_bad.csv:3:3: y is not a number: 'four'\n"),
+            std::string::npos)
+      << ended.err;
+  EXPECT_NE(ended.err.find("ways out: "), std::string::npos) << "the whole message: " << ended.err;
+  EXPECT_EQ(ended.out.find("seconds"), std::string::npos);
+  EXPECT_EQ(Files(), std::vector<std::string>{"in"}) << "without --out-dir nothing is written";
+}
+
+TEST_F(ManyFiles, AreWrittenAsTheyWouldBeAlone) {
+  Write("a.csv", Corner());
+  ASSERT_EQ(Run("fit a.csv -t 0.01 --out-dir deep/out --format dxf,json").code, 0);
+  ASSERT_EQ(Run("fit a.csv -t 0.01 -o a.dxf -o a.json").code, 0);
+  EXPECT_EQ(Contents(folder_ / "deep/out/a.dxf"), Contents(folder_ / "a.dxf"));
+  EXPECT_EQ(Contents(folder_ / "deep/out/a.json"), Contents(folder_ / "a.json"));
+  EXPECT_NE(Contents(folder_ / "a.dxf"), "");
+  ASSERT_EQ(Run("fit a.csv -t 0.01 --out-dir plain").code, 0);
+  EXPECT_EQ(ContentsOf("plain").count("a.json"), 1u) << "JSON if nothing is said";
+}
+
+TEST_F(ManyFiles, EndWithTheWorstCode) {
+  Write("good.csv", Corner());
+  Write("close.csv", "0,0\n1,0\n1.001,0\n");
+  Write("bad.csv", "x\n");
+  Write("bare.csv", "0,0\n3,0\n6,1\n");
+  EXPECT_EQ(Run("fit good.csv bare.csv -t 0.01").code, 0);
+  EXPECT_EQ(Run("fit good.csv bare.csv -t 0.3 --strategy arc").code, 1);
+  EXPECT_EQ(Run("fit good.csv close.csv -t 0.01").code, 4);
+  EXPECT_EQ(Run("fit close.csv good.csv -t 0.01").code, 4);
+  EXPECT_EQ(Run("fit close.csv good.csv --tolerance-column w").code, 3);
+  EXPECT_EQ(Run("fit close.csv bare.csv").code, 2) << "no tolerance";
+  EXPECT_EQ(Run("fit close.csv bad.csv good.csv -t 0.01").code, 3);
+  EXPECT_EQ(Run("fit none.csv good.csv -t 0.01").code, 3);
+}
+
+TEST_F(ManyFiles, AFileThatCannotBeWrittenFailsAlone) {
+  Write("a.csv", Corner());
+  Write("b.csv", Corner());
+  fs::create_directories(folder_ / "out" / "a.json");
+  Ended const ended = Run("fit a.csv b.csv -t 0.01 --out-dir out");
+  EXPECT_EQ(ended.code, 3);
+  EXPECT_NE(ended.err.find("a.json: cannot be written: "), std::string::npos) << ended.err;
+  EXPECT_NE(Contents(folder_ / "out" / "b.json"), "");
+}
+
+TEST_F(ManyFiles, RefuseWhatWouldCollide) {
+  fs::create_directory(folder_ / "more");
+  Write("a.csv", Corner());
+  Write("more/a.csv", Corner());
+  ExpectRefusal("fit a.csv more/a.csv -t 0.01 --out-dir out", 2,
+                "the fits of a.csv and more/a.csv would both be written to out/a.json");
+  ExpectRefusal("fit a.csv more/a.csv -t 0.01 --out-dir . --format csv", 2,
+                "the fit of a.csv would be written over the input a.csv");
+  ExpectRefusal("fit a.csv - -t 0.01", 2, "the standard input cannot be one of many files");
+  ExpectRefusal("fit a.csv more/a.csv -t 0.01 -o b.json", 2,
+                "many files are written with --out-dir and --format, not with -o, --json or --svg");
+  ExpectRefusal("fit a.csv -t 0.01 -j 2", 2, "--jobs is for many files");
+  ExpectRefusal("fit a.csv -t 0.01 -o b.json --format json,dxf", 2,
+                "--format names one format, unless --out-dir is given");
+  ExpectRefusal("fit a.csv -t 0.01 --out-dir more/a.csv", 3,
+                "more/a.csv: the folder cannot be made: Not a directory");
+  EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out -j 0").code, 2);
+  EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out --format json,json").code, 2);
+  EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out --format json,best").code, 2);
+  EXPECT_EQ(Contents(folder_ / "a.csv"), Corner());
+  EXPECT_FALSE(fs::exists(folder_ / "out")) << "refused before anything is made";
+}
+
+}  // namespace
+}  // namespace Vorn::Cli::Testing
