@@ -44,6 +44,7 @@ Exit codes:
   3   a file cannot be read or written, or a line of it is wrong
   4   a tolerance by spacing was asked for, but neighbours coincide
   70  internal error
+  130 interrupted
 
 Examples:
   contour check part.csv part.dxf --tolerance 0.02

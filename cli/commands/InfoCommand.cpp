@@ -31,6 +31,7 @@ Points are counted from 0. Exit codes:
   2   wrong usage
   3   the file cannot be read, or one of its lines is wrong
   70  internal error
+  130 interrupted
 
 Examples:
   contour info part.csv

@@ -36,6 +36,7 @@ What was dropped is said on standard error, points counted from 0. Exit codes:
   3   a file cannot be read or written, or a line of the points file is wrong
   4   fewer than two points would be left
   70  internal error
+  130 interrupted
 
 Examples:
   contour simplify part.csv --drop-close --tolerance 0.02 -o spaced.csv

@@ -124,6 +124,18 @@ TEST_F(ManyFiles, AFileThatCannotBeWrittenFailsAlone) {
   EXPECT_NE(Contents(folder_ / "out" / "b.json"), "");
 }
 
+TEST_F(ManyFiles, InterruptedKeepWhatIsDoneAndNothingElse) {
+  Write("a.csv", Corner());
+  Write("b.csv", Wave(400000, 1000.0));
+  Ended const ended = Run("fit a.csv b.csv -t 0.01 --out-dir out --format json,dxf -j 2",
+                          "timeout --preserve-status --signal=INT 1");
+  EXPECT_EQ(ended.code, 130) << ended.out << ended.err;
+  auto const contents = ContentsOf("out");
+  EXPECT_EQ(contents.size(), 2u) << "neither of b.csv nor temporary";
+  EXPECT_EQ(nlohmann::json::parse(contents.at("a.json")).at("elements").size(), 2u);
+  EXPECT_EQ(contents.count("a.dxf"), 1u);
+}
+
 TEST_F(ManyFiles, RefuseWhatWouldCollide) {
   fs::create_directory(folder_ / "more");
   Write("a.csv", Corner());

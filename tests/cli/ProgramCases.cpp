@@ -203,6 +203,18 @@ TEST_F(Program, HelpAndVersionGoToStandardOutput) {
   }
 }
 
+TEST_F(Program, EveryCommandListsItsExitCodesAndAnExample) {
+  for (std::string const command :
+       {"fit", "check", "info", "plot", "area", "intersect", "convert", "simplify"}) {
+    std::string const help = Run(command + " --help").out;
+    for (std::string const wanted :
+         {"Exit codes:\n  0 ", "\n  2 ", "\n  3 ", "\n  70  internal error\n  130 interrupted\n",
+          "Examples:\n  contour "}) {
+      EXPECT_NE(help.find(wanted), std::string::npos) << command << ": " << wanted;
+    }
+  }
+}
+
 TEST_F(Program, ProgressGoesToATerminalOnly) {
   Write("p.csv", Corner());
   EXPECT_EQ(Run("fit p.csv --tolerance 0.01").err, "");
