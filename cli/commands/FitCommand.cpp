@@ -56,7 +56,7 @@ printed as the fit reports them, and as measured again by the program over every
 
 Outputs: the ending of a file tells its format: .json (the contour with deviations and all),
 .csv, .dxf, .nc or .gcode, .wkt (the contour; see 'contour convert --help' for what each keeps),
-.svg, .png, .html (drawings). --format tells it for - and for other endings. Numbers are written so
+.svg, .png, .html (drawings). --to tells it for - and for other endings. Numbers are written so
 that they read back as the same doubles, but for G-code, which is rounded. With -o - the table
 is not printed.
 
@@ -82,10 +82,10 @@ Examples:
   contour fit part.csv -t 0.02
   contour fit part.csv -t 0.02 -o part.dxf -o part.svg -o part.json
   contour fit part.csv -t 0.02 -o part.nc --feed 600
-  contour fit - -t 0.02 -o - --format dxf < part.csv > part.dxf
+  contour fit - -t 0.02 -o - --to dxf < part.csv > part.dxf
   contour fit part.csv --tolerance-per-point 0.05 --strategy cells -o part.json
   contour fit outline.csv -t 0.01 --closed yes --start 120
-  contour fit scans/*.csv -t 0.02 --out-dir fitted --format json,dxf -j 8
+  contour fit scans/*.csv -t 0.02 --out-dir fitted --to json,dxf -j 8
 )";
 
 constexpr int kMostDigits = 15;
@@ -135,7 +135,7 @@ struct Options {
   Format FormatFor(std::string const& path) const {
     std::optional<Format> otherwise;
     if (!formats.empty()) otherwise = formats.front();
-    return OutputFormat(path, otherwise, "--format");
+    return OutputFormat(path, otherwise, "--to");
   }
 
   std::vector<NamedFile> Written() const {
@@ -234,7 +234,7 @@ ExitCode Run(Options const& options, Console const& console) {
   return ExitCodeOf(report.verdict);
 }
 
-/// The formats of a list as --format takes it; nothing when a word is none or comes twice.
+/// The formats of a list as --to takes it; nothing when a word is none or comes twice.
 std::optional<std::vector<Format>> ParseFormats(std::string const& text) {
   std::vector<Format> formats;
   std::istringstream words(text + ",");
@@ -248,7 +248,7 @@ std::optional<std::vector<Format>> ParseFormats(std::string const& text) {
 
 void AddFormats(CLI::App& app, Options* options) {
   app.add_option_function<std::string>(
-         "--format",
+         "--to",
          [options](std::string const& text) { options->formats = ParseFormats(text).value(); },
          "The format of outputs whose name does not tell, such as -: json, csv, dxf, gcode, wkt, "
          "svg, png, html; with --out-dir the formats to write, separated by commas; json if not "
@@ -279,7 +279,7 @@ void RefuseWrongUse(Options const& options) {
   auto const refuse = [](std::string const& message) { throw Failure(ExitCode::Usage, message); };
   if (options.AreMany()) {
     if (!options.outputs.empty() || !options.json.empty() || !options.svg.empty()) {
-      refuse("many files are written with --out-dir and --format, not with -o, --json or --svg");
+      refuse("many files are written with --out-dir and --to, not with -o, --json or --svg");
     }
     if (options.digits) refuse("--digits is for the table of a single file");
     RefuseCollisions(ManyOf(options));
@@ -287,7 +287,7 @@ void RefuseWrongUse(Options const& options) {
   }
   if (options.jobs) refuse("--jobs is for many files");
   if (options.hideTime) refuse("--no-time is for many files");
-  if (options.formats.size() > 1) refuse("--format names one format, unless --out-dir is given");
+  if (options.formats.size() > 1) refuse("--to names one format, unless --out-dir is given");
   RefuseSharedFiles({{"POINTS", options.points.path}}, options.Written());
 }
 

@@ -18,7 +18,7 @@ _contour_words() {
     *:--units) echo mm inch ;;
     plot:--to) echo svg png html ;;
     plot:--magnify) echo auto ;;
-    fit:--format | convert:--to) echo json csv dxf gcode wkt svg png html ;;
+    fit:--to | convert:--to) echo json csv dxf gcode wkt svg png html ;;
     *:--from) echo json csv dxf gcode wkt ;;
     *) return 1 ;;
   esac
@@ -83,7 +83,7 @@ _contour() {
   [[ $COMP_CWORD -eq 1 ]] || command=${COMP_WORDS[1]}
   if [[ -z $command && $word != -* ]]; then
     COMPREPLY=($(compgen -W "$(_contour_commands)" -- "$word"))
-  elif [[ $before == --format ]]; then
+  elif [[ $before == --to ]]; then
     _contour_formats "$command" "$before" "$word"
   elif _contour_words "$command" "$before" >/dev/null; then
     COMPREPLY=($(compgen -W "$(_contour_words "$command" "$before")" -- "$word"))

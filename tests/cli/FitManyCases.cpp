@@ -49,7 +49,7 @@ TEST_F(ManyFiles, GiveTheSameBytesForAnyNumberOfJobs) {
   Ended first;
   for (char const* jobs : {"1", "2", "8"}) {
     std::string const folder = std::string("out") + jobs;
-    Ended const ended = Run("fit in/*.csv -t 0.01 --format json,dxf,svg --no-time -j " +
+    Ended const ended = Run("fit in/*.csv -t 0.01 --to json,dxf,svg --no-time -j " +
                             std::string(jobs) + " --out-dir " + folder);
     EXPECT_EQ(ended.code, 3) << ended.err;
     auto const contents = ContentsOf(folder);
@@ -90,7 +90,7 @@ TEST_F(ManyFiles, HaveALineEachInTheOrderOfTheInputs) {
 
 TEST_F(ManyFiles, AreWrittenAsTheyWouldBeAlone) {
   Write("a.csv", Corner());
-  ASSERT_EQ(Run("fit a.csv -t 0.01 --out-dir deep/out --format dxf,json").code, 0);
+  ASSERT_EQ(Run("fit a.csv -t 0.01 --out-dir deep/out --to dxf,json").code, 0);
   ASSERT_EQ(Run("fit a.csv -t 0.01 -o a.dxf -o a.json").code, 0);
   EXPECT_EQ(Contents(folder_ / "deep/out/a.dxf"), Contents(folder_ / "a.dxf"));
   EXPECT_EQ(Contents(folder_ / "deep/out/a.json"), Contents(folder_ / "a.json"));
@@ -127,7 +127,7 @@ TEST_F(ManyFiles, AFileThatCannotBeWrittenFailsAlone) {
 TEST_F(ManyFiles, InterruptedKeepWhatIsDoneAndNothingElse) {
   Write("a.csv", Corner());
   Write("b.csv", Wave(400000, 1000.0));
-  Ended const ended = Run("fit a.csv b.csv -t 0.01 --out-dir out --format json,dxf -j 2",
+  Ended const ended = Run("fit a.csv b.csv -t 0.01 --out-dir out --to json,dxf -j 2",
                           "timeout --preserve-status --signal=INT 1");
   EXPECT_EQ(ended.code, 130) << ended.out << ended.err;
   auto const contents = ContentsOf("out");
@@ -142,19 +142,19 @@ TEST_F(ManyFiles, RefuseWhatWouldCollide) {
   Write("more/a.csv", Corner());
   ExpectRefusal("fit a.csv more/a.csv -t 0.01 --out-dir out", 2,
                 "the fits of a.csv and more/a.csv would both be written to out/a.json");
-  ExpectRefusal("fit a.csv more/a.csv -t 0.01 --out-dir . --format csv", 2,
+  ExpectRefusal("fit a.csv more/a.csv -t 0.01 --out-dir . --to csv", 2,
                 "the fit of a.csv would be written over the input a.csv");
   ExpectRefusal("fit a.csv - -t 0.01", 2, "the standard input cannot be one of many files");
   ExpectRefusal("fit a.csv more/a.csv -t 0.01 -o b.json", 2,
-                "many files are written with --out-dir and --format, not with -o, --json or --svg");
+                "many files are written with --out-dir and --to, not with -o, --json or --svg");
   ExpectRefusal("fit a.csv -t 0.01 -j 2", 2, "--jobs is for many files");
-  ExpectRefusal("fit a.csv -t 0.01 -o b.json --format json,dxf", 2,
-                "--format names one format, unless --out-dir is given");
+  ExpectRefusal("fit a.csv -t 0.01 -o b.json --to json,dxf", 2,
+                "--to names one format, unless --out-dir is given");
   ExpectRefusal("fit a.csv -t 0.01 --out-dir more/a.csv", 3,
                 "more/a.csv: the folder cannot be made: Not a directory");
   EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out -j 0").code, 2);
-  EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out --format json,json").code, 2);
-  EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out --format json,best").code, 2);
+  EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out --to json,json").code, 2);
+  EXPECT_EQ(Run("fit a.csv -t 0.01 --out-dir out --to json,best").code, 2);
   EXPECT_EQ(Contents(folder_ / "a.csv"), Corner());
   EXPECT_FALSE(fs::exists(folder_ / "out")) << "refused before anything is made";
 }

@@ -109,7 +109,7 @@ TEST_F(FitProgram, WritesEveryFormatInOneRun) {
 TEST_F(FitProgram, StandardOutputHoldsTheResultAlone) {
   Write("p.csv", Corner());
   ASSERT_EQ(Run("fit p.csv -t 0.01 -o a.dxf").code, 0);
-  Ended const ended = Run("fit - -t 0.01 -o - --format dxf -o a.wkt", "", "p.csv");
+  Ended const ended = Run("fit - -t 0.01 -o - --to dxf -o a.wkt", "", "p.csv");
   EXPECT_EQ(ended.code, 0) << ended.err;
   EXPECT_EQ(ended.err, "");
   EXPECT_EQ(ended.out, Contents(folder_ / "a.dxf"));
@@ -121,12 +121,12 @@ TEST_F(FitProgram, FormatMustBeToldWhereTheNameDoesNot) {
   for (std::string const arguments : {"fit p.csv -t 0.01 -o -", "fit p.csv -t 0.01 -o out.data"}) {
     Ended const ended = Run(arguments);
     EXPECT_EQ(ended.code, 2) << arguments;
-    EXPECT_NE(ended.err.find("--format must say which format to write"), std::string::npos)
+    EXPECT_NE(ended.err.find("--to must say which format to write"), std::string::npos)
         << ended.err;
   }
-  EXPECT_EQ(Run("fit p.csv -t 0.01 -o out.data --format csv").code, 0);
+  EXPECT_EQ(Run("fit p.csv -t 0.01 -o out.data --to csv").code, 0);
   EXPECT_EQ(Run("fit p.csv -t 0.01 -o p.csv").code, 2) << "the points would be lost";
-  EXPECT_EQ(Run("fit p.csv -t 0.01 -o - -o - --format csv").code, 2);
+  EXPECT_EQ(Run("fit p.csv -t 0.01 -o - -o - --to csv").code, 2);
   EXPECT_EQ(Contents(folder_ / "p.csv"), Corner());
 }
 
