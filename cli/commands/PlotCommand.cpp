@@ -139,7 +139,8 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
   }
   PointFile file = ReadPointsInput(options.points, console);
   if (IsToleranceStated(options.points.tolerance, file)) {
-    AssignTolerances(options.points.tolerance, &file);
+    bool const isClosed = FindClosure(file.points, ClosedChoice::Auto).isClosed;
+    AssignTolerances(options.points.tolerance, &file, isClosed);
   }
   ContourFile contour;
   if (!options.contour.empty()) contour = ReadDrawnContour(options.contour, console);

@@ -196,6 +196,17 @@ TEST(ToHtml, NumbersThatAreNoneBecomeNull) {
   EXPECT_TRUE(nlohmann::json::parse(DataOf(ToHtml(drawing)))["points"]["x"][1].is_null());
 }
 
+TEST_F(PlotCommand, TolerancesBySpacingKnowTheGapOfAClosedContour) {
+  std::string const square = "0,0\n2,0\n4,0\n4,2\n4,4\n2,4\n0,4\n0,2\n0,1\n";
+  RunResult const plot = RunInProcess(
+      {"plot", "-", "-o", "-", "--to", "html", "--tolerance-per-point", "9", "--units", "mm"},
+      square);
+  ASSERT_EQ(plot.code, ExitCode::Ok) << plot.err;
+  nlohmann::json const tolerances = nlohmann::json::parse(DataOf(plot.out))["points"]["w"];
+  EXPECT_EQ(tolerances[0], 0.3 * 1.0) << "a step of 1 from the last point, of 2 to the next";
+  EXPECT_EQ(tolerances[1], 0.3 * 2.0);
+}
+
 TEST_F(PlotCommand, AContourAloneIsDrawnAsConvertDrawsIt) {
   RunResult const plot = RunInProcess({"plot", At("part.wkt"), "-o", At("p.svg")});
   EXPECT_EQ(plot.code, ExitCode::Ok) << plot.err;
