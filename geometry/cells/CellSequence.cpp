@@ -1,9 +1,11 @@
 #include "geometry/cells/CellSequence.h"
 
+#include <algorithm>
 #include <array>
 #include <bit>
 #include <cmath>
 #include <cstring>
+#include <memory>
 #include <utility>
 
 #include "geometry/cells/SequenceSum.h"
@@ -36,7 +38,19 @@ std::uint32_t HashOf(Triangle const& triangle) {
   return static_cast<std::uint32_t>(hash >> 32);
 }
 
-using WordChain = std::vector<CellSequence::Words const*>;
+/// The words from the first level to the last one.
+struct WordChain {
+  void Append(CellSequence::Words const& words, std::size_t letters) {
+    levels.push_back(&words);
+    length += letters;
+    widest = std::max(widest, letters);
+  }
+
+  std::vector<CellSequence::Words const*> levels;
+  /// The number of letters in the expansions of all levels, and of the level that has most.
+  std::size_t length = 0;
+  std::size_t widest = 1;
+};
 using Sums = std::array<double, 3>;
 
 /// What a letter adds to three sums, if anything.
@@ -52,34 +66,37 @@ constexpr std::size_t kShortcutCost = 20;
 /// The sums over the sequence, each taken term by term in order.
 Sums RunThrough(WordChain const& chain, std::vector<Summand> const& summands) {
   // Up to the letters that the last words replace.
-  std::vector<std::uint32_t> letters = {0};
-  std::vector<std::uint32_t> next;
-  for (std::size_t level = 0; level + 1 < chain.size(); ++level) {
-    next.clear();
-    for (std::uint32_t const letter : letters) {
-      std::span<std::uint32_t const> const word = chain[level]->Of(letter);
-      next.insert(next.end(), word.begin(), word.end());
+  auto letters = std::make_unique_for_overwrite<std::uint32_t[]>(chain.widest);
+  auto next = std::make_unique_for_overwrite<std::uint32_t[]>(chain.widest);
+  std::size_t size = 1;
+  letters[0] = 0;
+  for (std::size_t level = 0; level + 1 < chain.levels.size(); ++level) {
+    std::size_t nextSize = 0;
+    for (std::size_t i = 0; i < size; ++i) {
+      for (std::uint32_t const letter : chain.levels[level]->Of(letters[i])) {
+        next[nextSize++] = letter;
+      }
     }
+    size = nextSize;
     letters.swap(next);
   }
   Sums sums{};
-  for (std::uint32_t const letter : letters) {
-    for (std::uint32_t const leaf : chain.back()->Of(letter)) {
+  for (std::size_t i = 0; i < size; ++i) {
+    for (std::uint32_t const leaf : chain.levels.back()->Of(letters[i])) {
       Summand const& summand = summands[leaf];
       if (summand.isSkipped) continue;
-      for (std::size_t i = 0; i < sums.size(); ++i) sums[i] += summand.terms[i];
+      for (std::size_t k = 0; k < sums.size(); ++k) sums[k] += summand.terms[k];
     }
   }
   return sums;
 }
 
-/// `length` is the number of letters in the expansions of all levels.
-Sums SumOver(WordChain const& chain, std::size_t length, std::vector<Summand> const& summands) {
+Sums SumOver(WordChain const& chain, std::vector<Summand> const& summands) {
   std::size_t wordLetters = 0;
-  for (CellSequence::Words const* words : chain) wordLetters += words->letters.size();
-  if (length <= kShortcutCost * wordLetters) return RunThrough(chain, summands);
+  for (CellSequence::Words const* words : chain.levels) wordLetters += words->letters.size();
+  if (chain.length <= kShortcutCost * wordLetters) return RunThrough(chain, summands);
 
-  SequenceSum sequence(chain);
+  SequenceSum sequence(chain.levels);
   std::vector<double> terms(summands.size());
   std::vector<bool> isSkipped(summands.size());
   Sums sums{};
@@ -98,30 +115,28 @@ Sums SumOver(WordChain const& chain, std::size_t length, std::vector<Summand> co
 class CellSequence::LevelBuilder {
  public:
   /// For the overlaps of a level's letters, each of which occurs as often as `counts` says.
-  explicit LevelBuilder(std::vector<std::size_t> const& counts)
-      : counts_(counts), slots_(std::bit_ceil(kSlotsPerLetter * counts.size())) {
-    level_.words.ends.reserve(counts.size());
-    level_.triangles.reserve(2 * counts.size());
+  LevelBuilder(std::vector<std::size_t> const& counts, Level* level)
+      : counts_(counts), level_(*level), slots_(std::bit_ceil(kSlotsPerLetter * counts.size())) {
+    level_.clear();
   }
 
-  void AddToWord(Triangle const& triangle) {
-    std::uint32_t const letter = LetterOf(triangle);
-    level_.words.letters.push_back(letter);
-    std::size_t const occurrences = counts_[level_.words.ends.size()];
-    level_.counts[letter] += occurrences;
-    level_.size += occurrences;
+  /// Adds a letter as it is, some copies of it. No other letter has an equal triangle among its
+  /// parts, or it stays a letter of its own.
+  void Keep(BoxedTriangle const& boxed, std::size_t copies) {
+    level_.magnitude.Include(boxed.triangle);
+    Append(NewLetter(boxed), copies);
   }
+
+  void Add(Triangle const& part) { Append(LetterOf(part), 1); }
 
   void EndWord() {
     level_.words.ends.push_back(static_cast<std::uint32_t>(level_.words.letters.size()));
   }
 
-  Level Take() { return std::move(level_); }
-
  private:
   static constexpr std::uint32_t kFree = UINT32_MAX;
-  /// Most levels have less than twice as many letters as the one before.
-  static constexpr std::size_t kSlotsPerLetter = 4;
+  /// About half the letters of a level are parts of others.
+  static constexpr std::size_t kSlotsPerLetter = 2;
 
   /// A letter and the hash of its triangle.
   struct Slot {
@@ -129,20 +144,33 @@ class CellSequence::LevelBuilder {
     std::uint32_t hash = 0;
   };
 
+  void Append(std::uint32_t letter, std::size_t copies) {
+    level_.words.letters.insert(level_.words.letters.end(), copies, letter);
+    std::size_t const occurrences = copies * counts_[level_.words.ends.size()];
+    level_.counts[letter] += occurrences;
+    level_.size += occurrences;
+  }
+
+  std::uint32_t NewLetter(BoxedTriangle const& boxed) {
+    auto const letter = static_cast<std::uint32_t>(level_.triangles.size());
+    level_.triangles.push_back(boxed);
+    level_.counts.push_back(0);
+    return letter;
+  }
+
   std::uint32_t LetterOf(Triangle const& triangle) {
     // Copies follow each other.
     if (!level_.words.letters.empty()) {
       std::uint32_t const previous = level_.words.letters.back();
       if (AreIdentical(level_.triangles[previous].triangle, triangle)) return previous;
     }
-    if (level_.triangles.size() * 2 >= slots_.size()) Enlarge();
+    if (taken_ * 2 >= slots_.size()) Enlarge();
     std::uint32_t const hash = HashOf(triangle);
     Slot& slot = SlotOf(triangle, hash);
     if (slot.letter == kFree) {
-      slot = {static_cast<std::uint32_t>(level_.triangles.size()), hash};
-      level_.triangles.emplace_back(triangle);
+      slot = {NewLetter(BoxedTriangle(triangle)), hash};
       level_.magnitude.Include(triangle);
-      level_.counts.push_back(0);
+      ++taken_;
     }
     return slot.letter;
   }
@@ -172,47 +200,55 @@ class CellSequence::LevelBuilder {
   }
 
   std::vector<std::size_t> const& counts_;
-  Level level_;
+  Level& level_;
   /// Letters by hash; a power of two of slots, at most half of them taken.
   std::vector<Slot> slots_;
+  std::size_t taken_ = 0;
 };
 
-CellSequence::CellSequence(std::span<Triangle const> triangles) {
+CellSequence::Level* CellSequence::AddLevel() {
+  if (depth_ == levels_.size()) levels_.emplace_back();
+  return &levels_[depth_++];
+}
+
+void CellSequence::Begin(std::span<Triangle const> triangles) {
+  clear();
   std::vector<std::size_t> const once = {1};
-  LevelBuilder builder(once);
-  for (Triangle const& triangle : triangles) builder.AddToWord(triangle);
+  LevelBuilder builder(once, AddLevel());
+  for (Triangle const& triangle : triangles) builder.Add(triangle);
   builder.EndWord();
-  levels_.push_back(builder.Take());
 }
 
 void CellSequence::NarrowBy(std::span<Triangle const> other) {
-  if (levels_.empty()) return;
-  Level const& last = levels_.back();
+  if (depth_ == 0) return;
+  Level* const next = AddLevel();
+  Level const& last = levels_[depth_ - 2];
   std::vector<Cutter> cutters;
   cutters.reserve(other.size());
   for (Triangle const& triangle : other) cutters.emplace_back(triangle, last.magnitude);
 
-  LevelBuilder builder(last.counts);
+  LevelBuilder builder(last.counts, next);
   Overlap overlap;
   for (BoxedTriangle const& boxed : last.triangles) {
     for (Cutter const& cutter : cutters) {
-      cutter.FindOverlapWith(boxed, &overlap);
-      for (Triangle const& part : overlap.parts) builder.AddToWord(part);
+      if (cutter.Cut(boxed, &overlap) == Cutter::Rest::Whole) {
+        builder.Keep(boxed, kCopiesOfContained);
+      } else {
+        for (Triangle const& part : overlap.parts) builder.Add(part);
+      }
     }
     builder.EndWord();
   }
-  levels_.push_back(builder.Take());
 }
 
 bool CellSequence::Overlaps(std::span<Triangle const> other) const {
-  if (levels_.empty()) return false;
-  Level const& last = levels_.back();
+  if (depth_ == 0) return false;
   Overlap overlap;
   for (Triangle const& triangle : other) {
-    Cutter const cutter(triangle, last.magnitude);
-    for (BoxedTriangle const& boxed : last.triangles) {
-      cutter.FindOverlapWith(boxed, &overlap);
-      if (!overlap.parts.empty()) return true;
+    Cutter const cutter(triangle, Last().magnitude);
+    for (BoxedTriangle const& boxed : Last().triangles) {
+      bool const isWhole = cutter.Cut(boxed, &overlap) == Cutter::Rest::Whole;
+      if (isWhole || !overlap.parts.empty()) return true;
     }
   }
   return false;
@@ -220,23 +256,23 @@ bool CellSequence::Overlaps(std::span<Triangle const> other) const {
 
 /// What GetOverlapping gives for a candidate and this cell, as a further level.
 CellSequence::Level CellSequence::OverlapWith(Triangle const& candidate) const {
-  Level const& last = levels_.back();
-  ChordCutter const cutter(candidate, last.magnitude);
-  LevelBuilder builder(last.counts);
+  Level level;
+  ChordCutter const cutter(candidate, Last().magnitude);
+  LevelBuilder builder(Last().counts, &level);
   Overlap overlap;
-  for (BoxedTriangle const& boxed : last.triangles) {
+  for (BoxedTriangle const& boxed : Last().triangles) {
     cutter.FindOverlapWith(boxed, &overlap);
-    for (Triangle const& part : overlap.parts) builder.AddToWord(part);
+    for (Triangle const& part : overlap.parts) builder.Add(part);
     builder.EndWord();
   }
-  return builder.Take();
+  return level;
 }
 
 bool CellSequence::BoundingRect(double* rect) const {
   if (empty()) return false;
   // Letters stand in the order in which they first occur, so the first of equal extremes is the
   // same as in a run over all copies.
-  std::vector<BoxedTriangle> const& triangles = levels_.back().triangles;
+  std::vector<BoxedTriangle> const& triangles = Last().triangles;
   Point const& first = triangles.front().triangle.pts[0];
   rect[0] = rect[2] = first.x;
   rect[1] = rect[3] = first.y;
@@ -254,15 +290,10 @@ bool CellSequence::CenterOfOverlapWith(Triangle const& candidate, Point* center)
 
 bool CellSequence::CenterWith(Level const* last, Point* center) const {
   WordChain chain;
-  chain.reserve(levels_.size() + 1);
-  std::size_t length = 0;
-  auto const append = [&](Level const& level) {
-    chain.push_back(&level.words);
-    length += level.size;
-  };
-  for (Level const& level : levels_) append(level);
-  if (last != nullptr) append(*last);
-  Level const& leaves = last != nullptr ? *last : levels_.back();
+  chain.levels.reserve(depth_ + 1);
+  for (Level const& level : Levels()) chain.Append(level.words, level.size);
+  if (last != nullptr) chain.Append(last->words, last->size);
+  Level const& leaves = last != nullptr ? *last : Last();
 
   std::vector<Summand> weighted;
   std::vector<Summand> own;
@@ -283,12 +314,12 @@ bool CellSequence::CenterWith(Level const* last, Point* center) const {
     }
   }
   Sums proper{};
-  if (isAnyProper) proper = SumOver(chain, length, weighted);
+  if (isAnyProper) proper = SumOver(chain, weighted);
   double const totalArea = proper[0];
   if (totalArea >= Numeric::kZero) {
     *center = {proper[1] / totalArea, proper[2] / totalArea};
   } else if (degenerateCount > 0) {
-    Sums const degenerate = SumOver(chain, length, own);
+    Sums const degenerate = SumOver(chain, own);
     auto const count = static_cast<double>(degenerateCount);
     *center = {degenerate[1] / count, degenerate[2] / count};
   } else {
@@ -298,9 +329,9 @@ bool CellSequence::CenterWith(Level const* last, Point* center) const {
 }
 
 std::vector<Triangle> CellSequence::Expand() const {
-  if (levels_.empty()) return {};
+  if (depth_ == 0) return {};
   std::vector<std::uint32_t> letters = {0};
-  for (Level const& level : levels_) {
+  for (Level const& level : Levels()) {
     std::vector<std::uint32_t> next;
     next.reserve(level.size);
     for (std::uint32_t const letter : letters) {
@@ -311,7 +342,7 @@ std::vector<Triangle> CellSequence::Expand() const {
   std::vector<Triangle> triangles;
   triangles.reserve(letters.size());
   for (std::uint32_t const letter : letters) {
-    triangles.push_back(levels_.back().triangles[letter].triangle);
+    triangles.push_back(Last().triangles[letter].triangle);
   }
   return triangles;
 }

@@ -28,12 +28,17 @@ namespace Vorn::Cells {
 class CellSequence {
  public:
   CellSequence() = default;
-  explicit CellSequence(std::span<GeometryUtils::Triangle const> triangles);
+  explicit CellSequence(std::span<GeometryUtils::Triangle const> triangles) { Begin(triangles); }
 
   /// The number of triangles, copies included.
-  std::size_t size() const { return levels_.empty() ? 0 : levels_.back().size; }
+  std::size_t size() const { return depth_ == 0 ? 0 : Last().size; }
   bool empty() const { return size() == 0; }
-  void clear() { levels_.clear(); }
+
+  /// Becomes the empty cell. What room the levels took is kept for those to come.
+  void clear() { depth_ = 0; }
+
+  /// Becomes a cell of these triangles.
+  void Begin(std::span<GeometryUtils::Triangle const> triangles);
 
   /// Replaces every triangle by its overlaps with the triangles of another cell, in order.
   void NarrowBy(std::span<GeometryUtils::Triangle const> other);
@@ -42,10 +47,10 @@ class CellSequence {
   bool Overlaps(std::span<GeometryUtils::Triangle const> other) const;
 
   /// How often the cell has been narrowed, plus one.
-  std::size_t Depth() const { return levels_.size(); }
+  std::size_t Depth() const { return depth_; }
 
   /// Goes back to what the cell was at a depth.
-  void ReturnTo(std::size_t depth) { levels_.resize(depth); }
+  void ReturnTo(std::size_t depth) { depth_ = depth; }
 
   /// As GetBoundingRect, GetCenter and the centre of what GetOverlapping gives for a candidate.
   bool BoundingRect(double* rect) const;
@@ -66,6 +71,11 @@ class CellSequence {
       std::uint32_t const begin = letter == 0 ? 0 : ends[letter - 1];
       return {letters.data() + begin, letters.data() + ends[letter]};
     }
+
+    void clear() {
+      ends.clear();
+      letters.clear();
+    }
   };
 
  private:
@@ -76,15 +86,28 @@ class CellSequence {
     /// How often each letter occurs in the sequence.
     std::vector<std::size_t> counts;
     std::size_t size = 0;
+
+    void clear() {
+      words.clear();
+      triangles.clear();
+      magnitude = {};
+      counts.clear();
+      size = 0;
+    }
   };
 
   /// Collects the words of a new level and numbers its letters.
   class LevelBuilder;
 
+  Level const& Last() const { return levels_[depth_ - 1]; }
+  std::span<Level const> Levels() const { return {levels_.data(), depth_}; }
+  Level* AddLevel();
   Level OverlapWith(GeometryUtils::Triangle const& candidate) const;
   bool CenterWith(Level const* last, GeometryUtils::Point* center) const;
 
+  /// The first `depth_` are the cell; those behind them are room to reuse.
   std::vector<Level> levels_;
+  std::size_t depth_ = 0;
 };
 
 }  // namespace Vorn::Cells

@@ -10,7 +10,7 @@
 // - A side of the other triangle whose ends are clearly on one side of a line of this one does not
 //   cross it: the true scaled parameter s of the crossing is out of [0, det] by more than 1024 E at
 //   one end. The two offsets must differ by more than 4 E, since their difference is det, and
-//   parallel segments follow other rules.
+//   parallel segments follow other rules, unless their boxes are apart.
 // - Where all vertices of the other triangle are beyond one line, at distances above a 256th of
 //   the largest distance of any of the six vertices from that line, nothing crosses: weighting the
 //   ends by scaled parameters in [-E, det + 2 E], a point of one segment would have to lie at an
@@ -23,6 +23,7 @@
 
 #include <algorithm>
 #include <array>
+#include <bit>
 #include <limits>
 
 #include "math/NumericConstants.h"
@@ -88,9 +89,19 @@ constexpr std::array<Signs, 512> kSigns = [] {
 
 using Bits [[gnu::vector_size(16)]] = std::int64_t;
 
+/// The first of three bits of each line; the second pair repeats line 0, whose bits are there.
+constexpr Bits kLineBits[2] = {{1, 8}, {64, 0}};
+
+unsigned Union(Bits const& bits) { return static_cast<unsigned>(bits[0] | bits[1]); }
+
 template <typename Pair>
 Pair Least(Pair const& a, Pair const& b) {
   return b < a ? b : a;
+}
+
+template <typename Pair>
+Pair Most(Pair const& a, Pair const& b) {
+  return b > a ? b : a;
 }
 
 /// Without signs.
@@ -112,9 +123,13 @@ struct OffsetsFrom {
 
   Pair Smallest() const { return Least(Least(Sizes(o0), Sizes(o1)), Sizes(o2)); }
 
-  Pair SmallestDifference() const {
-    return Least(Least(Sizes(o0 - o1), Sizes(o1 - o2)), Sizes(o2 - o0));
+  /// As InnerBits, where the ends of the side from a vertex differ by no more than a bound.
+  Bits FlatBits(Bits const& bits, Pair const& bound) const {
+    return ((Sizes(o0 - o1) <= bound) & bits) | ((Sizes(o1 - o2) <= bound) & (bits << 1)) |
+           ((Sizes(o2 - o0) <= bound) & (bits << 2));
   }
+
+  Pair Largest() const { return Most(Most(Sizes(o0), Sizes(o1)), Sizes(o2)); }
 
   /// Each lane's bit, shifted by one for every further vertex, where the vertex is inside.
   Bits InnerBits(Bits const& bits) const {
@@ -124,16 +139,25 @@ struct OffsetsFrom {
   Pair o0, o1, o2;
 };
 
-/// Whether a side counts as parallel to one of a triangle. A side of no length does not: it is a
-/// point, and clearly on no line.
-bool IsParallelToASide(Shape::Side const& side, Triangle const& triangle) {
-  for (int i = 0; i < 3; ++i) {
-    double const dx = triangle.pts[(i + 1) % 3].x - triangle.pts[i].x;
-    double const dy = triangle.pts[(i + 1) % 3].y - triangle.pts[i].y;
-    bool const isPoint = dx == 0.0 && dy == 0.0;
-    if (!isPoint && Numeric::IsZeroMagnitude(side.dy * dx - dy * side.dx)) return true;
-  }
-  return false;
+bool AreBoxesApart(Shape::Side const& side, Point const& start, Point const& end) {
+  return std::max(start.x, end.x) < side.xLow || side.xHigh < std::min(start.x, end.x) ||
+         std::max(start.y, end.y) < side.yLow || side.yHigh < std::min(start.y, end.y);
+}
+
+/// Whether two sides count as parallel and are not apart by their boxes. A side of no length is
+/// along nothing: it is a point, and clearly on no line.
+bool IsAlong(Shape::Side const& side, Point const& start, Point const& end) {
+  double const dx = end.x - start.x;
+  double const dy = end.y - start.y;
+  bool const isPoint = dx == 0.0 && dy == 0.0;
+  return !isPoint && Numeric::IsZeroMagnitude(side.dy * dx - dy * side.dx) &&
+         !AreBoxesApart(side, start, end);
+}
+
+bool IsAlongASide(Shape::Side const& side, Triangle const& triangle) {
+  Point const* const pts = triangle.pts;
+  return IsAlong(side, pts[0], pts[1]) || IsAlong(side, pts[1], pts[2]) ||
+         IsAlong(side, pts[2], pts[0]);
 }
 
 /// The bound of rounding errors, or infinity where that is not the only thing to fear.
@@ -155,6 +179,8 @@ Cutter::Cutter(Triangle const& triangle, Magnitude const& magnitude) : shape_(tr
       int const k = (2 * pair + lane) % 3;
       lines_[pair].x[lane] = triangle.pts[k].x;
       lines_[pair].y[lane] = triangle.pts[k].y;
+      vertices_[pair].x[lane] = triangle.pts[k].x;
+      vertices_[pair].y[lane] = triangle.pts[k].y;
       lines_[pair].dx[lane] = turn * shape_.sides[k].dx;
       lines_[pair].dy[lane] = turn * shape_.sides[k].dy;
     }
@@ -166,69 +192,71 @@ Cutter::Cutter(Triangle const& triangle, Magnitude const& magnitude) : shape_(tr
   if (!isProper) clear_ = std::numeric_limits<double>::infinity();
 }
 
-void Cutter::FindOverlapWith(BoxedTriangle const& other, Overlap* overlap) const {
+Cutter::Rest Cutter::Cut(BoxedTriangle const& other, Overlap* overlap) const {
   Sight sight;
   switch (PlaceOf(other, &sight)) {
+    case Place::Within:
+      return Rest::Whole;
     case Place::Apart:
       overlap->status = GeometryUtils::OverlappingStatus::NoOverlap;
       overlap->parts.clear();
-      break;
-    case Place::Within:
-      overlap->status = GeometryUtils::OverlappingStatus::Overlap;
-      overlap->parts.clear();
-      for (int copy = 0; copy < 3; ++copy) overlap->parts.push_back(other.triangle);
-      break;
+      return Rest::Parts;
     case Place::Crossing:
       FindOverlap(other, shape_, sight, overlap);
-      break;
+      return Rest::Parts;
     case Place::Unclear:
-      FindOverlap(Shape(other.triangle), shape_, overlap);
       break;
   }
+  FindOverlap(Shape(other.triangle), shape_, overlap);
+  return Rest::Parts;
 }
 
 Cutter::Place Cutter::PlaceOf(BoxedTriangle const& other, Sight* sight) const {
   using Offsets = OffsetsFrom<LinePair>;
-  Offsets const first(lines_[0], other.triangle);
-  Offsets const second(lines_[1], other.triangle);
-  Pair const least = Least(first.Smallest(), second.Smallest());
-  Pair const leastSkew = Least(first.SmallestDifference(), second.SmallestDifference());
+  Offsets const offsets[2] = {Offsets(lines_[0], other.triangle),
+                              Offsets(lines_[1], other.triangle)};
+  Pair const smallest[2] = {offsets[0].Smallest(), offsets[1].Smallest()};
+  Pair const least = Least(smallest[0], smallest[1]);
   bool const isClear = (least[0] > clear_) & (least[1] > clear_);
   if (!isClear) return Place::Unclear;
-  bool const isSkew = (leastSkew[0] > skew_) & (leastSkew[1] > skew_);
-  if (!isSkew && HasSideParallelTo(other.triangle)) return Place::Unclear;
+  Pair const skew = {skew_, skew_};
+  Bits const flat =
+      offsets[0].FlatBits(kLineBits[0], skew) | offsets[1].FlatBits(kLineBits[1], skew);
+  if (Union(flat) != 0 && HasSideAlong(Union(flat), other.triangle)) return Place::Unclear;
 
-  Bits const inner = first.InnerBits(Bits{1, 8}) | second.InnerBits(Bits{64, 0});
-  Signs const& signs = kSigns[static_cast<std::size_t>(inner[0] | inner[1])];
+  Bits const inner = offsets[0].InnerBits(kLineBits[0]) | offsets[1].InnerBits(kLineBits[1]);
+  Signs const& signs = kSigns[Union(inner)];
   sight->inside = signs.inside;
+  sight->outside = VerticesOutside(other);
   sight->mayCross = signs.mayCross;
-  if (signs.inside == 7U) return IsOutOfBoxOf(other) ? Place::Within : Place::Crossing;
-  bool const isApart = signs.beyond >= 0 && IsFarBeyond(signs.beyond, other) && IsOutOfBoxOf(other);
-  return isApart ? Place::Apart : Place::Crossing;
+  if (!sight->IsSecondOutside()) return Place::Crossing;
+  if (signs.mayCross == 0) return signs.inside != 0 ? Place::Within : Place::Apart;
+  if (signs.beyond < 0) return Place::Crossing;
+  // Vertices beyond a line that are not much nearer to it than any vertex is.
+  int const pair = signs.beyond / 2;
+  int const lane = signs.beyond % 2;
+  double const nearest = smallest[pair][lane];
+  double const farthest = offsets[pair].Largest()[lane];
+  return nearest * kFarRatio > std::max(farthest, area2_) ? Place::Apart : Place::Crossing;
 }
 
-/// Whether a side of the other triangle counts as parallel to one of this one.
-bool Cutter::HasSideParallelTo(Triangle const& other) const {
-  return std::any_of(std::begin(shape_.sides), std::end(shape_.sides),
-                     [&other](Shape::Side const& side) { return IsParallelToASide(side, other); });
+/// Whether one of the sides with a bit in `flat` counts as parallel to the line of that bit, and is
+/// near the side on it.
+bool Cutter::HasSideAlong(unsigned flat, Triangle const& other) const {
+  for (; flat != 0; flat &= flat - 1) {
+    int const bit = std::countr_zero(flat);
+    int const i = bit % 3;
+    if (IsAlong(shape_.sides[bit / 3], other.pts[i], other.pts[(i + 1) % 3])) return true;
+  }
+  return false;
 }
 
-/// Whether vertices beyond a line are not much nearer to it than any vertex is.
-bool Cutter::IsFarBeyond(int line, BoxedTriangle const& other) const {
-  LinePair const& pair = lines_[line / 2];
-  int const lane = line % 2;
-  double const o0 = pair.OffsetsOf(other.triangle.pts[0])[lane];
-  double const o1 = pair.OffsetsOf(other.triangle.pts[1])[lane];
-  double const o2 = pair.OffsetsOf(other.triangle.pts[2])[lane];
-  double const nearest = -std::max({o0, o1, o2});
-  double const farthest = -std::min({o0, o1, o2});
-  return nearest * kFarRatio > std::max(farthest, area2_);
-}
-
-/// Whether no vertex of this triangle can be in or on the other one.
-bool Cutter::IsOutOfBoxOf(BoxedTriangle const& other) const {
-  Point const* const pts = shape_.triangle.pts;
-  return other.IsOutOfBox(pts[0]) && other.IsOutOfBox(pts[1]) && other.IsOutOfBox(pts[2]);
+/// The vertices of this triangle that surely are neither in nor on the other one.
+unsigned Cutter::VerticesOutside(BoxedTriangle const& other) const {
+  auto const outOfBox = [&](PointPair const& p) {
+    return (other.xMin > p.x) | (p.x > other.xMax) | (other.yMin > p.y) | (p.y > other.yMax);
+  };
+  return Union((outOfBox(vertices_[0]) & Bits{1, 2}) | (outOfBox(vertices_[1]) & Bits{4, 0}));
 }
 
 ChordCutter::ChordCutter(Triangle const& chord, Magnitude const& magnitude) : shape_(chord) {
@@ -259,7 +287,7 @@ bool ChordCutter::IsClearlyApartFrom(BoxedTriangle const& other) const {
   bool const isClear = ((o0 > clear_) & (o1 > clear_) & (o2 > clear_)) |
                        ((o0 < -clear_) & (o1 < -clear_) & (o2 < -clear_));
   return isClear && other.IsOutOfBox(start) && other.IsOutOfBox(shape_.triangle.pts[1]) &&
-         !IsParallelToASide(along, other.triangle);
+         !IsAlongASide(along, other.triangle);
 }
 
 }  // namespace Vorn::Cells

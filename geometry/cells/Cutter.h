@@ -37,12 +37,18 @@ class Cutter {
   /// `magnitude` is that of the triangles to come.
   Cutter(GeometryUtils::Triangle const& triangle, Magnitude const& magnitude);
 
-  /// As FindOverlap of the other triangle with this one.
-  void FindOverlapWith(BoxedTriangle const& other, Overlap* overlap) const;
+  /// What is left of a triangle that is cut.
+  enum class Rest {
+    Whole,  ///< all of it: the overlap is kCopiesOfContained copies of it
+    Parts,  ///< what is told by the overlap, which may be nothing
+  };
+
+  /// As FindOverlap of the other triangle with this one. The overlap is written for `Parts` only.
+  Rest Cut(BoxedTriangle const& other, Overlap* overlap) const;
 
  private:
   enum class Place {
-    Within,    ///< the overlap is the other triangle, three times
+    Within,    ///< nothing of the other triangle is cut off
     Apart,     ///< there is no overlap
     Crossing,  ///< sides may cross; what is known stands in the sight
     Unclear,   ///< nothing is known
@@ -50,9 +56,8 @@ class Cutter {
 
   /// Where the other triangle lies.
   Place PlaceOf(BoxedTriangle const& other, Sight* sight) const;
-  bool HasSideParallelTo(GeometryUtils::Triangle const& other) const;
-  bool IsFarBeyond(int line, BoxedTriangle const& other) const;
-  bool IsOutOfBoxOf(BoxedTriangle const& other) const;
+  bool HasSideAlong(unsigned flat, GeometryUtils::Triangle const& other) const;
+  unsigned VerticesOutside(BoxedTriangle const& other) const;
 
   /// Two doubles that are worked on at once. Lanes never meet in a sum, so the results are those of
   /// plain doubles.
@@ -69,6 +74,10 @@ class Cutter {
   Shape shape_;
   /// Sides 0 and 1, then 2 and 0 again.
   LinePair lines_[2];
+  /// Vertices in the same way.
+  struct PointPair {
+    Pair x, y;
+  } vertices_[2];
   /// Twice the area.
   double area2_ = 0.0;
   /// An offset above this is clear; infinite when none is.

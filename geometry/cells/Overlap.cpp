@@ -6,22 +6,28 @@
 // triangles that comes out, and with it the weights of a cell's centre.
 
 #include <array>
+#include <bit>
 #include <cstddef>
 
 #include "geometry/cells/Ring.h"
 #include "geometry/cells/TriangleOverlap.h"
+#include "geometry/intersections/SegmentPair.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
 namespace {
 
 using Cells::CrossingPoints;
+using Cells::kCopiesOfContained;
 using Cells::Shape;
 using CrossingPoint = GeometryUtils::CrossingPoint;
 using OverlappingStatus = GeometryUtils::OverlappingStatus;
 using Point = GeometryUtils::Point;
 using PointStatus = GeometryUtils::PointStatus;
 using Triangle = GeometryUtils::Triangle;
+
+/// The vertex or side that follows.
+constexpr int kNext[3] = {1, 2, 0};
 
 using Polygon = Cells::InlineVector<Point, 12>;
 
@@ -138,9 +144,14 @@ void FindContained(Triangle const& first, Triangle const& second, VertexStatuses
     overlap->status = OverlappingStatus::OverlapFailed;
     return;
   }
-  // Deliberate: three copies. They weigh in the centre of the cell and in its size.
   Triangle const& contained = firstIn == 3 ? first : second;
-  for (int copy = 0; copy < 3; ++copy) overlap->parts.push_back(contained);
+  for (int copy = 0; copy < kCopiesOfContained; ++copy) overlap->parts.push_back(contained);
+  overlap->status = OverlappingStatus::Overlap;
+}
+
+void Divide(Polygon* polygon, Cells::Overlap* overlap) {
+  Cells::CutEars(polygon->data(), static_cast<int>(polygon->size()),
+                 [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });
   overlap->status = OverlappingStatus::Overlap;
 }
 
@@ -154,10 +165,45 @@ void FindCommonPart(Triangle const& first, Triangle const& second, VertexStatuse
   std::array<Triangle const*, 2> const triangles = {&first, &second};
   BoundaryWalk walk(triangles, statuses, crossings);
   Polygon& polygon = walk.Walk();
-  if (polygon.size() < 3) return;
-  Cells::CutEars(polygon.data(), static_cast<int>(polygon.size()),
-                 [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });
-  overlap->status = OverlappingStatus::Overlap;
+  if (polygon.size() >= 3) Divide(&polygon, overlap);
+}
+
+/// The most frequent case by far: one cut, where the walk is always the same. False, and nothing
+/// done, where a side ends before the other, by rounding.
+bool FindOneCut(Triangle const& first, Triangle const& second, Cells::Sight const& sight,
+                Cells::Overlap* overlap) {
+  int const bit0 = std::countr_zero(sight.mayCross);
+  int const bit1 = std::countr_zero(sight.mayCross & (sight.mayCross - 1));
+  int const side0 = bit0 / 3;
+  int const side1 = bit1 / 3;
+  int const cut = bit0 % 3;
+  auto const cross = [&](int side, Point* p) {
+    Point const& start = first.pts[side];
+    Point const& end = first.pts[kNext[side]];
+    Point const& cutStart = second.pts[cut];
+    Point const& cutEnd = second.pts[kNext[cut]];
+    return Intersections::IntersectSegments(
+               {start.x, start.y, end.x, end.y, cutStart.x, cutStart.y, cutEnd.x, cutEnd.y}, &p->x,
+               &p->y) == SegmentsRelPosition::Intersecting;
+  };
+  Point enter;
+  Point leave;
+  if (!cross(side0, &enter) || !cross(side1, &leave)) return false;
+
+  // The walk crosses over at the first point. Where the first vertex is outside, it follows the
+  // first triangle from there, and otherwise from the second point on.
+  bool const isFirstInside = (sight.inside & 1U) != 0;
+  int const next = kNext[isFirstInside ? side1 : side0];
+  int const afterNext = kNext[next];
+  bool const hasTwo = (sight.inside >> afterNext & 1U) != 0;
+  Polygon polygon;
+  polygon.push_back(enter);
+  if (isFirstInside) polygon.push_back(leave);
+  polygon.push_back(first.pts[next]);
+  if (hasTwo) polygon.push_back(first.pts[afterNext]);
+  if (!isFirstInside) polygon.push_back(leave);
+  Divide(&polygon, overlap);
+  return true;
 }
 
 }  // namespace
@@ -186,20 +232,23 @@ void Cells::FindOverlap(BoxedTriangle const& first, Shape const& second, Sight c
                         Overlap* overlap) {
   overlap->status = OverlappingStatus::NoOverlap;
   overlap->parts.clear();
+  if (sight.IsOneCut() && FindOneCut(first.triangle, second.triangle, sight, overlap)) return;
+  CrossingPoints crossings;
+  FindCrossingPoints(first.triangle, second.triangle, sight.mayCross, &crossings);
+  if (crossings.empty() && sight.inside == 0 && sight.IsSecondOutside()) return;
+
   VertexStatuses statuses;
+  Shape const shape(first.triangle);
   for (std::size_t v = 0; v < 3; ++v) {
     bool const isInside = (sight.inside >> v & 1U) != 0;
     statuses[0][v] = isInside ? PointStatus::Inside : PointStatus::Outside;
-    Point const& vertex = second.triangle.pts[v];
-    statuses[1][v] =
-        first.IsOutOfBox(vertex) ? PointStatus::Outside : Shape(first.triangle).StatusOf(vertex);
+    bool const isOutside = (sight.outside >> v & 1U) != 0;
+    statuses[1][v] = isOutside ? PointStatus::Outside : shape.StatusOf(second.triangle.pts[v]);
   }
   if (HasUndefined(statuses)) {
     overlap->status = OverlappingStatus::OverlapFailed;
     return;
   }
-  CrossingPoints crossings;
-  FindCrossingPoints(first.triangle, second.triangle, sight.mayCross, &crossings);
   FindCommonPart(first.triangle, second.triangle, statuses, crossings, overlap);
 }
 

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <bit>
 #include <cstddef>
 #include <type_traits>
 
@@ -82,6 +83,10 @@ struct Shape {
                                              double const* areas) const;
 };
 
+/// How many times a contained triangle makes up the overlap. Deliberate: the copies weigh in the
+/// centre of a cell and in its size.
+inline constexpr int kCopiesOfContained = 3;
+
 /// How many triangles an overlap can have: a walk takes at most four points on each of three sides,
 /// and twelve points make ten triangles.
 inline constexpr std::size_t kMostParts = 10;
@@ -92,13 +97,24 @@ struct Overlap {
   InlineVector<GeometryUtils::Triangle, kMostParts> parts;
 };
 
-/// What is known beforehand of two triangles: each vertex of the first is inside or outside the
-/// second, and which sides may cross.
+/// What is known beforehand of two triangles.
 struct Sight {
   /// Bit v: vertex v of the first triangle is inside the second one, otherwise outside.
   unsigned inside = 0;
+  /// Bit v: vertex v of the second triangle is outside the first one, otherwise anywhere.
+  unsigned outside = 0;
   /// Bit 3 i + j: side i of the first may cross side j of the second; the other sides do not.
   unsigned mayCross = 0;
+
+  /// Whether every vertex of the second triangle is outside the first one.
+  bool IsSecondOutside() const { return outside == 7U; }
+
+  /// Whether one side of the second triangle cuts off one or two vertices of the first, and there
+  /// is nothing else to it.
+  bool IsOneCut() const {
+    bool const hasTwoCrossings = std::has_single_bit(mayCross & (mayCross - 1));
+    return inside != 0 && hasTwoCrossings && IsSecondOutside();
+  }
 };
 
 /// The same triangles in the same order as GetOverlapping.

@@ -104,7 +104,7 @@ ErrorCode ArcCellBuilder::RunPass(bool isLed, bool isGuarded, bool* hasThinned) 
     nextCell.clear();
     if (!isLast) code = CellOf(triples.Current(), &nextCell);
     if (isFirst) {
-      cell_ = Cells::CellSequence(tripleCell);
+      cell_.Begin(tripleCell);
     } else {
       bool const endsHere = code != ErrorCode::Ok && afterFailure_ == AfterFailure::NoCell;
       if (endsHere && StaysUsable(tripleCell, isGuarded)) return code;

@@ -236,7 +236,7 @@ class LineRun {
         return lastAttempt_ ? Growth::LowerLimit : Growth::Failed;
       }
       if (from == start_) {
-        chainCell = CellSequence(pairCell_);
+        chainCell.Begin(pairCell_);
       } else {
         chainCell.NarrowBy(pairCell_);
         if (chainCell.empty()) return Growth::LowerLimit;

@@ -178,6 +178,26 @@ TEST(CellSequence, NarrowedByNothingIsEmpty) {
   EXPECT_TRUE(sequence.empty());
 }
 
+TEST(CellSequence, BeginsAnewInTheRoomOfWhatItWas) {
+  RandomGeometry random(11);
+  std::vector<Cell> const longer = LineCellsOf(NoisyLine(random, 9, 0.05));
+  std::vector<Cell> const shorter = CircleCellsOf(NoisyArc(random, 6, 20.0, 0.05));
+  CellSequence reused;
+  for (std::vector<Cell> const* cells : {&longer, &shorter, &longer}) {
+    CellSequence fresh(cells->front());
+    reused.Begin(cells->front());
+    for (std::size_t i = 1; i < cells->size(); ++i) {
+      fresh.NarrowBy((*cells)[i]);
+      reused.NarrowBy((*cells)[i]);
+    }
+    EXPECT_EQ(reused.Depth(), fresh.Depth());
+    EXPECT_TRUE(SameCell(fresh.Expand(), reused.Expand()));
+    reused.clear();
+    EXPECT_TRUE(reused.empty());
+    EXPECT_TRUE(reused.Expand().empty());
+  }
+}
+
 TEST(CellSequence, TellsNegativeZeroFromZero) {
   Cell const cell = {Triangle{{{0.0, 0.0}, {1, 0}, {0, 1}}},
                      Triangle{{{-0.0, 0.0}, {1, 0}, {0, 1}}},

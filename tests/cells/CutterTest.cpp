@@ -1,5 +1,6 @@
 #include <cmath>
 #include <cstdint>
+#include <set>
 #include <utility>
 
 #include "geometry/cells/Cutter.h"
@@ -37,9 +38,14 @@ Cutter::Place PlaceOf(Triangle const& other, Triangle const& cutter) {
 void ExpectSameOverlap(Triangle const& other, Triangle const& cutter) {
   Overlap plain;
   Cells::FindOverlap(Shape(other), Shape(cutter), &plain);
-  Overlap fast;
-  CutterFor(other, cutter).FindOverlapWith(BoxedTriangle(other), &fast);
   Cell const expected(plain.parts.begin(), plain.parts.end());
+  Overlap fast;
+  if (CutterFor(other, cutter).Cut(BoxedTriangle(other), &fast) == Cutter::Rest::Whole) {
+    EXPECT_EQ(plain.status, GeometryUtils::OverlappingStatus::Overlap);
+    EXPECT_TRUE(SameCell(expected, Cell(Cells::kCopiesOfContained, other)))
+        << Describe(other) << " within " << Describe(cutter);
+    return;
+  }
   Cell const actual(fast.parts.begin(), fast.parts.end());
   EXPECT_EQ(fast.status, plain.status);
   EXPECT_TRUE(SameCell(expected, actual)) << Describe(other) << " cut by " << Describe(cutter);
@@ -114,9 +120,44 @@ TEST(Cutter, LeavesAVertexOnALineToTheFullOverlap) {
   }
 }
 
-TEST(Cutter, LeavesParallelSidesToTheFullOverlap) {
-  // A side within, parallel to the lower one.
-  EXPECT_EQ(PlaceOf({{{1, 1}, {2, 1}, {1.25, 1.5}}}, kLarge), Cutter::Place::Unclear);
+TEST(Cutter, SeesWhatIsNearASideButAcrossNoLine) {
+  // A thousand times nearer to the lower side than it is wide.
+  Triangle const below{{{0.5, -0.001}, {2.5, -0.002}, {1.5, -0.5}}};
+  EXPECT_EQ(PlaceOf(below, kLarge), Cutter::Place::Apart);
+  ExpectSameOverlap(below, kLarge);
+}
+
+TEST(Cutter, LeavesParallelSidesWithBoxesThatMeetToTheFullOverlap) {
+  // A side within, parallel to the long one.
+  Triangle const parallel{{{1, 2}, {2, 1}, {1.25, 1.5}}};
+  EXPECT_EQ(PlaceOf(parallel, kLarge), Cutter::Place::Unclear);
+  ExpectSameOverlap(parallel, kLarge);
+}
+
+TEST(Cutter, ParallelSidesWithBoxesApartDoNotMatter) {
+  Triangle const parallel{{{1, 1}, {2, 1}, {1.25, 1.5}}};
+  EXPECT_EQ(PlaceOf(parallel, kLarge), Cutter::Place::Within);
+  ExpectSameOverlap(parallel, kLarge);
+}
+
+TEST(Cutter, CutsOffVerticesAsTheFullOverlapDoes) {
+  // Small triangles about a point of a side.
+  std::set<unsigned> insideSeen;
+  CompareOnRandomPairs(4200, 20000, [&insideSeen](RandomGeometry& random) {
+    Triangle const cutter = random.TriangleIn(-1.0, 1.0);
+    int const side = random.Integer(0, 2);
+    Point const middle =
+        Lerp(cutter.pts[side], cutter.pts[(side + 1) % 3], random.Uniform(0.1, 0.9));
+    Triangle const small = Moved(Scaled(random.TriangleIn(-1.0, 1.0), 0.05), middle);
+    Sight sight;
+    if (CutterFor(small, cutter).PlaceOf(BoxedTriangle(small), &sight) == Cutter::Place::Crossing &&
+        sight.IsOneCut()) {
+      insideSeen.insert(sight.inside);
+    }
+    return TrianglePair{small, cutter};
+  });
+  // One or two vertices are cut off, each and each pair of them.
+  EXPECT_EQ(insideSeen, (std::set<unsigned>{1, 2, 3, 4, 5, 6}));
 }
 
 TEST(Cutter, ASideOfNoLengthIsParallelToNothing) {
