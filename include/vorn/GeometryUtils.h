@@ -212,15 +212,17 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in] arc radius, direction and both angles are used; direction > 0 is counter-clockwise,
   ///            everything else clockwise
   /// @return sweep times radius; 0 for equal angles. >= 0 for angles in (-pi, pi] and a radius >=
-  ///       0.
-  /// @note One wrap by 2*pi at most. O(1).
+  /// 0,
+  ///         except for a sweep of less than 7e-15 across the seam
+  /// @note One wrap by 2*pi at most. Since 2*pi is cut short, a sweep across the seam comes out too
+  ///       small by 7e-15 at most: the least ones below 0. O(1).
   static double GetArcLength(Arc const& arc);
 
   /// Sweep of an arc.
   ///
   /// @param[in] arc as for GetArcLength
-  /// @return GetArcLength divided by the radius, in [0, 2*pi); 0.0 when the radius is tiny, zero or
-  ///         negative
+  /// @return GetArcLength divided by the radius, in [0, 2*pi) with the same exception; 0.0 when the
+  ///         radius is tiny, zero or negative
   static double GetArcAngleRad(Arc const& arc);
 
   /// Distance of the point (x, y) from the line a*x + b*y + c = 0.

@@ -87,8 +87,9 @@ class VORN_EXPORT Matrix {
   /// @param[out] az angle about z, in (-pi, pi]; 0.0 in gimbal lock
   /// @note Gimbal lock, when |cos(ay)| is not above 2.220446049250313e-16: ay is then
   ///       +-1.570796326794895 (a truncated right angle, kept on purpose), the whole turn about the
-  ///       common axis goes into ax. An element (0, 2) outside [-1, 1] gives a not-a-number.
-  ///       Property: for |ay| < pi/2 the angles of InitMxMyMz come back up to rounding.
+  ///       common axis goes into ax. An element (0, 2) outside [-1, 1], or a not-a-number there, is
+  ///       taken for the lock with ay negative. Property: for |ay| < pi/2 the angles of InitMxMyMz
+  ///       come back up to rounding.
   void GetAnglesFromMxMyMz(double* ax, double* ay, double* az);
 
   /// Angles that InitMzMyMx would build this matrix from. The matrix does not change.
@@ -96,9 +97,8 @@ class VORN_EXPORT Matrix {
   /// @param[out] ax angle about x, in (-pi, pi]
   /// @param[out] ay angle about y, in [-pi/2, pi/2]
   /// @param[out] az angle about z, in (-pi, pi]; 0.0 in gimbal lock
-  /// @note Gimbal lock as in GetAnglesFromMxMyMz; here an element (2, 0) outside [-1, 1] gives a
-  ///       not-a-number. Property: for |ay| < pi/2 the angles of InitMzMyMx come back up to
-  ///       rounding.
+  /// @note Gimbal lock as in GetAnglesFromMxMyMz, with the element (2, 0) in the place of (0, 2).
+  ///       Property: for |ay| < pi/2 the angles of InitMzMyMx come back up to rounding.
   void GetAnglesFromMzMyMx(double* ax, double* ay, double* az);
 
   /// Matrix times column vector. Neither operand changes.

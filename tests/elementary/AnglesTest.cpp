@@ -199,6 +199,19 @@ TEST(GetArcLength, AHairBackwardsIsAlmostAFullTurn) {
                    1.0 - (Up(1.0) - kTwoPi));
 }
 
+TEST(GetArcLength, TheLeastSweepsAcrossTheSeamComeOutNegative) {
+  double const pi = std::numbers::pi;
+  for (double const radius : {1.0, 8.0}) {
+    double const counterClockwise = GeometryUtils::GetArcLength(MakeArc(pi, Up(-pi), 1.0, radius));
+    EXPECT_SAME_BITS(counterClockwise, (Up(-pi) + kTwoPi - pi) * radius);
+    EXPECT_LT(counterClockwise, 0.0);
+    EXPECT_GT(counterClockwise, -7e-15 * radius);
+    EXPECT_SAME_BITS(GeometryUtils::GetArcLength(MakeArc(Up(-pi), pi, -1.0, radius)),
+                     counterClockwise);
+  }
+  EXPECT_GT(GeometryUtils::GetArcLength(MakeArc(pi, -pi + 7e-15, 1.0, 1.0)), 0.0);
+}
+
 TEST(GetArcLength, DoesNotCheckTheRadius) {
   EXPECT_SAME_BITS(GeometryUtils::GetArcLength(MakeArc(0.0, 1.0, 1.0, 0.0)), 0.0);
   EXPECT_SAME_BITS(GeometryUtils::GetArcLength(MakeArc(0.0, 1.0, 1.0, -2.0)), -2.0);
