@@ -59,6 +59,15 @@ struct Summand {
   bool isSkipped;
 };
 
+/// Between these bounds of a cell's total area and of its weighted sums nothing that matters is
+/// lost to subnormal numbers, and nothing overflows.
+constexpr double kLeastRoughArea = 1e-250;
+constexpr double kLargestRoughSum = 1e250;
+
+/// The error of a rough centre for each triangle, relative to the largest coordinate: 2 x 2 x
+/// sqrt(2) roundings of 2^-53, and some to spare.
+constexpr double kRoughness = 0x1p-50;
+
 /// How many letters of an expansion are run through in the time that the shortcuts take for one
 /// letter of the words (measured; they look at it once for every binade that the sums pass).
 constexpr std::size_t kShortcutCost = 20;
@@ -281,6 +290,27 @@ bool CellSequence::BoundingRect(double* rect) const {
 }
 
 bool CellSequence::Center(Point* center) const { return !empty() && CenterWith(nullptr, center); }
+
+std::optional<RoughCentre> CellSequence::FindRoughCentre() const {
+  if (empty()) return std::nullopt;
+  double totalArea = 0.0;
+  Point weighted{0.0, 0.0};
+  double largest = 0.0;
+  for (std::size_t letter = 0; letter < Last().triangles.size(); ++letter) {
+    TriangleCentre const centre(Last().triangles[letter].triangle);
+    double const area = static_cast<double>(Last().counts[letter]) * centre.area;
+    totalArea += area;
+    weighted.x += area * centre.center.x;
+    weighted.y += area * centre.center.y;
+    largest = std::max({largest, std::fabs(centre.center.x), std::fabs(centre.center.y)});
+  }
+  bool const isUsable = totalArea > kLeastRoughArea && totalArea * largest < kLargestRoughSum;
+  if (!isUsable) return std::nullopt;
+  // A sum of n terms of one sign is off by n roundings at most, and a mean of values up to the
+  // largest by twice that, times the largest; so is this one.
+  double const error = kRoughness * static_cast<double>(size()) * largest;
+  return RoughCentre{{weighted.x / totalArea, weighted.y / totalArea}, error};
+}
 
 bool CellSequence::CenterOfOverlapWith(Triangle const& candidate, Point* center) const {
   if (empty()) return false;

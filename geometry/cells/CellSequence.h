@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <optional>
 #include <span>
 #include <vector>
 
@@ -9,6 +10,12 @@
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn::Cells {
+
+/// A point, and how far from it the one that is meant may be.
+struct RoughCentre {
+  GeometryUtils::Point at;
+  double error;
+};
 
 /// A cell that is narrowed again and again, held without its copies.
 ///
@@ -55,6 +62,9 @@ class CellSequence {
   /// As GetBoundingRect, GetCenter and the centre of what GetOverlapping gives for a candidate.
   bool BoundingRect(double* rect) const;
   bool Center(GeometryUtils::Point* center) const;
+  /// The centre without its exact rounding, which takes no sum over the copies. Nothing for a cell
+  /// without a proper triangle, or with one of extreme size.
+  std::optional<RoughCentre> FindRoughCentre() const;
   bool CenterOfOverlapWith(GeometryUtils::Triangle const& candidate,
                            GeometryUtils::Point* center) const;
 

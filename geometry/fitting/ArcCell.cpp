@@ -1,6 +1,7 @@
 #include "geometry/fitting/ArcCell.h"
 
 #include <cstddef>
+#include <optional>
 
 #include "geometry/fitting/Runs.h"
 
@@ -128,11 +129,17 @@ bool ArcCellBuilder::StaysUsable(std::vector<Triangle> const& tripleCell, bool i
 }
 
 ErrorCode ArcCellBuilder::Thin(int steps) {
-  GeometryUtils::Point centre;
-  if (!cell_.Center(&centre)) return ErrorCode::Failed;
-  ErrorCode const code = Fitting::ThinSamples(run_, centre, steps, ccw_, &samples_);
-  if (code == ErrorCode::Ok) cell_.clear();
-  return code;
+  std::optional<ErrorCode> code;
+  if (std::optional<Cells::RoughCentre> const rough = cell_.FindRoughCentre()) {
+    code = Fitting::ThinSamples(run_, *rough, steps, ccw_, &samples_);
+  }
+  if (!code) {
+    GeometryUtils::Point centre;
+    if (!cell_.Center(&centre)) return ErrorCode::Failed;
+    code = Fitting::ThinSamples(run_, centre, steps, ccw_, &samples_);
+  }
+  if (*code == ErrorCode::Ok) cell_.clear();
+  return *code;
 }
 
 ErrorCode ArcCellBuilder::CellOf(Fitting::Triple const& triple, std::vector<Triangle>* cell) const {

@@ -4,10 +4,12 @@
 // samples nearest to and farthest from the cell's centre. The measured point in the angular middle
 // of the arc comes in, so that the arc is held at three places at least.
 
+#include <algorithm>
 #include <cmath>
 #include <cstddef>
 #include <cstdint>
 #include <iterator>
+#include <limits>
 #include <map>
 #include <optional>
 #include <vector>
@@ -30,8 +32,8 @@ class SampleThinning {
   using Point = GeometryUtils::Point;
 
   SampleThinning(std::vector<IndexedPoint> const& samples, Fitting::ArcRun const& run,
-                 Point const& centre)
-      : samples_(samples), run_(run), centre_(centre) {}
+                 Cells::RoughCentre const& centre)
+      : samples_(samples), run_(run), centre_(centre.at), error_(centre.error) {}
 
   /// Enters the samples of all triples up to a step into the map. False when a triple leaves the
   /// list.
@@ -63,21 +65,19 @@ class SampleThinning {
   /// The samples whose distance from the centre is smallest and largest. When they are one and the
   /// same, two that cut the list in thirds.
   void FindNearestAndFarthest() {
+    auto const firstEntry = std::next(entered_.begin());
     auto const lastEntry = std::prev(entered_.end());
-    nearest_ = farthest_ = std::next(entered_.begin());
-    double nearest2 = Distance2(nearest_);
-    double farthest2 = nearest2;
-    for (auto entry = std::next(nearest_); entry != lastEntry; ++entry) {
+    Choice<SampleMap::const_iterator> nearest;
+    Choice<SampleMap::const_iterator> farthest;
+    for (auto entry = firstEntry; entry != lastEntry; ++entry) {
       double const distance2 = Distance2(entry);
-      if (distance2 < nearest2) {
-        nearest2 = distance2;
-        nearest_ = entry;
-      }
-      if (distance2 > farthest2) {
-        farthest2 = distance2;
-        farthest_ = entry;
-      }
+      nearest.Offer(distance2, entry);
+      farthest.Offer(-distance2, entry);
     }
+    nearest_ = nearest.best;
+    farthest_ = farthest.best;
+    double const slack2 = DistanceSlack2(-farthest.least);
+    Require(nearest.Lead() > slack2 && farthest.Lead() > slack2);
     if (nearest_ == farthest_) {
       auto const third = static_cast<std::ptrdiff_t>((entered_.size() - 1) / 3);
       nearest_ = std::next(entered_.begin(), third);
@@ -111,9 +111,14 @@ class SampleThinning {
     }
     bool const isFirstOnArc =
         GeometryUtils::IsValidArcOrder(centre_, ccw, ToPoint(first), p1, ToPoint(last));
+    Require(AreClearlyApart(ToPoint(first), p1) && AreClearlyApart(p1, ToPoint(last)) &&
+            AreClearlyApart(ToPoint(last), ToPoint(first)));
     middle_ = NearestInDirection(Direction(isFirstOnArc ? p1 : p2));
     return true;
   }
+
+  /// Whether all that was chosen would be chosen for every centre within the error.
+  bool IsClear() const { return isClear_; }
 
   std::vector<IndexedPoint> Rebuild() {
     std::vector<IndexedPoint> kept;
@@ -141,6 +146,31 @@ class SampleThinning {
   /// Two ends, nearest, farthest and one to drop: with fewer there is nothing to thin.
   static constexpr std::size_t kFewestSamples = 5;
 
+  /// More than all roundings of a distance or of a direction together, relative to it.
+  static constexpr double kRounding = 0x1p-48;
+  static constexpr double kSafety = 16.0;
+
+  /// The first of the candidates with the least value, and how far behind the next one is.
+  template <typename Candidate>
+  struct Choice {
+    void Offer(double value, Candidate const& candidate) {
+      bool const isBetter = count == 0 || value < least;
+      if (count > 0) runnerUp = std::min(runnerUp, isBetter ? least : value);
+      if (isBetter) {
+        least = value;
+        best = candidate;
+      }
+      ++count;
+    }
+
+    double Lead() const { return runnerUp - least; }
+
+    Candidate best{};
+    double least = 0.0;
+    double runnerUp = std::numeric_limits<double>::infinity();
+    int count = 0;
+  };
+
   void Enter(int position, Point const& coords) {
     if (samples_.size() == 1 && position == 0) return;
     entered_[position] = coords;
@@ -153,18 +183,40 @@ class SampleThinning {
 
   double Direction(Point const& p) const { return std::atan2(p.y - centre_.y, p.x - centre_.x); }
 
-  std::optional<std::int32_t> NearestInDirection(double direction) const {
-    std::optional<std::int32_t> nearest;
-    double smallest = 0.0;
+  std::optional<std::int32_t> NearestInDirection(double direction) {
+    Choice<std::int32_t> nearest;
+    double slack = 0.0;
     for (std::int32_t j = run_.first + 1; j <= run_.first + run_.count - 2; ++j) {
-      double difference = std::fabs(Direction(ToPoint(At(run_.points, j))) - direction);
-      if (difference > Numeric::kTruncatedPi) difference = Numeric::kTruncatedTwoPi - difference;
-      if (!nearest || difference < smallest) {
-        smallest = difference;
-        nearest = j;
-      }
+      Point const p = ToPoint(At(run_.points, j));
+      nearest.Offer(AngleBetween(Direction(p), direction), j);
+      slack = std::max(slack, DirectionSlack(p));
     }
-    return nearest;
+    if (nearest.count == 0) return std::nullopt;
+    Require(nearest.Lead() > slack);
+    return nearest.best;
+  }
+
+  static double AngleBetween(double direction, double other) {
+    double const difference = std::fabs(direction - other);
+    return difference > Numeric::kTruncatedPi ? Numeric::kTruncatedTwoPi - difference : difference;
+  }
+
+  void Require(bool isClear) { isClear_ = isClear_ && (isClear || error_ == 0.0); }
+
+  bool AreClearlyApart(Point const& p, Point const& q) const {
+    return AngleBetween(Direction(p), Direction(q)) > DirectionSlack(p) + DirectionSlack(q);
+  }
+
+  /// By how much two squared distances up to the largest one may change against each other with a
+  /// centre within the error, their rounding included; several times over.
+  double DistanceSlack2(double largest2) const {
+    double const distance = std::sqrt(largest2);
+    return kSafety * (error_ + kRounding * distance) * (distance + error_);
+  }
+
+  /// The same for the directions of two points no nearer than this one.
+  double DirectionSlack(Point const& p) const {
+    return kSafety * (error_ / std::sqrt(GeometryUtils::GetDist2(p, centre_)) + kRounding);
   }
 
   void InsertMiddle(std::vector<IndexedPoint>* kept) {
@@ -182,6 +234,8 @@ class SampleThinning {
   std::vector<IndexedPoint> const& samples_;
   Fitting::ArcRun const& run_;
   Point const centre_;
+  double const error_;
+  bool isClear_ = true;
 
   SampleMap entered_;
   double lastEnteredTolerance_ = 0.0;
@@ -191,14 +245,24 @@ class SampleThinning {
   std::optional<std::int32_t> middle_;
 };
 
-ErrorCode Fitting::ThinSamples(ArcRun const& run, GeometryUtils::Point const& centre, int steps,
-                               bool ccw, std::vector<GeometryUtils::IndexedPoint>* samples) {
+std::optional<ErrorCode> Fitting::ThinSamples(ArcRun const& run, Cells::RoughCentre const& centre,
+                                              int steps, bool ccw,
+                                              std::vector<GeometryUtils::IndexedPoint>* samples) {
   SampleThinning thinning(*samples, run, centre);
   if (!thinning.EnterTriples(steps) || !thinning.HasEnoughSamples()) return ErrorCode::Failed;
   thinning.FindNearestAndFarthest();
-  if (!thinning.FindMiddle(ccw)) return ErrorCode::Failed;
+  bool const hasMiddle = thinning.FindMiddle(ccw);
+  if (!thinning.IsClear() || (!hasMiddle && centre.error > 0.0)) return std::nullopt;
+  if (!hasMiddle) return ErrorCode::Failed;
   *samples = thinning.Rebuild();
   return ErrorCode::Ok;
+}
+
+ErrorCode Fitting::ThinSamples(ArcRun const& run, GeometryUtils::Point const& centre, int steps,
+                               bool ccw, std::vector<GeometryUtils::IndexedPoint>* samples) {
+  // Without an error every choice is clear.
+  return ThinSamples(run, Cells::RoughCentre{centre, 0.0}, steps, ccw, samples)
+      .value_or(ErrorCode::Failed);
 }
 
 ErrorCode GeometryUtils::ReduceCircleArcPoints(std::vector<IndexedPoint>* samples,

@@ -1,4 +1,7 @@
+#include <algorithm>
+#include <cmath>
 #include <cstddef>
+#include <optional>
 #include <vector>
 
 #include "geometry/cells/CellSequence.h"
@@ -24,6 +27,19 @@ Cell Narrowed(Cell const& cell, Cell const& other) {
   return narrowed;
 }
 
+/// Within its own error, which is small for what a sum of so many terms can be off.
+void ExpectRoughCentreIsNear(Point const& center, CellSequence const& sequence) {
+  std::optional<Cells::RoughCentre> const rough = sequence.FindRoughCentre();
+  if (!rough) return;
+  double const distance = std::hypot(rough->at.x - center.x, rough->at.y - center.y);
+  EXPECT_LE(distance, rough->error);
+  double rect[4];
+  ASSERT_TRUE(sequence.BoundingRect(rect));
+  double largest = 0.0;
+  for (double const bound : rect) largest = std::max(largest, std::fabs(bound));
+  EXPECT_LE(rough->error, 1e-15 * static_cast<double>(sequence.size()) * largest);
+}
+
 void ExpectSameSummary(Cell const& plain, CellSequence const& sequence) {
   ASSERT_EQ(sequence.size(), plain.size());
   EXPECT_EQ(sequence.empty(), plain.empty());
@@ -31,6 +47,7 @@ void ExpectSameSummary(Cell const& plain, CellSequence const& sequence) {
   Point center = kPointSentinel;
   EXPECT_EQ(sequence.Center(&center), GeometryUtils::GetCenter(&plain, &plainCenter));
   EXPECT_SAME_POINT(center, plainCenter);
+  ExpectRoughCentreIsNear(plainCenter, sequence);
   double plainRect[4] = {kSentinel, kSentinel, kSentinel, kSentinel};
   double rect[4] = {kSentinel, kSentinel, kSentinel, kSentinel};
   EXPECT_EQ(sequence.BoundingRect(rect), GeometryUtils::GetBoundingRect(&plain, plainRect));
@@ -195,6 +212,24 @@ TEST(CellSequence, BeginsAnewInTheRoomOfWhatItWas) {
     reused.clear();
     EXPECT_TRUE(reused.empty());
     EXPECT_TRUE(reused.Expand().empty());
+  }
+}
+
+TEST(CellSequence, ProperCellsHaveARoughCentre) {
+  RandomGeometry random(12);
+  std::vector<Cell> const cells = CircleCellsOf(NoisyArc(random, 9, 20.0, 0.05));
+  CellSequence sequence(cells.front());
+  EXPECT_TRUE(sequence.FindRoughCentre());
+  sequence.NarrowBy(cells[1]);
+  EXPECT_TRUE(sequence.FindRoughCentre());
+}
+
+TEST(CellSequence, CellsWithoutAProperTriangleOrOfExtremeSizeHaveNoRoughCentre) {
+  EXPECT_FALSE(CellSequence().FindRoughCentre());
+  EXPECT_FALSE(CellSequence(Cell{Triangle{{{0, 0}, {1, 1}, {1, 1}}}}).FindRoughCentre());
+  for (double const size : {1e-130, 1e90, kInf, kNaN}) {
+    Cell const cell{Triangle{{{0, 0}, {size, 0}, {0, size}}}};
+    EXPECT_FALSE(CellSequence(cell).FindRoughCentre()) << size;
   }
 }
 
