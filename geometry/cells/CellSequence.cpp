@@ -127,14 +127,12 @@ class CellSequence::LevelBuilder {
   LevelBuilder(std::vector<std::size_t> const& counts, Level* level)
       : counts_(counts), level_(*level), slots_(std::bit_ceil(kSlotsPerLetter * counts.size())) {
     level_.clear();
+    level_.words.ends.reserve(counts.size());
   }
 
   /// Adds a letter as it is, some copies of it. No other letter has an equal triangle among its
   /// parts, or it stays a letter of its own.
-  void Keep(BoxedTriangle const& boxed, std::size_t copies) {
-    level_.magnitude.Include(boxed.triangle);
-    Append(NewLetter(boxed), copies);
-  }
+  void Keep(BoxedTriangle const& boxed, std::size_t copies) { Append(NewLetter(boxed), copies); }
 
   void Add(Triangle const& part) { Append(LetterOf(part), 1); }
 
@@ -154,7 +152,7 @@ class CellSequence::LevelBuilder {
   };
 
   void Append(std::uint32_t letter, std::size_t copies) {
-    level_.words.letters.insert(level_.words.letters.end(), copies, letter);
+    for (std::size_t copy = 0; copy < copies; ++copy) level_.words.letters.push_back(letter);
     std::size_t const occurrences = copies * counts_[level_.words.ends.size()];
     level_.counts[letter] += occurrences;
     level_.size += occurrences;
@@ -178,7 +176,6 @@ class CellSequence::LevelBuilder {
     Slot& slot = SlotOf(triangle, hash);
     if (slot.letter == kFree) {
       slot = {NewLetter(BoxedTriangle(triangle)), hash};
-      level_.magnitude.Include(triangle);
       ++taken_;
     }
     return slot.letter;
@@ -223,7 +220,10 @@ CellSequence::Level* CellSequence::AddLevel() {
 void CellSequence::Begin(std::span<Triangle const> triangles) {
   clear();
   std::vector<std::size_t> const once = {1};
-  LevelBuilder builder(once, AddLevel());
+  Level* const first = AddLevel();
+  first->magnitude = {};
+  first->magnitude.Include(triangles);
+  LevelBuilder builder(once, first);
   for (Triangle const& triangle : triangles) builder.Add(triangle);
   builder.EndWord();
 }
@@ -236,6 +236,8 @@ void CellSequence::NarrowBy(std::span<Triangle const> other) {
   cutters.reserve(other.size());
   for (Triangle const& triangle : other) cutters.emplace_back(triangle, last.magnitude);
 
+  next->magnitude = last.magnitude;
+  next->magnitude.Include(other);
   LevelBuilder builder(last.counts, next);
   Overlap overlap;
   for (BoxedTriangle const& boxed : last.triangles) {

@@ -92,6 +92,8 @@ class CellSequence {
   struct Level {
     Words words;
     std::vector<BoxedTriangle> triangles;
+    /// Of all triangles that ever made up the cell. Parts of triangles are within both of them but
+    /// for the rounding of crossing points, of which there is not enough to matter.
     Magnitude magnitude;
     /// How often each letter occurs in the sequence.
     std::vector<std::size_t> counts;
@@ -100,7 +102,6 @@ class CellSequence {
     void clear() {
       words.clear();
       triangles.clear();
-      magnitude = {};
       counts.clear();
       size = 0;
     }

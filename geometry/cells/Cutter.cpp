@@ -50,8 +50,8 @@ constexpr double kFarRatio = 256.0;
 /// Below this, products of coordinates may be subnormal, which rounds by other rules.
 constexpr double kLeastError = 1e-250;
 
-/// Above this, sums of products of coordinates may overflow.
-constexpr double kLargestError = 1e250;
+/// Above this, products of three coordinates, as in a crossing point, may overflow.
+constexpr double kLargestCoordinate = 1e100;
 
 /// What the signs of nine offsets say.
 struct Signs {
@@ -165,7 +165,8 @@ double ErrorBound(Triangle const& triangle, Magnitude const& ofOthers) {
   Magnitude whole = ofOthers;
   whole.Include(triangle);
   double const error = kErrorBound * whole.x * whole.y + whole.doubt;
-  bool const isUsable = error > kLeastError && error < kLargestError;
+  bool const isUsable =
+      error > kLeastError && whole.x < kLargestCoordinate && whole.y < kLargestCoordinate;
   return isUsable ? error : std::numeric_limits<double>::infinity();
 }
 

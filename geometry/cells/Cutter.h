@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <cstdint>
+#include <span>
 
 #include "geometry/cells/TriangleOverlap.h"
 #include "vorn/GeometryUtils.h"
@@ -23,6 +24,10 @@ struct Magnitude {
       y = absY > y ? absY : y;
       doubt += 0.0 * (p.x + p.y);
     }
+  }
+
+  void Include(std::span<GeometryUtils::Triangle const> triangles) {
+    for (GeometryUtils::Triangle const& triangle : triangles) Include(triangle);
   }
 };
 
