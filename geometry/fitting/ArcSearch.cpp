@@ -198,8 +198,8 @@ class ArcSearch {
   std::int32_t triedCount_ = 0;
   std::vector<IndexedPoint> samples_;
   Cells::CellSequence cell_;
-  /// Positions up to here are known to be in order; the first three need no test.
-  std::int32_t lastTested_ = 2;
+  /// Positions up to here are known to be in order; the first two need no test.
+  std::int32_t lastTested_ = 1;
   std::optional<bool> sense_;
   std::optional<Success> saved_;
 };

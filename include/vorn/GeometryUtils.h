@@ -1324,7 +1324,8 @@ class VORN_EXPORT GeometryUtils {
   /// @param[out]    deviationIndex index in points of the point with that deviation
   /// @param[in]     progress   told after every successful length
   /// @return Ok when some length succeeded; Failed for minCount > maxCount; otherwise the code that
-  ///         ended the search, SelfIntersection for points that turn back or leave the order
+  ///         ended the search, SelfIntersection for points that turn back, leave the order or take
+  ///         a step of a right angle or more
   /// @note On failure the outputs may hold values of a try that was given up. O(m^2) triples for a
   ///       run of m points.
   static ErrorCode GetFittingCircle2(std::vector<WPoint> const& points, std::int32_t first,

@@ -368,6 +368,20 @@ TEST(GetFittingCircle2, PointsThatRunBackOnTheCircleEndTheArc) {
   EXPECT_EQ(Transcribe(out), Transcribe(GrowArc<ReferenceFitting>(WholeRun(points))));
 }
 
+TEST(GetFittingCircle2, NoArcBeginsWithStepsOfARightAngle) {
+  double const third = 2 * std::acos(-1.0) / 3;
+  std::vector<WPoint> const triangle = MakeArcPoints({0, 0}, 10, 0, 2 * third, 3, 0.02);
+  ASSERT_EQ(FitArcRun<GeometryUtils>(WholeRun(triangle)).code, ErrorCode::Ok);
+  EXPECT_EQ(GrowArc<GeometryUtils>(WholeRun(triangle)).code, ErrorCode::SelfIntersection);
+  // One wide step, the first or the second, is enough.
+  std::vector<WPoint> points = MakeArcPoints({0, 0}, 10, 0, 2.4, 3, 0.02);
+  EXPECT_EQ(GrowArc<GeometryUtils>(WholeRun(points)).code, ErrorCode::Ok);
+  for (double const angle : {0.7, 1.7}) {
+    points[1] = {10 * std::cos(angle), 10 * std::sin(angle), 0.02};
+    EXPECT_EQ(GrowArc<GeometryUtils>(WholeRun(points)).code, ErrorCode::SelfIntersection);
+  }
+}
+
 TEST(GetFittingCircle2, CollinearPointsFail) {
   ArcFitOutput const out = GrowArc<GeometryUtils>(WholeRun(MakeLinePoints({0, 0}, 1, 2, 8, 0.1)));
   EXPECT_EQ(out.code, ErrorCode::Failed);

@@ -947,7 +947,7 @@ ErrorCode ReferenceFitting::GetFittingCircle2(
   std::optional<SavedArc> saved;
   ErrorCode code = ErrorCode::Ok;
   std::int32_t triedCount = 0;
-  std::int32_t lastTested = 2;
+  std::int32_t lastTested = 1;
   std::int32_t counter = first + minCount;
 
   for (std::int32_t n = minCount; n <= maxCount;) {
