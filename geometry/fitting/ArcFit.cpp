@@ -62,8 +62,9 @@ ErrorCode ArcFit::PlaceCircle(Fitting::ArcRun const& run, Cells::CellSequence co
   } else if (run.endFixed) {
     arc->radius = std::sqrt(GeometryUtils::GetDist2(run.end, arc->centre));
   }
-  bool const isInRange = minRadius_ <= arc->radius && arc->radius <= maxRadius_;
-  return isInRange ? ErrorCode::Ok : ErrorCode::NoFit;
+  // A NaN is neither: then a free end fails, since it cannot be moved onto the circle.
+  bool const isOutOfRange = arc->radius < minRadius_ || arc->radius > maxRadius_;
+  return isOutOfRange ? ErrorCode::NoFit : ErrorCode::Ok;
 }
 
 bool ArcFit::FindRadiusRange(Fitting::ArcRun const& run, Point const& centre) {

@@ -91,6 +91,21 @@ TEST(GetFittingCircleO, ThreeCollinearPointsFail) {
   EXPECT_EQ(Transcribe(FitArcRun<GeometryUtils>(in)), Transcribe(expected));
 }
 
+TEST(GetFittingCircleO, AnEndThatACircleWithoutCentreCannotTakeFails) {
+  // Rounding keeps the area of the three points from being zero, but not the pivot that their
+  // circumcentre is divided by.
+  ArcFitInput in = WholeRun({{-1.6314705975158141, 1.6314705975158144, 0.15},
+                             {-3.2629411950316283, 3.2629411950316287, 0.15},
+                             {-4.8944117925474426, 4.8944117925474426, 0.15}});
+  bool ccw = false;
+  auto const at = [&in](std::size_t i) { return Point{in.points[i].x, in.points[i].y}; };
+  ASSERT_EQ(GeometryUtils::IsCcw(at(0), at(1), at(2), &ccw), ErrorCode::Ok);
+  EXPECT_EQ(FitArcRun<GeometryUtils>(in).code, ErrorCode::Failed);
+  in.startFixed = true;
+  in.start = at(0);
+  EXPECT_EQ(FitArcRun<GeometryUtils>(in).code, ErrorCode::Failed);
+}
+
 TEST(GetFittingCircleO, ShortRunsAndRunsThatLeaveTheVectorFail) {
   ArcFitInput in = WholeRun(MakeArcPoints({0, 0}, 5, 0, 1, 6, 0.01));
   in.cells = {{{{1, 2}, {3, 4}, {5, 7}}}};

@@ -320,7 +320,7 @@ ErrorCode ChooseRadius(ArcRun const& run, Point* centre, double* radius) {
   } else {
     *radius = (lowest + highest) * 0.5;
   }
-  return lowest <= *radius && *radius <= highest ? ErrorCode::Ok : ErrorCode::NoFit;
+  return *radius < lowest || *radius > highest ? ErrorCode::NoFit : ErrorCode::Ok;
 }
 
 bool SnapEnd(ArcRun const& run, Point const& centre, double radius, bool fixed, std::int32_t index,
