@@ -47,7 +47,7 @@ ErrorCode CellsWalk::Run(LargestDeviation* largest) {
     ErrorCode const found = FindLine(isLastPair, &line);
     if (found != ErrorCode::Ok) return found;
     if (line.count > 2 || isLastPair) {
-      ErrorCode const taken = TakeLine(line);
+      ErrorCode const taken = TakeLine(&line);
       if (taken != ErrorCode::Ok) return taken;
     } else {
       // An opening arc needs three points as well.
@@ -59,17 +59,13 @@ ErrorCode CellsWalk::Run(LargestDeviation* largest) {
 }
 
 /// The longest segment from the first point not passed over; between the last two points one that
-/// begins where the contour ends. A segment that would leave a single point over gives up its last
-/// one.
+/// begins where the contour ends.
 ErrorCode CellsWalk::FindLine(bool isLastPair, Line* line) {
   if (isLastPair && (contour_.empty() || !IsKnownType(contour_.back().type))) {
     return ErrorCode::Failed;
   }
   std::int32_t const first = anchor_ + skipped_;
-  std::int32_t const remaining = LastIndex() + 1 - first;
-  ErrorCode const code = FitLine(first, remaining, isLastPair, false, line);
-  if (code != ErrorCode::Ok || line->count <= 2 || remaining - line->count != 1) return code;
-  return FitLine(first, line->count - 1, false, false, line);
+  return FitLine(first, LastIndex() + 1 - first, isLastPair, false, line);
 }
 
 ErrorCode CellsWalk::FitLine(std::int32_t first, std::int32_t count, bool startFixed, bool endFixed,
@@ -82,13 +78,20 @@ ErrorCode CellsWalk::FitLine(std::int32_t first, std::int32_t count, bool startF
                                        &line->deviationIndex, &indexList, &lineCode, progress_);
 }
 
-ErrorCode CellsWalk::TakeLine(Line const& line) {
-  ErrorCode const code = CoverGap(anchor_ + skipped_, line.start);
+/// Covers the points passed over and appends the segment. One that would leave a single point over
+/// gives up its last one, even if only two remain.
+ErrorCode CellsWalk::TakeLine(Line* line) {
+  std::int32_t const first = anchor_ + skipped_;
+  if (first + line->count == LastIndex()) {
+    ErrorCode const shortened = FitLine(first, line->count - 1, false, false, line);
+    if (shortened != ErrorCode::Ok) return shortened;
+  }
+  ErrorCode const code = CoverGap(first, line->start);
   if (code != ErrorCode::Ok) return code;
-  PlaceStart(line.start);
-  GeometryUtils::AddSegm(&contour_, line.end);
-  largest_.Take(line.deviation, line.deviationIndex);
-  anchor_ += line.count - 1;
+  PlaceStart(line->start);
+  GeometryUtils::AddSegm(&contour_, line->end);
+  largest_.Take(line->deviation, line->deviationIndex);
+  anchor_ += line->count - 1;
   skipped_ = kArcRoom;
   return ErrorCode::Ok;
 }

@@ -89,7 +89,7 @@ class CellsWalk {
   ErrorCode FindLine(bool isLastPair, Line* line);
   ErrorCode FitLine(std::int32_t first, std::int32_t count, bool startFixed, bool endFixed,
                     Line* line);
-  ErrorCode TakeLine(Line const& line);
+  ErrorCode TakeLine(Line* line);
   ErrorCode CoverGap(std::int32_t last, Point const& end);
   ErrorCode CoverByArc(std::int32_t last, Point const& end);
   ErrorCode BridgeGap(Point const& end);

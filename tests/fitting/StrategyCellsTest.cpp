@@ -95,6 +95,16 @@ TEST(CreateFittingCurveMixedCells, ThreePointsOfACornerComeToAnAnswer) {
   ExpectSoundAnswer(points, Fit(points));
 }
 
+TEST(CreateFittingCurveMixedCells, ASegmentOfThreePointsGivesUpItsLastOneToTheClosingArc) {
+  CurveFitOutput const out = Fit({{0, 0, .1}, {2, 0, .1}, {4, 0, .1}, {4, 2, .1}});
+  EXPECT_EQ(out.code, ErrorCode::Ok);
+  ASSERT_EQ(out.contour.size(), 3U);
+  EXPECT_EQ(out.contour[1].type, ElemType::Segment);
+  EXPECT_EQ(out.contour[1].end.x, 2.0);
+  EXPECT_EQ(out.contour[1].end.y, 0.0);
+  EXPECT_EQ(out.contour[2].type, ElemType::Arc);
+}
+
 TEST(CreateFittingCurveMixedCells, AnswersAreSound) {
   constexpr std::uint64_t kSeed = 5110;
   SCOPED_TRACE(kSeed);
