@@ -1,13 +1,12 @@
 #include "cli/Program.h"
 
-#include <CLI/CLI.hpp>
 #include <exception>
 #include <ostream>
-#include <sstream>
 
 #include "cli/commands/AreaCommand.h"
 #include "cli/commands/CheckCommand.h"
 #include "cli/commands/Command.h"
+#include "cli/commands/CommandLine.h"
 #include "cli/commands/ConvertCommand.h"
 #include "cli/commands/FitCommand.h"
 #include "cli/commands/InfoCommand.h"
@@ -25,33 +24,21 @@ constexpr char const* kFooter =
     "Run 'contour COMMAND --help' for the options, exit codes and examples of a command.";
 
 /// In the order in which --help lists them.
-constexpr void (*kCommands[])(CLI::App& program, Action* action) = {
+constexpr void (*kCommands[])(CommandLine& program, Action* action) = {
     AddFitCommand,  AddCheckCommand,     AddInfoCommand,    AddPlotCommand,
     AddAreaCommand, AddIntersectCommand, AddConvertCommand, AddSimplifyCommand,
 };
 
-[[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {
-  std::string name;
-  for (CLI::App const* command : program.get_subcommands()) name += command->get_name() + " ";
-  throw Failure(ExitCode::Usage, complaint + "\nRun 'contour " + name + "--help' for the usage.");
-}
-
 /// What the command line asks for.
 /// @throws Failure (ExitCode::Usage) when it is not understood or contradicts itself.
 Action ParseCommandLine(int argc, char const* const* argv) {
-  CLI::App program(kText, "contour");
-  program.set_version_flag("--version", "contour " CONTOUR_VERSION);
-  program.require_subcommand(1);
-  program.footer(kFooter);
+  CommandLine line("contour", kText);
+  line.SetVersion("contour " CONTOUR_VERSION);
+  line.SetFooter(kFooter);
   Action action;
-  for (auto const& add : kCommands) add(program, &action);
-  try {
-    program.parse(argc, argv);
-  } catch (CLI::ParseError const& error) {
-    std::ostringstream answer;
-    std::ostringstream complaint;
-    if (program.exit(error, answer, complaint) != 0) RefuseUsage(program, error.what());
-    return [text = answer.str()](Console const& console) {
+  for (auto const& add : kCommands) add(line, &action);
+  if (std::optional<std::string> const answer = line.Parse(argc, argv)) {
+    return [text = *answer](Console const& console) {
       console.out << text;
       return ExitCode::Ok;
     };

@@ -1,6 +1,5 @@
 #include "cli/commands/AreaCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <algorithm>
 #include <memory>
 #include <ostream>
@@ -98,26 +97,25 @@ ExitCode Run(Options const& options, Console const& console) {
   return ExitCode::Ok;
 }
 
-void AddOptions(CLI::App& app, Options* options) {
-  app.add_option("CONTOUR", options->paths, "Files with contours; - is the standard input")
-      ->required()
-      ->type_name("FILE");
-  CLI::Option* const from = AddWord(
-      app, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+void AddOptions(Command& command, Options* options) {
+  command
+      .AddTexts("CONTOUR", &options->paths, "FILE", "Files with contours; - is the standard input")
+      .Require();
+  Option const from = AddWord(
+      command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contours as this");
-  CLI::Option* const points =
-      app.add_flag("--points", options->arePoints,
-                   "The files hold points; measure the polygon through them")
-          ->excludes(from);
-  AddColumns(app, &options->columns)->needs(points);
-  app.add_option("--units", options->units,
-                 "The units of the coordinates, for example mm; goes before what the file says")
-      ->type_name("NAME");
-  app.add_flag("--close", options->doClose,
-               "Close an open contour with a line from its end to its start");
-  app.add_flag("--json", options->asJson, "Write the measures as JSON, with every digit");
-  app.footer(kFooter);
+  Option const points = command
+                            .AddFlag("--points", &options->arePoints,
+                                     "The files hold points; measure the polygon through them")
+                            .Exclude(from);
+  AddColumns(command, &options->columns).Need(points);
+  command.AddText("--units", &options->units, "NAME",
+                  "The units of the coordinates, for example mm; goes before what the file says");
+  command.AddFlag("--close", &options->doClose,
+                  "Close an open contour with a line from its end to its start");
+  command.AddFlag("--json", &options->asJson, "Write the measures as JSON, with every digit");
+  command.SetFooter(kFooter);
 }
 
 void RefuseSharedInput(std::vector<std::string> const& paths) {
@@ -128,11 +126,11 @@ void RefuseSharedInput(std::vector<std::string> const& paths) {
 
 }  // namespace
 
-void AddAreaCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("area", kText);
+void AddAreaCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("area", kText);
   auto const options = std::make_shared<Options>();
-  AddOptions(*app, options.get());
-  app->callback([options, action] {
+  AddOptions(command, options.get());
+  command.OnParsed([options, action] {
     RefuseSharedInput(options->paths);
     *action = [options](Console const& console) { return Run(*options, console); };
   });

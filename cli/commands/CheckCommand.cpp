@@ -1,6 +1,5 @@
 #include "cli/commands/CheckCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <memory>
 #include <numeric>
 #include <ostream>
@@ -107,26 +106,25 @@ ExitCode Run(Options const& options, Console const& console) {
   return report.Code();
 }
 
-void AddOptions(CLI::App& app, Options* options) {
-  AddPointsInput(app, &options->points);
-  app.add_option("CONTOUR", options->contour, "File with the contour; - is the standard input")
-      ->required()
-      ->type_name("FILE");
-  AddClosedChoice(app, &options->closed);
+void AddOptions(Command& command, Options* options) {
+  AddPointsInput(command, &options->points);
+  command
+      .AddText("CONTOUR", &options->contour, "FILE",
+               "File with the contour; - is the standard input")
+      .Require();
+  AddClosedChoice(command, &options->closed);
   AddWord(
-      app, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contour as this");
-  app.add_option("--table", options->table,
-                 "Write every point's deviation to this CSV file; - is the standard output, which "
-                 "then holds nothing else")
-      ->type_name("FILE");
-  app.add_option("--json", options->json,
-                 "Write all that is found to this JSON file, with all digits; - is the standard "
-                 "output, which then holds nothing else")
-      ->type_name("FILE");
-  app.add_flag("--all", options->all, "List every point, not just the ten worst");
-  app.footer(std::string(kPointsFileText) + kFooter);
+  command.AddText("--table", &options->table, "FILE",
+                  "Write every point's deviation to this CSV file; - is the standard output, which "
+                  "then holds nothing else");
+  command.AddText("--json", &options->json, "FILE",
+                  "Write all that is found to this JSON file, with all digits; - is the standard "
+                  "output, which then holds nothing else");
+  command.AddFlag("--all", &options->all, "List every point, not just the ten worst");
+  command.SetFooter(std::string(kPointsFileText) + kFooter);
 }
 
 void RefuseBadFiles(Options const& options) {
@@ -139,11 +137,11 @@ void RefuseBadFiles(Options const& options) {
 
 }  // namespace
 
-void AddCheckCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("check", kText);
+void AddCheckCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("check", kText);
   auto const options = std::make_shared<Options>();
-  AddOptions(*app, options.get());
-  app->callback([options, action] {
+  AddOptions(command, options.get());
+  command.OnParsed([options, action] {
     RefuseBadFiles(*options);
     *action = [options](Console const& console) { return Run(*options, console); };
   });

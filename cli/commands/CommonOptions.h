@@ -6,36 +6,32 @@
 #include <utility>
 #include <vector>
 
-namespace CLI {
-class App;
-class Option;
-}  // namespace CLI
+#include "cli/commands/CommandLine.h"
 
 /// Kinds of options that several commands have.
 namespace Vorn::Cli {
 
 /// An option whose value is a finite number above zero, read independently of the locale.
-CLI::Option* AddPositiveNumber(CLI::App& app, std::string const& name, std::optional<double>* value,
-                               std::string const& valueName, std::string const& help);
+Option AddPositiveNumber(Command& command, std::string const& name, std::optional<double>* value,
+                         std::string const& valueName, std::string const& help);
 
 /// An option whose value is a whole number from `least` to `most`.
-CLI::Option* AddWholeNumber(CLI::App& app, std::string const& name, std::optional<int>* value,
-                            int least, int most, std::string const& valueName,
-                            std::string const& help);
+Option AddWholeNumber(Command& command, std::string const& name, std::optional<int>* value,
+                      int least, int most, std::string const& valueName, std::string const& help);
 
 /// An option whose value is one of the words; `take` is called with the one given.
-CLI::Option* AddWord(CLI::App& app, std::string const& name, std::vector<std::string> const& words,
-                     std::function<void(std::string const&)> const& take, std::string const& help);
+Option AddWord(Command& command, std::string const& name, std::vector<std::string> const& words,
+               std::function<void(std::string const&)> const& take, std::string const& help);
 
 /// An option whose value is one of a few names, each standing for a value.
 template <typename Value>
-CLI::Option* AddChoice(CLI::App& app, std::string const& name, Value* value,
-                       std::vector<std::pair<std::string, Value>> const& choices,
-                       std::string const& help) {
+Option AddChoice(Command& command, std::string const& name, Value* value,
+                 std::vector<std::pair<std::string, Value>> const& choices,
+                 std::string const& help) {
   std::vector<std::string> words;
   for (auto const& choice : choices) words.push_back(choice.first);
   return AddWord(
-      app, name, words,
+      command, name, words,
       [value, choices](std::string const& word) {
         for (auto const& choice : choices) {
           if (choice.first == word) *value = choice.second;

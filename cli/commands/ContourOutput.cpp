@@ -1,20 +1,18 @@
 #include "cli/commands/ContourOutput.h"
 
-#include <CLI/CLI.hpp>
-
 #include "cli/Failure.h"
 #include "cli/Numbers.h"
 #include "cli/commands/CommonOptions.h"
 
 namespace Vorn::Cli {
 
-void AddWriteOptions(CLI::App& app, WriteOptions* options) {
+void AddWriteOptions(Command& command, WriteOptions* options) {
   constexpr int kMostDecimals = 9;
-  app.add_flag("--dxf-entities", options->dxfEntities,
-               "DXF: a LINE or an ARC for each piece in place of one POLYLINE");
-  AddPositiveNumber(app, "--feed", &options->feed, "F",
+  command.AddFlag("--dxf-entities", &options->dxfEntities,
+                  "DXF: a LINE or an ARC for each piece in place of one POLYLINE");
+  AddPositiveNumber(command, "--feed", &options->feed, "F",
                     "G-code: the feed in units a minute; without it there is no F word");
-  AddWholeNumber(app, "--gcode-decimals", &options->gcodeDecimals, 0, kMostDecimals, "N",
+  AddWholeNumber(command, "--gcode-decimals", &options->gcodeDecimals, 0, kMostDecimals, "N",
                  "G-code: digits after the point; 4 unless the units are inches, then 5");
 }
 

@@ -5,14 +5,12 @@
 
 #include "cli/formats/Format.h"
 
-namespace CLI {
-class App;
-}
-
 namespace Vorn::Cli {
 
+class Command;
+
 /// Adds the options that say how a contour is written: --dxf-entities, --feed, --gcode-decimals.
-void AddWriteOptions(CLI::App& app, WriteOptions* options);
+void AddWriteOptions(Command& command, WriteOptions* options);
 
 /// The format of a file to write: by its ending, else `otherwise`.
 /// @param option what to give when neither tells, for the message

@@ -1,6 +1,5 @@
 #include "cli/commands/ConvertCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <algorithm>
 #include <memory>
 #include <ostream>
@@ -112,41 +111,40 @@ ExitCode Run(Options const& options, Console const& console) {
   return ExitCode::Ok;
 }
 
-void AddFormat(CLI::App& app, std::string const& name, std::vector<std::string> const& words,
+void AddFormat(Command& command, std::string const& name, std::vector<std::string> const& words,
                std::optional<Format>* format, std::string const& help) {
   AddWord(
-      app, name, words, [format](std::string const& word) { *format = FormatNamed(word); }, help);
+      command, name, words, [format](std::string const& word) { *format = FormatNamed(word); },
+      help);
 }
 
-void AddOptions(CLI::App& app, Options* options) {
-  app.add_option("CONTOUR", options->input, "File with the contour; - is the standard input")
-      ->required()
-      ->type_name("FILE");
-  app.add_option("-o,--output", options->outputs,
-                 "Write the contour to this file; may be given several times; - is the standard "
-                 "output")
-      ->required()
-      ->expected(1)
-      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
-      ->type_name("FILE");
-  AddFormat(app, "--from", {"json", "csv", "dxf", "gcode", "wkt"}, &options->from,
+void AddOptions(Command& command, Options* options) {
+  command
+      .AddText("CONTOUR", &options->input, "FILE", "File with the contour; - is the standard input")
+      .Require();
+  command
+      .AddRepeatable(
+          "-o,--output", &options->outputs, "FILE",
+          "Write the contour to this file; may be given several times; - is the standard "
+          "output")
+      .Require();
+  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt"}, &options->from,
             "Read the input as this");
-  AddFormat(app, "--to", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png", "html"}, &options->to,
-            "Write the outputs as this");
-  app.add_option("--units", options->units,
-                 "The units of the coordinates, for example mm; goes before what the file says")
-      ->type_name("NAME");
-  AddWriteOptions(app, &options->write);
-  app.footer(kFooter);
+  AddFormat(command, "--to", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png", "html"},
+            &options->to, "Write the outputs as this");
+  command.AddText("--units", &options->units, "NAME",
+                  "The units of the coordinates, for example mm; goes before what the file says");
+  AddWriteOptions(command, &options->write);
+  command.SetFooter(kFooter);
 }
 
 }  // namespace
 
-void AddConvertCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("convert", kText);
+void AddConvertCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("convert", kText);
   auto const options = std::make_shared<Options>();
-  AddOptions(*app, options.get());
-  app->callback([options, action] {
+  AddOptions(command, options.get());
+  command.OnParsed([options, action] {
     RefuseSharedFiles({{"CONTOUR", options->input}}, options->Written());
     for (std::string const& path : options->outputs) FormatFor(*options, path);
     *action = [options](Console const& console) { return Run(*options, console); };

@@ -1,6 +1,5 @@
 #include "cli/commands/FitCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <algorithm>
 #include <cstdio>
 #include <limits>
@@ -246,33 +245,31 @@ std::optional<std::vector<Format>> ParseFormats(std::string const& text) {
   return formats;
 }
 
-void AddFormats(CLI::App& app, Options* options) {
-  app.add_option_function<std::string>(
-         "--to",
-         [options](std::string const& text) { options->formats = ParseFormats(text).value(); },
-         "The format of outputs whose name does not tell, such as -: json, csv, dxf, gcode, wkt, "
-         "svg, png, html; with --out-dir the formats to write, separated by commas; json if not "
-         "said")
-      ->check(CLI::Validator(
-          [](std::string& text) -> std::string {
-            return ParseFormats(text) ? ""
-                                      : Quoted(text) +
-                                            " names none of json, csv, dxf, gcode, wkt, svg, png, "
-                                            "html, or one of them twice";
-          },
-          ""))
-      ->type_name("NAME[,NAME]...");
+void AddFormats(Command& command, Options* options) {
+  auto const complaint = [](std::string const& text) -> std::string {
+    return ParseFormats(text) ? ""
+                              : Quoted(text) +
+                                    " names none of json, csv, dxf, gcode, wkt, svg, png, html, or "
+                                    "one of them twice";
+  };
+  auto const take = [options](std::string const& text) {
+    options->formats = ParseFormats(text).value();
+  };
+  command.AddChecked(
+      "--to", complaint, take, "NAME[,NAME]...",
+      "The format of outputs whose name does not tell, such as -: json, csv, dxf, gcode, wkt, "
+      "svg, png, html; with --out-dir the formats to write, separated by commas; json if not said");
 }
 
-void AddManyOptions(CLI::App& app, Options* options) {
+void AddManyOptions(Command& command, Options* options) {
   constexpr int kMostJobs = 1024;
-  app.add_option("--out-dir", options->outFolder,
-                 "Fit one or many files and write the contours into this folder, named after the "
-                 "inputs; it is made if need be")
-      ->type_name("FOLDER");
-  AddWholeNumber(app, "-j,--jobs", &options->jobs, 1, kMostJobs, "N",
+  command.AddText("--out-dir", &options->outFolder, "FOLDER",
+                  "Fit one or many files and write the contours into this folder, named after the "
+                  "inputs; it is made if need be");
+  AddWholeNumber(command, "-j,--jobs", &options->jobs, 1, kMostJobs, "N",
                  "Fit so many files at once; as many as there are processors if not said");
-  app.add_flag("--no-time", options->hideTime, "Leave the times out of the lines of many files");
+  command.AddFlag("--no-time", &options->hideTime,
+                  "Leave the times out of the lines of many files");
 }
 
 void RefuseWrongUse(Options const& options) {
@@ -291,48 +288,46 @@ void RefuseWrongUse(Options const& options) {
   RefuseSharedFiles({{"POINTS", options.points.path}}, options.Written());
 }
 
-void AddOptions(CLI::App& app, Options* options) {
-  app.add_option("POINTS", options->paths,
-                 "CSV files with the measured points, each a contour; - is the standard input")
-      ->required()
-      ->type_name("FILE");
-  AddPointsOptions(app, &options->points);
+void AddOptions(Command& command, Options* options) {
+  command
+      .AddTexts("POINTS", &options->paths, "FILE",
+                "CSV files with the measured points, each a contour; - is the standard input")
+      .Require();
+  AddPointsOptions(command, &options->points);
   AddChoice<Strategy>(
-      app, "--strategy", &options->strategy,
+      command, "--strategy", &options->strategy,
       {{"mixed", Strategy::Mixed}, {"cells", Strategy::MixedCells}, {"arc", Strategy::SingleArc}},
       "mixed: lines and arcs compared run by run (default); cells: lines first, arcs between "
       "them; arc: one arc for all points");
   AddChoice<ClosedChoice>(
-      app, "--closed", &options->closed,
+      command, "--closed", &options->closed,
       {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
       "Whether the contour runs back to its start; auto (default): see below");
-  AddWholeNumber(app, "--start", &options->start, 0, std::numeric_limits<int>::max(), "INDEX",
+  AddWholeNumber(command, "--start", &options->start, 0, std::numeric_limits<int>::max(), "INDEX",
                  "Cut a closed contour open at this point, counted from 0; without it, at its "
                  "sharpest corner");
-  app.add_option("-o,--output", options->outputs,
-                 "Write the contour to this file, in the format that its ending names; may be "
-                 "given several times; - is the standard output")
-      ->expected(1)
-      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
-      ->type_name("FILE");
-  AddFormats(app, options);
-  AddManyOptions(app, options);
-  AddWriteOptions(app, &options->write);
-  AddWholeNumber(app, "--digits", &options->digits, 0, kMostDigits, "N",
+  command.AddRepeatable(
+      "-o,--output", &options->outputs, "FILE",
+      "Write the contour to this file, in the format that its ending names; may be "
+      "given several times; - is the standard output");
+  AddFormats(command, options);
+  AddManyOptions(command, options);
+  AddWriteOptions(command, &options->write);
+  AddWholeNumber(command, "--digits", &options->digits, 0, kMostDigits, "N",
                  "Digits after the point of lengths in the table; files always hold every digit");
-  app.add_option("--json", options->json, "The same as -o, always as JSON")->type_name("FILE");
-  app.add_option("--svg", options->svg, "The same as -o, always as SVG")->type_name("FILE");
-  app.add_flag("-q,--quiet", options->isQuiet, "Draw no progress bar on the terminal");
-  app.footer(std::string(kPointsFileText) + kFooter);
+  command.AddText("--json", &options->json, "FILE", "The same as -o, always as JSON");
+  command.AddText("--svg", &options->svg, "FILE", "The same as -o, always as SVG");
+  command.AddFlag("-q,--quiet", &options->isQuiet, "Draw no progress bar on the terminal");
+  command.SetFooter(std::string(kPointsFileText) + kFooter);
 }
 
 }  // namespace
 
-void AddFitCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("fit", kText);
+void AddFitCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("fit", kText);
   auto const options = std::make_shared<Options>();
-  AddOptions(*app, options.get());
-  app->callback([options, action] {
+  AddOptions(command, options.get());
+  command.OnParsed([options, action] {
     options->points.path = options->paths.front();
     RefuseWrongUse(*options);
     *action = [options](Console const& console) {

@@ -2,13 +2,11 @@
 
 #include "cli/commands/Command.h"
 
-namespace CLI {
-class App;
-}
-
 namespace Vorn::Cli {
 
+class CommandLine;
+
 /// Adds `contour fit`; when the command line asks for it, *action becomes what it does.
-void AddFitCommand(CLI::App& program, Action* action);
+void AddFitCommand(CommandLine& program, Action* action);
 
 }  // namespace Vorn::Cli

@@ -1,6 +1,5 @@
 #include "cli/commands/InfoCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <memory>
 #include <ostream>
 
@@ -61,14 +60,14 @@ ExitCode Run(Options const& options, Console const& console) {
 
 }  // namespace
 
-void AddInfoCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("info", kText);
+void AddInfoCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("info", kText);
   auto const options = std::make_shared<Options>();
-  AddPointsInput(*app, &options->points);
-  AddClosedChoice(*app, &options->closed);
-  app->add_flag("--json", options->asJson, "Write the facts as JSON, long lists whole");
-  app->footer(std::string(kPointsFileText) + kFooter);
-  app->callback([options, action] {
+  AddPointsInput(command, &options->points);
+  AddClosedChoice(command, &options->closed);
+  command.AddFlag("--json", &options->asJson, "Write the facts as JSON, long lists whole");
+  command.SetFooter(std::string(kPointsFileText) + kFooter);
+  command.OnParsed([options, action] {
     *action = [options](Console const& console) { return Run(*options, console); };
   });
 }

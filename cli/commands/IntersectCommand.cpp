@@ -1,6 +1,5 @@
 #include "cli/commands/IntersectCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <memory>
 #include <ostream>
 
@@ -81,22 +80,20 @@ ExitCode Run(Options const& options, Console const& console) {
   return options.failIfAny && !found.empty() ? ExitCode::OutsideTolerance : ExitCode::Ok;
 }
 
-void AddOptions(CLI::App& app, Options* options) {
-  app.add_option("A", options->a, "File with a contour; - is the standard input")
-      ->required()
-      ->type_name("FILE");
-  app.add_option("B", options->b, "File with another contour; without it, A meets itself")
-      ->type_name("FILE");
+void AddOptions(Command& command, Options* options) {
+  command.AddText("A", &options->a, "FILE", "File with a contour; - is the standard input")
+      .Require();
+  command.AddText("B", &options->b, "FILE",
+                  "File with another contour; without it, A meets itself");
   AddWord(
-      app, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contours as this");
-  app.add_option("-o,--output", options->output,
-                 "Write the points to this CSV file; - is the standard output")
-      ->type_name("FILE");
-  app.add_flag("--json", options->asJson, "Write the points as JSON, with every digit");
-  app.add_flag("--fail-if-any", options->failIfAny, "Exit with 1 when there are intersections");
-  app.footer(kFooter);
+  command.AddText("-o,--output", &options->output, "FILE",
+                  "Write the points to this CSV file; - is the standard output");
+  command.AddFlag("--json", &options->asJson, "Write the points as JSON, with every digit");
+  command.AddFlag("--fail-if-any", &options->failIfAny, "Exit with 1 when there are intersections");
+  command.SetFooter(kFooter);
 }
 
 void RefuseBadFiles(Options const& options) {
@@ -108,11 +105,11 @@ void RefuseBadFiles(Options const& options) {
 
 }  // namespace
 
-void AddIntersectCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("intersect", kText);
+void AddIntersectCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("intersect", kText);
   auto const options = std::make_shared<Options>();
-  AddOptions(*app, options.get());
-  app->callback([options, action] {
+  AddOptions(command, options.get());
+  command.OnParsed([options, action] {
     RefuseBadFiles(*options);
     *action = [options](Console const& console) { return Run(*options, console); };
   });

@@ -1,6 +1,5 @@
 #include "cli/commands/PlotCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <algorithm>
 #include <cmath>
 #include <filesystem>
@@ -195,57 +194,51 @@ ExitCode Run(Options const& options, Console const& console) {
 }
 
 /// A number above zero, or the word for choosing one.
-void AddMagnify(CLI::App& app, std::optional<double>* magnify) {
-  auto const isGood = [](std::string const& text) {
+void AddMagnify(Command& command, std::optional<double>* magnify) {
+  auto const complaint = [](std::string const& text) -> std::string {
     std::optional<double> const value = ParseNumber(text);
-    return text == "auto" || (value && std::isfinite(*value) && *value > 0.0);
+    bool const isGood = text == "auto" || (value && std::isfinite(*value) && *value > 0.0);
+    return isGood ? "" : Quoted(text) + " is neither auto nor a number above 0";
   };
-  app.add_option_function<std::string>(
-         "--magnify",
-         [magnify](std::string const& text) {
-           *magnify = text == "auto" ? std::optional<double>() : ParseNumber(text);
-         },
-         "Draw deviations and tolerance K times as large as they are; auto (the default): a round "
-         "number that makes the largest tolerance readable")
-      ->check(CLI::Validator(
-          [isGood](std::string& text) -> std::string {
-            return isGood(text) ? "" : Quoted(text) + " is neither auto nor a number above 0";
-          },
-          ""))
-      ->type_name("K");
+  auto const take = [magnify](std::string const& text) {
+    *magnify = text == "auto" ? std::optional<double>() : ParseNumber(text);
+  };
+  command.AddChecked(
+      "--magnify", complaint, take, "K",
+      "Draw deviations and tolerance K times as large as they are; auto (the default): a round "
+      "number that makes the largest tolerance readable");
 }
 
-void AddOptions(CLI::App& app, Options* options) {
+void AddOptions(Command& command, Options* options) {
   constexpr int kMostPixels = 30000;
-  AddPointsInput(app, &options->points);
-  app.add_option("CONTOUR", options->contour, "File with a contour; - is the standard input")
-      ->type_name("FILE");
-  app.add_option("-o,--output", options->outputs,
-                 "Write the drawing to this file; may be given several times; - is the standard "
-                 "output")
-      ->required()
-      ->expected(1)
-      ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
-      ->type_name("FILE");
+  AddPointsInput(command, &options->points);
+  command.AddText("CONTOUR", &options->contour, "FILE",
+                  "File with a contour; - is the standard input");
+  command
+      .AddRepeatable(
+          "-o,--output", &options->outputs, "FILE",
+          "Write the drawing to this file; may be given several times; - is the standard "
+          "output")
+      .Require();
   AddWord(
-      app, "--to", {"svg", "png", "html"},
+      command, "--to", {"svg", "png", "html"},
       [options](std::string const& word) { options->to = FormatNamed(word); },
       "Write the outputs as this");
-  AddMagnify(app, &options->magnify);
-  CLI::Option* const dpi = AddPositiveNumber(app, "--dpi", &options->dpi, "N",
-                                             "PNG: pixels to the inch on A4; 150 if not said");
-  AddWholeNumber(app, "--width", &options->width, 1, kMostPixels, "N", "PNG: width in pixels")
-      ->excludes(dpi);
-  app.footer(std::string(kPointsFileText) + kFooter);
+  AddMagnify(command, &options->magnify);
+  Option const dpi = AddPositiveNumber(command, "--dpi", &options->dpi, "N",
+                                       "PNG: pixels to the inch on A4; 150 if not said");
+  AddWholeNumber(command, "--width", &options->width, 1, kMostPixels, "N", "PNG: width in pixels")
+      .Exclude(dpi);
+  command.SetFooter(std::string(kPointsFileText) + kFooter);
 }
 
 }  // namespace
 
-void AddPlotCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("plot", kText);
+void AddPlotCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("plot", kText);
   auto const options = std::make_shared<Options>();
-  AddOptions(*app, options.get());
-  app->callback([options, action] {
+  AddOptions(command, options.get());
+  command.OnParsed([options, action] {
     TellContourFromPoints(options.get());
     RefuseSharedInput(*options);
     RefuseSharedFiles(options->Read(), options->Written());

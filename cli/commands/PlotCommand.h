@@ -2,13 +2,11 @@
 
 #include "cli/commands/Command.h"
 
-namespace CLI {
-class App;
-}
-
 namespace Vorn::Cli {
 
+class CommandLine;
+
 /// Adds the subcommand; when the command line asks for it, *action becomes what it does.
-void AddPlotCommand(CLI::App& program, Action* action);
+void AddPlotCommand(CommandLine& program, Action* action);
 
 }  // namespace Vorn::Cli

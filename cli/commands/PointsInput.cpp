@@ -1,25 +1,9 @@
 #include "cli/commands/PointsInput.h"
 
-#include <CLI/CLI.hpp>
-
 #include "cli/Numbers.h"
 #include "cli/commands/CommonOptions.h"
 
 namespace Vorn::Cli {
-
-namespace {
-
-/// The words of --columns.
-CLI::Validator Columns() {
-  return CLI::Validator(
-      [](std::string& text) -> std::string {
-        return ParseColumnChoice(text) ? ""
-                                       : Quoted(text) + " is not two or three different columns";
-      },
-      "");
-}
-
-}  // namespace
 
 char const* const kPointsFileText =
     R"(Points file: one point a line, x,y or x,y,w (w: the tolerance of the point), in the order of
@@ -28,48 +12,47 @@ tab or blanks; decimal commas are read where the separator is none. What follows
 comment; "# tolerance T" and "# units mm" are read.
 )";
 
-CLI::Option* AddColumns(CLI::App& app, ColumnChoice* columns) {
-  return app
-      .add_option_function<std::string>(
-          "--columns",
-          [columns](std::string const& text) { *columns = ParseColumnChoice(text).value(); },
-          "The columns that hold x, y and, if there is a third, the tolerance: names from the "
-          "header or numbers counted from 1")
-      ->check(Columns())
-      ->type_name("X,Y[,W]");
+Option AddColumns(Command& command, ColumnChoice* columns) {
+  auto const complaint = [](std::string const& text) -> std::string {
+    return ParseColumnChoice(text) ? "" : Quoted(text) + " is not two or three different columns";
+  };
+  auto const take = [columns](std::string const& text) {
+    *columns = ParseColumnChoice(text).value();
+  };
+  return command.AddChecked("--columns", complaint, take, "X,Y[,W]",
+                            "The columns that hold x, y and, if there is a third, the tolerance: "
+                            "names from the header or "
+                            "numbers counted from 1");
 }
 
-void AddPointsInput(CLI::App& app, PointsInput* input) {
-  app.add_option("POINTS", input->path,
-                 "CSV file with the measured points; - is the standard input")
-      ->required()
-      ->type_name("FILE");
-  AddPointsOptions(app, input);
+void AddPointsInput(Command& command, PointsInput* input) {
+  command
+      .AddText("POINTS", &input->path, "FILE",
+               "CSV file with the measured points; - is the standard input")
+      .Require();
+  AddPointsOptions(command, input);
 }
 
-void AddPointsOptions(CLI::App& app, PointsInput* input) {
+void AddPointsOptions(Command& command, PointsInput* input) {
   ToleranceChoice& choice = input->tolerance;
-  CLI::Option* const same =
-      AddPositiveNumber(app, "-t,--tolerance", &choice.same, "T",
-                        "One tolerance for all points, in the units of the file");
-  CLI::Option* const column =
-      app.add_option("--tolerance-column", choice.column,
-                     "Take each point's tolerance from the column of this name or number")
-          ->type_name("NAME");
-  CLI::Option* const cap = AddPositiveNumber(
-      app, "--tolerance-per-point", &choice.cap, "CAP",
+  Option const same = AddPositiveNumber(command, "-t,--tolerance", &choice.same, "T",
+                                        "One tolerance for all points, in the units of the file");
+  Option const column =
+      command.AddText("--tolerance-column", &choice.column, "NAME",
+                      "Take each point's tolerance from the column of this name or number");
+  Option const cap = AddPositiveNumber(
+      command, "--tolerance-per-point", &choice.cap, "CAP",
       "Give each point the smaller of CAP and 0.3 times the distance to its nearer neighbour");
-  same->excludes(column)->excludes(cap);
-  column->excludes(cap);
-  AddColumns(app, &input->columns);
-  app.add_option("--units", input->units,
-                 "The units of the coordinates, for example mm; goes before what the file says")
-      ->type_name("NAME");
+  same.Exclude(column).Exclude(cap);
+  column.Exclude(cap);
+  AddColumns(command, &input->columns);
+  command.AddText("--units", &input->units, "NAME",
+                  "The units of the coordinates, for example mm; goes before what the file says");
 }
 
-void AddClosedChoice(CLI::App& app, ClosedChoice* choice) {
+void AddClosedChoice(Command& command, ClosedChoice* choice) {
   AddChoice<ClosedChoice>(
-      app, "--closed", choice,
+      command, "--closed", choice,
       {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
       "Whether the contour runs back to its start; auto (default) judges by the ends as "
       "'contour fit' does");

@@ -6,11 +6,7 @@
 #include "cli/CsvReader.h"
 #include "cli/Tolerances.h"
 #include "cli/commands/Command.h"
-
-namespace CLI {
-class App;
-class Option;
-}  // namespace CLI
+#include "cli/commands/CommandLine.h"
 
 namespace Vorn::Cli {
 
@@ -23,16 +19,16 @@ struct PointsInput {
 };
 
 /// Adds the option --columns.
-CLI::Option* AddColumns(CLI::App& app, ColumnChoice* columns);
+Option AddColumns(Command& command, ColumnChoice* columns);
 
 /// Adds the positional POINTS and the options for tolerances, columns and units.
-void AddPointsInput(CLI::App& app, PointsInput* input);
+void AddPointsInput(Command& command, PointsInput* input);
 
 /// Adds the options alone, for a command that may read many files.
-void AddPointsOptions(CLI::App& app, PointsInput* input);
+void AddPointsOptions(Command& command, PointsInput* input);
 
 /// Adds --closed, for commands to which the neighbourhood of the last and the first point matters.
-void AddClosedChoice(CLI::App& app, ClosedChoice* choice);
+void AddClosedChoice(Command& command, ClosedChoice* choice);
 
 /// Reads the points. Tolerances that come from options are not assigned yet, see AssignTolerances.
 /// @throws Failure as ReadPoints does.

@@ -1,6 +1,5 @@
 #include "cli/commands/SimplifyCommand.h"
 
-#include <CLI/CLI.hpp>
 #include <algorithm>
 #include <limits>
 #include <memory>
@@ -125,21 +124,22 @@ ExitCode Run(Options const& options, Console const& console) {
 
 }  // namespace
 
-void AddSimplifyCommand(CLI::App& program, Action* action) {
-  CLI::App* const app = program.add_subcommand("simplify", kText);
+void AddSimplifyCommand(CommandLine& program, Action* action) {
+  Command command = program.AddCommand("simplify", kText);
   auto const options = std::make_shared<Options>();
-  AddPointsInput(*app, &options->points);
-  AddClosedChoice(*app, &options->closed);
-  app->add_flag("--drop-close", options->dropClose,
-                "Leave out points that are too close to the one before")
-      ->required();
-  app->add_option("-o,--output", options->output,
-                  "Write the points that are left to this file; - is the standard output (default)")
-      ->type_name("FILE");
-  app->add_option("--dropped", options->dropped, "Write the points that are left out to this file")
-      ->type_name("FILE");
-  app->footer(std::string(kPointsFileText) + kFooter);
-  app->callback([options, action] {
+  AddPointsInput(command, &options->points);
+  AddClosedChoice(command, &options->closed);
+  command
+      .AddFlag("--drop-close", &options->dropClose,
+               "Leave out points that are too close to the one before")
+      .Require();
+  command.AddText(
+      "-o,--output", &options->output, "FILE",
+      "Write the points that are left to this file; - is the standard output (default)");
+  command.AddText("--dropped", &options->dropped, "FILE",
+                  "Write the points that are left out to this file");
+  command.SetFooter(std::string(kPointsFileText) + kFooter);
+  command.OnParsed([options, action] {
     RefuseSharedFiles({{"POINTS", options->points.path}}, options->Written());
     *action = [options](Console const& console) { return Run(*options, console); };
   });

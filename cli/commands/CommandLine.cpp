@@ -1,0 +1,96 @@
+#include "cli/commands/CommandLine.h"
+
+#include <CLI/CLI.hpp>
+#include <sstream>
+
+#include "cli/Failure.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+[[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {
+  std::string name;
+  for (CLI::App const* command : program.get_subcommands()) name += command->get_name() + " ";
+  throw Failure(ExitCode::Usage,
+                complaint + "\nRun '" + program.get_name() + " " + name + "--help' for the usage.");
+}
+
+}  // namespace
+
+Option Option::Require() const { return Option(option_->required()); }
+
+Option Option::Exclude(Option other) const { return Option(option_->excludes(other.option_)); }
+
+Option Option::Need(Option other) const { return Option(option_->needs(other.option_)); }
+
+Option Command::AddText(std::string const& name, std::string* value, std::string const& valueName,
+                        std::string const& help) {
+  return Option(command_->add_option(name, *value, help)->type_name(valueName));
+}
+
+Option Command::AddText(std::string const& name, std::optional<std::string>* value,
+                        std::string const& valueName, std::string const& help) {
+  return Option(command_->add_option(name, *value, help)->type_name(valueName));
+}
+
+Option Command::AddTexts(std::string const& name, std::vector<std::string>* values,
+                         std::string const& valueName, std::string const& help) {
+  return Option(command_->add_option(name, *values, help)->type_name(valueName));
+}
+
+Option Command::AddRepeatable(std::string const& name, std::vector<std::string>* values,
+                              std::string const& valueName, std::string const& help) {
+  return Option(command_->add_option(name, *values, help)
+                    ->expected(1)
+                    ->multi_option_policy(CLI::MultiOptionPolicy::TakeAll)
+                    ->type_name(valueName));
+}
+
+Option Command::AddChecked(std::string const& name,
+                           std::function<std::string(std::string const&)> const& complaint,
+                           std::function<void(std::string const&)> const& take,
+                           std::string const& valueName, std::string const& help) {
+  return Option(command_->add_option_function<std::string>(name, take, help)
+                    ->check(CLI::Validator(complaint, ""))
+                    ->type_name(valueName));
+}
+
+Option Command::AddFlag(std::string const& name, bool* value, std::string const& help) {
+  return Option(command_->add_flag(name, *value, help));
+}
+
+void Command::SetFooter(std::string const& text) { command_->footer(text); }
+
+void Command::OnParsed(std::function<void()> const& call) { command_->callback(call); }
+
+CommandLine::CommandLine(std::string const& name, std::string const& text)
+    : program_(std::make_unique<CLI::App>(text, name)) {
+  program_->require_subcommand(1);
+}
+
+CommandLine::~CommandLine() = default;
+
+void CommandLine::SetVersion(std::string const& text) {
+  program_->set_version_flag("--version", text);
+}
+
+void CommandLine::SetFooter(std::string const& text) { program_->footer(text); }
+
+Command CommandLine::AddCommand(std::string const& name, std::string const& text) {
+  return Command(program_->add_subcommand(name, text));
+}
+
+std::optional<std::string> CommandLine::Parse(int argc, char const* const* argv) {
+  try {
+    program_->parse(argc, argv);
+  } catch (CLI::ParseError const& error) {
+    std::ostringstream answer;
+    std::ostringstream complaint;
+    if (program_->exit(error, answer, complaint) != 0) RefuseUsage(*program_, error.what());
+    return answer.str();
+  }
+  return std::nullopt;
+}
+
+}  // namespace Vorn::Cli

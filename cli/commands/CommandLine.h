@@ -1,0 +1,94 @@
+#pragma once
+
+#include <functional>
+#include <memory>
+#include <optional>
+#include <string>
+#include <vector>
+
+namespace CLI {
+class App;
+class Option;
+}  // namespace CLI
+
+/// What may stand on the command line, in our own words. CommandLine.cpp alone knows the library
+/// that parses it, which takes longer to compile than all that a command does.
+namespace Vorn::Cli {
+
+/// An option or an operand of a command.
+class Option {
+ public:
+  explicit Option(CLI::Option* option) : option_(option) {}
+
+  /// It must be given.
+  Option Require() const;
+
+  /// It cannot be given together with the other.
+  Option Exclude(Option other) const;
+
+  /// It can be given only together with the other.
+  Option Need(Option other) const;
+
+ private:
+  CLI::Option* option_;
+};
+
+/// A command with its options and operands. The name of an option has dashes, "-o,--output" is two
+/// names of one; the name of an operand has none. `valueName` is what the help calls the value.
+class Command {
+ public:
+  explicit Command(CLI::App* command) : command_(command) {}
+
+  Option AddText(std::string const& name, std::string* value, std::string const& valueName,
+                 std::string const& help);
+  Option AddText(std::string const& name, std::optional<std::string>* value,
+                 std::string const& valueName, std::string const& help);
+
+  /// Takes one word or several in a row.
+  Option AddTexts(std::string const& name, std::vector<std::string>* values,
+                  std::string const& valueName, std::string const& help);
+
+  /// Takes one word each time it is given.
+  Option AddRepeatable(std::string const& name, std::vector<std::string>* values,
+                       std::string const& valueName, std::string const& help);
+
+  /// `complaint` tells what is wrong with a word and is empty for a good one, which `take` gets.
+  Option AddChecked(std::string const& name,
+                    std::function<std::string(std::string const&)> const& complaint,
+                    std::function<void(std::string const&)> const& take,
+                    std::string const& valueName, std::string const& help);
+
+  Option AddFlag(std::string const& name, bool* value, std::string const& help);
+
+  /// The end of its help.
+  void SetFooter(std::string const& text);
+
+  /// Called when the command line has been read and asks for this command.
+  void OnParsed(std::function<void()> const& call);
+
+ private:
+  CLI::App* command_;
+};
+
+/// The command line of the program: one of its commands, or a question for help or the version.
+class CommandLine {
+ public:
+  CommandLine(std::string const& name, std::string const& text);
+  ~CommandLine();
+  CommandLine(CommandLine const&) = delete;
+  CommandLine& operator=(CommandLine const&) = delete;
+
+  void SetVersion(std::string const& text);
+  void SetFooter(std::string const& text);
+  Command AddCommand(std::string const& name, std::string const& text);
+
+  /// Sets what the words say, and calls what is to be called.
+  /// @return the answer to a question for help or the version
+  /// @throws Failure (ExitCode::Usage) when they are not understood or contradict themselves.
+  std::optional<std::string> Parse(int argc, char const* const* argv);
+
+ private:
+  std::unique_ptr<CLI::App> program_;
+};
+
+}  // namespace Vorn::Cli
