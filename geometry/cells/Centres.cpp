@@ -4,8 +4,8 @@
 #include <cmath>
 
 #include "geometry/cells/FixedPoints.h"
-#include "geometry/cells/TriangleCentre.h"
 #include "geometry/intersections/CirclePoints.h"
+#include "geometry/triangles/TriangleCentre.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 #include "vorn/MathUtils.h"

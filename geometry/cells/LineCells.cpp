@@ -11,7 +11,7 @@
 #include <cmath>
 #include <cstddef>
 
-#include "geometry/cells/Ring.h"
+#include "geometry/triangles/Ring.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 

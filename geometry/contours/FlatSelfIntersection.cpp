@@ -15,8 +15,8 @@
 
 #include <algorithm>
 
-#include "geometry/contours/PieceExtents.h"
 #include "geometry/contours/SelfIntersectionSteps.h"
+#include "geometry/contours/near/PieceExtents.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {

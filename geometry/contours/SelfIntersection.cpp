@@ -15,8 +15,8 @@
 
 #include <iterator>
 
-#include "geometry/contours/PieceExtents.h"
 #include "geometry/contours/SelfIntersectionSteps.h"
+#include "geometry/contours/near/PieceExtents.h"
 #include "geometry/intersections/SegmentPair.h"
 #include "vorn/GeometryUtils.h"
 
