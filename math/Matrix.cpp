@@ -8,8 +8,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstddef>
 #include <iterator>
-#include <utility>
 
 #include "math/NumericConstants.h"
 
@@ -23,70 +23,100 @@ namespace {
 constexpr int kOrder = 3;
 constexpr int kElements = kOrder * kOrder;
 
-constexpr double kIdentity[kElements] = {1.0, 0.0, 0.0, 0.0, 1.0, 0.0, 0.0, 0.0, 1.0};
+/// Offsets of the second and the third row.
+constexpr std::ptrdiff_t kRow1 = kOrder;
+constexpr std::ptrdiff_t kRow2 = 2 * kRow1;
+
+/// A row, and a matrix as its rows. Values, so that the steps of an operation stay in registers
+/// instead of passing through memory.
+struct Row {
+  double x, y, z;
+};
+struct Rows {
+  Row r0, r1, r2;
+};
+
+constexpr Rows kIdentity{{1.0, 0.0, 0.0}, {0.0, 1.0, 0.0}, {0.0, 0.0, 1.0}};
 
 /// Coefficients of (1 + x)^(-1/2); the last term used is x^9.
 constexpr double kInverseRootSeries[] = {
     1.0,         -0.5,         0.375,          -0.3125,           0.2734375,
     -0.24609375, 0.2255859375, -0.20947265625, 0.196380615234375, -0.1854705810546875};
 
-/// product = a * b. The product must be another array than both factors.
-void Multiply(double const* a, double const* b, double* product) {
-  for (int row = 0; row < kOrder; ++row) {
-    for (int column = 0; column < kOrder; ++column) {
-      double sum = 0.0;
-      for (int k = 0; k < kOrder; ++k) sum += a[kOrder * row + k] * b[kOrder * k + column];
-      product[kOrder * row + column] = sum;
-    }
-  }
+Row ReadRow(double const* m) { return {m[0], m[1], m[2]}; }
+
+Rows Read(double const* m) { return {ReadRow(m), ReadRow(m + kRow1), ReadRow(m + kRow2)}; }
+
+void WriteRow(Row const& row, double* out) {
+  out[0] = row.x;
+  out[1] = row.y;
+  out[2] = row.z;
 }
 
-void TransposeInPlace(double* m) {
-  for (int row = 0; row < kOrder; ++row) {
-    for (int column = row + 1; column < kOrder; ++column) {
-      std::swap(m[kOrder * row + column], m[kOrder * column + row]);
-    }
-  }
+void Write(Rows const& m, double* out) {
+  WriteRow(m.r0, out);
+  WriteRow(m.r1, out + kRow1);
+  WriteRow(m.r2, out + kRow2);
 }
 
-Matrix RotationX(double angle) {
+/// row * m. The three sums are written side by side: none waits for another one, and two of them
+/// fit into one instruction where the processor has such.
+inline Row Times(Row const& row, Rows const& m) {
+  return {((0.0 + row.x * m.r0.x) + row.y * m.r1.x) + row.z * m.r2.x,
+          ((0.0 + row.x * m.r0.y) + row.y * m.r1.y) + row.z * m.r2.y,
+          ((0.0 + row.x * m.r0.z) + row.y * m.r1.z) + row.z * m.r2.z};
+}
+
+inline Rows Times(Rows const& a, Rows const& b) {
+  return {Times(a.r0, b), Times(a.r1, b), Times(a.r2, b)};
+}
+
+Rows Transposed(Rows const& m) {
+  return {{m.r0.x, m.r1.x, m.r2.x}, {m.r0.y, m.r1.y, m.r2.y}, {m.r0.z, m.r1.z, m.r2.z}};
+}
+
+/// sum + factor * term
+Row AddScaled(Row const& sum, double factor, Row const& term) {
+  return {sum.x + factor * term.x, sum.y + factor * term.y, sum.z + factor * term.z};
+}
+
+Rows AddScaled(Rows const& sum, double factor, Rows const& term) {
+  return {AddScaled(sum.r0, factor, term.r0), AddScaled(sum.r1, factor, term.r1),
+          AddScaled(sum.r2, factor, term.r2)};
+}
+
+Rows RotationX(double angle) {
   double const c = std::cos(angle);
   double const s = std::sin(angle);
-  return Mtrx{{1.0, 0.0, 0.0, 0.0, c, s, 0.0, -s, c}};
+  return {{1.0, 0.0, 0.0}, {0.0, c, s}, {0.0, -s, c}};
 }
 
-Matrix RotationY(double angle) {
+Rows RotationY(double angle) {
   double const c = std::cos(angle);
   double const s = std::sin(angle);
-  return Mtrx{{c, 0.0, -s, 0.0, 1.0, 0.0, s, 0.0, c}};
+  return {{c, 0.0, -s}, {0.0, 1.0, 0.0}, {s, 0.0, c}};
 }
 
-Matrix RotationZ(double angle) {
+Rows RotationZ(double angle) {
   double const c = std::cos(angle);
   double const s = std::sin(angle);
-  return Mtrx{{c, s, 0.0, -s, c, 0.0, 0.0, 0.0, 1.0}};
+  return {{c, s, 0.0}, {-s, c, 0.0}, {0.0, 0.0, 1.0}};
 }
 
-/// drift = transpose(m) * m - I: zero exactly when m is orthogonal.
-void OrthogonalityDrift(double const* m, double* drift) {
-  double transposed[kElements];
-  std::copy_n(m, kElements, transposed);
-  TransposeInPlace(transposed);
-  Multiply(transposed, m, drift);
-  for (int i = 0; i < kElements; ++i) drift[i] -= kIdentity[i];
+/// transpose(m) * m - I: zero exactly when m is orthogonal.
+Rows OrthogonalityDrift(Rows const& m) {
+  return AddScaled(Times(Transposed(m), m), -1.0, kIdentity);
 }
 
-/// sum = (I + drift)^(-1/2), cut after the given number of terms.
-void InverseRoot(double const* drift, int terms, double* sum) {
-  double power[kElements];
-  double raised[kElements];
-  std::copy_n(kIdentity, kElements, sum);
-  std::copy_n(kIdentity, kElements, power);
+/// (I + drift)^(-1/2), cut after the given number of terms.
+Rows InverseRoot(Rows const& drift, int terms) {
+  Rows sum = kIdentity;
+  Rows power = kIdentity;
   for (int k = 1; k < terms; ++k) {
-    Multiply(power, drift, raised);
-    std::copy_n(raised, kElements, power);
-    for (int i = 0; i < kElements; ++i) sum[i] += kInverseRootSeries[k] * power[i];
+    power = Times(power, drift);
+    sum = AddScaled(sum, kInverseRootSeries[k], power);
   }
+  return sum;
 }
 
 }  // namespace
@@ -104,25 +134,26 @@ Matrix& Matrix::operator=(Matrix const& other) {
 
 Matrix Matrix::operator*(Matrix const& other) {
   Matrix product;
-  Multiply(m_, other.m_, product.m_);
+  Write(Times(Read(m_), Read(other.m_)), product.m_);
   return product;
 }
 
 double Matrix::Det() const {
   // The order of the terms is fixed: planes averaged from raw determinants cancel to exact zeros
   // only while every caller gets the same rounding.
-  return m_[2] * m_[3] * m_[7] + (m_[0] * m_[4] * m_[8] + m_[1] * m_[5] * m_[6]) -
-         m_[2] * m_[4] * m_[6] - m_[3] * m_[1] * m_[8] - m_[0] * m_[5] * m_[7];
+  auto const [r0, r1, r2] = Read(m_);
+  return r0.z * r1.x * r2.y + (r0.x * r1.y * r2.z + r0.y * r1.z * r2.x) - r0.z * r1.y * r2.x -
+         r1.x * r0.y * r2.z - r0.x * r1.z * r2.y;
 }
 
-void Matrix::InitI() { std::copy_n(kIdentity, kElements, m_); }
+void Matrix::InitI() { Write(kIdentity, m_); }
 
 void Matrix::InitMxMyMz(double ax, double ay, double az) {
-  *this = RotationX(ax) * RotationY(ay) * RotationZ(az);
+  Write(Times(Times(RotationX(ax), RotationY(ay)), RotationZ(az)), m_);
 }
 
 void Matrix::InitMzMyMx(double ax, double ay, double az) {
-  *this = RotationZ(az) * RotationY(ay) * RotationX(ax);
+  Write(Times(Times(RotationZ(az), RotationY(ay)), RotationX(ax)), m_);
 }
 
 void Matrix::GetAnglesFromMxMyMz(double* ax, double* ay, double* az) {
@@ -149,7 +180,7 @@ void Matrix::GetAnglesFromMzMyMx(double* ax, double* ay, double* az) {
   if (std::fabs(std::cos(asinY)) > kTangency) {
     *ay = asinY;
     *az = std::atan2(-m_[3], m_[0]);
-    *ax = std::atan2(-m_[7], m_[8]);
+    *ax = std::atan2(-m_[kRow2 + 1], m_[kRow2 + 2]);
     return;
   }
   // Gimbal lock, as above.
@@ -164,40 +195,31 @@ void Matrix::GetAnglesFromMzMyMx(double* ax, double* ay, double* az) {
 }
 
 SpatVector Matrix::MxV(SpatVector& vector) {
-  SpatVector result = vector;  // carries the entries past z along
-  double const* v = vector.v;
-  for (int i = 0; i < kOrder; ++i) {
-    double const* row = m_ + kOrder * i;
-    result.v[i] = row[0] * v[0] + row[1] * v[1] + row[2] * v[2];
-  }
-  return result;
+  double const* const v = vector.v;
+  auto const [r0, r1, r2] = Read(m_);
+  return {{r0.x * v[0] + r0.y * v[1] + r0.z * v[2], r1.x * v[0] + r1.y * v[1] + r1.z * v[2],
+           r2.x * v[0] + r2.y * v[1] + r2.z * v[2], v[3], v[4]}};
 }
 
 SpatVector Matrix::VxM(SpatVector& vector) {
-  SpatVector result = vector;  // carries the entries past z along
-  double const* v = vector.v;
-  for (int j = 0; j < kOrder; ++j) {
-    result.v[j] = v[0] * m_[j] + v[1] * m_[kOrder + j] + v[2] * m_[2 * kOrder + j];
-  }
-  return result;
+  double const* const v = vector.v;
+  auto const [r0, r1, r2] = Read(m_);
+  return {{v[0] * r0.x + v[1] * r1.x + v[2] * r2.x, v[0] * r0.y + v[1] * r1.y + v[2] * r2.y,
+           v[0] * r0.z + v[1] * r1.z + v[2] * r2.z, v[3], v[4]}};
 }
 
 int Matrix::QuantityOfDataElements() const { return kElements; }
 
 bool Matrix::Reorth(int dimension, double* elements, int terms) {
   if (dimension != kOrder) return false;
-  double drift[kElements];
-  double inverseRoot[kElements];
-  double corrected[kElements];
-  OrthogonalityDrift(elements, drift);
-  InverseRoot(drift, std::min(terms, static_cast<int>(std::size(kInverseRootSeries))), inverseRoot);
-  Multiply(elements, inverseRoot, corrected);
-  std::copy_n(corrected, kElements, elements);
+  Rows const drifted = Read(elements);
+  int const usedTerms = std::min(terms, static_cast<int>(std::size(kInverseRootSeries)));
+  Write(Times(drifted, InverseRoot(OrthogonalityDrift(drifted), usedTerms)), elements);
   return true;
 }
 
 bool Matrix::Reorth(int terms) { return Reorth(kOrder, m_, terms); }
 
-void Matrix::Transpose() { TransposeInPlace(m_); }
+void Matrix::Transpose() { Write(Transposed(Read(m_)), m_); }
 
 }  // namespace Vorn
