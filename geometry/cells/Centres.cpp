@@ -4,7 +4,7 @@
 #include <cmath>
 
 #include "geometry/cells/FixedPoints.h"
-#include "geometry/intersections/CirclePoints.h"
+#include "geometry/intersections/Circles.h"
 #include "geometry/triangles/TriangleCentre.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
@@ -19,7 +19,7 @@ bool Cells::ChordAcross(double const* rect, double a, double b, double c,
   double const dy = rect[1] - middle.y;
   double const radius = std::sqrt(dy * dy + dx * dx);
   Intersections::CirclePoints const found =
-      Intersections::CutCircleByLine(a, b, c, middle.x, middle.y, radius);
+      Intersections::CutCircleByLine({middle, radius}, {a, b, c});
   if (found.count == 0) return false;
   GeometryUtils::Point const& p1 = found.pts[0];
   GeometryUtils::Point const& p2 = found.pts[found.count - 1];

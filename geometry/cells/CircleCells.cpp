@@ -6,9 +6,10 @@
 
 #include <cmath>
 #include <cstddef>
+#include <optional>
 #include <span>
 
-#include "geometry/elementary/Circumcentre.h"
+#include "geometry/elementary/CircleThrough.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
@@ -76,11 +77,10 @@ Point MovedAlongRadius(WPoint const& p, Point const& center, double newRadius, d
 ErrorCode GeometryUtils::GetCirclePolygon(WPoint first, WPoint middle, WPoint last, bool firstFixed,
                                           bool lastFixed, int orientation, int* vertexCount,
                                           Point2D<double>* const vertices) {
-  Point center;
-  if (!Circles::SolveCircumcentre({first.x, first.y}, {middle.x, middle.y}, {last.x, last.y},
-                                  &center)) {
-    return ErrorCode::Failed;
-  }
+  std::optional<Point> const circumcentre =
+      Elementary::PaddedCircumcentre({first.x, first.y}, {middle.x, middle.y}, {last.x, last.y});
+  if (!circumcentre) return ErrorCode::Failed;
+  Point const center = *circumcentre;
   double const radius = std::sqrt(GetDist2({first.x, first.y}, center));
   bool const isProperRadius = radius > Numeric::kZero;
   if (!isProperRadius) return ErrorCode::Failed;

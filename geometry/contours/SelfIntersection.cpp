@@ -145,11 +145,7 @@ class Walk {
                                : arcSteps_.CountSegmentArc(b.start, b.end, *a.arc)) > 0;
     }
     if (b.arc != nullptr) return arcSteps_.CountSegmentArc(a.start, a.end, *b.arc) > 0;
-    Intersections::SegmentPair const pair(a.start.x, a.start.y, a.end.x, a.end.y, b.start.x,
-                                          b.start.y, b.end.x, b.end.y);
-    double x = 0.0;
-    double y = 0.0;
-    return Intersections::IntersectSegments(pair, &x, &y) == SegmentsRelPosition::Intersecting;
+    return Intersections::HaveOneCommonPoint({a.start, a.end}, {b.start, b.end});
   }
 
   /// Moves to the next element of non-zero length. False, it untouched, when there is none before

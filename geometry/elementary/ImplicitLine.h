@@ -1,11 +1,15 @@
+// Lines as a*x + b*y + c = 0, known as the implicit form. They are never normalised: the raw
+// coefficients decide exact comparisons (parallel segments), and a division would spoil them.
+
 #pragma once
 
 #include <cmath>
+#include <optional>
 
+#include "geometry/elementary/Points.h"
 #include "math/NumericConstants.h"
-#include "vorn/Types.h"
 
-namespace Vorn::Lines {
+namespace Vorn::Elementary {
 
 /// The line a*x + b*y + c = 0, not normalised.
 struct ImplicitLine {
@@ -13,30 +17,33 @@ struct ImplicitLine {
   double b = 0.0;
   double c = 0.0;
 
-  /// Becomes the line through two points; false, unchanged, where they coincide.
-  bool Through(double x1, double y1, double x2, double y2) {
-    if (Numeric::IsZeroMagnitude(x1 - x2) && Numeric::IsZeroMagnitude(y1 - y2)) return false;
-    a = y1 - y2;
-    b = x2 - x1;
-    c = x1 * y2 - y1 * x2;
-    return true;
-  }
+  /// The left side of the equation at a point: the signed distance times the length of (a, b).
+  double At(Point const& p) const { return a * p.x + b * p.y + c; }
 
-  double At(double x, double y) const { return a * x + b * y + c; }
+  /// The length of (a, b).
+  double Norm() const { return std::sqrt(a * a + b * b); }
 
-  /// The length of (a, b), with the sign that makes the origin's deviation At(0, 0) / SignedNorm()
-  /// no greater than zero.
-  double SignedNorm() const {
-    double const norm = std::sqrt(a * a + b * b);
-    return c > 0.0 ? -norm : norm;
-  }
+  /// The length of (a, b), with the sign that makes the origin's deviation At({0, 0}) /
+  /// SignedNorm() no greater than zero.
+  double SignedNorm() const { return c > 0.0 ? -Norm() : Norm(); }
 
   /// The perpendicular through a point; c is not needed for it.
-  ImplicitLine NormalThrough(double x, double y) const { return {b, -a, a * y - b * x}; }
+  ImplicitLine NormalThrough(Point const& p) const { return {b, -a, a * p.y - b * p.x}; }
 };
 
-/// Where two lines cross. Parallel, nothing written, also for one line given twice.
-SegmentsRelPosition Cross(ImplicitLine const& line1, ImplicitLine const& line2, double* x,
-                          double* y);
+/// The line through two points; nothing where they coincide.
+inline std::optional<ImplicitLine> LineThrough(Point const& p, Point const& q) {
+  if (Numeric::IsZeroMagnitude(p.x - q.x) && Numeric::IsZeroMagnitude(p.y - q.y)) {
+    return std::nullopt;
+  }
+  return ImplicitLine{p.y - q.y, q.x - p.x, p.x * q.y - p.y * q.x};
+}
 
-}  // namespace Vorn::Lines
+/// The line of all points equally far from two others; nothing where they coincide.
+inline std::optional<ImplicitLine> PerpendicularBisector(Point const& p, Point const& q) {
+  std::optional<ImplicitLine> const line = LineThrough(p, q);
+  if (!line) return std::nullopt;
+  return line->NormalThrough(Middle(p, q));
+}
+
+}  // namespace Vorn::Elementary

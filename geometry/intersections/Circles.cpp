@@ -1,35 +1,54 @@
-// A segment, a line or a point against a full circle.
-//
 // Notation: D the direction of the segment, F its start seen from the centre, t the parameter along
 // it; the points on the circle solve A t^2 + B t + C = 0.
+#include "geometry/intersections/Circles.h"
 
 #include <cmath>
 
-#include "geometry/elementary/ImplicitLine.h"
-#include "geometry/intersections/CirclePoints.h"
+#include "geometry/elementary/Deviations.h"
+#include "geometry/intersections/Lines.h"
 #include "math/NumericConstants.h"
-#include "vorn/GeometryUtils.h"
 
-namespace Vorn {
+namespace Vorn::Intersections {
 
-using Intersections::CirclePoints;
+namespace {
 
-Intersections::CirclePoints Intersections::CutCircle(double x1, double y1, double x2, double y2,
-                                                     double cx, double cy, double r) {
-  double const dx = x2 - x1;
-  double const dy = y2 - y1;
-  double const fx = x1 - cx;
-  double const fy = y1 - cy;
+/// The point of the line with a given x. The line must not be vertical.
+Point AtX(ImplicitLine const& line, double x) {
+  return {x, -(line.a / line.b) * x - line.c / line.b};
+}
+
+/// The point of the line with a given y. The line must not be horizontal.
+Point AtY(ImplicitLine const& line, double y) {
+  return {-(line.b / line.a) * y - line.c / line.a, y};
+}
+
+/// A stretch of the line around a foot that reaches as far to both sides, measured along the
+/// coordinate in which the line changes faster; the other coordinate follows from the line itself.
+Segment StretchAround(ImplicitLine const& line, Point const& foot, double reach) {
+  if (std::fabs(line.a) > std::fabs(line.b)) {
+    return {AtY(line, foot.y + reach), AtY(line, foot.y - reach)};
+  }
+  return {AtX(line, foot.x + reach), AtX(line, foot.x - reach)};
+}
+
+}  // namespace
+
+CirclePoints CutCircleBySegment(Circle const& circle, Segment const& segment) {
+  auto const& [start, end] = segment;
+  double const dx = end.x - start.x;
+  double const dy = end.y - start.y;
+  double const fx = start.x - circle.centre.x;
+  double const fy = start.y - circle.centre.y;
   double const a = dx * dx + dy * dy;
   double const b = 2.0 * (dx * fx + dy * fy);
-  double const c = fx * fx + fy * fy - r * r;
+  double const c = fx * fx + fy * fy - circle.radius * circle.radius;
   double const disc = b * b - 4.0 * a * c;
   CirclePoints found;
   if (disc < 0.0) return found;
 
   auto const takeIfOnSegment = [&](double t) {
     // A zero-length segment makes t infinite or a NaN, which is outside.
-    if (0.0 <= t && t <= 1.0) found.Add(x1 + t * dx, y1 + t * dy);
+    if (0.0 <= t && t <= 1.0) found.Add({start.x + t * dx, start.y + t * dy});
   };
   double const root = std::sqrt(disc);
   takeIfOnSegment((root - b) / (2.0 * a));
@@ -37,64 +56,23 @@ Intersections::CirclePoints Intersections::CutCircle(double x1, double y1, doubl
   return found;
 }
 
-int Intersections::CirclePoints::Write(double* ax, double* ay, double* bx, double* by) const {
-  if (count > 0) {
-    *ax = pts[0].x;
-    *ay = pts[0].y;
-  }
-  if (count > 1) {
-    *bx = pts[1].x;
-    *by = pts[1].y;
-  }
-  return count;
+CirclePoints CutCircleByLine(Circle const& circle, ImplicitLine const& line) {
+  std::optional<double> const distance = Elementary::Deviation(line, circle.centre);
+  if (!distance || *distance > circle.radius) return {};
+  std::optional<Point> const foot = FootOn(line, circle.centre);
+  if (!foot) return {};
+  // Twice the radius is sure to hold the chord.
+  return CutCircleBySegment(circle, StretchAround(line, *foot, 2.0 * circle.radius));
 }
 
-int GeometryUtils::GetLineSegmentAndCircleIntersection(double x1, double y1, double x2, double y2,
-                                                       double cx, double cy, double r, double* ax,
-                                                       double* ay, double* bx, double* by) {
-  return Intersections::CutCircle(x1, y1, x2, y2, cx, cy, r).Write(ax, ay, bx, by);
-}
-
-CirclePoints Intersections::CutCircleByLine(double a, double b, double c, double cx, double cy,
-                                            double r) {
-  double distance = 0.0;
-  if (!GeometryUtils::GetDeviation(a, b, c, cx, cy, &distance) || distance > r) return {};
-  Lines::ImplicitLine const line{a, b, c};
-  double footX = 0.0;
-  double footY = 0.0;
-  if (Lines::Cross(line, line.NormalThrough(cx, cy), &footX, &footY) !=
-      SegmentsRelPosition::Intersecting) {
-    return {};
-  }
-  // A stretch of the line that is sure to hold the chord, measured along the coordinate in which
-  // the line changes faster; the other coordinate follows from the line itself.
-  double const reach = 2.0 * r;
-  if (std::fabs(a) > std::fabs(b)) {
-    double const y1 = footY + reach;
-    double const y2 = footY - reach;
-    return CutCircle(-(b / a) * y1 - c / a, y1, -(b / a) * y2 - c / a, y2, cx, cy, r);
-  }
-  double const x1 = footX + reach;
-  double const x2 = footX - reach;
-  return CutCircle(x1, -(a / b) * x1 - c / b, x2, -(a / b) * x2 - c / b, cx, cy, r);
-}
-
-int GeometryUtils::GetLineAndCircleIntersection(double a, double b, double c, double cx, double cy,
-                                                double r, double* ax, double* ay, double* bx,
-                                                double* by) {
-  return Intersections::CutCircleByLine(a, b, c, cx, cy, r).Write(ax, ay, bx, by);
-}
-
-bool GeometryUtils::GetNearestPointOnCircle(Point const& center, double radius, Point const& p,
-                                            Point* nearest) {
+std::optional<Point> NearestOnCircle(Circle const& circle, Point const& p) {
   // Deliberate: the ray ends at twice the point's distance, so a point nearer to the centre than
   // half the radius has no projection.
-  CirclePoints const found =
-      Intersections::CutCircle(center.x, center.y, center.x + 2.0 * (p.x - center.x),
-                               center.y + 2.0 * (p.y - center.y), center.x, center.y, radius);
-  if (found.count != 1) return false;
-  *nearest = found.pts[0];
-  return true;
+  Point const& centre = circle.centre;
+  Point const rayEnd{centre.x + 2.0 * (p.x - centre.x), centre.y + 2.0 * (p.y - centre.y)};
+  CirclePoints const found = CutCircleBySegment(circle, {centre, rayEnd});
+  if (found.count != 1) return std::nullopt;
+  return found.pts[0];
 }
 
-}  // namespace Vorn
+}  // namespace Vorn::Intersections

@@ -1,16 +1,33 @@
+// The intersection of two segments, inline: the overlap of two triangles asks for it nine times.
+//
+// It follows the classic scheme: reject by boxes, then solve the 2 x 2 system for both parameters
+// scaled by the determinant, so that the range tests need no division.
+//   F. Antonio, "Faster Line Segment Intersection", Graphics Gems III, 1992.
+
 #pragma once
 
 #include <algorithm>
 #include <cmath>
 
+#include "geometry/elementary/Points.h"
+#include "geometry/elementary/Shapes.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
-/// The intersection of two segments, inline: the overlap of two triangles asks for it nine times.
 namespace Vorn::Intersections {
 
+using Elementary::Point;
+using Elementary::Segment;
+
+/// Whether a value lies between two others, which may stand in any order and count as between.
 inline bool IsWithin(double value, double end1, double end2) {
   return std::min(end1, end2) <= value && value <= std::max(end1, end2);
+}
+
+/// Whether a point lies in the bounding box of a segment, borders included.
+inline bool IsInBox(Point const& p, Segment const& segment) {
+  return IsWithin(p.x, segment.start.x, segment.end.x) &&
+         IsWithin(p.y, segment.start.y, segment.end.y);
 }
 
 /// Whether [p1, p2] and [p3, p4], ends in any order, have no number in common on one axis.
@@ -22,11 +39,17 @@ inline bool AreApart(double p1, double p2, double p3, double p4) {
 }
 
 /// Two segments (x1, y1)-(x2, y2) and (x3, y3)-(x4, y4) and the differences that every step of
-/// their intersection uses; the second difference is reversed.
+/// their intersection uses: d1 = P2 - P1 and d2 = P3 - P4, reversed, as the scheme wants it.
 struct SegmentPair {
-  SegmentPair(double ax, double ay, double bx, double by, double cx, double cy, double dx,
-              double dy)
-      : x1(ax), y1(ay), x2(bx), y2(by), x3(cx), y3(cy), x4(dx), y4(dy) {}
+  SegmentPair(Segment const& first, Segment const& second)
+      : x1(first.start.x),
+        y1(first.start.y),
+        x2(first.end.x),
+        y2(first.end.y),
+        x3(second.start.x),
+        y3(second.start.y),
+        x4(second.end.x),
+        y4(second.end.y) {}
 
   double x1, y1, x2, y2, x3, y3, x4, y4;
   double dx1 = x2 - x1;
@@ -34,9 +57,16 @@ struct SegmentPair {
   double dx2 = x3 - x4;
   double dy2 = y3 - y4;
 
+  /// Whether the bounding boxes have no point in common.
   bool AreBoxesApart() const { return AreApart(x1, x2, x3, x4) || AreApart(y1, y2, y3, y4); }
+
+  /// The cross product of d1 and d2, negated.
   double Determinant() const { return dy1 * dx2 - dy2 * dx1; }
+
+  /// The parameter of the crossing along the first segment, times the determinant.
   double ScaledParameter1() const { return (x1 - x3) * dy2 - (y1 - y3) * dx2; }
+
+  /// The parameter of the crossing along the second segment, times the determinant.
   double ScaledParameter2() const { return (y1 - y3) * dx1 - (x1 - x3) * dy1; }
 };
 
@@ -46,20 +76,30 @@ inline bool AreParametersInRange(double s, double u, double det) {
   return det <= s && s <= 0.0 && det <= u && u <= 0.0;
 }
 
-/// Segments whose determinant counts as zero: parallel ones and those of no length.
-SegmentsRelPosition IntersectParallel(SegmentPair const& pair, double* x, double* y);
+/// How two segments lie whose determinant counts as zero: parallel ones and those of no length.
+/// `common` as in IntersectSegments.
+SegmentsRelPosition IntersectParallel(SegmentPair const& pair, Point* common);
 
-inline SegmentsRelPosition IntersectSegments(SegmentPair const& pair, double* x, double* y) {
+/// How two segments lie to each other, ends included. `common` receives the common point for
+/// Intersecting and the middle of the common part for Collinear; otherwise it stays. See
+/// GeometryUtils::GetLineSegmentsIntersection for what counts as parallel.
+inline SegmentsRelPosition IntersectSegments(SegmentPair const& pair, Point* common) {
   if (pair.AreBoxesApart()) return SegmentsRelPosition::Disjoint;
   double const det = pair.Determinant();
-  if (!(std::fabs(det) > Numeric::kZero)) return IntersectParallel(pair, x, y);
+  if (!(std::fabs(det) > Numeric::kZero)) return IntersectParallel(pair, common);
   double const s = pair.ScaledParameter1();
   double const u = pair.ScaledParameter2();
   if (!AreParametersInRange(s, u, det)) return SegmentsRelPosition::Disjoint;
   // Products before the division: a crossing at an end point gives that end point exactly.
-  *x = pair.x1 + s * pair.dx1 / det;
-  *y = pair.y1 + s * pair.dy1 / det;
+  common->x = pair.x1 + s * pair.dx1 / det;
+  common->y = pair.y1 + s * pair.dy1 / det;
   return SegmentsRelPosition::Intersecting;
+}
+
+/// Whether two segments have exactly one common point, as IntersectSegments tells it.
+inline bool HaveOneCommonPoint(Segment const& first, Segment const& second) {
+  Point common;
+  return IntersectSegments({first, second}, &common) == SegmentsRelPosition::Intersecting;
 }
 
 }  // namespace Vorn::Intersections

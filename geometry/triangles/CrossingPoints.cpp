@@ -97,8 +97,7 @@ bool MayMeet(Shape const& first, int i, Shape const& second, int j) {
 }
 
 Intersections::SegmentPair PairOfSides(Side const& side, Side const& other) {
-  return {side.start.x,  side.start.y,  side.end.x,  side.end.y,
-          other.start.x, other.start.y, other.end.x, other.end.y};
+  return {{side.start, side.end}, {other.start, other.end}};
 }
 
 /// Of the records from `begin` on, more than a line can cross since sides that touch at vertices
@@ -141,7 +140,7 @@ class SideCollector {
     Side const other{second_.pts[j], second_.pts[(j + 1) % 3]};
     CrossingPoint found{{}, i_, j};
     SegmentsRelPosition const relation =
-        Intersections::IntersectSegments(PairOfSides(side_, other), &found.pt.x, &found.pt.y);
+        Intersections::IntersectSegments(PairOfSides(side_, other), &found.pt);
     if (relation == SegmentsRelPosition::Intersecting) {
       if (held_) {
         AppendByDistance(*held_, found, DistanceFromStartOf(side_), &points_);

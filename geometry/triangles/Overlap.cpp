@@ -182,9 +182,8 @@ bool FindOneCut(Triangle const& first, Triangle const& second, Cells::Sight cons
     Point const& end = first.pts[kNext[side]];
     Point const& cutStart = second.pts[cut];
     Point const& cutEnd = second.pts[kNext[cut]];
-    return Intersections::IntersectSegments(
-               {start.x, start.y, end.x, end.y, cutStart.x, cutStart.y, cutEnd.x, cutEnd.y}, &p->x,
-               &p->y) == SegmentsRelPosition::Intersecting;
+    return Intersections::IntersectSegments({{start, end}, {cutStart, cutEnd}}, p) ==
+           SegmentsRelPosition::Intersecting;
   };
   Point enter;
   Point leave;

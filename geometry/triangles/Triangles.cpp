@@ -71,9 +71,7 @@ Point InnerPoint(Triangle const& triangle) {
     Point const& oppositeB = pts[(b + 2) % 3];
     Point crossing;
     SegmentsRelPosition const medians =
-        Intersections::IntersectSegments({middleA.x, middleA.y, oppositeA.x, oppositeA.y, middleB.x,
-                                          middleB.y, oppositeB.x, oppositeB.y},
-                                         &crossing.x, &crossing.y);
+        Intersections::IntersectSegments({{middleA, oppositeA}, {middleB, oppositeB}}, &crossing);
     if (medians == SegmentsRelPosition::Collinear || medians == SegmentsRelPosition::Intersecting) {
       return crossing;
     }

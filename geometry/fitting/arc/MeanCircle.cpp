@@ -6,9 +6,10 @@
 #include <cstddef>
 #include <cstdint>
 #include <new>
+#include <optional>
 #include <vector>
 
-#include "geometry/elementary/Circumcentre.h"
+#include "geometry/elementary/CircleThrough.h"
 #include "geometry/fitting/Runs.h"
 #include "vorn/GeometryUtils.h"
 
@@ -143,9 +144,9 @@ class MeanCircleRun {
     Point last = ToPoint(Measured(length - 1));
     if (fixed_.first && length == 3) first = fixed_.firstPoint;
     if (fixed_.last && length == count_) last = fixed_.lastPoint;
-    Point circumcentre;
-    if (!Circles::SolveCircumcentre(first, middle, last, &circumcentre)) return false;
-    circumcentres_.push_back(circumcentre);
+    std::optional<Point> const circumcentre = Elementary::PaddedCircumcentre(first, middle, last);
+    if (!circumcentre) return false;
+    circumcentres_.push_back(*circumcentre);
     return true;
   }
 

@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <cstdint>
+#include <optional>
 #include <utility>
 
 #include "geometry/elementary/ImplicitLine.h"
@@ -39,10 +40,10 @@ bool GeometryUtils::GetDeviationFromLineParameters(Point const& a, Point const& 
                                                    double* minDeviation, double* maxDeviation,
                                                    std::int32_t* minIndex, std::int32_t* maxIndex) {
   if (!Fitting::HoldsRun(points, start, count)) return false;
-  Lines::ImplicitLine line;
-  if (!line.Through(a.x, a.y, b.x, b.y)) return false;
+  std::optional<Elementary::ImplicitLine> const line = Elementary::LineThrough(a, b);
+  if (!line) return false;
   // Without a norm no point has a deviation, and there are no extremes to hand out.
-  double const divisor = line.SignedNorm();
+  double const divisor = line->SignedNorm();
   if (Numeric::IsZeroMagnitude(divisor)) return false;
   bool isAnyMeasured = false;
   double smallest = 0.0;
@@ -51,7 +52,7 @@ bool GeometryUtils::GetDeviationFromLineParameters(Point const& a, Point const& 
   std::int32_t largestAt = -1;
   for (std::int32_t i = start; i < start + count; ++i) {
     WPoint const& p = Fitting::At(points, i);
-    double const deviation = line.At(p.x, p.y) / divisor;
+    double const deviation = line->At({p.x, p.y}) / divisor;
     if (!isAnyMeasured || deviation < smallest) {
       smallest = deviation;
       smallestAt = i;

@@ -17,6 +17,7 @@
 #include "geometry/cells/fast/CellSequence.h"
 #include "geometry/elementary/ImplicitLine.h"
 #include "geometry/fitting/Runs.h"
+#include "geometry/intersections/Lines.h"
 #include "vorn/GeometryUtils.h"
 
 namespace Vorn {
@@ -42,11 +43,12 @@ bool CenterForLine(Cells::FixedPoints const& fixed, CellSequence const& cell, Po
 /// feet of the given points.
 bool CutLine(Point const& parameters, Point const& nearStart, Point const& nearEnd,
              Cells::FixedPoints const& fixed, Point* start, Point* end) {
-  Lines::ImplicitLine const line{fixed.swapped ? 1.0 : parameters.y,
-                                 fixed.swapped ? parameters.y : 1.0, parameters.x};
+  Elementary::ImplicitLine const line{fixed.swapped ? 1.0 : parameters.y,
+                                      fixed.swapped ? parameters.y : 1.0, parameters.x};
   auto const findFoot = [&line](Point const& p, Point* foot) {
-    return Lines::Cross(line, line.NormalThrough(p.x, p.y), &foot->x, &foot->y) ==
-           SegmentsRelPosition::Intersecting;
+    std::optional<Point> const found = Intersections::FootOn(line, p);
+    if (found) *foot = *found;
+    return found.has_value();
   };
   *start = fixed.p1;
   *end = fixed.p2;

@@ -1,8 +1,5 @@
-// Angle conventions, arc sweep and arc length.
-//
-// An angle is wrapped at most once and always by the truncated constants: callers feed it angles
-// of atan2 or differences of two of them, for which one wrap is enough, and further wraps would
-// change results that are compared bit for bit.
+// Standalone members: no other operation of the library uses them. Angle conventions and the
+// difference of two angles; each wraps at most once.
 
 #include <cmath>
 
@@ -35,21 +32,6 @@ double GeometryUtils::SubtrAng(double a, double b) {
   if (difference >= kTruncatedPi) return difference - kTruncatedTwoPi;
   if (difference > -kTruncatedPi) return difference;
   return difference + kTruncatedTwoPi;
-}
-
-double GeometryUtils::GetArcLength(Arc const& arc) {
-  double start = arc.startAngle;
-  double end = arc.endAngle;
-  if (arc.direction > 0.0) {
-    if (start > end) end += kTruncatedTwoPi;
-    return (end - start) * arc.radius;
-  }
-  if (end > start) end -= kTruncatedTwoPi;
-  return (start - end) * arc.radius;
-}
-
-double GeometryUtils::GetArcAngleRad(Arc const& arc) {
-  return Numeric::IsZero(arc.radius) ? 0.0 : GetArcLength(arc) / arc.radius;
 }
 
 }  // namespace Vorn
