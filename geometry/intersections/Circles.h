@@ -7,6 +7,7 @@
 #include "geometry/elementary/ImplicitLine.h"
 #include "geometry/elementary/Points.h"
 #include "geometry/elementary/Shapes.h"
+#include "math/Assert.h"
 
 namespace Vorn::Intersections {
 
@@ -22,7 +23,10 @@ struct CirclePoints {
   int count = 0;
 
   /// Appends a point; there must be room.
-  void Add(Point const& p) { pts[count++] = p; }
+  void Add(Point const& p) {
+    VORN_ASSERT(count < 2);
+    pts[count++] = p;
+  }
 };
 
 /// Where a segment, ends included, cuts a circle: of two points the one nearer to its end first.

@@ -4,13 +4,14 @@
 #include <cstddef>
 #include <type_traits>
 
+#include "math/Assert.h"
 #include "vorn/GeometryUtils.h"
 
 /// The common part of two triangles without allocation, for cells that are cut thousands of times.
 namespace Vorn::Cells {
 
 /// A vector of fixed capacity on the stack, for plain records. Room is left as it is until it is
-/// used: clearing it would cost more than many an overlap.
+/// used: most overlaps need less time than clearing it would take.
 template <typename T, std::size_t kCapacity>
 class InlineVector {
   static_assert(std::is_trivially_copyable_v<T>);
@@ -18,8 +19,17 @@ class InlineVector {
  public:
   InlineVector() {}  // NOLINT(modernize-use-equals-default): the union has no default
 
-  void push_back(T const& value) { items_[size_++] = value; }
-  void resize(std::size_t size) { size_ = size; }
+  /// Appends a value; there must be room.
+  void push_back(T const& value) {
+    VORN_ASSERT(size_ < kCapacity);
+    items_[size_++] = value;
+  }
+
+  /// Drops the values from a size on.
+  void resize(std::size_t size) {
+    VORN_ASSERT(size <= size_);
+    size_ = size;
+  }
   void clear() { size_ = 0; }
   std::size_t size() const { return size_; }
   bool empty() const { return size_ == 0; }
