@@ -1,4 +1,7 @@
 # Debian packages, one per component: the shared library, the development files, the program.
+if(NOT BUILD_SHARED_LIBS)
+  message(FATAL_ERROR "The Debian packages hold the shared library: set BUILD_SHARED_LIBS to ON")
+endif()
 set(library_package libgeometryutils${PROJECT_VERSION_MAJOR})
 set(development_package libgeometryutils-dev)
 set(tools_package geometryutils-tools)

@@ -40,6 +40,12 @@ install(
 set(pkgconfig_dir ${CMAKE_INSTALL_LIBDIR}/pkgconfig)
 file(RELATIVE_PATH pkgconfig_to_prefix /${pkgconfig_dir} /)
 string(REGEX REPLACE "/$" "" pkgconfig_to_prefix "${pkgconfig_to_prefix}")
+# What a program linked by another compiler than that of C++ needs besides a static library.
+set(pkgconfig_private_libs ${CMAKE_CXX_IMPLICIT_LINK_LIBRARIES})
+list(FILTER pkgconfig_private_libs INCLUDE REGEX "^(stdc\\+\\+|c\\+\\+|m)$")
+list(REMOVE_DUPLICATES pkgconfig_private_libs)
+list(TRANSFORM pkgconfig_private_libs PREPEND -l)
+list(JOIN pkgconfig_private_libs " " pkgconfig_private_libs)
 configure_file(${PROJECT_SOURCE_DIR}/cmake/GeometryUtils.pc.in
                ${PROJECT_BINARY_DIR}/GeometryUtils.pc @ONLY)
 install(

@@ -44,7 +44,8 @@ endfunction()
 # Hidden visibility does not hide the instances of standard templates (namespace std has default
 # visibility), so the linker gets the list of what leaves the library.
 function(vorn_export_only_the_classes target)
-  if(NOT CMAKE_SYSTEM_NAME STREQUAL "Linux")
+  get_target_property(type ${target} TYPE)
+  if(NOT CMAKE_SYSTEM_NAME STREQUAL "Linux" OR NOT type STREQUAL "SHARED_LIBRARY")
     return()
   endif()
   set(map ${PROJECT_SOURCE_DIR}/cmake/exports.map)
