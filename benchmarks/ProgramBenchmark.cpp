@@ -8,10 +8,10 @@
 
 #include "benchmarks/Measure.h"
 #include "benchmarks/Registration.h"
-#include "cli/CsvReader.h"
-#include "cli/Numbers.h"
-#include "cli/Remeasure.h"
-#include "cli/formats/Shapes.h"
+#include "io/base/Numbers.h"
+#include "io/measure/Remeasure.h"
+#include "io/pieces/Shapes.h"
+#include "io/points/CsvReader.h"
 
 namespace Vorn::Benchmarks {
 namespace {
@@ -22,8 +22,8 @@ std::string PointsText(std::int64_t count) {
   for (std::int64_t i = 0; i < count; ++i) {
     double const angle =
         2.0 * std::numbers::pi * static_cast<double>(i) / static_cast<double>(count);
-    text += Cli::FormatExact(100.0 * std::cos(angle)) + "," +
-            Cli::FormatExact(100.0 * std::sin(angle)) + "\n";
+    text += IO::FormatExact(100.0 * std::cos(angle)) + "," +
+            IO::FormatExact(100.0 * std::sin(angle)) + "\n";
   }
   return text;
 }
@@ -32,7 +32,7 @@ void ReadPoints(benchmark::State& state, std::int64_t count) {
   std::string const text = PointsText(count);
   std::size_t read = 0;
   for (auto _ : state) {
-    Cli::PointFile const file = Cli::ParsePoints(text, "points.csv", {});
+    IO::PointFile const file = IO::ParsePoints(text, "points.csv", {});
     read = file.points.size();
     benchmark::DoNotOptimize(file.points.data());
   }
@@ -40,25 +40,25 @@ void ReadPoints(benchmark::State& state, std::int64_t count) {
   CountTimePer(&state, "seconds_per_point", count);
 }
 
-std::vector<Cli::Piece> Polygon(int corners) {
+std::vector<IO::Piece> Polygon(int corners) {
   auto const corner = [corners](int i) {
     double const angle = 2.0 * std::numbers::pi * i / corners;
     return GeometryUtils::Point{100.0 * std::cos(angle), 100.0 * std::sin(angle)};
   };
-  std::vector<Cli::Piece> pieces;
-  for (int i = 0; i < corners; ++i) pieces.push_back(Cli::MakeLine(corner(i), corner(i + 1)));
+  std::vector<IO::Piece> pieces;
+  for (int i = 0; i < corners; ++i) pieces.push_back(IO::MakeLine(corner(i), corner(i + 1)));
   return pieces;
 }
 
 /// Against a polygon of a thousand sides.
 void MeasurePoints(benchmark::State& state, std::int64_t count) {
   constexpr int kSides = 1000;
-  std::vector<Cli::Piece> const pieces = Polygon(kSides);
-  std::vector<WPoint> points = Cli::ParsePoints(PointsText(count), "points.csv", {}).points;
+  std::vector<IO::Piece> const pieces = Polygon(kSides);
+  std::vector<WPoint> points = IO::ParsePoints(PointsText(count), "points.csv", {}).points;
   for (WPoint& point : points) point.w = 0.01;
   double worst = 0.0;
   for (auto _ : state) {
-    worst = Cli::Remeasure(points, pieces).Worst().distance;
+    worst = IO::Remeasure(points, pieces).Worst().distance;
     benchmark::DoNotOptimize(worst);
   }
   double const rise = 100.0 * (1.0 - std::cos(std::numbers::pi / kSides));

@@ -1,7 +1,7 @@
 #include <iostream>
 
-#include "cli/Interruption.h"
 #include "cli/Program.h"
+#include "cli/terminal/Interruption.h"
 
 int main(int argc, char** argv) {
   Vorn::Cli::EndCleanlyOnSignals();

@@ -30,7 +30,7 @@ constexpr void (*kCommands[])(CommandLine& program, Action* action) = {
 };
 
 /// What the command line asks for.
-/// @throws Failure (ExitCode::Usage) when it is not understood or contradicts itself.
+/// @throws Failure (FailureKind::BadArgument) when it is not understood or contradicts itself.
 Action ParseCommandLine(int argc, char const* const* argv) {
   CommandLine line("contour", kText);
   line.SetVersion("contour " CONTOUR_VERSION);
@@ -48,7 +48,7 @@ Action ParseCommandLine(int argc, char const* const* argv) {
 
 ExitCode Dispatch(int argc, char const* const* argv, Console const& console) {
   ExitCode const code = ParseCommandLine(argc, argv)(console);
-  if (!console.out.flush()) throw Failure(ExitCode::File, "standard output: cannot be written");
+  if (!console.out.flush()) throw Failure(FailureKind::File, "standard output: cannot be written");
   return code;
 }
 
@@ -60,7 +60,7 @@ ExitCode RunProgram(int argc, char const* const* argv, std::istream& in, std::os
     return Dispatch(argc, argv, {in, out, err});
   } catch (Failure const& failure) {
     err << "contour: " << failure.what() << '\n';
-    return failure.Code();
+    return ExitCodeOf(failure.Kind());
   } catch (std::exception const& error) {
     err << "contour: internal error: " << error.what() << '\n';
     return ExitCode::Internal;

@@ -2,7 +2,7 @@
 
 #include <iosfwd>
 
-#include "cli/Failure.h"
+#include "cli/ExitCode.h"
 
 namespace Vorn::Cli {
 

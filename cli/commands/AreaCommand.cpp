@@ -5,13 +5,15 @@
 #include <ostream>
 #include <utility>
 
-#include "cli/CsvReader.h"
-#include "cli/Numbers.h"
-#include "cli/TextFile.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/PointsInput.h"
-#include "cli/formats/Format.h"
-#include "cli/measure/ContourArea.h"
+#include "cli/texts/AreaText.h"
+#include "io/base/Numbers.h"
+#include "io/base/TextFile.h"
+#include "io/formats/ContourReader.h"
+#include "io/formats/Format.h"
+#include "io/measure/ContourArea.h"
+#include "io/points/CsvReader.h"
 
 namespace Vorn::Cli {
 
@@ -69,13 +71,13 @@ ContourFile ReadClosed(Options const& options, std::string const& path, Console 
     return PolygonThrough(
         ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns));
   }
-  ContourFile contour = ReadContour(path, console, options.from);
+  ContourFile contour = ReadContour(path, console.in, options.from);
   if (options.doClose) return Closed(std::move(contour));
   if (!IsClosed(contour)) {
     double const gap = Distance(contour.pieces.back().end, contour.pieces.front().start);
-    throw Failure(ExitCode::Usage, contour.path + ": the contour is open, its ends are " +
-                                       FormatShort(gap) +
-                                       " apart; --close measures it with a line between them");
+    throw Failure(FailureKind::BadArgument,
+                  contour.path + ": the contour is open, its ends are " + FormatShort(gap) +
+                      " apart; --close measures it with a line between them");
   }
   return contour;
 }
@@ -120,7 +122,7 @@ void AddOptions(Command& command, Options* options) {
 
 void RefuseSharedInput(std::vector<std::string> const& paths) {
   if (std::count(paths.begin(), paths.end(), kStandardInput) > 1) {
-    throw Failure(ExitCode::Usage, "the standard input can be read only once");
+    throw Failure(FailureKind::BadArgument, "the standard input can be read only once");
   }
 }
 

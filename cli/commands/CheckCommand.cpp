@@ -5,14 +5,16 @@
 #include <ostream>
 #include <utility>
 
-#include "cli/Numbers.h"
-#include "cli/TextFile.h"
-#include "cli/Tolerances.h"
-#include "cli/check/CheckReport.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
-#include "cli/formats/Format.h"
+#include "cli/texts/CheckText.h"
+#include "io/base/Numbers.h"
+#include "io/base/TextFile.h"
+#include "io/formats/ContourReader.h"
+#include "io/formats/Format.h"
+#include "io/measure/CheckReport.h"
+#include "io/points/Tolerances.h"
 
 namespace Vorn::Cli {
 
@@ -88,7 +90,7 @@ std::string TextFor(Options const& options, CheckReport const& report) {
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
   PointFile file = ReadPointsInput(options.points, console);
-  ContourFile contour = ReadContour(options.contour, console, options.from);
+  ContourFile contour = ReadContour(options.contour, console.in, options.from);
   std::string source;
   if (IsToleranceStated(options.points.tolerance, file)) {
     bool const isClosed = FindClosure(file.points, options.closed).isClosed;
@@ -103,7 +105,7 @@ ExitCode Run(Options const& options, Console const& console) {
   outputs.Write(console);
   bool const isOutTaken = options.table == "-" || options.json == "-";
   if (!isOutTaken) console.out << TextFor(options, report);
-  return report.Code();
+  return report.outside.empty() ? ExitCode::Ok : ExitCode::OutsideTolerance;
 }
 
 void AddOptions(Command& command, Options* options) {
@@ -129,7 +131,7 @@ void AddOptions(Command& command, Options* options) {
 
 void RefuseBadFiles(Options const& options) {
   if (options.points.path == kStandardInput && options.contour == kStandardInput) {
-    throw Failure(ExitCode::Usage, "POINTS and CONTOUR cannot both be the standard input");
+    throw Failure(FailureKind::BadArgument, "POINTS and CONTOUR cannot both be the standard input");
   }
   RefuseSharedFiles({{"POINTS", options.points.path}, {"CONTOUR", options.contour}},
                     options.Written());

@@ -3,7 +3,7 @@
 #include <functional>
 #include <iosfwd>
 
-#include "cli/Failure.h"
+#include "cli/ExitCode.h"
 
 namespace Vorn::Cli {
 

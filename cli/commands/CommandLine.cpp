@@ -3,7 +3,7 @@
 #include <CLI/CLI.hpp>
 #include <sstream>
 
-#include "cli/Failure.h"
+#include "io/base/Failure.h"
 
 namespace Vorn::Cli {
 
@@ -12,7 +12,7 @@ namespace {
 [[noreturn]] void RefuseUsage(CLI::App const& program, std::string const& complaint) {
   std::string name;
   for (CLI::App const* command : program.get_subcommands()) name += command->get_name() + " ";
-  throw Failure(ExitCode::Usage,
+  throw Failure(FailureKind::BadArgument,
                 complaint + "\nRun '" + program.get_name() + " " + name + "--help' for the usage.");
 }
 

@@ -6,6 +6,8 @@
 #include <string>
 #include <vector>
 
+#include "cli/Library.h"
+
 namespace CLI {
 class App;
 class Option;
@@ -84,7 +86,8 @@ class CommandLine {
 
   /// Sets what the words say, and calls what is to be called.
   /// @return the answer to a question for help or the version
-  /// @throws Failure (ExitCode::Usage) when they are not understood or contradict themselves.
+  /// @throws Failure (FailureKind::BadArgument) when they are not understood or contradict
+  /// themselves.
   std::optional<std::string> Parse(int argc, char const* const* argv);
 
  private:

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
-#include "cli/Numbers.h"
+#include "io/base/Numbers.h"
 
 namespace Vorn::Cli {
 

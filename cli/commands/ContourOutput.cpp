@@ -1,8 +1,8 @@
 #include "cli/commands/ContourOutput.h"
 
-#include "cli/Failure.h"
-#include "cli/Numbers.h"
 #include "cli/commands/CommonOptions.h"
+#include "io/base/Failure.h"
+#include "io/base/Numbers.h"
 
 namespace Vorn::Cli {
 
@@ -20,8 +20,8 @@ Format OutputFormat(std::string const& path, std::optional<Format> otherwise,
                     std::string const& option) {
   if (std::optional<Format> const format = FormatOf(path)) return *format;
   if (otherwise) return *otherwise;
-  throw Failure(ExitCode::Usage, (path == "-" ? "the standard output" : Quoted(path)) + ": " +
-                                     option + " must say which format to write");
+  throw Failure(FailureKind::BadArgument, (path == "-" ? "the standard output" : Quoted(path)) +
+                                              ": " + option + " must say which format to write");
 }
 
 }  // namespace Vorn::Cli

@@ -3,7 +3,8 @@
 #include <optional>
 #include <string>
 
-#include "cli/formats/Format.h"
+#include "cli/Library.h"
+#include "io/formats/Format.h"
 
 namespace Vorn::Cli {
 
@@ -14,7 +15,7 @@ void AddWriteOptions(Command& command, WriteOptions* options);
 
 /// The format of a file to write: by its ending, else `otherwise`.
 /// @param option what to give when neither tells, for the message
-/// @throws Failure (ExitCode::Usage) when neither tells.
+/// @throws Failure (FailureKind::BadArgument) when neither tells.
 Format OutputFormat(std::string const& path, std::optional<Format> otherwise,
                     std::string const& option);
 

@@ -5,12 +5,13 @@
 #include <ostream>
 #include <utility>
 
-#include "cli/Numbers.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
 #include "cli/commands/Outputs.h"
-#include "cli/drawing/Drawing.h"
-#include "cli/formats/Format.h"
+#include "io/base/Numbers.h"
+#include "io/drawing/Drawing.h"
+#include "io/formats/ContourReader.h"
+#include "io/formats/Format.h"
 
 namespace Vorn::Cli {
 
@@ -72,7 +73,8 @@ struct Options {
 Format FormatFor(Options const& options, std::string const& path) {
   std::optional<Format> const format = options.to ? options.to : FormatOf(path);
   std::string const what = path == "-" ? "the standard output" : path;
-  if (!format) throw Failure(ExitCode::Usage, what + ": --to must say which format to write");
+  if (!format)
+    throw Failure(FailureKind::BadArgument, what + ": --to must say which format to write");
   return *format;
 }
 
@@ -98,7 +100,7 @@ void Report(Options const& options, ContourFile const& contour, Console const& c
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile contour = ReadContour(options.input, console, options.from);
+  ContourFile contour = ReadContour(options.input, console.in, options.from);
   if (!options.units.empty()) contour.units = options.units;
   Outputs outputs;
   for (std::string const& path : options.outputs) {

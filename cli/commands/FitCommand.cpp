@@ -8,19 +8,19 @@
 #include <sstream>
 #include <utility>
 
-#include "cli/ContourFit.h"
-#include "cli/Json.h"
-#include "cli/Numbers.h"
-#include "cli/Progress.h"
-#include "cli/Report.h"
-#include "cli/Table.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
 #include "cli/commands/FitMany.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
-#include "cli/drawing/Drawing.h"
-#include "cli/formats/Format.h"
+#include "cli/terminal/Progress.h"
+#include "cli/texts/FitTable.h"
+#include "io/base/Numbers.h"
+#include "io/drawing/Drawing.h"
+#include "io/fit/ContourFit.h"
+#include "io/fit/FitJson.h"
+#include "io/fit/FitReport.h"
+#include "io/formats/Format.h"
 
 namespace Vorn::Cli {
 
@@ -273,7 +273,9 @@ void AddManyOptions(Command& command, Options* options) {
 }
 
 void RefuseWrongUse(Options const& options) {
-  auto const refuse = [](std::string const& message) { throw Failure(ExitCode::Usage, message); };
+  auto const refuse = [](std::string const& message) {
+    throw Failure(FailureKind::BadArgument, message);
+  };
   if (options.AreMany()) {
     if (!options.outputs.empty() || !options.json.empty() || !options.svg.empty()) {
       refuse("many files are written with --out-dir and --to, not with -o, --json or --svg");

@@ -14,8 +14,8 @@
 #include <ostream>
 #include <utility>
 
-#include "cli/Numbers.h"
 #include "cli/commands/Outputs.h"
+#include "io/base/Numbers.h"
 
 namespace Vorn::Cli {
 
@@ -96,7 +96,7 @@ Outcome Guarded(std::string const& path, Step const& step) {
   try {
     return step();
   } catch (Failure const& failure) {
-    return Failed(path, failure.Code(), failure.what());
+    return Failed(path, ExitCodeOf(failure.Kind()), failure.what());
   } catch (std::exception const& error) {
     return Failed(path, ExitCode::Internal, path + ": internal error: " + error.what());
   }
@@ -190,8 +190,8 @@ void MakeFolder(std::string const& folder) {
   std::error_code error;
   fs::create_directories(folder, error);
   if (error || !fs::is_directory(folder)) {
-    throw Failure(ExitCode::File, folder + ": the folder cannot be made: " +
-                                      (error ? error.message() : "a file has this name"));
+    throw Failure(FailureKind::File, folder + ": the folder cannot be made: " +
+                                         (error ? error.message() : "a file has this name"));
   }
 }
 
@@ -212,7 +212,7 @@ void RefuseCollisions(FitMany const& many) {
   std::map<std::string, std::string> inputs;
   for (std::string const& path : many.paths) {
     if (path == kStandardStream) {
-      throw Failure(ExitCode::Usage, "the standard input cannot be one of many files");
+      throw Failure(FailureKind::BadArgument, "the standard input cannot be one of many files");
     }
     inputs.emplace(WholePath(path), path);
   }
@@ -223,13 +223,13 @@ void RefuseCollisions(FitMany const& many) {
       std::string const output = OutputOf(many, path, format);
       std::string const whole = WholePath(output);
       if (auto const input = inputs.find(whole); input != inputs.end()) {
-        throw Failure(ExitCode::Usage,
+        throw Failure(FailureKind::BadArgument,
                       "the fit of " + path + " would be written over the input " + input->second);
       }
       auto const [other, isNew] = outputs.emplace(whole, path);
       if (!isNew) {
-        throw Failure(ExitCode::Usage, "the fits of " + other->second + " and " + path +
-                                           " would both be written to " + output);
+        throw Failure(FailureKind::BadArgument, "the fits of " + other->second + " and " + path +
+                                                    " would both be written to " + output);
       }
     }
   }

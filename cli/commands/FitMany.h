@@ -5,9 +5,9 @@
 #include <string>
 #include <vector>
 
-#include "cli/Report.h"
 #include "cli/commands/Command.h"
-#include "cli/formats/Format.h"
+#include "io/fit/FitReport.h"
+#include "io/formats/Format.h"
 
 namespace Vorn::Cli {
 
@@ -26,7 +26,8 @@ struct FitMany {
 /// The file that the fit of `path` is written to: the name of the input with another ending.
 std::string OutputOf(FitMany const& many, std::string const& path, Format format);
 
-/// @throws Failure (ExitCode::Usage) naming the files when an input is the standard input, two
+/// @throws Failure (FailureKind::BadArgument) naming the files when an input is the standard input,
+/// two
 ///         outputs have one name, or an output is an input.
 void RefuseCollisions(FitMany const& many);
 

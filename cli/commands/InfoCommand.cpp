@@ -3,9 +3,10 @@
 #include <memory>
 #include <ostream>
 
-#include "cli/Tolerances.h"
-#include "cli/analysis/InfoReport.h"
 #include "cli/commands/PointsInput.h"
+#include "cli/texts/InfoText.h"
+#include "io/points/InfoReport.h"
+#include "io/points/Tolerances.h"
 
 namespace Vorn::Cli {
 

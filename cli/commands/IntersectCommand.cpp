@@ -3,11 +3,13 @@
 #include <memory>
 #include <ostream>
 
-#include "cli/TextFile.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
-#include "cli/formats/Format.h"
-#include "cli/intersect/Intersections.h"
+#include "cli/texts/IntersectionText.h"
+#include "io/base/TextFile.h"
+#include "io/formats/ContourReader.h"
+#include "io/formats/Format.h"
+#include "io/measure/Intersections.h"
 
 namespace Vorn::Cli {
 
@@ -65,9 +67,9 @@ struct Options {
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile const a = ReadContour(options.a, console, options.from);
+  ContourFile const a = ReadContour(options.a, console.in, options.from);
   std::optional<ContourFile> other;
-  if (!options.b.empty()) other = ReadContour(options.b, console, options.from);
+  if (!options.b.empty()) other = ReadContour(options.b, console.in, options.from);
   ContourFile const* const b = other ? &*other : nullptr;
   std::vector<Intersection> const found =
       b == nullptr ? SelfIntersectionsOf(a) : IntersectionsOf(a, *b);
@@ -98,7 +100,7 @@ void AddOptions(Command& command, Options* options) {
 
 void RefuseBadFiles(Options const& options) {
   if (options.a == kStandardInput && options.b == kStandardInput) {
-    throw Failure(ExitCode::Usage, "A and B cannot both be the standard input");
+    throw Failure(FailureKind::BadArgument, "A and B cannot both be the standard input");
   }
   RefuseSharedFiles(options.Read(), options.Written());
 }

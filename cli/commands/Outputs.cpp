@@ -4,8 +4,8 @@
 #include <memory>
 #include <ostream>
 
-#include "cli/AtomicFile.h"
-#include "cli/Interruption.h"
+#include "cli/terminal/Interruption.h"
+#include "io/base/AtomicFile.h"
 
 namespace Vorn::Cli {
 
@@ -25,7 +25,7 @@ bool AreSameFile(std::string const& a, std::string const& b) {
 [[noreturn]] void Refuse(NamedFile const& a, NamedFile const& b) {
   std::string const what = b.path == "-" ? "the standard output" : "the same file: " + b.path;
   std::string const who = a.option == b.option ? "two " + a.option : a.option + " and " + b.option;
-  throw Failure(ExitCode::Usage, who + " name " + what);
+  throw Failure(FailureKind::BadArgument, who + " name " + what);
 }
 
 /// All of them or, when interrupted, none.
@@ -50,7 +50,7 @@ void RefuseSharedFiles(std::vector<NamedFile> const& read, std::vector<NamedFile
 
 void RequireWritable(std::vector<NamedFile> const& files) {
   for (NamedFile const& file : files) {
-    if (file.path != "-") RequireWritable(file.path);
+    if (file.path != "-") IO::RequireWritable(file.path);
   }
 }
 

@@ -15,11 +15,11 @@ struct NamedFile {
 };
 
 /// Refuses that a file is written twice or written over what is read; "-" is no file.
-/// @throws Failure (ExitCode::Usage) naming both options and the file.
+/// @throws Failure (FailureKind::BadArgument) naming both options and the file.
 void RefuseSharedFiles(std::vector<NamedFile> const& read, std::vector<NamedFile> const& written);
 
 /// Finds out before a long computation that a file could not be written afterwards.
-/// @throws Failure (ExitCode::File) naming the file.
+/// @throws Failure (FailureKind::File) naming the file.
 void RequireWritable(std::vector<NamedFile> const& files);
 
 /// The results of a command on their way into files and to the standard output.
@@ -29,7 +29,7 @@ class Outputs {
   void Add(std::string const& path, std::string text);
 
   /// Writes every file whole or none of them, then the standard output.
-  /// @throws Failure (ExitCode::File) naming the file.
+  /// @throws Failure (FailureKind::File) naming the file.
   void Write(Console const& console) const;
 
  private:

@@ -7,14 +7,14 @@
 #include <ostream>
 #include <utility>
 
-#include "cli/Numbers.h"
-#include "cli/Tolerances.h"
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
-#include "cli/drawing/Drawing.h"
-#include "cli/formats/ContourFile.h"
-#include "cli/formats/Format.h"
+#include "io/base/Numbers.h"
+#include "io/drawing/Drawing.h"
+#include "io/formats/ContourReader.h"
+#include "io/formats/Format.h"
+#include "io/points/Tolerances.h"
 
 namespace Vorn::Cli {
 
@@ -89,10 +89,10 @@ Format FormatFor(Options const& options, std::string const& path) {
   std::optional<Format> const format = options.to ? options.to : FormatOf(path);
   if (!format) {
     std::string const what = path == "-" ? "the standard output" : path;
-    throw Failure(ExitCode::Usage, what + ": --to must say which format to write");
+    throw Failure(FailureKind::BadArgument, what + ": --to must say which format to write");
   }
   if (HoldsContour(*format)) {
-    throw Failure(ExitCode::Usage,
+    throw Failure(FailureKind::BadArgument,
                   path + ": not a drawing; 'contour convert' writes " + NameOf(*format));
   }
   return *format;
@@ -104,7 +104,7 @@ void TellContourFromPoints(Options* options) {
   std::optional<Format> const format = FormatOf(options->points.path);
   if (!format || !HoldsContour(*format) || *format == Format::Csv) return;
   if (options->IsAboutPoints()) {
-    throw Failure(ExitCode::Usage,
+    throw Failure(FailureKind::BadArgument,
                   options->points.path +
                       ": a contour alone has nothing to judge or to magnify; POINTS is missing");
   }
@@ -114,7 +114,7 @@ void TellContourFromPoints(Options* options) {
 
 void RefuseSharedInput(Options const& options) {
   if (options.points.path == "-" && options.contour == "-") {
-    throw Failure(ExitCode::Usage, "POINTS and CONTOUR cannot both be the standard input");
+    throw Failure(FailureKind::BadArgument, "POINTS and CONTOUR cannot both be the standard input");
   }
 }
 
@@ -123,7 +123,7 @@ std::string NameOfFile(std::string const& path) {
 }
 
 ContourFile ReadDrawnContour(std::string const& path, Console const& console) {
-  ContourFile contour = ReadContour(path, console);
+  ContourFile contour = ReadContour(path, console.in);
   for (Gap const& gap : FindGaps(contour)) {
     console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
   }

@@ -1,7 +1,7 @@
 #include "cli/commands/PointsInput.h"
 
-#include "cli/Numbers.h"
 #include "cli/commands/CommonOptions.h"
+#include "io/base/Numbers.h"
 
 namespace Vorn::Cli {
 

@@ -2,11 +2,11 @@
 
 #include <string>
 
-#include "cli/Closure.h"
-#include "cli/CsvReader.h"
-#include "cli/Tolerances.h"
 #include "cli/commands/Command.h"
 #include "cli/commands/CommandLine.h"
+#include "io/points/Closure.h"
+#include "io/points/CsvReader.h"
+#include "io/points/Tolerances.h"
 
 namespace Vorn::Cli {
 

@@ -5,11 +5,11 @@
 #include <memory>
 #include <ostream>
 
-#include "cli/DropClose.h"
-#include "cli/Numbers.h"
-#include "cli/TextFile.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
+#include "io/base/Numbers.h"
+#include "io/base/TextFile.h"
+#include "io/points/DropClose.h"
 
 namespace Vorn::Cli {
 
@@ -73,7 +73,7 @@ std::vector<std::size_t> KeptPoints(Options const& options, PointFile* file) {
   Closure const closure = FindClosure(file->points, options.closed);
   if (closure.isClosed && !closure.repeatsFirst) DropCloseToFirst(file->points, rule, &kept);
   if (kept.size() < 2) {
-    throw Failure(ExitCode::PointsTooClose,
+    throw Failure(FailureKind::PointsTooClose,
                   file->path + ": fewer than two points would be left: all lie too close to " +
                       file->NameOf(0));
   }

@@ -7,7 +7,7 @@
 #include <sstream>
 
 #include "cli/RunInProcess.h"
-#include "cli/TextFile.h"
+#include "io/base/TextFile.h"
 
 namespace Vorn::Cli {
 namespace {

@@ -3,11 +3,12 @@
 #include <filesystem>
 #include <fstream>
 
-#include "cli/FormatContours.h"
 #include "cli/RunInProcess.h"
-#include "cli/formats/CsvPieces.h"
-#include "cli/formats/Format.h"
-#include "cli/formats/JsonPieces.h"
+#include "io/FormatContours.h"
+#include "io/formats/ContourReader.h"
+#include "io/formats/CsvPieces.h"
+#include "io/formats/Format.h"
+#include "io/formats/JsonPieces.h"
 
 namespace Vorn::Cli {
 namespace {

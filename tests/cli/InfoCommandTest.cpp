@@ -3,7 +3,7 @@
 #include <nlohmann/json.hpp>
 
 #include "cli/RunInProcess.h"
-#include "cli/Spacing.h"
+#include "io/points/Spacing.h"
 #include "support/SharedData.h"
 
 namespace Vorn::Cli {

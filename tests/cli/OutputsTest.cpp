@@ -16,7 +16,7 @@ std::string Refusal(std::vector<NamedFile> const& read, std::vector<NamedFile> c
   try {
     RefuseSharedFiles(read, written);
   } catch (Failure const& failure) {
-    EXPECT_EQ(failure.Code(), ExitCode::Usage);
+    EXPECT_EQ(failure.Kind(), FailureKind::BadArgument);
     return failure.what();
   }
   return "";

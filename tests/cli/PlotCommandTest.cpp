@@ -7,7 +7,7 @@
 #include <sstream>
 
 #include "cli/RunInProcess.h"
-#include "cli/drawing/Drawing.h"
+#include "io/drawing/Drawing.h"
 
 namespace Vorn::Cli {
 namespace {

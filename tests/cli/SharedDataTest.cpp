@@ -10,11 +10,11 @@
 #include <nlohmann/json.hpp>
 #include <sstream>
 
-#include "cli/Picture.h"
 #include "cli/RunInProcess.h"
-#include "cli/TextFile.h"
-#include "cli/drawing/Style.h"
-#include "cli/formats/ContourFile.h"
+#include "io/Picture.h"
+#include "io/base/TextFile.h"
+#include "io/drawing/Style.h"
+#include "io/formats/ContourReader.h"
 #include "support/SharedData.h"
 
 namespace Vorn::Cli {

@@ -1,0 +1,57 @@
+#include "cli/texts/AreaText.h"
+
+#include <algorithm>
+#include <cmath>
+
+#include "io/base/Numbers.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr int kDigits = 10;
+constexpr std::size_t kNameWidth = 12;
+
+std::string Number(double value) { return FormatShort(value, kDigits); }
+
+std::string Fact(std::string name, std::string const& text) {
+  name.resize(kNameWidth, ' ');
+  return name + text + "\n";
+}
+
+std::string PointText(XY const& point) {
+  return "(" + Number(point.x) + ", " + Number(point.y) + ")";
+}
+
+std::string Heading(ContourArea const& area) {
+  std::vector<Piece> const& pieces = area.contour.pieces;
+  auto const arcs = static_cast<std::size_t>(std::count_if(
+      pieces.begin(), pieces.end(), [](Piece const& piece) { return piece.IsArc(); }));
+  std::string const& units = area.contour.units;
+  return area.contour.path + ": " + Counted(pieces.size(), "piece") + ", " +
+         Counted(pieces.size() - arcs, "line") + ", " + Counted(arcs, "arc") +
+         (units.empty() ? "" : ", lengths in " + units) + "\n";
+}
+
+std::string CrossingText(ContourArea const& area) {
+  std::string const text = Describe(area.crossing);
+  if (area.crossing != Crossing::Found) return text;
+  return text + ": the area is the sum of its loops, each with its sign";
+}
+
+}  // namespace
+
+std::string ToText(ContourArea const& area) {
+  std::string text = Heading(area);
+  text += Fact("area", Number(std::fabs(area.signedArea)));
+  text += Fact("signed", Number(area.signedArea) + ", positive counter-clockwise with y up");
+  text += Fact("sense", SenseOf(area));
+  text += Fact("perimeter", Number(area.perimeter));
+  text += Fact("centroid", area.centroid ? PointText(*area.centroid) : "none");
+  text += Fact("box", PointText(area.extent.low) + " to " + PointText(area.extent.high));
+  text += Fact("crossing", CrossingText(area));
+  for (Gap const& gap : area.gaps) text += Fact("gap", Describe(gap) + ", bridged");
+  return text;
+}
+
+}  // namespace Vorn::Cli

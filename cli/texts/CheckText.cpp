@@ -1,0 +1,147 @@
+#include "cli/texts/CheckText.h"
+
+#include <algorithm>
+
+#include "io/base/Numbers.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+constexpr std::size_t kMostGaps = 10;
+constexpr std::size_t kNameWidth = 12;
+constexpr int kRelativeDecimals = 6;
+
+using Row = std::vector<std::string>;
+
+std::string Fact(std::string name, std::string const& text) {
+  name.resize(kNameWidth, ' ');
+  return name + text + "\n";
+}
+
+std::string PlaceOf(CheckReport const& report, std::size_t point) {
+  PointDeviation const& deviation = report.deviations[point];
+  return report.file.NameOf(point) + ", to the " + (deviation.isLeft ? "left" : "right") +
+         " of piece " + std::to_string(deviation.piece + 1);
+}
+
+std::string PiecesText(CheckReport const& report) {
+  std::vector<Piece> const& pieces = report.contour.pieces;
+  auto const arcs = static_cast<std::size_t>(std::count_if(
+      pieces.begin(), pieces.end(), [](Piece const& piece) { return piece.IsArc(); }));
+  double length = 0.0;
+  for (Piece const& piece : pieces) length += piece.length;
+  return std::to_string(pieces.size()) + ": " + Counted(pieces.size() - arcs, "line") + ", " +
+         Counted(arcs, "arc") + ", " + FormatShort(length) + " long, " +
+         (report.contour.isClosed ? "closed" : "open");
+}
+
+std::string DeviationFacts(CheckReport const& report) {
+  std::string text = Fact("largest", FormatShort(report.deviations[report.furthest].distance) +
+                                         " at " + PlaceOf(report, report.furthest));
+  if (!report.HasTolerances()) return text;
+  text +=
+      Fact("relative", FormatFixed(report.deviations[report.worst].relative, kRelativeDecimals) +
+                           " of the tolerance at " + PlaceOf(report, report.worst));
+  std::string const total = Counted(report.file.points.size(), "point");
+  return text + Fact("outside", report.outside.empty()
+                                    ? "none of " + total
+                                    : std::to_string(report.outside.size()) + " of " + total);
+}
+
+std::string ToleranceText(CheckReport const& report) {
+  if (!report.HasTolerances()) return "none given: deviations are lengths";
+  auto const [smallest, largest] =
+      std::minmax_element(report.file.points.begin(), report.file.points.end(),
+                          [](WPoint const& a, WPoint const& b) { return a.w < b.w; });
+  std::string text = FormatShort(smallest->w);
+  if (smallest->w != largest->w) text += " to " + FormatShort(largest->w);
+  return text + " (" + report.toleranceSource + ")";
+}
+
+std::string JointFacts(CheckReport const& report) {
+  std::vector<Gap> const& gaps = report.gaps;
+  if (gaps.empty()) return Fact("joints", "the pieces meet");
+  std::string text = Fact("joints", Counted(gaps.size(), "gap"));
+  for (std::size_t i = 0; i < std::min(gaps.size(), kMostGaps); ++i) {
+    text += Fact("", Describe(gaps[i]));
+  }
+  if (gaps.size() > kMostGaps) {
+    text += Fact("", "and " + std::to_string(gaps.size() - kMostGaps) + " more");
+  }
+  return text;
+}
+
+std::string AreaText(CheckReport const& report) {
+  if (!report.contour.isClosed) return "none: the contour is open";
+  if (!report.enclosed) return "not known: the contour crosses itself or cannot be tested";
+  return FormatShort(report.enclosed->area) + ", " +
+         (report.enclosed->isCounterClockwise ? "counter-clockwise" : "clockwise") + " (y up)";
+}
+
+std::string ResultText(CheckReport const& report) {
+  if (!report.HasTolerances()) return "measured";
+  return report.outside.empty() ? "within tolerance" : "OUTSIDE TOLERANCE";
+}
+
+std::string Summary(CheckReport const& report) {
+  return Fact("points", std::to_string(report.file.points.size())) +
+         Fact("pieces", PiecesText(report)) + Fact("tolerance", ToleranceText(report)) +
+         DeviationFacts(report) + JointFacts(report) + Fact("crossing", Describe(report.crossing)) +
+         Fact("area", AreaText(report)) + Fact("result", ResultText(report));
+}
+
+Row Header(CheckReport const& report) {
+  Row row = {"point", "line", "x", "y", "deviation", "piece"};
+  if (report.HasTolerances()) row.insert(row.end(), {"tolerance", "relative"});
+  return row;
+}
+
+Row PointRow(CheckReport const& report, std::size_t point) {
+  WPoint const& measured = report.file.points[point];
+  PointDeviation const& deviation = report.deviations[point];
+  Row row = {std::to_string(point),
+             std::to_string(report.file.lines[point]),
+             FormatShort(measured.x),
+             FormatShort(measured.y),
+             FormatShort(SignedDistance(deviation)),
+             std::to_string(deviation.piece + 1)};
+  if (report.HasTolerances()) {
+    row.push_back(FormatShort(measured.w));
+    row.push_back(FormatFixed(deviation.relative, kRelativeDecimals));
+  }
+  return row;
+}
+
+std::string Aligned(std::vector<Row> const& rows) {
+  std::vector<std::size_t> widths(rows.front().size());
+  for (Row const& row : rows) {
+    for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
+  }
+  std::string text;
+  for (Row const& row : rows) {
+    for (std::size_t i = 0; i < row.size(); ++i) {
+      if (i > 0) text += "  ";
+      text.append(widths[i] - row[i].size(), ' ');
+      text += row[i];
+    }
+    text += "\n";
+  }
+  return text;
+}
+
+}  // namespace
+
+std::string ToText(CheckReport const& report, std::vector<std::size_t> const& order,
+                   std::size_t rows) {
+  std::vector<Row> table = {Header(report)};
+  for (std::size_t i = 0; i < std::min(rows, order.size()); ++i) {
+    table.push_back(PointRow(report, order[i]));
+  }
+  std::string const& units = report.file.units;
+  return report.file.path + " against " + report.contour.path +
+         (units.empty() ? "" : ", lengths in " + units) + "\n\n" + Summary(report) + "\n" +
+         Aligned(table);
+}
+
+}  // namespace Vorn::Cli

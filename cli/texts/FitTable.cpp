@@ -1,0 +1,156 @@
+#include "cli/texts/FitTable.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numbers>
+
+#include "io/base/Numbers.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+using Row = std::vector<std::string>;
+
+constexpr int kMostDecimals = 9;
+constexpr double kLargestFixed = 1e9;
+
+/// Coordinates are printed to a hundredth of the smallest tolerance, as long as that gives
+/// columns of a readable width.
+class LengthFormat {
+ public:
+  LengthFormat(Report const& report, std::optional<int> wanted) {
+    if (wanted) {
+      decimals_ = *wanted;
+      return;
+    }
+    double const digits = 2.0 - std::floor(std::log10(report.SmallestTolerance()));
+    decimals_ = static_cast<int>(std::clamp(digits, 0.0, static_cast<double>(kMostDecimals)));
+    isFixed_ = digits <= kMostDecimals;
+  }
+
+  std::string operator()(double value) const {
+    if (isFixed_ && std::fabs(value) < kLargestFixed) return FormatFixed(value, decimals_);
+    return FormatShort(value, kMostDecimals);
+  }
+
+ private:
+  int decimals_ = 0;
+  bool isFixed_ = true;
+};
+
+Row Header() {
+  return {"no",       "kind",   "start x",   "start y", "end x",  "end y", "centre x",
+          "centre y", "radius", "direction", "sweep",   "length", "points"};
+}
+
+Row PieceRow(Report const& report, std::size_t i, LengthFormat const& length) {
+  Piece const& piece = report.pieces[i];
+  Row row = {std::to_string(i + 1), piece.IsArc() ? "arc" : "line",
+             length(piece.start.x), length(piece.start.y),
+             length(piece.end.x),   length(piece.end.y)};
+  if (piece.IsArc()) {
+    double const degrees = piece.sweep * 180.0 / std::numbers::pi;
+    row.insert(row.end(), {length(piece.center.x), length(piece.center.y), length(piece.radius),
+                           piece.counterClockwise ? "ccw" : "cw", FormatFixed(degrees, 3)});
+  } else {
+    row.insert(row.end(), 5, "-");
+  }
+  row.push_back(length(piece.length));
+  row.push_back(report.ranges ? std::to_string((*report.ranges)[i].count) : "-");
+  return row;
+}
+
+/// Columns as wide as their widest entry; words to the left, numbers to the right.
+std::string Aligned(std::vector<Row> const& rows) {
+  std::vector<std::size_t> widths(rows.front().size());
+  for (Row const& row : rows) {
+    for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
+  }
+  std::string text;
+  for (Row const& row : rows) {
+    std::string line;
+    for (std::size_t i = 0; i < row.size(); ++i) {
+      std::string const padding(widths[i] - row[i].size(), ' ');
+      bool const isWord = rows.front()[i] == "kind" || rows.front()[i] == "direction";
+      line += (i > 0 ? "  " : "") + (isWord ? row[i] + padding : padding + row[i]);
+    }
+    line.erase(line.find_last_not_of(' ') + 1);
+    text += line + "\n";
+  }
+  return text;
+}
+
+std::string WithUnits(std::string const& number, Report const& report) {
+  return report.file.units.empty() ? number : number + " " + report.file.units;
+}
+
+std::string ToleranceText(Report const& report) {
+  double const smallest = report.SmallestTolerance();
+  double const largest = report.LargestTolerance();
+  std::string text = FormatShort(smallest);
+  if (smallest != largest) text += " to " + FormatShort(largest);
+  return WithUnits(text, report) + " (" + report.toleranceSource + ")";
+}
+
+std::string ReportedText(Report const& report) {
+  FitAnswer const& fit = report.fit;
+  if (report.isFullCircle) return "nothing: a full circle is fitted by the program itself";
+  if (!IsDeviationRelative(report.strategy)) {
+    return WithUnits(FormatShort(fit.deviation), report) +
+           " as a length (this strategy reports no relative deviation and no point)";
+  }
+  std::string const text = FormatFixed(fit.deviation, 6) + " of the tolerance";
+  if (fit.deviationIndex < 0) return text + ", exact by construction";
+  return text + " at " + report.file.NameOf(static_cast<std::size_t>(fit.deviationIndex));
+}
+
+std::string RemeasuredText(Report const& report) {
+  PointDeviation const& worst = report.remeasured.Worst();
+  return FormatFixed(worst.relative, 6) + " of the tolerance at " +
+         report.file.NameOf(report.remeasured.worst) + ", " +
+         WithUnits(FormatShort(worst.distance), report) + " from piece " +
+         std::to_string(worst.piece + 1);
+}
+
+std::string ClosedText(Report const& report) {
+  Closure const& closure = report.closure;
+  if (!closure.isClosed) return "no" + (closure.reason.empty() ? "" : " (" + closure.reason + ")");
+  std::string const seam = report.file.NameOf(report.seam);
+  std::string const text = "yes (" + closure.reason + "), ";
+  if (report.Gap() == 0.0) return text + "joined exactly at " + seam;
+  return text + "GAP of " + WithUnits(FormatShort(report.Gap()), report) + " at " + seam;
+}
+
+std::string CompressionText(Report const& report) {
+  auto const points = static_cast<double>(report.file.points.size());
+  auto const pieces = static_cast<double>(report.pieces.size());
+  return FormatFixed(points / pieces, 1) + " points a piece, " +
+         FormatFixed(100.0 * pieces / points, 1) + " % of the points";
+}
+
+std::string Summary(Report const& report) {
+  return "points      " + std::to_string(report.file.points.size()) + "\n" + "tolerance   " +
+         ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) + "\n" +
+         "closed      " + ClosedText(report) + "\n" + "pieces      " +
+         std::to_string(report.pieces.size()) + ": " + Counted(report.LineCount(), "line") + ", " +
+         Counted(report.ArcCount(), "arc") + "\n" + "compression " + CompressionText(report) +
+         "\n" + "reported    " + ReportedText(report) + "\n" + "re-measured " +
+         RemeasuredText(report) + "\n" + "result      " + Describe(report.verdict) + "\n" +
+         "time        " + FormatFixed(report.fit.seconds, 3) + " s\n";
+}
+
+}  // namespace
+
+std::string ToTable(Report const& report, std::optional<int> digits) {
+  LengthFormat const length(report, digits);
+  std::vector<Row> rows = {Header()};
+  for (std::size_t i = 0; i < report.pieces.size(); ++i) {
+    rows.push_back(PieceRow(report, i, length));
+  }
+  std::string const units = report.file.units.empty() ? "" : ", lengths in " + report.file.units;
+  return report.file.path + units + ", sweeps in degrees\n\n" + Aligned(rows) + "\n" +
+         Summary(report);
+}
+
+}  // namespace Vorn::Cli

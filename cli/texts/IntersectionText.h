@@ -1,0 +1,15 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "cli/Library.h"
+#include "io/measure/Intersections.h"
+
+namespace Vorn::Cli {
+
+/// For people. Without `b` the intersections are those of `a` with itself.
+std::string ToText(std::vector<Intersection> const& found, ContourFile const& a,
+                   ContourFile const* b);
+
+}  // namespace Vorn::Cli

@@ -1,0 +1,123 @@
+#include "io/base/AtomicFile.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
+#include <cstdio>
+#include <cstdlib>
+#include <cstring>
+#include <filesystem>
+
+#include "io/base/Failure.h"
+#include "io/base/StagedFiles.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+namespace fs = std::filesystem;
+
+[[noreturn]] void Refuse(std::string const& path, std::string const& reason) {
+  throw Failure(FailureKind::File, path + ": cannot be written: " + reason);
+}
+
+/// Behind symbolic links: the new contents go where a plain write would have put them.
+std::string Target(std::string const& path) {
+  std::error_code error;
+  if (!fs::is_symlink(path, error)) return path;
+  fs::path const target = fs::weakly_canonical(path, error);
+  if (error) Refuse(path, error.message());
+  return target.string();
+}
+
+std::string FolderOf(std::string const& path) {
+  fs::path const folder = fs::path(path).parent_path();
+  return folder.empty() ? "." : folder.string();
+}
+
+mode_t DefaultMode() {
+  mode_t const mask = umask(0);
+  umask(mask);
+  return static_cast<mode_t>(0666) & ~mask;
+}
+
+/// A replaced file keeps its permissions.
+mode_t ModeFor(std::string const& target) {
+  struct stat status {};
+  return stat(target.c_str(), &status) == 0 ? (status.st_mode & 07777) : DefaultMode();
+}
+
+}  // namespace
+
+void RequireWritable(std::string const& path) {
+  std::string const target = Target(path);
+  std::error_code error;
+  fs::file_status const status = fs::status(target, error);
+  if (fs::is_directory(status)) Refuse(path, "is a directory");
+  if (fs::exists(status) && !fs::is_regular_file(status)) Refuse(path, "is not a regular file");
+  if (fs::path(target).filename().empty()) Refuse(path, "names no file");
+  if (access(FolderOf(target).c_str(), W_OK | X_OK) != 0) Refuse(path, std::strerror(errno));
+}
+
+AtomicFile::AtomicFile(std::string const& path, std::string_view contents)
+    : path_(path), target_(Target(path)) {
+  RequireWritable(path);
+  int const descriptor = MakeTemporary();
+  try {
+    Write(descriptor, contents);
+  } catch (...) {
+    close(descriptor);
+    RemoveTemporary();
+    throw;
+  }
+  if (close(descriptor) != 0) {
+    int const reason = errno;
+    RemoveTemporary();
+    Refuse(path_, std::strerror(reason));
+  }
+}
+
+int AtomicFile::MakeTemporary() {
+  std::string name = target_ + ".XXXXXX";
+  auto const lock = LockStagedFiles();
+  int const descriptor = mkstemp(name.data());
+  if (descriptor < 0) Refuse(path_, std::strerror(errno));
+  NoteTemporary(name);
+  temporary_ = name;
+  return descriptor;
+}
+
+void AtomicFile::RemoveTemporary() {
+  auto const lock = LockStagedFiles();
+  unlink(temporary_.c_str());
+  ForgetTemporary(temporary_);
+  temporary_.clear();
+}
+
+void AtomicFile::Write(int descriptor, std::string_view contents) const {
+  while (!contents.empty()) {
+    ssize_t const written = write(descriptor, contents.data(), contents.size());
+    if (written < 0 && errno == EINTR) continue;
+    if (written < 0) Refuse(path_, std::strerror(errno));
+    contents.remove_prefix(static_cast<std::size_t>(written));
+  }
+  if (fchmod(descriptor, ModeFor(target_)) != 0) Refuse(path_, std::strerror(errno));
+  if (fsync(descriptor) != 0) Refuse(path_, std::strerror(errno));
+}
+
+AtomicFile::~AtomicFile() {
+  if (!temporary_.empty()) RemoveTemporary();
+}
+
+void AtomicFile::Commit() {
+  auto const lock = LockStagedFiles();
+  if (std::rename(temporary_.c_str(), target_.c_str()) != 0) {
+    Refuse(path_, std::strerror(errno));
+  }
+  ForgetTemporary(temporary_);
+  temporary_.clear();
+}
+
+}  // namespace Vorn::IO

@@ -1,0 +1,102 @@
+#include "io/base/Numbers.h"
+
+#include <fast_float/fast_float.h>
+
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <cstdio>
+
+namespace Vorn::IO {
+
+namespace {
+
+constexpr std::size_t kLongestQuote = 40;
+
+bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f'; }
+
+bool EveryCommaHasADigitBehind(std::string_view text) {
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    if (text[i] != ',') continue;
+    if (i + 1 == text.size() || text[i + 1] < '0' || text[i + 1] > '9') return false;
+  }
+  return true;
+}
+
+std::string WithoutMinusOnZero(std::string text) {
+  bool const isZero = text.find_first_not_of("-0.") == std::string::npos;
+  if (isZero && text.front() == '-') text.erase(0, 1);
+  return text;
+}
+
+}  // namespace
+
+std::optional<double> ParseNumber(std::string_view text, DecimalMark mark) {
+  if (text.size() > 1 && text.front() == '+' && text[1] != '-') text.remove_prefix(1);
+  if (mark == DecimalMark::Comma && !EveryCommaHasADigitBehind(text)) return {};
+  double value = 0.0;
+  char const* const end = text.data() + text.size();
+  fast_float::parse_options const options(fast_float::chars_format::general,
+                                          mark == DecimalMark::Comma ? ',' : '.');
+  fast_float::from_chars_result const result =
+      fast_float::from_chars_advanced(text.data(), end, value, options);
+  if (text.empty() || result.ptr != end || result.ec == std::errc::invalid_argument) return {};
+  return value;
+}
+
+std::string FormatShort(double value, int digits) {
+  std::array<char, 64> buffer{};
+  std::snprintf(buffer.data(), buffer.size(), "%.*g", digits, value);
+  return WithoutMinusOnZero(buffer.data());
+}
+
+std::string FormatFixed(double value, int decimals) {
+  // The largest double has 309 digits ahead of the point.
+  std::array<char, 400> buffer{};
+  std::snprintf(buffer.data(), buffer.size(), "%.*f", decimals, value);
+  return WithoutMinusOnZero(buffer.data());
+}
+
+std::string FormatExact(double value) {
+  std::array<char, 64> buffer{};
+  std::to_chars_result const result =
+      std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
+  return {buffer.data(), result.ptr};
+}
+
+std::string_view Trimmed(std::string_view text) {
+  while (!text.empty() && IsBlank(text.front())) text.remove_prefix(1);
+  while (!text.empty() && IsBlank(text.back())) text.remove_suffix(1);
+  return text;
+}
+
+std::string LowerCase(std::string_view text) {
+  std::string lower(text);
+  std::transform(lower.begin(), lower.end(), lower.begin(), [](char c) {
+    return c >= 'A' && c <= 'Z' ? static_cast<char>(c - 'A' + 'a') : c;
+  });
+  return lower;
+}
+
+std::string Quoted(std::string_view text) {
+  bool const cut = text.size() > kLongestQuote;
+  std::string quoted(text.substr(0, kLongestQuote));
+  std::replace_if(
+      quoted.begin(), quoted.end(), [](char c) { return (c >= 0 && c < ' ') || c == '\x7f'; }, '?');
+  return "'" + quoted + (cut ? "...'" : "'");
+}
+
+std::string ShellQuoted(std::string const& text) {
+  constexpr std::string_view kPlain =
+      "abcdefghijklmnopqrstuvwxyzABCDEFGHIJKLMNOPQRSTUVWXYZ0123456789_-./+:,@%";
+  if (!text.empty() && text.find_first_not_of(kPlain) == std::string::npos) return text;
+  std::string quoted = "'";
+  for (char const c : text) quoted += c == '\'' ? "'\\''" : std::string(1, c);
+  return quoted + "'";
+}
+
+std::string Counted(std::size_t count, std::string const& noun) {
+  return std::to_string(count) + " " + noun + (count == 1 ? "" : "s");
+}
+
+}  // namespace Vorn::IO

@@ -1,0 +1,28 @@
+#pragma once
+
+#include <cstddef>
+#include <string_view>
+
+namespace Vorn::IO {
+
+/// Walks over the lines of a text; a line ends with LF, CR LF or CR.
+class TextLines {
+ public:
+  explicit TextLines(std::string_view text) : text_(text), nextLineFeed_(text.find('\n')) {}
+
+  bool AtEnd() const { return position_ >= text_.size(); }
+
+  /// The next line without its end. Must not be called at the end.
+  std::string_view Take();
+
+  /// Where the line after the one just taken begins.
+  std::size_t Position() const { return position_; }
+
+ private:
+  std::string_view text_;
+  std::size_t position_ = 0;
+  /// Kept between calls: a text that has carriage returns alone is not searched over and over.
+  std::size_t nextLineFeed_;
+};
+
+}  // namespace Vorn::IO

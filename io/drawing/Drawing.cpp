@@ -1,0 +1,103 @@
+#include "io/drawing/Drawing.h"
+
+#include <algorithm>
+#include <filesystem>
+#include <utility>
+
+#include "io/base/Numbers.h"
+#include "io/base/TextFile.h"
+#include "io/formats/Format.h"
+#include "io/pieces/ContourFile.h"
+#include "io/points/CsvReader.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+bool ByTolerance(WPoint const& a, WPoint const& b) { return a.w < b.w; }
+
+std::string WithUnits(std::string text, Drawing const& drawing) {
+  return drawing.units.empty() ? text : std::move(text) + " " + drawing.units;
+}
+
+}  // namespace
+
+bool Drawing::HasTolerances() const {
+  return !points.empty() &&
+         std::all_of(points.begin(), points.end(), [](WPoint const& point) { return point.w > 0; });
+}
+
+bool Drawing::IsToleranceUniform() const { return SmallestTolerance() == LargestTolerance(); }
+
+double Drawing::SmallestTolerance() const {
+  return std::min_element(points.begin(), points.end(), ByTolerance)->w;
+}
+
+double Drawing::LargestTolerance() const {
+  return std::max_element(points.begin(), points.end(), ByTolerance)->w;
+}
+
+std::size_t Drawing::ArcCount() const {
+  return static_cast<std::size_t>(std::count_if(pieces.begin(), pieces.end(),
+                                                [](Piece const& piece) { return piece.IsArc(); }));
+}
+
+bool Drawing::IsClosed() const { return HasContour() && ReturnsToStart(pieces); }
+
+std::size_t Drawing::Worst() const {
+  bool const isRelative = HasTolerances();
+  auto const largest = std::max_element(
+      deviations.begin(), deviations.end(), [&](PointDeviation const& a, PointDeviation const& b) {
+        return isRelative ? a.relative < b.relative : a.distance < b.distance;
+      });
+  return static_cast<std::size_t>(largest - deviations.begin());
+}
+
+Drawing DrawingOf(Report const& report) {
+  Drawing drawing;
+  drawing.title = std::filesystem::path(report.file.path).filename().string();
+  drawing.units = report.file.units;
+  drawing.points = report.file.points;
+  drawing.pieces = report.pieces;
+  drawing.deviations = report.remeasured.points;
+  drawing.verdict = report.verdict;
+  drawing.facts = {DescribeTolerance(drawing), "strategy " + NameOf(report.strategy)};
+  return drawing;
+}
+
+Drawing DrawingOf(ContourFile const& contour) {
+  Drawing drawing = MakeDrawing({}, contour.pieces);
+  drawing.title = contour.path == kStandardInput
+                      ? kStandardInputName
+                      : std::filesystem::path(contour.path).filename().string();
+  drawing.units = contour.units;
+  return drawing;
+}
+
+Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece> pieces) {
+  Drawing drawing;
+  drawing.points = std::move(points);
+  drawing.pieces = std::move(pieces);
+  if (drawing.HasTolerances()) drawing.facts = {DescribeTolerance(drawing)};
+  if (drawing.points.empty() || !drawing.HasContour()) return drawing;
+  drawing.deviations = Remeasure(drawing.points, drawing.pieces).points;
+  if (drawing.HasTolerances()) {
+    bool const isWithin = drawing.deviations[drawing.Worst()].relative <= kLargestRelative;
+    drawing.verdict = isWithin ? Verdict::WithinTolerance : Verdict::OutsideTolerance;
+  }
+  return drawing;
+}
+
+std::string Drawn(Drawing const& drawing, Format format, PngSize const& size) {
+  if (format == Format::Html) return ToHtml(drawing);
+  return format == Format::Png ? ToPng(drawing, size) : ToSvg(drawing);
+}
+
+std::string DescribeTolerance(Drawing const& drawing) {
+  if (!drawing.HasTolerances()) return "";
+  std::string range = FormatShort(drawing.SmallestTolerance());
+  if (!drawing.IsToleranceUniform()) range += " to " + FormatShort(drawing.LargestTolerance());
+  return WithUnits("tolerance " + range, drawing);
+}
+
+}  // namespace Vorn::IO

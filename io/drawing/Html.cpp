@@ -1,0 +1,172 @@
+#include <algorithm>
+#include <map>
+#include <nlohmann/json.hpp>
+#include <string_view>
+
+#include "HtmlParts.h"
+#include "io/base/Numbers.h"
+#include "io/drawing/Band.h"
+#include "io/drawing/Drawing.h"
+#include "io/drawing/Feet.h"
+#include "io/drawing/Layout.h"
+#include "io/drawing/SvgElements.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+/// What is measured here need not be told to the last bit, and large files stay smaller.
+constexpr int kDigits = 9;
+
+/// The size on a common screen that the magnification is chosen for, in pixels.
+constexpr double kScreenWidth = 900.0;
+constexpr double kScreenHeight = 420.0;
+
+Json Rounded(double value) {
+  std::optional<double> const rounded = ParseNumber(FormatShort(value, kDigits));
+  if (!rounded) return nullptr;
+  return *rounded;
+}
+
+Json Place(GeometryUtils::Point const& point) { return Json::array({point.x, point.y}); }
+
+Json TolerancesJson(Drawing const& drawing) {
+  if (!drawing.HasTolerances()) return nullptr;
+  if (drawing.IsToleranceUniform()) return drawing.LargestTolerance();
+  Json tolerances = Json::array();
+  for (WPoint const& point : drawing.points) tolerances.push_back(point.w);
+  return tolerances;
+}
+
+Json PointsJson(Drawing const& drawing) {
+  Json x = Json::array();
+  Json y = Json::array();
+  for (WPoint const& point : drawing.points) {
+    x.push_back(point.x);
+    y.push_back(point.y);
+  }
+  return {{"x", std::move(x)}, {"y", std::move(y)}, {"w", TolerancesJson(drawing)}};
+}
+
+Json PieceJson(Piece const& piece) {
+  Json json = {{"kind", piece.IsArc() ? "arc" : "line"},
+               {"start", Place(piece.start)},
+               {"end", Place(piece.end)},
+               {"length", piece.length}};
+  if (!piece.IsArc()) return json;
+  json["center"] = Place(piece.center);
+  json["radius"] = piece.radius;
+  json["ccw"] = piece.counterClockwise;
+  json["startAngle"] = piece.startAngle;
+  json["sweep"] = piece.sweep;
+  return json;
+}
+
+Json DeviationsJson(Drawing const& drawing, std::vector<Foot> const& feet) {
+  Json deviations = Json::array();
+  Json pieces = Json::array();
+  Json alongs = Json::array();
+  for (std::size_t i = 0; i < feet.size(); ++i) {
+    PointDeviation const& deviation = drawing.deviations[i];
+    deviations.push_back(Rounded(deviation.isLeft ? deviation.distance : -deviation.distance));
+    pieces.push_back(deviation.piece);
+    alongs.push_back(Rounded(feet[i].along));
+  }
+  return {{"signed", std::move(deviations)},
+          {"piece", std::move(pieces)},
+          {"along", std::move(alongs)}};
+}
+
+/// Only where tolerances differ; else the band is as wide everywhere.
+Json BandJson(Drawing const& drawing, std::vector<Foot> const& feet) {
+  if (!drawing.HasTolerances() || drawing.IsToleranceUniform()) return nullptr;
+  Json band = {{"piece", Json::array()},
+               {"from", Json::array()},
+               {"to", Json::array()},
+               {"tolerance", Json::array()}};
+  for (Svg::BandSection const& section : Svg::BandSections(drawing, feet, 0.0)) {
+    band["piece"].push_back(section.piece);
+    band["from"].push_back(Rounded(section.from));
+    band["to"].push_back(Rounded(section.to));
+    band["tolerance"].push_back(section.tolerance);
+  }
+  return band;
+}
+
+double MagnifyOnScreen(Drawing const& drawing) {
+  if (drawing.magnify) return *drawing.magnify;
+  Svg::View const screen(Svg::BoxAround(drawing), 0.0, 0.0, kScreenWidth, kScreenHeight,
+                         kScreenHeight);
+  return Svg::ReadableMagnification(drawing, screen.Scale());
+}
+
+Json VerdictJson(Drawing const& drawing) {
+  if (!drawing.verdict) return nullptr;
+  return {{"text", Describe(*drawing.verdict)},
+          {"isGood", *drawing.verdict == Verdict::WithinTolerance}};
+}
+
+Json DataJson(Drawing const& drawing) {
+  Json facts = Json::array();
+  for (std::string const& fact : drawing.facts) {
+    if (!fact.empty()) facts.push_back(fact);
+  }
+  Json json = {{"title", drawing.title}, {"facts", facts}, {"units", drawing.units}};
+  json["points"] = PointsJson(drawing);
+  json["pieces"] = Json::array();
+  json["verdict"] = VerdictJson(drawing);
+  if (!drawing.HasContour()) return json;
+  for (Piece const& piece : drawing.pieces) json["pieces"].push_back(PieceJson(piece));
+  json["isClosed"] = drawing.IsClosed();
+  if (!drawing.IsMeasured()) return json;
+  std::vector<Foot> const feet = FeetOf(drawing);
+  json["deviations"] = DeviationsJson(drawing, feet);
+  json["band"] = BandJson(drawing, feet);
+  json["worst"] = drawing.Worst();
+  json["magnify"] = MagnifyOnScreen(drawing);
+  return json;
+}
+
+/// JSON that may stand inside a script element: with no `<` in it, nothing can end the element or
+/// begin a comment. In JSON the character occurs only inside strings, where it may be escaped.
+std::string EmbeddedJson(Json const& json) {
+  std::string text;
+  for (char const c : json.dump(-1, ' ', false, Json::error_handler_t::replace)) {
+    if (c == '<') {
+      text += "\\u003c";
+    } else {
+      text += c;
+    }
+  }
+  return text;
+}
+
+/// The page with each `{{name}}` replaced, in one pass: what is put in is not looked at again.
+std::string Filled(std::string_view page,
+                   std::map<std::string, std::string, std::less<>> const& parts) {
+  std::string filled;
+  for (;;) {
+    std::size_t const open = page.find("{{");
+    filled += page.substr(0, open);
+    if (open == std::string_view::npos) return filled;
+    std::size_t const close = page.find("}}", open);
+    filled += parts.find(page.substr(open + 2, close - open - 2))->second;
+    page.remove_prefix(close + 2);
+  }
+}
+
+}  // namespace
+
+std::string ToHtml(Drawing const& drawing) {
+  // A file name need not be UTF-8; the page is.
+  Json const title = drawing.title;
+  std::string const name = Json::parse(title.dump(-1, ' ', false, Json::error_handler_t::replace));
+  return Filled(Html::kPage, {{"title", Svg::Escaped(name)},
+                              {"style", Html::kStyle},
+                              {"data", EmbeddedJson(DataJson(drawing))},
+                              {"script", Html::kScript}});
+}
+
+}  // namespace Vorn::IO

@@ -1,0 +1,99 @@
+#include "io/fit/FitJson.h"
+
+#include <nlohmann/json.hpp>
+
+#include "io/formats/JsonPieces.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+Json InputJson(Report const& report) {
+  Json units = nullptr;
+  if (!report.file.units.empty()) units = report.file.units;
+  return {
+      {"file", report.file.path},
+      {"points", report.file.points.size()},
+      {"units", units},
+      {"tolerance",
+       {{"source", report.toleranceSource},
+        {"smallest", report.SmallestTolerance()},
+        {"largest", report.LargestTolerance()}}},
+  };
+}
+
+Json RangeJson(std::optional<std::vector<PointRange>> const& ranges, std::size_t piece) {
+  if (!ranges) return nullptr;
+  PointRange const& range = (*ranges)[piece];
+  Json first = nullptr;
+  if (range.count > 0) first = range.first;
+  return {{"first", first}, {"count", range.count}};
+}
+
+Json ReportedJson(Report const& report) {
+  bool const hasIndex = report.fit.deviationIndex >= 0;
+  Json index = nullptr;
+  if (hasIndex) index = report.fit.deviationIndex;
+  return {
+      {"value", report.fit.deviation},
+      {"kind", IsDeviationRelative(report.strategy) ? "relative" : "absolute"},
+      {"point", index},
+  };
+}
+
+Json RemeasuredJson(Report const& report) {
+  PointDeviation const& worst = report.remeasured.Worst();
+  return {
+      {"value", worst.relative},          {"kind", "relative"},
+      {"point", report.remeasured.worst}, {"distance", worst.distance},
+      {"element", worst.piece + 1},
+  };
+}
+
+Json ClosureJson(Report const& report) {
+  bool const isClosed = report.closure.isClosed;
+  Json seam = nullptr;
+  if (isClosed) seam = report.seam;
+  return {{"closed", isClosed}, {"seam", seam}, {"gap", report.Gap()}};
+}
+
+char const* VerdictName(Verdict verdict) {
+  switch (verdict) {
+    case Verdict::WithinTolerance:
+      return "within tolerance";
+    case Verdict::OutsideTolerance:
+      return "outside tolerance";
+    case Verdict::StopsEarly:
+      return "stops early";
+  }
+  return "unknown";
+}
+
+}  // namespace
+
+std::string ToJson(Report const& report) {
+  Json elements = Json::array();
+  for (std::size_t i = 0; i < report.pieces.size(); ++i) {
+    elements.push_back(PieceJson(report.pieces[i], i + 1, RangeJson(report.ranges, i)));
+  }
+  Json document = {
+      {"schemaVersion", kJsonSchemaVersion},
+      {"input", InputJson(report)},
+      {"strategy", NameOf(report.strategy)},
+      {"code", static_cast<std::int32_t>(report.fit.code)},
+      {"verdict", VerdictName(report.verdict)},
+      {"counts",
+       {{"elements", report.pieces.size()},
+        {"lines", report.LineCount()},
+        {"arcs", report.ArcCount()}}},
+      {"deviation", {{"reported", ReportedJson(report)}, {"remeasured", RemeasuredJson(report)}}},
+  };
+  document.update(ClosureJson(report));
+  document["elements"] = elements;
+  // A file name need not be UTF-8; a replacement character is better than no document.
+  return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+}
+
+}  // namespace Vorn::IO

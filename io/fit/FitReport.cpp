@@ -1,0 +1,109 @@
+#include "io/fit/FitReport.h"
+
+#include <algorithm>
+#include <utility>
+
+#include "io/fit/Closing.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+bool ByTolerance(WPoint const& a, WPoint const& b) { return a.w < b.w; }
+
+/// Written so that a deviation that is not a number is outside.
+bool IsWithin(double relative) { return relative <= kLargestRelative; }
+
+Verdict Judge(Report const& report, bool reachesLastPoint) {
+  if (!reachesLastPoint) return Verdict::StopsEarly;
+  bool const reportsRelative = !report.isFullCircle && IsDeviationRelative(report.strategy);
+  bool const within = (!reportsRelative || IsWithin(report.fit.deviation)) &&
+                      IsWithin(report.remeasured.Worst().relative);
+  return within ? Verdict::WithinTolerance : Verdict::OutsideTolerance;
+}
+
+/// The ranges over the points of the circuit as ranges over those of the file. The seam stands at
+/// both ends of the circuit; the first piece keeps it.
+std::optional<std::vector<PointRange>> RangesInFile(Circuit const& circuit,
+                                                    std::vector<Piece> const& pieces) {
+  std::optional<std::vector<PointRange>> ranges = AssignPoints(circuit.points, pieces);
+  if (!ranges) return ranges;
+  for (PointRange& range : *ranges) {
+    if (range.first + range.count == circuit.points.size() && range.count > 0) --range.count;
+    range.first = circuit.origin[range.first];
+  }
+  return ranges;
+}
+
+}  // namespace
+
+std::size_t Report::ArcCount() const {
+  return static_cast<std::size_t>(std::count_if(pieces.begin(), pieces.end(),
+                                                [](Piece const& piece) { return piece.IsArc(); }));
+}
+
+std::size_t Report::LineCount() const { return pieces.size() - ArcCount(); }
+
+double Report::SmallestTolerance() const {
+  return std::min_element(file.points.begin(), file.points.end(), ByTolerance)->w;
+}
+
+double Report::LargestTolerance() const {
+  return std::max_element(file.points.begin(), file.points.end(), ByTolerance)->w;
+}
+
+double Report::Gap() const { return GapOf(pieces); }
+
+Report MakeReport(PointFile file, std::string toleranceSource,
+                  GeometryUtils::FittingStrategy strategy, FitAnswer fit) {
+  Report report;
+  report.file = std::move(file);
+  report.toleranceSource = std::move(toleranceSource);
+  report.strategy = strategy;
+  report.fit = std::move(fit);
+  report.pieces = PiecesOf(report.fit.contour);
+  report.ranges = AssignPoints(report.file.points, report.pieces);
+  report.remeasured = Remeasure(report.file.points, report.pieces);
+  report.verdict = Judge(report, ReachesLastPoint(report.file.points, report.pieces, strategy));
+  return report;
+}
+
+Report MakeClosedReport(PointFile file, std::string toleranceSource,
+                        GeometryUtils::FittingStrategy strategy, FitAnswer fit,
+                        Closure const& closure, Circuit const& circuit,
+                        std::optional<std::vector<Piece>> circle) {
+  Report report;
+  report.file = std::move(file);
+  report.toleranceSource = std::move(toleranceSource);
+  report.strategy = strategy;
+  report.fit = std::move(fit);
+  report.closure = closure;
+  report.seam = circuit.origin.front();
+  report.isFullCircle = circle.has_value();
+  report.pieces = circle ? std::move(*circle) : PiecesOf(report.fit.contour);
+  bool const reachesLastPoint =
+      report.isFullCircle || ReachesLastPoint(circuit.points, report.pieces, strategy);
+  if (reachesLastPoint) CloseExactly(circuit.points, &report.pieces);
+  report.ranges = RangesInFile(circuit, report.pieces);
+  report.remeasured = Remeasure(report.file.points, report.pieces);
+  report.verdict = Judge(report, reachesLastPoint);
+  if (report.fit.deviationIndex >= 0) {
+    auto const inCircuit = static_cast<std::size_t>(report.fit.deviationIndex);
+    report.fit.deviationIndex = static_cast<std::int32_t>(circuit.origin[inCircuit]);
+  }
+  return report;
+}
+
+std::string Describe(Verdict verdict) {
+  switch (verdict) {
+    case Verdict::WithinTolerance:
+      return "within tolerance";
+    case Verdict::OutsideTolerance:
+      return "OUTSIDE TOLERANCE";
+    case Verdict::StopsEarly:
+      return "NO FIT: the contour stops before the last point";
+  }
+  return "unknown";
+}
+
+}  // namespace Vorn::IO

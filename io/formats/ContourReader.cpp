@@ -1,0 +1,68 @@
+#include "io/formats/ContourReader.h"
+
+#include "io/base/Failure.h"
+#include "io/base/TextFile.h"
+#include "io/formats/CsvPieces.h"
+#include "io/formats/Dxf.h"
+#include "io/formats/Format.h"
+#include "io/formats/GCode.h"
+#include "io/formats/JsonPieces.h"
+#include "io/formats/Text.h"
+#include "io/formats/Wkt.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+void RefuseBinary(std::string_view text, std::string const& path) {
+  std::size_t const zero = text.find('\0');
+  if (zero != std::string_view::npos) {
+    throw Failure(FailureKind::File, path + ":" + PlaceOf(text, zero) + ": is binary, not text");
+  }
+}
+
+void RefuseEmpty(std::string_view text, std::string const& path) {
+  if (text.find_first_not_of(" \t\r\n") == std::string_view::npos) RefuseFile(path, "is empty");
+}
+
+Format RecognisedFormat(std::string_view text, std::string const& path) {
+  if (std::optional<Format> const byName = FormatOf(path)) return *byName;
+  if (std::optional<Format> const byContent = FormatOfContent(text)) return *byContent;
+  RefuseFile(path, "holds no contour: it looks like none of JSON, CSV, DXF, G-code and WKT");
+}
+
+ContourFile ParseAs(Format format, std::string_view text, std::string const& path) {
+  switch (format) {
+    case Format::Json:
+      return ParseJsonPieces(text, path);
+    case Format::Csv:
+      return ParseCsvPieces(text, path);
+    case Format::Dxf:
+      return ParseDxf(text, path);
+    case Format::GCode:
+      return ParseGCode(text, path);
+    case Format::Wkt:
+      return ParseWkt(text, path);
+    default:
+      throw Failure(FailureKind::BadArgument,
+                    path + ": a contour cannot be read from " + NameOf(format));
+  }
+}
+
+}  // namespace
+
+ContourFile ParseContour(std::string_view text, std::string const& path,
+                         std::optional<Format> format) {
+  RefuseBinary(text, path);
+  RefuseEmpty(text, path);
+  ContourFile contour = ParseAs(format ? *format : RecognisedFormat(text, path), text, path);
+  contour.path = path;
+  if (contour.pieces.empty()) RefuseFile(path, "holds no contour: there are no pieces");
+  return contour;
+}
+
+ContourFile ReadContour(std::string const& path, std::istream& in, std::optional<Format> format) {
+  return ParseContour(ReadTextFile(path, in), InputName(path), format);
+}
+
+}  // namespace Vorn::IO

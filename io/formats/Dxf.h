@@ -1,0 +1,29 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "io/pieces/ContourFile.h"
+
+namespace Vorn::IO {
+
+enum class DxfStyle {
+  Polyline,  ///< one POLYLINE with bulges, which keeps the contour connected
+  Entities,  ///< a LINE or an ARC for each piece
+};
+
+/// The contour as DXF R12 (AC1009). A gap ends one POLYLINE and begins another; the closed flag is
+/// theirs (70 = 1) and lost with separate entities unless the ends meet. Units stand in a comment
+/// (999), since R12 has no other place for them. Bulges and degrees are rounded once more than the
+/// coordinates, so arcs read back to 2e-15 of the largest coordinate or radius. Arcs of more
+/// than 315 degrees are written in two halves.
+std::string ToDxf(ContourFile const& contour, DxfStyle style = DxfStyle::Polyline);
+
+/// Reads LINE, ARC, CIRCLE, LWPOLYLINE and POLYLINE in the order of the file, of R12 or later. An
+/// entity that ends where the one before ends is turned round; arcs have no sense of their own and
+/// are turned to the nearer end. A circle becomes two halves. Texts, points, dimensions, viewports,
+/// paper space and blocks are passed over.
+/// @throws Failure (FailureKind::File) naming file, line and entity.
+ContourFile ParseDxf(std::string_view text, std::string const& path);
+
+}  // namespace Vorn::IO

@@ -1,0 +1,57 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace Vorn::IO::Dxf {
+
+/// A code, its value and the line of the file on which the code stands.
+struct Group {
+  int code = 0;
+  std::string_view value;
+  std::size_t line = 0;
+};
+
+/// One entity of a drawing, or one vertex of a polyline.
+class Entity {
+ public:
+  Entity(std::string_view type, std::size_t number, std::size_t line, std::string const& path)
+      : type_(type), number_(number), line_(line), path_(path) {}
+
+  void Add(Group const& group) { groups_.push_back(group); }
+
+  std::string_view Type() const { return type_; }
+  std::vector<Group> const& Groups() const { return groups_; }
+
+  /// The number under the code; the entity is refused when there is none.
+  double Number(int code) const;
+  double NumberOr(int code, double otherwise) const;
+  double NumberOf(Group const& group) const;
+  int FlagsOr(int code, int otherwise) const;
+
+  [[noreturn]] void Refuse(std::string const& message) const;
+  [[noreturn]] void Refuse(std::size_t line, std::string const& message) const;
+
+ private:
+  Group const* Find(int code) const;
+
+  std::string type_;
+  std::size_t number_;
+  std::size_t line_;
+  std::string path_;
+  std::vector<Group> groups_;
+};
+
+/// What a file says that matters for a contour.
+struct Drawing {
+  std::string units;  ///< of the header or of a comment; may be empty
+  std::vector<Entity> entities;
+};
+
+/// Takes the text apart without a look at what the entities are.
+/// @throws Failure (FailureKind::File) naming file and line when it is not built as DXF is.
+Drawing ReadDrawing(std::string_view text, std::string const& path);
+
+}  // namespace Vorn::IO::Dxf

@@ -1,0 +1,125 @@
+#include "io/formats/Format.h"
+
+#include <array>
+#include <filesystem>
+
+#include "io/base/Failure.h"
+#include "io/base/Numbers.h"
+#include "io/formats/CsvPieces.h"
+#include "io/formats/Dxf.h"
+#include "io/formats/GCode.h"
+#include "io/formats/JsonPieces.h"
+#include "io/formats/Text.h"
+#include "io/formats/Wkt.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+struct NamedFormat {
+  std::string_view name;
+  Format format;
+};
+
+/// The first name of a format is the one it goes by; each is the ending of a file as well.
+constexpr std::array<NamedFormat, 11> kFormats = {{
+    {"json", Format::Json},
+    {"csv", Format::Csv},
+    {"dxf", Format::Dxf},
+    {"gcode", Format::GCode},
+    {"nc", Format::GCode},
+    {"wkt", Format::Wkt},
+    {"svg", Format::Svg},
+    {"html", Format::Html},
+    {"htm", Format::Html},
+    {"png", Format::Png},
+    {"ngc", Format::GCode},
+}};
+
+constexpr std::string_view kCurves[] = {"srid",         "linestring",    "circularstring",
+                                        "multicurve",   "compoundcurve", "multilinestring",
+                                        "curvepolygon", "polygon"};
+
+bool IsComment(std::string_view line) { return line.starts_with('#'); }
+
+/// The first line that says something, in lower case.
+std::string FirstLine(std::string_view text) {
+  Lines lines(text);
+  std::string_view line;
+  while (lines.Next(&line)) {
+    line = Trimmed(line);
+    if (!line.empty() && !IsComment(line)) return LowerCase(line);
+  }
+  return {};
+}
+
+bool LooksLikeWkt(std::string_view line) {
+  for (std::string_view const curve : kCurves) {
+    if (line.starts_with(curve)) return true;
+  }
+  return false;
+}
+
+bool LooksLikeGCode(std::string_view line) {
+  constexpr std::string_view kSigns = "%(;";
+  constexpr std::string_view kLetters = "gmnotsfxyz";
+  if (kSigns.find(line.front()) != std::string_view::npos) return true;
+  bool const isWord = line.size() > 1 && line[1] >= '0' && line[1] <= '9';
+  return isWord && kLetters.find(line.front()) != std::string_view::npos;
+}
+
+}  // namespace
+
+std::optional<Format> FormatNamed(std::string_view name) {
+  std::string const lower = LowerCase(name);
+  for (NamedFormat const& known : kFormats) {
+    if (known.name == lower) return known.format;
+  }
+  return {};
+}
+
+std::optional<Format> FormatOf(std::string const& path) {
+  std::string const ending = std::filesystem::path(path).extension().string();
+  return ending.empty() ? std::nullopt : FormatNamed(ending.substr(1));
+}
+
+std::string NameOf(Format format) {
+  for (NamedFormat const& known : kFormats) {
+    if (known.format == format) return std::string(known.name);
+  }
+  return "unknown";
+}
+
+std::optional<Format> FormatOfContent(std::string_view text) {
+  std::string const line = FirstLine(text);
+  if (line.empty()) return {};
+  if (line.front() == '{') return Format::Json;
+  if (line == "0" || line == "999") return Format::Dxf;
+  if (LooksLikeWkt(line)) return Format::Wkt;
+  if (line.find("start_x") != std::string::npos) return Format::Csv;
+  if (LooksLikeGCode(line)) return Format::GCode;
+  return {};
+}
+
+bool HoldsContour(Format format) {
+  return format != Format::Svg && format != Format::Html && format != Format::Png;
+}
+
+std::string ToText(ContourFile const& contour, Format format, WriteOptions const& options) {
+  switch (format) {
+    case Format::Json:
+      return ToJson(contour);
+    case Format::Csv:
+      return ToCsv(contour);
+    case Format::Dxf:
+      return ToDxf(contour, options.dxfEntities ? DxfStyle::Entities : DxfStyle::Polyline);
+    case Format::GCode:
+      return ToGCode(contour, {options.feed, options.gcodeDecimals});
+    case Format::Wkt:
+      return ToWkt(contour);
+    default:
+      throw Failure(FailureKind::Internal, NameOf(format) + " holds no contour");
+  }
+}
+
+}  // namespace Vorn::IO

@@ -1,0 +1,78 @@
+#include "io/formats/Text.h"
+
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <cmath>
+#include <optional>
+
+#include "io/base/Failure.h"
+#include "io/base/Numbers.h"
+#include "io/pieces/Shapes.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
+
+std::string_view WithoutMark(std::string_view text) {
+  if (text.starts_with(kUtf8Mark)) text.remove_prefix(kUtf8Mark.size());
+  return text;
+}
+
+}  // namespace
+
+Lines::Lines(std::string_view text) : lines_(WithoutMark(text)) {}
+
+bool Lines::Next(std::string_view* line) {
+  if (lines_.AtEnd()) return false;
+  *line = lines_.Take();
+  ++number_;
+  return true;
+}
+
+void RefuseFile(std::string const& path, std::string const& message) {
+  throw Failure(FailureKind::File, path + ": " + message);
+}
+
+void RefuseLine(std::string const& path, std::size_t line, std::string const& message) {
+  throw Failure(FailureKind::File, path + ":" + std::to_string(line) + ": " + message);
+}
+
+double RequireNumber(std::string_view text, std::string const& what, std::string const& path,
+                     std::size_t line) {
+  std::optional<double> const value = ParseNumber(text);
+  if (!value) RefuseLine(path, line, what + " " + Quoted(text) + " is not a number");
+  if (!std::isfinite(*value)) {
+    RefuseLine(path, line, what + " " + Quoted(text) + " is not finite");
+  }
+  if (!IsUsable(*value)) RefuseLine(path, line, what + " " + Quoted(text) + " is too large");
+  return *value;
+}
+
+std::string FormatPlain(double value) {
+  // The smallest double has 324 digits after the point before 17 that count.
+  std::array<char, 400> buffer{};
+  std::to_chars_result const result =
+      std::to_chars(buffer.data(), buffer.data() + buffer.size(), value, std::chars_format::fixed);
+  std::string text(buffer.data(), result.ptr);
+  return text.find('.') == std::string::npos ? text + ".0" : text;
+}
+
+std::string OneLine(std::string text) {
+  std::replace_if(
+      text.begin(), text.end(), [](char c) { return c == '\n' || c == '\r'; }, ' ');
+  return text;
+}
+
+std::string PlaceOf(std::string_view text, std::size_t offset) {
+  std::string_view const before = text.substr(0, offset);
+  auto const line = std::count(before.begin(), before.end(), '\n') + 1;
+  std::size_t const lineEnd = before.rfind('\n');
+  std::size_t const column =
+      lineEnd == std::string_view::npos ? before.size() + 1 : before.size() - lineEnd;
+  return std::to_string(line) + ":" + std::to_string(column);
+}
+
+}  // namespace Vorn::IO

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+#include "io/base/TextLines.h"
+
+/// What the readers of contour files have in common.
+namespace Vorn::IO {
+
+/// The lines of a text, whatever the system they were written on; a byte order mark is skipped.
+class Lines {
+ public:
+  explicit Lines(std::string_view text);
+
+  /// False at the end of the text.
+  bool Next(std::string_view* line);
+
+  /// Of the line that Next gave last, counted from 1.
+  std::size_t Number() const { return number_; }
+
+ private:
+  TextLines lines_;
+  std::size_t number_ = 0;
+};
+
+/// Ends the reading of a file with a message about all of it.
+[[noreturn]] void RefuseFile(std::string const& path, std::string const& message);
+
+/// The same about one line.
+[[noreturn]] void RefuseLine(std::string const& path, std::size_t line, std::string const& message);
+
+/// The coordinate that the text is. `what` names it: "start_x".
+/// @throws Failure (FailureKind::File) naming file, line and text when it is none that can be used.
+double RequireNumber(std::string_view text, std::string const& what, std::string const& path,
+                     std::size_t line);
+
+/// The fewest digits that read back as the same double, without an exponent and with a point, as
+/// readers of older formats want it: "0.00001", "5.0".
+std::string FormatPlain(double value);
+
+/// With blanks in place of line breaks, so that a comment stays one.
+std::string OneLine(std::string text);
+
+/// Line and column of a place in the text, both counted from 1: "3:17".
+std::string PlaceOf(std::string_view text, std::size_t offset);
+
+}  // namespace Vorn::IO

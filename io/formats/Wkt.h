@@ -1,0 +1,20 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+#include "io/pieces/ContourFile.h"
+
+namespace Vorn::IO {
+
+/// The contour as well-known text: LINESTRING, CIRCULARSTRING or COMPOUNDCURVE, and a MULTICURVE
+/// of these when it has gaps. Arcs are told by start, middle and end, in two halves above 315
+/// degrees. A closed contour is a curve that ends where it starts, not a CURVEPOLYGON: a contour is
+/// a curve with a start and a sense, which a polygon need not keep. There are no units.
+std::string ToWkt(ContourFile const& contour);
+
+/// Reads what ToWkt writes, MULTILINESTRING, and POLYGON or CURVEPOLYGON with a single ring.
+/// @throws Failure (FailureKind::File) naming file, line, column and offending text.
+ContourFile ParseWkt(std::string_view text, std::string const& path);
+
+}  // namespace Vorn::IO

@@ -1,0 +1,114 @@
+#include <algorithm>
+#include <nlohmann/json.hpp>
+
+#include "io/measure/CheckReport.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+constexpr int kSchemaVersion = 1;
+
+Json OrNull(std::string const& text) { return text.empty() ? Json(nullptr) : Json(text); }
+
+Json PointsJson(CheckReport const& report) {
+  return {{"file", report.file.path},
+          {"count", report.file.points.size()},
+          {"units", OrNull(report.file.units)}};
+}
+
+Json ContourJson(CheckReport const& report) {
+  std::vector<Piece> const& pieces = report.contour.pieces;
+  auto const arcs = static_cast<std::size_t>(std::count_if(
+      pieces.begin(), pieces.end(), [](Piece const& piece) { return piece.IsArc(); }));
+  double length = 0.0;
+  for (Piece const& piece : pieces) length += piece.length;
+  return {{"file", report.contour.path},
+          {"pieces", pieces.size()},
+          {"lines", pieces.size() - arcs},
+          {"arcs", arcs},
+          {"length", length},
+          {"closed", report.contour.isClosed},
+          {"units", OrNull(report.contour.units)}};
+}
+
+Json ToleranceJson(CheckReport const& report) {
+  if (!report.HasTolerances()) return nullptr;
+  auto const [smallest, largest] =
+      std::minmax_element(report.file.points.begin(), report.file.points.end(),
+                          [](WPoint const& a, WPoint const& b) { return a.w < b.w; });
+  return {{"source", report.toleranceSource}, {"smallest", smallest->w}, {"largest", largest->w}};
+}
+
+Json DeviationJson(CheckReport const& report, std::size_t point) {
+  WPoint const& measured = report.file.points[point];
+  PointDeviation const& deviation = report.deviations[point];
+  Json json = {
+      {"point", point},  {"line", report.file.lines[point]},       {"x", measured.x},
+      {"y", measured.y}, {"deviation", SignedDistance(deviation)}, {"piece", deviation.piece + 1}};
+  if (!report.HasTolerances()) return json;
+  json["tolerance"] = measured.w;
+  json["relative"] = deviation.relative;
+  return json;
+}
+
+Json GapsJson(CheckReport const& report) {
+  Json gaps = Json::array();
+  for (Gap const& gap : report.gaps) {
+    gaps.push_back({{"before", gap.before + 1}, {"after", gap.after + 1}, {"size", gap.size}});
+  }
+  return gaps;
+}
+
+/// Whether the contour crosses or touches itself; null where that cannot be told.
+Json CrossingJson(CheckReport const& report) {
+  bool const isKnown = report.crossing == Crossing::None || report.crossing == Crossing::Found;
+  return isKnown ? Json(report.crossing == Crossing::Found) : Json(nullptr);
+}
+
+Json AreaJson(CheckReport const& report) {
+  if (!report.enclosed) return nullptr;
+  return {{"value", report.enclosed->area},
+          {"direction", report.enclosed->isCounterClockwise ? "ccw" : "cw"}};
+}
+
+char const* ResultName(CheckReport const& report) {
+  if (!report.HasTolerances()) return "measured";
+  return report.outside.empty() ? "within tolerance" : "outside tolerance";
+}
+
+}  // namespace
+
+std::string ToJson(CheckReport const& report) {
+  Json worst = nullptr;
+  Json outside = nullptr;
+  if (report.HasTolerances()) {
+    worst = DeviationJson(report, report.worst);
+    outside = report.outside;
+  }
+  Json deviations = Json::array();
+  for (std::size_t i = 0; i < report.deviations.size(); ++i) {
+    deviations.push_back(DeviationJson(report, i));
+  }
+  Json const document = {
+      {"schemaVersion", kSchemaVersion},
+      {"points", PointsJson(report)},
+      {"contour", ContourJson(report)},
+      {"tolerance", ToleranceJson(report)},
+      {"result", ResultName(report)},
+      {"largest", DeviationJson(report, report.furthest)},
+      {"relative", worst},
+      {"outside", outside},
+      {"gaps", GapsJson(report)},
+      {"crosses", CrossingJson(report)},
+      {"crossing", Describe(report.crossing)},
+      {"area", AreaJson(report)},
+      {"deviations", deviations},
+  };
+  // A file name need not be UTF-8; a replacement character is better than no document.
+  return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+}
+
+}  // namespace Vorn::IO

@@ -1,0 +1,48 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "io/measure/Crossing.h"
+#include "io/measure/Remeasure.h"
+#include "io/pieces/ContourFile.h"
+#include "io/points/CsvReader.h"
+
+namespace Vorn::IO {
+
+/// What `contour check` finds when it measures points against a contour from a file.
+struct CheckReport {
+  PointFile file;
+  ContourFile contour;
+  std::string toleranceSource;  ///< empty: nobody states a tolerance, and `relative` means nothing
+  std::vector<PointDeviation> deviations;
+  std::size_t furthest = 0;          ///< index of the largest distance; the first of several
+  std::size_t worst = 0;             ///< index of the largest relative deviation; likewise
+  std::vector<std::size_t> outside;  ///< indices of the points beyond their tolerance
+  std::vector<Gap> gaps;
+  Crossing crossing = Crossing::NotTestable;
+  std::optional<Enclosed> enclosed;
+
+  bool HasTolerances() const { return !toleranceSource.empty(); }
+
+  /// All indices, the worst point first: by relative deviation where there are tolerances, else by
+  /// distance.
+  std::vector<std::size_t> WorstFirst() const;
+};
+
+/// Measures; the points carry their tolerances unless the source is empty.
+CheckReport MakeCheckReport(PointFile file, std::string toleranceSource, ContourFile contour);
+
+/// To the left of the contour's sense of travel is positive; on it there is no minus sign.
+double SignedDistance(PointDeviation const& deviation);
+
+/// Every point in a line of CSV, with all digits, deviations signed.
+std::string ToCsv(CheckReport const& report);
+
+/// For programs: everything, with all digits, as a JSON document that ends with a line end. Points
+/// are counted from 0, pieces and lines of the file from 1; what is not known is null.
+std::string ToJson(CheckReport const& report);
+
+}  // namespace Vorn::IO

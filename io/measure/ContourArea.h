@@ -1,0 +1,44 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "io/measure/Crossing.h"
+#include "io/pieces/ContourFile.h"
+#include "io/pieces/Shapes.h"
+
+namespace Vorn::IO {
+
+/// What a closed contour encloses.
+struct ContourArea {
+  ContourFile contour;    ///< as it was measured
+  std::vector<Gap> gaps;  ///< bridged by straight lines
+  Crossing crossing = Crossing::NotTestable;
+  double signedArea = 0.0;     ///< positive counter-clockwise; every loop with its own sign
+  double perimeter = 0.0;      ///< with the bridges
+  std::optional<XY> centroid;  ///< of a contour that does not cross itself and encloses something
+  Extent extent;
+
+  /// Whether the contour is the border of one region, so that its area is that of the region.
+  bool IsSimple() const { return crossing == Crossing::None; }
+};
+
+/// Whether the contour says that it is closed or ends where it begins.
+bool IsClosed(ContourFile const& contour);
+
+/// With a line from the end to the start, unless the contour ends there anyway.
+ContourFile Closed(ContourFile contour);
+
+/// Measures a contour that is closed. The area of one that crosses itself is the sum of the areas
+/// of its loops, each positive where it runs counter-clockwise and counted as often as it is run
+/// round.
+ContourArea MeasureArea(ContourFile contour);
+
+/// "counter-clockwise", "clockwise" or, of an area of zero, "none".
+std::string SenseOf(ContourArea const& area);
+
+/// Several as one JSON document; every digit.
+std::string ToJson(std::vector<ContourArea> const& areas);
+
+}  // namespace Vorn::IO

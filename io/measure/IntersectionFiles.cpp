@@ -1,0 +1,63 @@
+#include <nlohmann/json.hpp>
+
+#include "io/base/Numbers.h"
+#include "io/measure/Intersections.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+using Json = nlohmann::ordered_json;
+
+constexpr int kSchemaVersion = 1;
+
+std::string KindOfPiece(ContourFile const& contour, std::size_t piece) {
+  return contour.pieces[piece].IsArc() ? "arc" : "line";
+}
+
+Json PlaceJson(ContourFile const& contour, OnContour const& place) {
+  return {{"piece", place.piece + 1},
+          {"kind", KindOfPiece(contour, place.piece)},
+          {"position", place.position}};
+}
+
+Json PointJson(XY const& point) { return {{"x", point.x}, {"y", point.y}}; }
+
+}  // namespace
+
+std::string ToJson(std::vector<Intersection> const& found, ContourFile const& a,
+                   ContourFile const* b) {
+  Json list = Json::array();
+  for (Intersection const& one : found) {
+    list.push_back({{"kind", NameOf(one.kind)},
+                    {"at", PointJson(one.at)},
+                    {"until", one.until ? PointJson(*one.until) : Json(nullptr)},
+                    {"a", PlaceJson(a, one.a)},
+                    {"b", PlaceJson(b == nullptr ? a : *b, one.b)}});
+  }
+  Json const document = {{"schemaVersion", kSchemaVersion},
+                         {"a", a.path},
+                         {"b", b == nullptr ? Json(nullptr) : Json(b->path)},
+                         {"intersections", list}};
+  // A file name need not be UTF-8; a replacement character is better than no document.
+  return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+}
+
+std::string ToCsv(std::vector<Intersection> const& found, ContourFile const& a,
+                  ContourFile const* b) {
+  std::string text = "kind,x,y,to_x,to_y,piece_a,kind_a,position_a,piece_b,kind_b,position_b\n";
+  ContourFile const& second = b == nullptr ? a : *b;
+  for (Intersection const& one : found) {
+    XY const until = one.until.value_or(one.at);
+    text += NameOf(one.kind);
+    for (double const value : {one.at.x, one.at.y, until.x, until.y}) {
+      text += "," + FormatExact(value);
+    }
+    text += "," + std::to_string(one.a.piece + 1) + "," + KindOfPiece(a, one.a.piece) + "," +
+            FormatExact(one.a.position) + "," + std::to_string(one.b.piece + 1) + "," +
+            KindOfPiece(second, one.b.piece) + "," + FormatExact(one.b.position) + "\n";
+  }
+  return text;
+}
+
+}  // namespace Vorn::IO

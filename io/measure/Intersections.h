@@ -1,0 +1,54 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "io/pieces/ContourFile.h"
+#include "io/pieces/Shapes.h"
+
+namespace Vorn::IO {
+
+/// One contour at a place that two have in common.
+struct OnContour {
+  std::size_t piece = 0;  ///< index; at a joint the piece that ends there
+  double position = 0.0;  ///< length of the contour up to there, gaps not counted
+};
+
+/// A place that two contours, or two parts of one, have in common.
+struct Intersection {
+  enum class Kind {
+    Crossing,  ///< each passes to the other side of the other one
+    Touching,  ///< they stay on one side, run in one direction there, or one of them ends there
+    Overlap,   ///< they share a stretch, from `at` to `until`
+  };
+
+  Kind kind = Kind::Crossing;
+  XY at;
+  std::optional<XY> until;
+  OnContour a;
+  OnContour b;
+};
+
+/// All places that the two have in common, sorted along the first. Pieces without length count for
+/// nothing, and gaps are not bridged. A place at a joint, where pieces that follow each other
+/// both pass, is one place; a stretch is told for each pair of pieces that share it.
+std::vector<Intersection> IntersectionsOf(ContourFile const& a, ContourFile const& b);
+
+/// The places where the contour meets itself, but for the joints of pieces that follow each other.
+std::vector<Intersection> SelfIntersectionsOf(ContourFile const& contour);
+
+/// "crossing", "touching", "overlap".
+std::string NameOf(Intersection::Kind kind);
+
+/// The intersections of `a` with `b`, or without `b` of `a` with itself, as JSON; pieces are
+/// numbered from 1.
+std::string ToJson(std::vector<Intersection> const& found, ContourFile const& a,
+                   ContourFile const* b);
+
+/// The same as CSV.
+std::string ToCsv(std::vector<Intersection> const& found, ContourFile const& a,
+                  ContourFile const* b);
+
+}  // namespace Vorn::IO

@@ -1,0 +1,309 @@
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <nlohmann/json.hpp>
+#include <sstream>
+
+#include "io/Contours.h"
+#include "io/fit/Closing.h"
+#include "io/fit/ContourFit.h"
+#include "io/fit/FitJson.h"
+#include "support/SharedData.h"
+
+namespace Vorn::IO {
+namespace {
+
+/// A rectangle of 30 by 20, a point at every unit, from (12, 0) on; the first is not repeated.
+std::vector<WPoint> Rectangle() {
+  std::vector<WPoint> points;
+  for (int i = 0; i < 100; ++i) {
+    int const k = (i + 12) % 100;
+    double const x = k < 30 ? k : k < 50 ? 30 : k < 80 ? 80 - k : 0;
+    double const y = k < 30 ? 0 : k < 50 ? k - 30 : k < 80 ? 20 : 100 - k;
+    points.push_back({x, y, 0.0});
+  }
+  return points;
+}
+
+FitChoice Same(double tolerance) {
+  FitChoice choice;
+  choice.tolerance.same = tolerance;
+  return choice;
+}
+
+FitChoice PerPoint(double cap) {
+  FitChoice choice;
+  choice.tolerance.cap = cap;
+  return choice;
+}
+
+Report FitRectangle(FitChoice const& choice) {
+  return FitContour(Contours::FileWith(Rectangle()), choice, nullptr);
+}
+
+/// Cut open at the corner (30, 20).
+FitChoice FromCorner(double tolerance) {
+  FitChoice choice = Same(tolerance);
+  choice.start = 38;
+  return choice;
+}
+
+TEST(FitContour, ClosedRectangleHasFourSidesThatMeetExactly) {
+  Report const report = FitRectangle(FromCorner(0.01));
+  EXPECT_TRUE(report.closure.isClosed);
+  EXPECT_EQ(report.pieces.size(), 4u);
+  EXPECT_EQ(report.LineCount(), 4u);
+  EXPECT_EQ(report.Gap(), 0.0);
+  EXPECT_EQ(report.verdict, Verdict::WithinTolerance);
+  EXPECT_EQ(report.remeasured.points.size(), 100u);
+}
+
+TEST(FitContour, SeamIsTheFirstOfTheSharpestCornersOrTheOneGiven) {
+  EXPECT_EQ(FitRectangle(Same(0.01)).seam, 18u) << "(30, 0)";
+  FitChoice choice = Same(0.01);
+  choice.start = 0;
+  Report const report = FitRectangle(choice);
+  EXPECT_EQ(report.seam, 0u);
+  EXPECT_EQ(report.pieces.size(), 5u) << "one side is cut in two";
+  EXPECT_EQ(report.Gap(), 0.0);
+}
+
+PointFile Cam() {
+  std::istringstream nothing;
+  return ReadPoints(std::string(CONTOUR_EXAMPLES) + "/cam.csv", nothing,
+                    {ToleranceColumn::Use::IfPresent, "w"}, {});
+}
+
+TEST(FitContour, SmoothContourIsCutOpenAtAJoint) {
+  // The file of the cam begins in the middle of an arc.
+  auto const fit = [](std::optional<std::size_t> start) {
+    FitChoice choice;
+    choice.start = start;
+    return FitContour(Cam(), choice, nullptr);
+  };
+  Report const found = fit({});
+  Report const fromFirst = fit(0);
+  EXPECT_NE(found.seam, 0u);
+  EXPECT_LT(found.pieces.size(), fromFirst.pieces.size());
+  for (Report const* report : {&found, &fromFirst}) {
+    EXPECT_EQ(report->verdict, Verdict::WithinTolerance);
+    EXPECT_EQ(report->Gap(), 0.0);
+  }
+}
+
+/// Keeps what it is told.
+class Percents final : public ExecutionState {
+ public:
+  void SetProgress(std::int32_t percent) override { seen.push_back(percent); }
+  std::vector<std::int32_t> seen;
+};
+
+TEST(FitContour, ProgressOfTwoAttemptsIsOneBar) {
+  FitChoice choice;
+  Percents percents;
+  FitContour(Cam(), choice, &percents);
+  ASSERT_FALSE(percents.seen.empty());
+  // Within an attempt the library takes back a few percent where a piece ends up shorter.
+  for (std::size_t i = 1; i < percents.seen.size(); ++i) {
+    EXPECT_GT(percents.seen[i], percents.seen[i - 1] - 10) << i;
+  }
+  EXPECT_EQ(percents.seen.back(), 100);
+}
+
+TEST(FitContour, RangesCountPointsAsTheFileDoes) {
+  Report const report = FitRectangle(FromCorner(0.01));
+  ASSERT_TRUE(report.ranges.has_value());
+  std::vector<PointRange> const& ranges = *report.ranges;
+  ASSERT_EQ(ranges.size(), 4u);
+  EXPECT_EQ(ranges[0].first, 38u);
+  EXPECT_EQ(ranges[0].count, 31u) << "both corners of the first side";
+  EXPECT_EQ(ranges[1].first, 69u);
+  // The corner (0, 0) is point 88; the piece goes on through the end of the file to point 17 or 18.
+  EXPECT_NEAR(static_cast<double>(ranges[2].first), 88.5, 0.5);
+  EXPECT_EQ((ranges[2].first + ranges[2].count) % 100, ranges[3].first);
+  EXPECT_EQ(ranges[3].first + ranges[3].count, 38u) << "the seam belongs to the first piece";
+  std::size_t total = 0;
+  for (PointRange const& range : ranges) total += range.count;
+  EXPECT_EQ(total, 100u);
+}
+
+TEST(FitContour, DeviationsNameThePointOfTheFile) {
+  std::vector<WPoint> points = Rectangle();
+  points[5].y = 0.12;  // (17, 0), further than the tolerance off its side
+  Report const report = FitContour(Contours::FileWith(points), FromCorner(0.1), nullptr);
+  ASSERT_EQ(report.verdict, Verdict::WithinTolerance);
+  EXPECT_NEAR(static_cast<double>(report.remeasured.worst), 5.0, 1.0);
+  EXPECT_NEAR(static_cast<double>(report.fit.deviationIndex), 5.0, 1.0);
+}
+
+TEST(FitContour, SaidToBeOpenIsFittedAsBefore) {
+  FitChoice choice = Same(0.01);
+  choice.closed = ClosedChoice::No;
+  Report const report = FitRectangle(choice);
+  EXPECT_FALSE(report.closure.isClosed);
+  EXPECT_EQ(report.pieces.size(), 5u);
+  EXPECT_NEAR(report.Gap(), 1.0, 0.01);
+}
+
+TEST(FitContour, CloseClosingPairIsNamedAsTheFileCountsIt) {
+  std::vector<WPoint> points = Rectangle();
+  points.push_back({11.9, 0.0, 0.0});
+  try {
+    FitContour(Contours::FileWith(points), Same(0.2), nullptr);
+    FAIL() << "0.1 is too close for 0.2";
+  } catch (Failure const& failure) {
+    EXPECT_EQ(failure.Kind(), FailureKind::PointsTooClose);
+    EXPECT_EQ(std::string(failure.what()),
+              "part.csv: point 100 (line 102) and point 0 (line 2) are too close: distance 0.1, "
+              "needed more than 0.6 (1.5 times the sum of their tolerances)\n"
+              "the largest single tolerance that would pass for this file is 0.0333333\n"
+              "see: contour info part.csv -t 0.2\n"
+              "ways out: --tolerance 0.0333333, or --tolerance-per-point CAP to follow the "
+              "spacing, or leave points out: contour simplify part.csv -t 0.2 --drop-close");
+  }
+  EXPECT_EQ(FitContour(Contours::FileWith(points), Same(0.0333333), nullptr).Gap(), 0.0);
+}
+
+TEST(FitContour, TolerancePerPointFollowsTheSpacingAcrossTheSeam) {
+  std::vector<WPoint> points = Rectangle();
+  points.push_back({11.9, 0.0, 0.0});
+  Report const report = FitContour(Contours::FileWith(points), PerPoint(0.2), nullptr);
+  EXPECT_NEAR(report.file.points.front().w, 0.03, 1e-12);
+  EXPECT_NEAR(report.file.points.back().w, 0.03, 1e-12);
+  EXPECT_EQ(report.Gap(), 0.0);
+}
+
+TEST(FitContour, StartMustBeAPointOfAClosedContour) {
+  auto const refusal = [](FitChoice const& choice) -> std::string {
+    try {
+      FitRectangle(choice);
+    } catch (Failure const& failure) {
+      EXPECT_EQ(failure.Kind(), FailureKind::BadArgument);
+      return failure.what();
+    }
+    return "";
+  };
+  FitChoice choice = Same(0.01);
+  choice.start = 100;
+  EXPECT_EQ(refusal(choice), "part.csv: --start 100: the points are counted from 0 to 99");
+  choice.start = 3;
+  choice.closed = ClosedChoice::No;
+  EXPECT_EQ(refusal(choice),
+            "part.csv: --start is for closed contours, and this one is open (given by --closed); "
+            "--closed yes closes it");
+}
+
+TEST(FitContour, ClosedNeedsThreePoints) {
+  FitChoice choice = Same(0.01);
+  choice.closed = ClosedChoice::Yes;
+  for (std::vector<WPoint> const& points : {std::vector<WPoint>{{0, 0, 0}, {1, 0, 0}},
+                                            std::vector<WPoint>{{0, 0, 0}, {1, 0, 0}, {0, 0, 0}}}) {
+    EXPECT_THROW(FitContour(Contours::FileWith(points), choice, nullptr), Failure);
+  }
+  Report const report =
+      FitContour(Contours::FileWith({{0, 0, 0}, {4, 0, 0}, {0, 3, 0}}), choice, nullptr);
+  EXPECT_EQ(report.Gap(), 0.0);
+}
+
+TEST(FitContour, ReportsTellOfTheSeamAndTheGap) {
+  Report const closed = FitRectangle(FromCorner(0.01));
+  auto const json = nlohmann::json::parse(ToJson(closed));
+  EXPECT_EQ(json.at("closed"), true);
+  EXPECT_EQ(json.at("gap"), 0.0);
+  EXPECT_EQ(json.at("seam"), 38);
+
+  FitChoice choice = Same(0.01);
+  choice.closed = ClosedChoice::No;
+  Report const open = FitRectangle(choice);
+  auto const openJson = nlohmann::json::parse(ToJson(open));
+  EXPECT_EQ(openJson.at("closed"), false);
+  EXPECT_NEAR(openJson.at("gap").get<double>(), 1.0, 0.01);
+  EXPECT_TRUE(openJson.at("seam").is_null());
+}
+
+TEST(FitContour, FullCircleIsTwoArcsWithEveryStrategy) {
+  std::vector<WPoint> points;
+  for (int i = 0; i < 90; ++i) {
+    double const angle = i * std::atan(1.0) * 8.0 / 90.0;
+    double const radius = 10.0 + (i % 2 == 0 ? 0.004 : -0.004);
+    points.push_back({radius * std::cos(angle), radius * std::sin(angle), 0.0});
+  }
+  for (auto const strategy :
+       {GeometryUtils::FittingStrategy::Mixed, GeometryUtils::FittingStrategy::MixedCells,
+        GeometryUtils::FittingStrategy::SingleArc}) {
+    FitChoice choice = Same(0.01);
+    choice.strategy = strategy;
+    Report const report = FitContour(Contours::FileWith(points), choice, nullptr);
+    EXPECT_EQ(report.verdict, Verdict::WithinTolerance);
+    EXPECT_EQ(report.ArcCount(), 2u);
+    EXPECT_EQ(report.pieces.size(), 2u);
+    EXPECT_EQ(report.Gap(), 0.0);
+    EXPECT_NEAR(report.pieces[0].radius, 10.0, 1e-3);
+    auto const json = nlohmann::json::parse(ToJson(report));
+    EXPECT_TRUE(json.at("deviation").at("reported").at("value").is_null());
+  }
+}
+
+struct Measured {
+  char const* name;
+  FitChoice choice;
+  bool isClosed;
+};
+
+TEST(FitContour, MeasuredContoursStayWithinToleranceAndCloseExactly) {
+  auto const folder = Testing::SharedDataFolder();
+  if (!folder) GTEST_SKIP() << "VORN_DATA_DIR is not set";
+  for (Measured const& measured :
+       {Measured{"rail_head_known_arcs", Same(0.01), false},
+        Measured{"wheel_worn_a", Same(0.03), false}, Measured{"rail_worn_low", Same(0.025), false},
+        Measured{"mirror_sphere_83m", Same(0.00005), false},
+        Measured{"hatch_boundary", Same(0.002), true}, Measured{"glyph_five", PerPoint(2.0), true},
+        Measured{"test_track_centreline", PerPoint(0.03), false},
+        Measured{"gcode_letter_d", Same(0.015), true},
+        Measured{"airfoil_clark_y", Same(0.0004), false},
+        Measured{"airfoil_clark_y", PerPoint(0.001), false},
+        Measured{"circle_r3", Same(0.001), true}, Measured{"circle_r3", Same(0.0001), true}}) {
+    SCOPED_TRACE(measured.name);
+    std::vector<WPoint> const points = Testing::ReadPoints(*folder + "/" + measured.name + ".csv");
+    Report const report = FitContour(Contours::FileWith(points), measured.choice, nullptr);
+    EXPECT_EQ(report.verdict, Verdict::WithinTolerance);
+    EXPECT_EQ(report.closure.isClosed, measured.isClosed);
+    if (measured.isClosed) {
+      EXPECT_EQ(report.Gap(), 0.0);
+    } else {
+      EXPECT_GT(report.Gap(), 0.0);
+    }
+    // The contour goes from piece to piece without a gap, and arcs end on their circles.
+    for (std::size_t i = 0; i < report.pieces.size(); ++i) {
+      Piece const& piece = report.pieces[i];
+      if (i > 0) {
+        EXPECT_EQ(piece.start.x, report.pieces[i - 1].end.x) << i;
+        EXPECT_EQ(piece.start.y, report.pieces[i - 1].end.y) << i;
+      }
+      if (!piece.IsArc()) continue;
+      double const w = report.SmallestTolerance();
+      for (GeometryUtils::Point const& end : {piece.start, piece.end}) {
+        EXPECT_NEAR(std::hypot(end.x - piece.center.x, end.y - piece.center.y), piece.radius,
+                    1e-3 * w)
+            << i;
+      }
+    }
+  }
+}
+
+TEST(FitContour, KnownCircleIsFound) {
+  auto const folder = Testing::SharedDataFolder();
+  if (!folder) GTEST_SKIP() << "VORN_DATA_DIR is not set";
+  std::vector<WPoint> const points = Testing::ReadPoints(*folder + "/circle_r3.csv");
+  Report const report = FitContour(Contours::FileWith(points), Same(0.001), nullptr);
+  ASSERT_EQ(report.pieces.size(), 2u);
+  for (Piece const& arc : report.pieces) {
+    EXPECT_NEAR(arc.center.x, 0.0, 6e-5);
+    EXPECT_NEAR(arc.center.y, 20.0, 6e-5);
+    EXPECT_NEAR(arc.radius, 3.0, 6e-5);
+    EXPECT_TRUE(arc.counterClockwise);
+  }
+}
+
+}  // namespace
+}  // namespace Vorn::IO

@@ -1,0 +1,110 @@
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <bit>
+#include <limits>
+#include <nlohmann/json.hpp>
+
+#include "io/Contours.h"
+#include "io/fit/FitJson.h"
+#include "io/fit/FitReport.h"
+
+namespace Vorn::IO {
+namespace {
+
+using Strategy = GeometryUtils::FittingStrategy;
+
+Report StraightReport(double offset, double reported, Strategy strategy, double lastX = 2.0) {
+  FitAnswer fit;
+  fit.code = ErrorCode::Ok;
+  fit.contour = {Contours::Segment(0, 0), Contours::Segment(lastX, 0)};
+  fit.deviation = reported;
+  fit.deviationIndex = 1;
+  return MakeReport(Contours::FileWith({{0, 0, 0.125}, {1, offset, 0.125}, {2, 0, 0.125}}), "",
+                    strategy, std::move(fit));
+}
+
+TEST(Verdict, RoundingBeyondOneIsForgivenAndNoMore) {
+  EXPECT_EQ(StraightReport(0.125, 1.0, Strategy::Mixed).verdict, Verdict::WithinTolerance);
+  EXPECT_EQ(StraightReport(0.125 * (1.0 + 0.9e-9), 1.0, Strategy::Mixed).verdict,
+            Verdict::WithinTolerance);
+  EXPECT_EQ(StraightReport(0.125 * (1.0 + 1.1e-9), 1.0, Strategy::Mixed).verdict,
+            Verdict::OutsideTolerance);
+}
+
+TEST(Verdict, ReportedDeviationCountsToo) {
+  EXPECT_EQ(StraightReport(0.0, 1.1, Strategy::Mixed).verdict, Verdict::OutsideTolerance);
+  EXPECT_EQ(StraightReport(0.0, std::numeric_limits<double>::quiet_NaN(), Strategy::Mixed).verdict,
+            Verdict::OutsideTolerance);
+}
+
+TEST(Verdict, LengthReportedByTheSingleArcIsNotTakenForARelativeOne) {
+  EXPECT_EQ(StraightReport(0.0, 1.1, Strategy::SingleArc).verdict, Verdict::WithinTolerance);
+}
+
+TEST(Verdict, ContourThatStopsEarlyIsNoFit) {
+  EXPECT_EQ(StraightReport(0.0, 0.0, Strategy::Mixed, 1.0).verdict, Verdict::StopsEarly);
+  EXPECT_EQ(StraightReport(0.0, 0.0, Strategy::Mixed, 1.6).verdict, Verdict::OutsideTolerance)
+      << "nearer to the last point than half the spacing, but out of its tolerance";
+  EXPECT_EQ(StraightReport(0.0, 0.0, Strategy::MixedCells, 1.0).verdict, Verdict::StopsEarly);
+}
+
+TEST(Json, HoldsEveryFieldWithItsExactBits) {
+  Report const report = Contours::LineAndArcReport();
+  auto const json = nlohmann::json::parse(ToJson(report));
+  EXPECT_EQ(json.at("schemaVersion"), 1);
+  EXPECT_EQ(json.at("input").at("file"), "part.csv");
+  EXPECT_EQ(json.at("input").at("points"), 7);
+  EXPECT_TRUE(json.at("input").at("units").is_null());
+  EXPECT_EQ(json.at("input").at("tolerance").at("largest"), 0.02);
+  EXPECT_EQ(json.at("strategy"), "mixed");
+  EXPECT_EQ(json.at("code"), 0);
+  EXPECT_EQ(json.at("verdict"), "within tolerance");
+  EXPECT_EQ(json.at("counts").at("arcs"), 1);
+  EXPECT_EQ(json.at("deviation").at("reported").at("value"), 0.5);
+  EXPECT_EQ(json.at("deviation").at("reported").at("point"), 1);
+  EXPECT_EQ(json.at("deviation").at("remeasured").at("point"), 3);
+  ASSERT_EQ(json.at("elements").size(), 2u);
+
+  auto const& line = json.at("elements").at(0);
+  EXPECT_EQ(line.at("kind"), "line");
+  EXPECT_FALSE(line.contains("radius"));
+  EXPECT_EQ(line.at("points").at("count"), 3);
+
+  auto const& arc = json.at("elements").at(1);
+  auto const expectBits = [&](nlohmann::json const& value, double expected) {
+    EXPECT_EQ(std::bit_cast<std::uint64_t>(value.get<double>()),
+              std::bit_cast<std::uint64_t>(expected));
+  };
+  Piece const& piece = report.pieces[1];
+  expectBits(arc.at("end").at("x"), piece.end.x);
+  expectBits(arc.at("end").at("y"), piece.end.y);
+  expectBits(arc.at("center").at("y"), piece.center.y);
+  expectBits(arc.at("radius"), piece.radius);
+  expectBits(arc.at("startAngle"), piece.startAngle);
+  expectBits(arc.at("endAngle"), piece.endAngle);
+  expectBits(arc.at("sweep"), piece.sweep);
+  expectBits(arc.at("length"), piece.length);
+  EXPECT_EQ(arc.at("direction"), "cw");
+}
+
+TEST(Json, WritesNullForWhatIsNotKnown) {
+  Report report = Contours::LineAndArcReport();
+  report.fit.deviation = std::numeric_limits<double>::quiet_NaN();
+  report.fit.deviationIndex = -1;
+  report.ranges.reset();
+  auto const json = nlohmann::json::parse(ToJson(report));
+  EXPECT_TRUE(json.at("deviation").at("reported").at("value").is_null());
+  EXPECT_TRUE(json.at("deviation").at("reported").at("point").is_null());
+  EXPECT_TRUE(json.at("elements").at(0).at("points").is_null());
+}
+
+TEST(Json, FileNameThatIsNotUtf8StillGivesADocument) {
+  Report report = Contours::LineAndArcReport();
+  report.file.path = "caf\xE9.csv";
+  auto const json = nlohmann::json::parse(ToJson(report));
+  EXPECT_EQ(json.at("input").at("file"), "caf\xEF\xBF\xBD.csv");
+}
+
+}  // namespace
+}  // namespace Vorn::IO
