@@ -34,7 +34,8 @@ Segment StretchAround(ImplicitLine const& line, Point const& foot, double reach)
 }  // namespace
 
 CirclePoints CutCircleBySegment(Circle const& circle, Segment const& segment) {
-  auto const& [start, end] = segment;
+  Point const& start = segment.start;
+  Point const& end = segment.end;
   double const dx = end.x - start.x;
   double const dy = end.y - start.y;
   double const fx = start.x - circle.centre.x;
