@@ -1,26 +1,19 @@
-// Cells of admissible circle centres.
-//
-// Every measured point is moved along its radius by its tolerance, inward and outward. The extreme
-// circles pass through an inner or outer point of each of the three measured points; their centres
-// are the corners of the cell.
+#include "geometry/cells/CircleCells.h"
 
-#include <cmath>
-#include <cstddef>
+#include <array>
 #include <optional>
 #include <span>
 
 #include "geometry/elementary/CircleThrough.h"
+#include "geometry/elementary/Sense.h"
+#include "geometry/triangles/Ears.h"
 #include "math/NumericConstants.h"
-#include "vorn/GeometryUtils.h"
 
-namespace Vorn {
+namespace Vorn::Cells {
 
 namespace {
 
-using Point = GeometryUtils::Point;
-using Triangle = GeometryUtils::Triangle;
-
-constexpr int kMaxVertices = 6;
+using Elementary::Circle;
 
 /// Which of the eight candidate points an extreme circle passes through.
 enum Candidate {
@@ -34,6 +27,8 @@ enum Candidate {
   kLast,
   kCandidates
 };
+
+using Candidates = std::array<Point, kCandidates>;
 
 struct Row {
   Candidate start;
@@ -60,79 +55,81 @@ constexpr Row kLastFixed[] = {{kFirstInner, kMiddleInner, kLast},
 constexpr Row kBothFixed[] = {
     {kFirst, kMiddleInner, kLast}, {kFirst, kMiddleOuter, kLast}, {kFirst, kMiddleOuter, kLast}};
 
-std::span<Row const> RowsFor(bool firstFixed, bool lastFixed) {
-  if (firstFixed && lastFixed) return kBothFixed;
-  if (firstFixed) return kFirstFixed;
-  if (lastFixed) return kLastFixed;
+std::span<Row const> RowsFor(ArcTriple const& triple) {
+  if (triple.firstFixed && triple.lastFixed) return kBothFixed;
+  if (triple.firstFixed) return kFirstFixed;
+  if (triple.lastFixed) return kLastFixed;
   return kBothFree;
 }
 
-Point MovedAlongRadius(WPoint const& p, Point const& center, double newRadius, double radius) {
-  return {center.x + (p.x - center.x) * newRadius / radius,
-          center.y + (p.y - center.y) * newRadius / radius};
+/// The circle through the measured points; nothing when it has no centre or a tiny radius.
+std::optional<Circle> MeasuredCircle(ArcTriple const& triple) {
+  Point const first{triple.first.x, triple.first.y};
+  std::optional<Point> const centre = Elementary::PaddedCircumcentre(
+      first, {triple.middle.x, triple.middle.y}, {triple.last.x, triple.last.y});
+  if (!centre) return std::nullopt;
+  double const radius = Elementary::Distance(first, *centre);
+  bool const isProperRadius = radius > Numeric::kZero;
+  if (!isProperRadius) return std::nullopt;
+  return Circle{*centre, radius};
+}
+
+/// A point of the circle, moved along its radius until it is so far from the centre.
+Point MovedAlongRadius(WPoint const& p, Circle const& circle, double newRadius) {
+  auto const& [centre, radius] = circle;
+  return {centre.x + (p.x - centre.x) * newRadius / radius,
+          centre.y + (p.y - centre.y) * newRadius / radius};
+}
+
+Candidates CandidatesOf(ArcTriple const& triple, Circle const& circle) {
+  Candidates candidates;
+  WPoint const measured[3] = {triple.first, triple.middle, triple.last};
+  for (std::size_t i = 0; i < 3; ++i) {
+    WPoint const& p = measured[i];
+    candidates[2 * i] = MovedAlongRadius(p, circle, circle.radius - p.w);
+    candidates[2 * i + 1] = MovedAlongRadius(p, circle, circle.radius + p.w);
+  }
+  candidates[kFirst] = {triple.first.x, triple.first.y};
+  candidates[kLast] = {triple.last.x, triple.last.y};
+  return candidates;
 }
 
 }  // namespace
 
-ErrorCode GeometryUtils::GetCirclePolygon(WPoint first, WPoint middle, WPoint last, bool firstFixed,
-                                          bool lastFixed, int orientation, int* vertexCount,
-                                          Point2D<double>* const vertices) {
-  std::optional<Point> const circumcentre =
-      Elementary::PaddedCircumcentre({first.x, first.y}, {middle.x, middle.y}, {last.x, last.y});
-  if (!circumcentre) return ErrorCode::Failed;
-  Point const center = *circumcentre;
-  double const radius = std::sqrt(GetDist2({first.x, first.y}, center));
-  bool const isProperRadius = radius > Numeric::kZero;
-  if (!isProperRadius) return ErrorCode::Failed;
-
-  Point candidates[kCandidates];
-  WPoint const measured[3] = {first, middle, last};
-  for (int i = 0; i < 3; ++i) {
-    WPoint const& p = measured[i];
-    candidates[2 * i] = MovedAlongRadius(p, center, radius - p.w, radius);
-    candidates[2 * i + 1] = MovedAlongRadius(p, center, radius + p.w, radius);
-  }
-  candidates[kFirst] = {first.x, first.y};
-  candidates[kLast] = {last.x, last.y};
-
-  bool const areEndsFree = !firstFixed && !lastFixed;
-  bool const isSelecting = areEndsFree && orientation != 0;
-  Point kept[kMaxVertices];
-  int keptCount = 0;
-  int wantedSign = orientation;
-  for (Row const& row : RowsFor(firstFixed, lastFixed)) {
+ErrorCode FindCorners(ArcTriple const& triple, CircleCellCorners* corners) {
+  std::optional<Circle> const measured = MeasuredCircle(triple);
+  if (!measured) return ErrorCode::Failed;
+  Candidates const candidates = CandidatesOf(triple, *measured);
+  bool const isSelecting = triple.AreEndsFree() && triple.orientation != 0;
+  int wantedSign = triple.orientation;
+  CircleCellCorners kept;
+  for (Row const& row : RowsFor(triple)) {
     Point const& start = candidates[row.start];
-    Point const& mid = candidates[row.middle];
+    Point const& middle = candidates[row.middle];
     Point const& end = candidates[row.end];
-    Point rowCenter;
-    double rowRadius = 0.0;
-    if (!GetCircle(start, mid, end, &rowCenter, &rowRadius)) return ErrorCode::Failed;
-    int const sign = Numeric::Sign(GetArea(Triangle{{start, mid, end}}));
-    if (!isSelecting && keptCount == 0) wantedSign = sign;
+    std::optional<Circle> const extreme = Elementary::CircleThrough(start, middle, end);
+    if (!extreme) return ErrorCode::Failed;
+    int const sign = Numeric::Sign(Elementary::SignedArea(start, middle, end));
+    if (!isSelecting && kept.empty()) wantedSign = sign;
     if (sign == wantedSign) {
-      kept[keptCount++] = rowCenter;
+      kept.push_back(extreme->centre);
     } else if (!isSelecting) {
       return ErrorCode::OrientationMismatch;
     }
   }
-  if (areEndsFree && keptCount < 3) return ErrorCode::OrientationMismatch;
-
-  for (int i = 0; i < keptCount; ++i) vertices[i] = {kept[i].x, kept[i].y};
-  *vertexCount = keptCount;
+  if (kept.size() < 3) return ErrorCode::OrientationMismatch;
+  *corners = kept;
   return ErrorCode::Ok;
 }
 
-ErrorCode GeometryUtils::GetCircleTriangles(WPoint first, WPoint middle, WPoint last,
-                                            bool firstFixed, bool lastFixed, int orientation,
-                                            std::vector<Triangle>* triangles) {
-  Point2D<double> vertices[kMaxVertices];
-  int count = 0;
-  ErrorCode const code =
-      GetCirclePolygon(first, middle, last, firstFixed, lastFixed, orientation, &count, vertices);
+ErrorCode FindCircleCell(ArcTriple const& triple, CircleCell* cell) {
+  CircleCellCorners corners;
+  ErrorCode const code = FindCorners(triple, &corners);
   if (code != ErrorCode::Ok) return code;
-  std::vector<Point> polygon;
-  for (int i = 0; i < count; ++i) polygon.push_back({vertices[i].x, vertices[i].y});
-  return ConvexPolygonDivide(polygon, 0, count, triangles) ? ErrorCode::Ok : ErrorCode::Failed;
+  cell->clear();
+  Triangles::CutEars(corners.data(), static_cast<int>(corners.size()),
+                     [cell](Triangle const& ear) { cell->push_back(ear); });
+  return ErrorCode::Ok;
 }
 
-}  // namespace Vorn
+}  // namespace Vorn::Cells

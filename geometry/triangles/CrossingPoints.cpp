@@ -1,31 +1,23 @@
-// Where the sides of one triangle cross the sides of another.
-//
-// Points come out by side of the first triangle and along a side by distance from its start. A
-// point found is held back until the next one on the same side tells which of the two is nearer.
+#include "geometry/triangles/CrossingPoints.h"
 
 #include <algorithm>
 #include <cmath>
-#include <cstddef>
-#include <optional>
+#include <utility>
 
 #include "geometry/intersections/SegmentPair.h"
-#include "geometry/triangles/TriangleOverlap.h"
 #include "math/NumericConstants.h"
-#include "vorn/GeometryUtils.h"
 
-namespace Vorn {
+namespace Vorn::Triangles {
 
 namespace {
 
-using Cells::Shape;
-using CrossingPoint = GeometryUtils::CrossingPoint;
-using Point = GeometryUtils::Point;
-using Triangle = GeometryUtils::Triangle;
+using Elementary::SquaredDistance;
 
-struct Side {
-  Point const& start;
-  Point const& end;
-};
+/// Every pair of sides.
+constexpr SidePairs kAllPairs = 0x1FF;
+
+/// The bits of one side of the first triangle, shifted down.
+constexpr SidePairs kOneSide = 0x7;
 
 /// The ends of the stretch that two sides of one line share.
 struct Stretch {
@@ -34,7 +26,7 @@ struct Stretch {
 };
 
 /// Along the axis on which the first side is longer. Nothing when the sides only lie on one line.
-std::optional<Stretch> SharedStretch(Side const& first, Side const& second) {
+std::optional<Stretch> SharedStretch(Segment const& first, Segment const& second) {
   bool const isAlongX =
       std::fabs(first.end.x - first.start.x) > std::fabs(first.end.y - first.start.y);
   auto const along = [isAlongX](Point const& p) { return isAlongX ? p.x : p.y; };
@@ -54,31 +46,20 @@ std::optional<Stretch> SharedStretch(Side const& first, Side const& second) {
   return Stretch{ends[1], ends[2]};
 }
 
-/// Appends two records, the one nearer to the origin first; on equal distances the first one.
-template <typename Record, typename Distance2, typename Records>
-void AppendByDistance(Record const& first, Record const& second, Distance2 const& distance2,
-                      Records* records) {
-  bool const isSecondNearer = distance2(first) > distance2(second);
-  records->push_back(isSecondNearer ? second : first);
-  records->push_back(isSecondNearer ? first : second);
+/// Appends two records, the one nearer to the start first; on equal distances the first one.
+void AppendByDistance(CrossingPoint const& first, CrossingPoint const& second, Point const& start,
+                      CrossingPoints* points) {
+  bool const isSecondNearer = SquaredDistance(first.pt, start) > SquaredDistance(second.pt, start);
+  points->push_back(isSecondNearer ? second : first);
+  points->push_back(isSecondNearer ? first : second);
 }
 
-double SquaredDistance(Point const& p, Point const& q) {
-  double const dx = p.x - q.x;
-  double const dy = p.y - q.y;
-  return dy * dy + dx * dx;
-}
-
-auto DistanceFromStartOf(Side const& side) {
-  return [&side](CrossingPoint const& record) { return SquaredDistance(record.pt, side.start); };
-}
-
-/// Whether side i of the first triangle may meet side j of the second: they cross, as the
-/// intersection of two segments decides it, or they are parallel and not apart. Without a branch,
-/// since nearly all sides do not meet. For coordinates that are numbers.
-bool MayMeet(Shape const& first, int i, Shape const& second, int j) {
-  Shape::Side const& a = first.sides[i];
-  Shape::Side const& b = second.sides[j];
+/// Whether side i of the first triangle may meet side j of the second. The steps are those of
+/// IntersectSegments, without a branch, since nearly all sides do not meet. For coordinates that
+/// are numbers.
+bool MayMeet(PreparedTriangle const& first, int i, PreparedTriangle const& second, int j) {
+  PreparedTriangle::Side const& a = first.sides[i];
+  PreparedTriangle::Side const& b = second.sides[j];
   double const dx = first.triangle.pts[i].x - second.triangle.pts[j].x;
   double const dy = first.triangle.pts[i].y - second.triangle.pts[j].y;
   bool const areApart =
@@ -96,143 +77,97 @@ bool MayMeet(Shape const& first, int i, Shape const& second, int j) {
   return !(areApart | (isProper & !isInRange));
 }
 
-Intersections::SegmentPair PairOfSides(Side const& side, Side const& other) {
-  return {{side.start, side.end}, {other.start, other.end}};
-}
-
-/// Of the records from `begin` on, more than a line can cross since sides that touch at vertices
-/// report them twice, keeps the two points farthest apart.
-void KeepFarthestTwo(Side const& side, int i, std::size_t begin, Cells::CrossingPoints* points) {
-  std::size_t m = begin;
-  std::size_t n = begin + 1;
-  double farthest2 = SquaredDistance((*points)[m].pt, (*points)[n].pt);
-  for (std::size_t p = begin; p < points->size(); ++p) {
-    for (std::size_t q = p + 1; q < points->size(); ++q) {
-      double const distance2 = SquaredDistance((*points)[p].pt, (*points)[q].pt);
+/// The positions of the two points farthest apart from `begin` on, of which there must be two or
+/// more; the first such pair of equals.
+std::pair<std::size_t, std::size_t> FarthestTwo(CrossingPoints const& points, std::size_t begin) {
+  std::pair<std::size_t, std::size_t> farthest{begin, begin + 1};
+  double farthest2 = SquaredDistance(points[begin].pt, points[begin + 1].pt);
+  for (std::size_t p = begin; p < points.size(); ++p) {
+    for (std::size_t q = p + 1; q < points.size(); ++q) {
+      double const distance2 = SquaredDistance(points[p].pt, points[q].pt);
       if (distance2 > farthest2) {
         farthest2 = distance2;
-        m = p;
-        n = q;
+        farthest = {p, q};
       }
     }
   }
+  return farthest;
+}
+
+/// Of the records of side i from `begin` on, more than a line can cross since sides that touch at
+/// vertices report them twice, keeps the two points farthest apart.
+void KeepFarthestTwo(Point const& start, int i, std::size_t begin, CrossingPoints* points) {
+  auto const [m, n] = FarthestTwo(*points, begin);
   CrossingPoint fromM = (*points)[m];
   CrossingPoint fromN = (*points)[n];
   // Deliberate: the second record carries the first triangle's side in the place of the second's.
   fromM.side1 = i;
   fromN.side2 = i;
   points->resize(begin);
-  AppendByDistance(fromM, fromN, DistanceFromStartOf(side), points);
+  AppendByDistance(fromM, fromN, start, points);
 }
 
-/// Collects what lies on side i of the first triangle.
-class SideCollector {
- public:
-  SideCollector(Triangle const& first, int i, Triangle const& second, Cells::CrossingPoints* points)
-      : side_{first.pts[i], first.pts[(i + 1) % 3]},
-        i_(i),
-        second_(second),
-        points_(*points),
-        begin_(points->size()) {}
-
-  /// Takes side j of the second triangle.
-  void Take(int j) {
-    Side const other{second_.pts[j], second_.pts[(j + 1) % 3]};
-    CrossingPoint found{{}, i_, j};
-    SegmentsRelPosition const relation =
-        Intersections::IntersectSegments(PairOfSides(side_, other), &found.pt);
-    if (relation == SegmentsRelPosition::Intersecting) {
-      if (held_) {
-        AppendByDistance(*held_, found, DistanceFromStartOf(side_), &points_);
-        held_.reset();
-      } else {
-        held_ = found;
-      }
-    } else if (relation == SegmentsRelPosition::Collinear) {
-      if (std::optional<Stretch> const shared = SharedStretch(side_, other)) {
-        AppendByDistance(CrossingPoint{shared->low, i_, j}, CrossingPoint{shared->high, i_, j},
-                         DistanceFromStartOf(side_), &points_);
-        // Deliberate: the ends of the stretch stand for the point that was held.
-        held_.reset();
-      }
+/// Takes what side i of the first triangle and side j of the second have in common.
+void TakeCommonPoints(Triangle const& first, int i, Triangle const& second, int j,
+                      SidePoints* points) {
+  Segment const side = SideOf(first, i);
+  Segment const other = SideOf(second, j);
+  Point common;
+  SegmentsRelPosition const relation = Intersections::IntersectSegments({side, other}, &common);
+  if (relation == SegmentsRelPosition::Intersecting) {
+    points->TakeCrossing({common, i, j});
+  } else if (relation == SegmentsRelPosition::Collinear) {
+    if (std::optional<Stretch> const shared = SharedStretch(side, other)) {
+      points->TakeStretch({shared->low, i, j}, {shared->high, i, j});
     }
   }
-
-  void Finish() {
-    if (held_) points_.push_back(*held_);
-    if (points_.size() - begin_ >= 3) KeepFarthestTwo(side_, i_, begin_, &points_);
-  }
-
- private:
-  Side const side_;
-  int const i_;
-  Triangle const& second_;
-  Cells::CrossingPoints& points_;
-  std::size_t const begin_;
-  std::optional<CrossingPoint> held_;
-};
+}
 
 }  // namespace
 
-bool GeometryUtils::GetCrossingPoints(Triangle const& first, int startSide, Triangle const& second,
-                                      std::vector<Point>* points) {
-  int const firstSide = (startSide % 3 + 3) % 3;
-  for (int turn = 0; turn < 3; ++turn) {
-    int const i = (firstSide + turn) % 3;
-    Point const& start = first.pts[i];
-    Point const& end = first.pts[(i + 1) % 3];
-    auto const distance2 = [&start](Point const& p) { return SquaredDistance(p, start); };
-    std::optional<Point> held;
-    for (int j = 0; j < 3; ++j) {
-      Point const& otherStart = second.pts[j];
-      Point const& otherEnd = second.pts[(j + 1) % 3];
-      Point found;
-      if (GetLineSegmentsIntersection(start.x, start.y, end.x, end.y, otherStart.x, otherStart.y,
-                                      otherEnd.x, otherEnd.y, &found.x,
-                                      &found.y) != SegmentsRelPosition::Intersecting) {
-        continue;
-      }
-      if (held) {
-        AppendByDistance(*held, found, distance2, points);
-        held.reset();
-      } else {
-        held = found;
-      }
-    }
-    if (held) points->push_back(*held);
+void SidePoints::TakeCrossing(CrossingPoint const& found) {
+  if (held_) {
+    AppendByDistance(*held_, found, start_, &points_);
+    held_.reset();
+  } else {
+    held_ = found;
   }
-  return true;
 }
 
-void Cells::FindCrossingPoints(Shape const& first, Shape const& second, CrossingPoints* points) {
-  bool const areOrdered = first.isOrdered && second.isOrdered;
+void SidePoints::TakeStretch(CrossingPoint const& end1, CrossingPoint const& end2) {
+  AppendByDistance(end1, end2, start_, &points_);
+  held_.reset();
+}
+
+void SidePoints::Finish() {
+  if (held_) points_.push_back(*held_);
+  held_.reset();
+}
+
+SidePairs PairsThatMayMeet(PreparedTriangle const& first, PreparedTriangle const& second) {
+  if (!first.isOrdered || !second.isOrdered) return kAllPairs;
+  SidePairs pairs = 0;
   for (int i = 0; i < 3; ++i) {
-    SideCollector collector(first.triangle, i, second.triangle, points);
     for (int j = 0; j < 3; ++j) {
-      if (!areOrdered || MayMeet(first, i, second, j)) collector.Take(j);
+      pairs |= (MayMeet(first, i, second, j) ? 1U : 0U) << (3 * i + j);
     }
-    collector.Finish();
   }
+  return pairs;
 }
 
-void Cells::FindCrossingPoints(Triangle const& first, Triangle const& second, unsigned mayCross,
-                               CrossingPoints* points) {
+void FindCrossingPoints(Triangle const& first, Triangle const& second, SidePairs pairs,
+                        CrossingPoints* points) {
   for (int i = 0; i < 3; ++i) {
-    unsigned const sides = mayCross >> (3 * i) & 7U;
-    if (sides == 0) continue;
-    SideCollector collector(first, i, second, points);
+    SidePairs const ofSide = pairs >> (3 * i) & kOneSide;
+    if (ofSide == 0) continue;
+    std::size_t const begin = points->size();
+    SidePoints onSide(first.pts[i], points);
     for (int j = 0; j < 3; ++j) {
-      if ((sides >> j & 1U) != 0) collector.Take(j);
+      if ((ofSide >> j & 1U) != 0) TakeCommonPoints(first, i, second, j, &onSide);
     }
-    collector.Finish();
+    onSide.Finish();
+    if (points->size() - begin >= 3) KeepFarthestTwo(first.pts[i], i, begin, points);
   }
 }
 
-void GeometryUtils::GetCrossingPoints(Triangle const& first, Triangle const& second,
-                                      std::vector<CrossingPoint>* points) {
-  Cells::CrossingPoints found;
-  Cells::FindCrossingPoints(Shape(first), Shape(second), &found);
-  points->insert(points->end(), found.begin(), found.end());
-}
-
-}  // namespace Vorn
+}  // namespace Vorn::Triangles

@@ -1,27 +1,25 @@
+// The centre of a single triangle.
+
 #pragma once
 
-#include "vorn/GeometryUtils.h"
+#include "geometry/triangles/Triangle.h"
 
-namespace Vorn::Cells {
+namespace Vorn::Triangles {
 
 /// What one triangle adds to the centre of a cell.
 struct TriangleCentre {
-  explicit TriangleCentre(GeometryUtils::Triangle const& triangle);
-
-  /// Without sign.
-  double area;
-  GeometryUtils::Point center;
+  /// The area, without sign.
+  double area = 0.0;
+  /// The inner point.
+  Point centre;
 };
 
-/// Widens rect (min x, min y, max x, max y) to take in a triangle; only strict extremes replace
-/// what stands there.
-inline void ExtendRect(GeometryUtils::Triangle const& triangle, double* rect) {
-  for (GeometryUtils::Point const& p : triangle.pts) {
-    if (p.x < rect[0]) rect[0] = p.x;
-    if (p.y < rect[1]) rect[1] = p.y;
-    if (p.x > rect[2]) rect[2] = p.x;
-    if (p.y > rect[3]) rect[3] = p.y;
-  }
-}
+/// An inner point of a triangle that stays well conditioned for slim ones: the crossing of the
+/// medians of the two longer sides, which meet at the widest angle. Where the shortest side has no
+/// length or the medians do not meet, the middle between the middles of the longer sides.
+Point InnerPoint(Triangle const& triangle);
 
-}  // namespace Vorn::Cells
+/// Area and inner point of a triangle.
+TriangleCentre CentreOf(Triangle const& triangle);
+
+}  // namespace Vorn::Triangles

@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
 
 #include "geometry/intersections/Circles.h"
-#include "geometry/triangles/TriangleOverlap.h"
+#include "geometry/triangles/InlineVector.h"
 #include "math/Assert.h"
 
 namespace Vorn {
@@ -25,7 +25,7 @@ TEST(AssertDeathTest, FalseConditionEndsTheProgramAndIsNamed) {
 }
 
 TEST(AssertDeathTest, OverfullArrayEndsTheProgram) {
-  Cells::InlineVector<int, 2> numbers;
+  Triangles::InlineVector<int, 2> numbers;
   numbers.push_back(1);
   numbers.push_back(2);
   EXPECT_DEATH(numbers.push_back(3), "assertion failed: size_ < kCapacity");

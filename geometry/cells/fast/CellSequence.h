@@ -1,21 +1,22 @@
+// A cell that is narrowed again and again, held without its copies. It stands for a plain cell
+// (PlainCell) narrowed by Triangles::AppendOverlaps, triangle by triangle.
+
 #pragma once
 
 #include <cstddef>
-#include <cstdint>
 #include <optional>
 #include <span>
 #include <vector>
 
-#include "geometry/cells/fast/Cutter.h"
-#include "vorn/GeometryUtils.h"
+#include "geometry/cells/Bounds.h"
+#include "geometry/cells/fast/CellLevel.h"
+#include "geometry/cells/fast/SequenceCentre.h"
+#include "geometry/triangles/Overlap.h"
+#include "geometry/triangles/Triangle.h"
 
 namespace Vorn::Cells {
 
-/// A point, and how far from it the one that is meant may be.
-struct RoughCentre {
-  GeometryUtils::Point at;
-  double error;
-};
+using Triangles::kMostParts;
 
 /// A cell that is narrowed again and again, held without its copies.
 ///
@@ -34,90 +35,75 @@ struct RoughCentre {
 /// floating-point sum over them.
 class CellSequence {
  public:
+  /// The empty cell.
   CellSequence() = default;
-  explicit CellSequence(std::span<GeometryUtils::Triangle const> triangles) { Begin(triangles); }
+
+  /// A cell of these triangles.
+  explicit CellSequence(std::span<Triangle const> triangles) { Begin(triangles); }
 
   /// The number of triangles, copies included.
   std::size_t size() const { return depth_ == 0 ? 0 : Last().size; }
+
+  /// Whether there is no triangle.
   bool empty() const { return size() == 0; }
 
   /// Becomes the empty cell. What room the levels took is kept for those to come.
   void clear() { depth_ = 0; }
 
   /// Becomes a cell of these triangles.
-  void Begin(std::span<GeometryUtils::Triangle const> triangles);
+  void Begin(std::span<Triangle const> triangles);
 
-  /// Replaces every triangle by its overlaps with the triangles of another cell, in order.
-  void NarrowBy(std::span<GeometryUtils::Triangle const> other);
+  /// Replaces every triangle by its overlaps with the triangles of another cell, in order. O(number
+  /// of distinct triangles times the size of the other cell).
+  void NarrowBy(std::span<Triangle const> other);
 
   /// Whether narrowing by another cell would leave anything.
-  bool Overlaps(std::span<GeometryUtils::Triangle const> other) const;
+  bool Overlaps(std::span<Triangle const> other) const;
 
-  /// How often the cell has been narrowed, plus one.
+  /// How often the cell has been narrowed, plus one; 0 before it began.
   std::size_t Depth() const { return depth_; }
 
-  /// Goes back to what the cell was at a depth.
-  void ReturnTo(std::size_t depth) { depth_ = depth; }
+  /// Goes back to what the cell was at a depth, which must not be above the present one.
+  void ReturnTo(std::size_t depth);
 
-  /// As GetBoundingRect, GetCenter and the centre of what GetOverlapping gives for a candidate.
-  bool BoundingRect(double* rect) const;
-  bool Center(GeometryUtils::Point* center) const;
+  /// As Cells::BoundingRect.
+  std::optional<Rect> BoundingRect() const;
+
+  /// As CentreOf.
+  std::optional<Point> Centre() const;
+
+  /// Centre for callers that hold its point already.
+  bool Center(Point* centre) const {
+    std::optional<Point> const found = Centre();
+    if (found) *centre = *found;
+    return found.has_value();
+  }
+
   /// The centre without its exact rounding, which takes no sum over the copies. Nothing for a cell
   /// without a proper triangle, or with one of extreme size.
   std::optional<RoughCentre> FindRoughCentre() const;
-  bool CenterOfOverlapWith(GeometryUtils::Triangle const& candidate,
-                           GeometryUtils::Point* center) const;
 
-  /// The triangles one by one, copies included.
-  std::vector<GeometryUtils::Triangle> Expand() const;
+  /// As PlainCell::CentreOfOverlapWith.
+  std::optional<Point> CentreOfOverlapWith(Triangle const& candidate) const;
 
-  /// The words that replace the letters of one level by letters of the next.
-  struct Words {
-    /// Where each word ends in `letters`; it begins where the one before ends.
-    std::vector<std::uint32_t> ends;
-    std::vector<std::uint32_t> letters;
-
-    std::span<std::uint32_t const> Of(std::uint32_t letter) const {
-      std::uint32_t const begin = letter == 0 ? 0 : ends[letter - 1];
-      return {letters.data() + begin, letters.data() + ends[letter]};
-    }
-
-    void clear() {
-      ends.clear();
-      letters.clear();
-    }
-  };
+  /// The triangles one by one, copies included. O(size).
+  std::vector<Triangle> Expand() const;
 
  private:
-  struct Level {
-    Words words;
-    std::vector<BoxedTriangle> triangles;
-    /// Of all triangles that ever made up the cell. Parts of triangles are within both of them but
-    /// for the rounding of crossing points, of which there is not enough to matter.
-    Magnitude magnitude;
-    /// How often each letter occurs in the sequence.
-    std::vector<std::size_t> counts;
-    std::size_t size = 0;
+  CellLevel const& Last() const { return levels_[depth_ - 1]; }
+  std::span<CellLevel const> Levels() const { return {levels_.data(), depth_}; }
 
-    void clear() {
-      words.clear();
-      triangles.clear();
-      counts.clear();
-      size = 0;
-    }
-  };
+  /// The words of all levels, with room for one more.
+  WordChain Chain() const;
 
-  /// Collects the words of a new level and numbers its letters.
-  class LevelBuilder;
+  /// A further level, empty but for the room it took before.
+  CellLevel* AddLevel();
 
-  Level const& Last() const { return levels_[depth_ - 1]; }
-  std::span<Level const> Levels() const { return {levels_.data(), depth_}; }
-  Level* AddLevel();
-  Level OverlapWith(GeometryUtils::Triangle const& candidate) const;
-  bool CenterWith(Level const* last, GeometryUtils::Point* center) const;
+  /// The common parts of a candidate and this cell, as a further level.
+  CellLevel OverlapWith(Triangle const& candidate) const;
 
   /// The first `depth_` are the cell; those behind them are room to reuse.
-  std::vector<Level> levels_;
+  std::vector<CellLevel> levels_;
   std::size_t depth_ = 0;
 };
 

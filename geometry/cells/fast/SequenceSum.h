@@ -1,10 +1,12 @@
+// Sums over the sequence that words stand for. It stands for a plain loop over all copies.
+
 #pragma once
 
 #include <cstddef>
 #include <cstdint>
 #include <vector>
 
-#include "geometry/cells/fast/CellSequence.h"
+#include "geometry/cells/fast/Words.h"
 
 namespace Vorn::Cells {
 
@@ -19,8 +21,9 @@ namespace Vorn::Cells {
 /// provably stays inside the binade; elsewhere the word is run through letter by letter.
 class SequenceSum {
  public:
-  /// The words from the first level to the last one, whose letters the terms belong to.
-  explicit SequenceSum(std::vector<CellSequence::Words const*> const& chain);
+  /// The words from the first level to the last one, whose letters the terms belong to. They must
+  /// outlive this.
+  explicit SequenceSum(std::vector<Words const*> const& levels);
 
   /// The sum over all letters of the last level. A letter whose term is skipped adds nothing, not
   /// even a zero.
@@ -34,7 +37,12 @@ class SequenceSum {
     std::int64_t lowest = 0;
     std::int64_t highest = 0;
 
+    /// Goes on along another path.
     void Append(Path const& next);
+
+    /// Whether the path could lie within a binade. Also keeps the integers far from overflow: of
+    /// two such paths one after the other, no position is beyond 2^54 units.
+    bool FitsBinade() const;
   };
 
   /// What a letter's expansion does to a running sum in one binade.
@@ -45,6 +53,7 @@ class SequenceSum {
     Path fromEven;
     Path fromOdd;
 
+    /// The path from a position on the grid.
     Path const& From(std::int64_t position) const {
       return (position & 1) == 0 ? fromEven : fromOdd;
     }
@@ -52,16 +61,40 @@ class SequenceSum {
 
   static constexpr int kNoExponent = INT32_MIN;
 
-  void FindTotals();
-  void Add(std::size_t level, std::uint32_t letter);
-  bool MayStayInBinade(std::size_t level, std::uint32_t letter) const;
-  bool AddAtOnce(std::size_t level, std::uint32_t letter);
-  Movement const& MovementOf(std::size_t level, std::uint32_t letter, int exponent);
-  Movement TermMovement(std::uint32_t letter, int exponent) const;
-  static Path Step(std::int64_t units);
-  static bool IsWithinBinade(Path const& path);
+  /// A letter of a level, whose expansion is added.
+  struct Place {
+    std::size_t level;
+    Letter letter;
+  };
 
-  std::vector<CellSequence::Words const*> chain_;
+  /// Fills lengths_ and costs_ of one level from those of the next.
+  void MeasureLevel(std::size_t level);
+
+  /// Fills totals_.
+  void FindTotals();
+
+  /// Adds the expansion of a letter to the sum.
+  void Add(Place const& place);
+
+  /// Whether the sum is likely to stay in its binade while an expansion is added.
+  bool MayStayInBinade(Place const& place) const;
+
+  /// Moves the sum by a whole expansion. False, sum unchanged, where that could differ from adding
+  /// the terms one by one.
+  bool AddAtOnce(Place const& place);
+
+  /// What the expansion of a letter does to a sum in a binade; found once for each binade.
+  Movement const& MovementOf(Place const& place, int exponent);
+
+  /// What the term of a letter of the last level does.
+  Movement TermMovement(Letter letter, int exponent) const;
+
+  /// The path of a single step.
+  static Path Step(std::int64_t units);
+
+  bool IsLast(std::size_t level) const { return level + 1 == levels_.size(); }
+
+  std::vector<Words const*> levels_;
   /// For each level and letter, how many terms its expansion holds.
   std::vector<std::vector<std::size_t>> lengths_;
   /// And how many steps it takes to run through them.

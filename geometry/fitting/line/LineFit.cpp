@@ -32,11 +32,9 @@ using Point = GeometryUtils::Point;
 
 /// As GetCenterForLine.
 bool CenterForLine(Cells::FixedPoints const& fixed, CellSequence const& cell, Point* center) {
-  if (!fixed.IsAny()) return cell.Center(center);
-  double rect[4];
-  GeometryUtils::Triangle candidate;
-  return cell.BoundingRect(rect) && fixed.FindCandidate(rect, &candidate) &&
-         cell.CenterOfOverlapWith(candidate, center);
+  std::optional<Point> const found = Cells::CentreForLine(fixed, cell);
+  if (found) *center = *found;
+  return found.has_value();
 }
 
 /// The ends of the line that a parameter point stands for: fixed ones as they are, the others the

@@ -33,36 +33,41 @@ void ExpectRoughCentreIsNear(Point const& center, CellSequence const& sequence) 
   if (!rough) return;
   double const distance = std::hypot(rough->at.x - center.x, rough->at.y - center.y);
   EXPECT_LE(distance, rough->error);
-  double rect[4];
-  ASSERT_TRUE(sequence.BoundingRect(rect));
+  std::optional<Cells::Rect> const rect = sequence.BoundingRect();
+  ASSERT_TRUE(rect);
   double largest = 0.0;
-  for (double const bound : rect) largest = std::max(largest, std::fabs(bound));
+  for (double const bound : {rect->xMin, rect->yMin, rect->xMax, rect->yMax})
+    largest = std::max(largest, std::fabs(bound));
   EXPECT_LE(rough->error, 1e-15 * static_cast<double>(sequence.size()) * largest);
 }
 
 void ExpectSameSummary(Cell const& plain, CellSequence const& sequence) {
   ASSERT_EQ(sequence.size(), plain.size());
   EXPECT_EQ(sequence.empty(), plain.empty());
-  Point plainCenter = kPointSentinel;
-  Point center = kPointSentinel;
-  EXPECT_EQ(sequence.Center(&center), GeometryUtils::GetCenter(&plain, &plainCenter));
-  EXPECT_SAME_POINT(center, plainCenter);
-  ExpectRoughCentreIsNear(plainCenter, sequence);
+  Point plainCentre = kPointSentinel;
+  std::optional<Point> const centre = sequence.Centre();
+  EXPECT_EQ(centre.has_value(), GeometryUtils::GetCenter(&plain, &plainCentre));
+  EXPECT_SAME_POINT(centre.value_or(kPointSentinel), plainCentre);
+  ExpectRoughCentreIsNear(plainCentre, sequence);
   double plainRect[4] = {kSentinel, kSentinel, kSentinel, kSentinel};
-  double rect[4] = {kSentinel, kSentinel, kSentinel, kSentinel};
-  EXPECT_EQ(sequence.BoundingRect(rect), GeometryUtils::GetBoundingRect(&plain, plainRect));
-  for (int i = 0; i < 4; ++i) EXPECT_SAME_BITS(rect[i], plainRect[i]);
+  std::optional<Cells::Rect> const rect = sequence.BoundingRect();
+  ASSERT_EQ(rect.has_value(), GeometryUtils::GetBoundingRect(&plain, plainRect));
+  if (!rect) return;
+  EXPECT_SAME_BITS(rect->xMin, plainRect[0]);
+  EXPECT_SAME_BITS(rect->yMin, plainRect[1]);
+  EXPECT_SAME_BITS(rect->xMax, plainRect[2]);
+  EXPECT_SAME_BITS(rect->yMax, plainRect[3]);
 }
 
-void ExpectSameCenterOfOverlap(Cell const& plain, CellSequence const& sequence,
+void ExpectSameCentreOfOverlap(Cell const& plain, CellSequence const& sequence,
                                Triangle const& candidate) {
   Cell overlap;
   GeometryUtils::GetOverlapping(candidate, &plain, &overlap);
-  Point plainCenter = kPointSentinel;
-  Point center = kPointSentinel;
-  bool const plainFound = !overlap.empty() && GeometryUtils::GetCenter(&overlap, &plainCenter);
-  EXPECT_EQ(sequence.CenterOfOverlapWith(candidate, &center), plainFound);
-  EXPECT_SAME_POINT(center, plainCenter);
+  Point plainCentre = kPointSentinel;
+  bool const plainFound = !overlap.empty() && GeometryUtils::GetCenter(&overlap, &plainCentre);
+  std::optional<Point> const centre = sequence.CentreOfOverlapWith(candidate);
+  EXPECT_EQ(centre.has_value(), plainFound);
+  EXPECT_SAME_POINT(centre.value_or(kPointSentinel), plainCentre);
 }
 
 /// Line cells of consecutive pairs, all in the form that the first one chose.
@@ -115,9 +120,9 @@ std::size_t NarrowAlong(std::vector<Cell> const& cells) {
     Triangle chord;
     if (GeometryUtils::GetBoundingCircleAndLineIntersectionTriangle(
             &plain, 1.0, 0.25, -rect[0] - 0.25 * rect[1], &chord)) {
-      ExpectSameCenterOfOverlap(plain, sequence, chord);
+      ExpectSameCentreOfOverlap(plain, sequence, chord);
     }
-    ExpectSameCenterOfOverlap(plain, sequence, plain[plain.size() / 2]);
+    ExpectSameCentreOfOverlap(plain, sequence, plain[plain.size() / 2]);
   }
   return largest;
 }
@@ -182,9 +187,7 @@ TEST(CellSequence, EmptyHasNoCentreAndNoBounds) {
 
   CellSequence const ofNothing{Cell{}};
   ExpectSameSummary({}, ofNothing);
-  Point center = kPointSentinel;
-  EXPECT_FALSE(ofNothing.CenterOfOverlapWith(Triangle{}, &center));
-  EXPECT_SAME_POINT(center, kPointSentinel);
+  EXPECT_FALSE(ofNothing.CentreOfOverlapWith(Triangle{}));
 }
 
 TEST(CellSequence, NarrowedByNothingIsEmpty) {

@@ -3,6 +3,7 @@
 #include <set>
 #include <utility>
 
+#include "geometry/cells/fast/ChordCutter.h"
 #include "geometry/cells/fast/Cutter.h"
 #include "gtest/gtest.h"
 #include "support/Bits.h"
@@ -17,9 +18,9 @@ namespace {
 using Cells::BoxedTriangle;
 using Cells::Cutter;
 using Cells::Magnitude;
-using Cells::Overlap;
-using Cells::Shape;
 using Cells::Sight;
+using Triangles::Overlap;
+using Triangles::PreparedTriangle;
 using Point = GeometryUtils::Point;
 using Triangle = GeometryUtils::Triangle;
 
@@ -37,12 +38,12 @@ Cutter::Place PlaceOf(Triangle const& other, Triangle const& cutter) {
 
 void ExpectSameOverlap(Triangle const& other, Triangle const& cutter) {
   Overlap plain;
-  Cells::FindOverlap(Shape(other), Shape(cutter), &plain);
+  Triangles::FindOverlap(PreparedTriangle(other), PreparedTriangle(cutter), &plain);
   Cell const expected(plain.parts.begin(), plain.parts.end());
   Overlap fast;
   if (CutterFor(other, cutter).Cut(BoxedTriangle(other), &fast) == Cutter::Rest::Whole) {
     EXPECT_EQ(plain.status, GeometryUtils::OverlappingStatus::Overlap);
-    EXPECT_TRUE(SameCell(expected, Cell(Cells::kCopiesOfContained, other)))
+    EXPECT_TRUE(SameCell(expected, Cell(Triangles::kCopiesOfContained, other)))
         << Describe(other) << " within " << Describe(cutter);
     return;
   }
@@ -267,7 +268,7 @@ Cells::ChordCutter ChordCutterFor(Triangle const& chord, Triangle const& other) 
 
 void ExpectSameChordOverlap(Triangle const& chord, Triangle const& other) {
   Overlap plain;
-  Cells::FindOverlap(Shape(chord), Shape(other), &plain);
+  Triangles::FindOverlap(PreparedTriangle(chord), PreparedTriangle(other), &plain);
   Overlap fast;
   ChordCutterFor(chord, other).FindOverlapWith(BoxedTriangle(other), &fast);
   Cell const expected(plain.parts.begin(), plain.parts.end());

@@ -13,7 +13,7 @@ namespace Vorn::Testing {
 namespace {
 
 using Cells::SequenceSum;
-using Words = Cells::CellSequence::Words;
+using Cells::Words;
 
 struct Chain {
   std::vector<Words> levels;
