@@ -17,6 +17,8 @@ endif()
 
 # Compressed as the archive wants it: best compression, neither name nor time inside.
 find_program(gzip_program gzip REQUIRED)
+
+# Compresses a file of the sources into one of the build, again whenever it changes.
 function(compress source target)
   execute_process(
     COMMAND ${gzip_program} -9 --no-name --stdout ${source} OUTPUT_FILE ${target}

@@ -5,7 +5,8 @@ function(vorn_set_defaults target)
   target_compile_features(${target} PRIVATE cxx_std_20)
   target_compile_definitions(${target} PRIVATE $<$<BOOL:${VORN_ASSERTIONS}>:VORN_ASSERTIONS>)
   if(MSVC)
-    target_compile_options(${target} PRIVATE /W4 /fp:precise $<$<BOOL:${VORN_WARNINGS_AS_ERRORS}>:/WX>)
+    target_compile_options(
+      ${target} PRIVATE /W4 /fp:precise $<$<BOOL:${VORN_WARNINGS_AS_ERRORS}>:/WX>)
     return()
   endif()
 

@@ -82,16 +82,16 @@ _contour() {
   COMPREPLY=()
   [[ $COMP_CWORD -eq 1 ]] || command=${COMP_WORDS[1]}
   if [[ -z $command && $word != -* ]]; then
-    COMPREPLY=($(compgen -W "$(_contour_commands)" -- "$word"))
+    mapfile -t COMPREPLY < <(compgen -W "$(_contour_commands)" -- "$word")
   elif [[ $before == --to ]]; then
     _contour_formats "$command" "$before" "$word"
   elif _contour_words "$command" "$before" >/dev/null; then
-    COMPREPLY=($(compgen -W "$(_contour_words "$command" "$before")" -- "$word"))
+    mapfile -t COMPREPLY < <(compgen -W "$(_contour_words "$command" "$before")" -- "$word")
   elif [[ $before == --out-dir ]]; then
-    COMPREPLY=($(compgen -d -- "$word"))
+    mapfile -t COMPREPLY < <(compgen -d -- "$word")
     compopt -o filenames 2>/dev/null
   elif [[ $word == -* ]]; then
-    COMPREPLY=($(compgen -W "$(_contour_options "$command")" -- "$word"))
+    mapfile -t COMPREPLY < <(compgen -W "$(_contour_options "$command")" -- "$word")
   elif ! _contour_takes_number "$before"; then
     _contour_files "$command" "$before" "$word"
   fi
