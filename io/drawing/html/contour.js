@@ -1,16 +1,24 @@
 // The drawing of the contour: true to scale, deviations and tolerance magnified.
 
-const BAND_STEP = 0.5;        // pixels: bands that differ by less are drawn alike
-const FEW_POINTS = 4000;      // so many may have true shapes and whiskers
-const LEAST_LABEL_ROOM = 34;  // pixels of a piece with its number beside it
+import {ticksBetween} from './numbers.js';
+import {placeOn, boxOf, View, Tracer} from './geometry.js';
+import {bandPaths} from './band.js';
+import {arrow, ring, square} from './marks.js';
+import {paintPoints} from './points.js';
+import {FEW_POINTS, Occupancy} from './scene.js';
+import {Surface} from './surface.js';
 
-class ContourDrawing {
+/** Pixels of a piece with its number beside it. */
+const LEAST_LABEL_ROOM = 34;
+
+export class ContourDrawing {
   constructor(canvas, scene, state) {
     this.scene = scene;
     this.state = state;
     this.view = new View();
     this.isFresh = true;
-    this.surface = new Surface(canvas, scene.isMeasured ? 325 : 529, (...page) => this.paint(...page));
+    const paperHeight = scene.isMeasured ? 325 : 529;
+    this.surface = new Surface(canvas, paperHeight, (...page) => this.paint(...page));
   }
 
   showAll() {
@@ -65,7 +73,7 @@ class ContourDrawing {
     // So many points would hide the contour.
     const areMany = this.scene.count > FEW_POINTS;
     if (!areMany) this.paintPieces();
-    this.paintPoints();
+    paintPoints(this);
     if (areMany) this.paintPieces();
     this.paintJoints();
     this.paintEnds();
@@ -116,40 +124,6 @@ class ContourDrawing {
     }
   }
 
-  /** The band as path data by its width on the canvas. */
-  bandPaths() {
-    const {scene, view} = this;
-    const widthOf = (w) => Math.min(20000, 2 * scene.times * w * view.scale);
-    const margin = 0.5 * widthOf(scene.largestTolerance) + 4;
-    const paths = new Map();
-    const pathOf = (width) => {
-      if (!paths.has(width)) {
-        const path = new Path2D();
-        paths.set(width, {path, tracer: new Tracer(view, path, margin)});
-      }
-      return paths.get(width).tracer;
-    };
-    if (scene.isToleranceUniform) {
-      const tracer = pathOf(widthOf(scene.largestTolerance));
-      for (const piece of scene.pieces) tracer.trace(piece);
-      return paths;
-    }
-    const {piece, from, to, tolerance} = scene.band;
-    const least = 0.5 / view.scale;
-    for (let i = 0; i < piece.length; ++i) {
-      // Sections too short to be seen are drawn together, with the largest of their tolerances.
-      const first = i;
-      let largest = tolerance[i];
-      while (to[i] - from[first] < least && piece[i + 1] === piece[first]) {
-        ++i;
-        largest = Math.max(largest, tolerance[i]);
-      }
-      const width = Math.max(1, Math.round(widthOf(largest) / BAND_STEP)) * BAND_STEP;
-      pathOf(width).trace(scene.pieces[piece[first]], from[first], to[i]);
-    }
-    return paths;
-  }
-
   paintBand() {
     const {context, scene, view, colors} = this;
     if (2 * scene.times * scene.largestTolerance * view.scale < 1) return;
@@ -157,7 +131,7 @@ class ContourDrawing {
       this.paintDiscs();
       return;
     }
-    const paths = this.bandPaths();
+    const paths = bandPaths(scene, view);
     context.lineJoin = 'round';
     context.lineCap = 'butt';
     for (const [extra, color] of [[1.6, colors['band-edge']], [0, colors.band]]) {
@@ -214,91 +188,6 @@ class ContourDrawing {
     context.setLineDash([]);
   }
 
-  /** The points on the canvas that are not hidden behind others. */
-  visiblePoints() {
-    const {scene, view} = this;
-    const free = new Occupancy(view.width, view.height, scene.count > FEW_POINTS ? 1 : 0.25);
-    const visible = [];
-    for (let i = 0; i < scene.count; ++i) {
-      if (free.take(view.px(scene.x[i]), view.py(scene.y[i]))) visible.push(i);
-    }
-    return visible;
-  }
-
-  /** As large as the distance of neighbours allows. */
-  dotSize(visible) {
-    const {scene, view} = this;
-    const gaps = [];
-    const step = Math.max(1, Math.floor(visible.length / 200));
-    for (let k = 0; k < visible.length; k += step) {
-      const i = visible[k];
-      if (i + 1 >= scene.count) continue;
-      gaps.push(Math.hypot(scene.x[i + 1] - scene.x[i], scene.y[i + 1] - scene.y[i]) * view.scale);
-    }
-    gaps.sort((a, b) => a - b);
-    return Math.min(6, Math.max(2.4, 0.65 * (gaps[gaps.length >> 1] ?? 10)));
-  }
-
-  paintPoints() {
-    const {context, scene, colors} = this;
-    const visible = this.visiblePoints();
-    if (scene.times !== 1) this.paintWhiskers(visible);
-    const size = this.dotSize(visible);
-    const isCoarse = visible.length > FEW_POINTS;
-    const outside = [];
-    context.fillStyle = colors.point;
-    context.beginPath();
-    for (const i of visible) {
-      if (scene.hasContour && scene.isOutside(i)) {
-        outside.push(i);
-        continue;
-      }
-      const [x, y] = this.pixelOf(i);
-      if (isCoarse || scene.isOnArc(i)) {
-        const side = 0.88 * size;
-        context.rect(x - 0.5 * side, y - 0.5 * side, side, side);
-      } else {
-        context.moveTo(x + 0.5 * size, y);
-        context.arc(x, y, 0.5 * size, 0, 2 * Math.PI);
-      }
-    }
-    context.fill();
-    this.paintCrosses(outside);
-  }
-
-  paintCrosses(points) {
-    const {context} = this;
-    context.strokeStyle = this.colors.outside;
-    context.lineWidth = 1.3;
-    context.beginPath();
-    for (const i of points) {
-      const [x, y] = this.pixelOf(i);
-      context.moveTo(x - 3.5, y - 3.5);
-      context.lineTo(x + 3.5, y + 3.5);
-      context.moveTo(x + 3.5, y - 3.5);
-      context.lineTo(x - 3.5, y + 3.5);
-    }
-    context.stroke();
-  }
-
-  /** Thin lines from the contour to the magnified points. */
-  paintWhiskers(visible) {
-    const {context, scene, view} = this;
-    const cell = visible.length > FEW_POINTS ? 2 : 0.5;
-    const sides = [new Occupancy(view.width, view.height, cell),
-                   new Occupancy(view.width, view.height, cell)];
-    context.strokeStyle = this.colors.whisker;
-    context.lineWidth = 0.7;
-    context.beginPath();
-    for (const i of visible) {
-      const x = view.px(scene.footX[i]), y = view.py(scene.footY[i]);
-      if (!sides[scene.deviation(i) > 0 ? 1 : 0].take(x, y)) continue;
-      context.moveTo(x, y);
-      context.lineTo(...this.pixelOf(i));
-    }
-    context.stroke();
-  }
-
   paintJoints() {
     const {context, scene, view, colors} = this;
     const free = new Occupancy(view.width, view.height, 1);
@@ -319,7 +208,7 @@ class ContourDrawing {
 
   /** A triangle at the start that points ahead, a square at the end. */
   paintEnds() {
-    const {scene, view} = this;
+    const {context, scene, view, colors} = this;
     const last = scene.count - 1;
     let start = [scene.x[0], scene.y[0]];
     let end = [scene.x[last], scene.y[last]];
@@ -332,9 +221,9 @@ class ContourDrawing {
     } else {
       ahead = this.placeAhead(0, 11);
     }
-    if (!scene.isClosed) this.square(view.px(end[0]), view.py(end[1]), 8);
+    if (!scene.isClosed) square(context, colors, [view.px(end[0]), view.py(end[1])], 8);
     const x = view.px(start[0]), y = view.py(start[1]);
-    this.arrow(x, y, view.px(ahead[0]) - x, view.py(ahead[1]) - y, 12, true);
+    arrow(context, colors, [x, y], [view.px(ahead[0]) - x, view.py(ahead[1]) - y], 12, true);
   }
 
   /** The first point that is some pixels away from point i. */
@@ -345,34 +234,6 @@ class ContourDrawing {
     while (k < scene.count - 1 &&
            Math.hypot(scene.x[k] - x, scene.y[k] - y) * view.scale < distance) ++k;
     return [scene.x[Math.min(k, scene.count - 1)], scene.y[Math.min(k, scene.count - 1)]];
-  }
-
-  square(x, y, size) {
-    const {context, colors} = this;
-    context.fillStyle = colors.paper;
-    context.strokeStyle = colors.text;
-    context.lineWidth = 1.2;
-    context.fillRect(x - 0.5 * size, y - 0.5 * size, size, size);
-    context.strokeRect(x - 0.5 * size, y - 0.5 * size, size, size);
-  }
-
-  /** A triangle that starts at (x, y) and points along (dx, dy). */
-  arrow(x, y, dx, dy, size, isOutlined) {
-    const length = Math.hypot(dx, dy);
-    if (!(length > 0)) return;
-    const ux = size * dx / length, uy = size * dy / length;
-    const {context, colors} = this;
-    context.beginPath();
-    context.moveTo(x + ux, y + uy);
-    context.lineTo(x - 0.5 * uy, y + 0.5 * ux);
-    context.lineTo(x + 0.5 * uy, y - 0.5 * ux);
-    context.closePath();
-    context.fillStyle = colors.start;
-    context.fill();
-    if (!isOutlined) return;
-    context.strokeStyle = colors.text;
-    context.lineWidth = 1.1;
-    context.stroke();
   }
 
   /** Small arrows to the right of the points' sense of travel: nothing joins the points. */
@@ -396,21 +257,12 @@ class ContourDrawing {
       context.moveTo(tailX, tailY);
       context.lineTo(tailX + 12 * dx / length, tailY + 12 * dy / length);
       context.stroke();
-      this.arrow(tailX + 11 * dx / length, tailY + 11 * dy / length, dx, dy, 7, false);
+      const tip = [tailX + 11 * dx / length, tailY + 11 * dy / length];
+      arrow(context, colors, tip, [dx, dy], 7, false);
     }
   }
 
-  ring(i, radius, color, width) {
-    const {context} = this;
-    const [x, y] = this.pixelOf(i);
-    context.strokeStyle = color;
-    context.lineWidth = width;
-    context.beginPath();
-    context.arc(x, y, radius, 0, 2 * Math.PI);
-    context.stroke();
-  }
-
-  paintWorst() { this.ring(this.scene.worst, 8, this.colors.worst, 2); }
+  paintWorst() { ring(this.context, this.pixelOf(this.scene.worst), 8, this.colors.worst); }
 
   /** The number of each piece beside its middle, where there is room. */
   paintNumbers() {
@@ -443,6 +295,6 @@ class ContourDrawing {
   paintHovered() {
     const i = this.state.hovered;
     if (i < 0) return;
-    this.ring(i, 5, this.colors.text, 2);
+    ring(this.context, this.pixelOf(i), 5, this.colors.text);
   }
 }

@@ -1,9 +1,14 @@
 // The deviations along the contour, positive to the left of the direction of travel.
 
+import {ticksBetween} from './numbers.js';
+import {FEW_POINTS, Occupancy} from './scene.js';
+import {Surface} from './surface.js';
+import {cross, ring} from './marks.js';
+
 const PLOT = {left: 72, right: 16, top: 26, bottom: 36};
 const STRIP = 14;
 
-class Diagram {
+export class Diagram {
   constructor(canvas, scene, state) {
     this.scene = scene;
     this.state = state;
@@ -207,12 +212,7 @@ class Diagram {
     context.strokeStyle = colors.outside;
     context.lineWidth = 1.2;
     context.beginPath();
-    for (const [x, y] of kinds.outside) {
-      context.moveTo(x - 3, y - 3);
-      context.lineTo(x + 3, y + 3);
-      context.moveTo(x + 3, y - 3);
-      context.lineTo(x - 3, y + 3);
-    }
+    for (const place of kinds.outside) cross(context, place, 3);
     context.stroke();
   }
 
@@ -220,13 +220,7 @@ class Diagram {
     const {context, colors} = this;
     for (const [i, radius, color] of [[this.scene.worst, 7, colors.worst],
                                       [this.state.hovered, 5, colors.text]]) {
-      if (i < 0) continue;
-      const [x, y] = this.pixelOf(i);
-      context.strokeStyle = color;
-      context.lineWidth = 2;
-      context.beginPath();
-      context.arc(x, y, radius, 0, 2 * Math.PI);
-      context.stroke();
+      if (i >= 0) ring(context, this.pixelOf(i), radius, color);
     }
   }
 

@@ -1,5 +1,8 @@
 # Writes the text files as one C++ header: cmake -DOUT=header -DPARTS=name=file,file;... -P this
-set(header "// Made from the files in cli/drawing/html.\n#pragma once\n\n")
+#
+# The page holds its scripts as one module, in the order given, so what they import and export from
+# each other by name goes.
+set(header "// Made from the files in io/drawing/html.\n#pragma once\n\n")
 string(APPEND header "namespace Vorn::IO::Html {\n\n")
 foreach(part IN LISTS PARTS)
   string(REGEX MATCH "^([^=]+)=(.+)$" unused "${part}")
@@ -8,6 +11,8 @@ foreach(part IN LISTS PARTS)
   set(text "")
   foreach(file IN LISTS files)
     file(READ "${file}" contents)
+    string(REGEX REPLACE "import {[^}]*} from '[.]/[a-z]+[.]js';\n" "" contents "${contents}")
+    string(REGEX REPLACE "(^|\n)export " "\\1" contents "${contents}")
     string(APPEND text "${contents}")
   endforeach()
   string(APPEND header "inline constexpr char ${name}[] = R\"html~(${text})html~\";\n\n")

@@ -1,7 +1,7 @@
 // Places on pieces, the map from the plane to the canvas, and the search for the nearest point.
 
 /** The place of a piece at this length from its start. */
-function placeOn(piece, along) {
+export function placeOn(piece, along) {
   const part = piece.length > 0 ? along / piece.length : 0;
   if (piece.kind === 'arc') {
     const turn = part * piece.sweep;
@@ -14,7 +14,7 @@ function placeOn(piece, along) {
 }
 
 /** The box around a piece: [xMin, yMin, xMax, yMax]. */
-function boxOf(piece) {
+export function boxOf(piece) {
   const box = [Infinity, Infinity, -Infinity, -Infinity];
   const steps = piece.kind === 'arc' ? 32 : 1;
   for (let i = 0; i <= steps; ++i) include(box, ...placeOn(piece, piece.length * i / steps));
@@ -23,7 +23,7 @@ function boxOf(piece) {
   return box;
 }
 
-function include(box, x, y) {
+export function include(box, x, y) {
   if (!Number.isFinite(x) || !Number.isFinite(y)) return;
   box[0] = Math.min(box[0], x);
   box[1] = Math.min(box[1], y);
@@ -32,7 +32,7 @@ function include(box, x, y) {
 }
 
 /** Maps the plane to the canvas: one scale, y up, the middle of the canvas at (x, y). */
-class View {
+export class View {
   constructor() {
     this.x = 0;
     this.y = 0;
@@ -78,7 +78,7 @@ class View {
  * Draws stretches of pieces into a path, only as far as they are near the canvas: a far zoom puts
  * the rest at pixels that a canvas no longer tells apart.
  */
-class Tracer {
+export class Tracer {
   constructor(view, path, margin) {
     this.view = view;
     this.path = path;
@@ -167,7 +167,7 @@ class Tracer {
 }
 
 /** Finds the nearest of many places quickly. */
-class PointGrid {
+export class PointGrid {
   constructor(x, y) {
     this.x = x;
     this.y = y;
@@ -223,7 +223,7 @@ class PointGrid {
 }
 
 /** Distance in the plane from a place to a piece. */
-function distanceTo(piece, x, y) {
+export function distanceTo(piece, x, y) {
   const toEnds = Math.min(Math.hypot(x - piece.start[0], y - piece.start[1]),
                           Math.hypot(x - piece.end[0], y - piece.end[1]));
   if (piece.kind === 'arc') {

@@ -1,12 +1,12 @@
 // Numbers for people, ticks of axes, colours of the style sheet.
 
 /** At most `digits` significant digits, without trailing zeros. */
-function short(value, digits = 6) {
+export function short(value, digits = 6) {
   return value === null || value === undefined ? '' : String(Number(value.toPrecision(digits)));
 }
 
 /** 1, 2 or 5 times a power of ten, not below `least`. */
-function niceStep(least) {
+export function niceStep(least) {
   const power = 10 ** Math.floor(Math.log10(least));
   for (const factor of [1, 2, 5]) {
     if (factor * power >= least * (1 - 1e-12)) return factor * power;
@@ -15,7 +15,7 @@ function niceStep(least) {
 }
 
 /** Round numbers in [low, high] no closer than `leastStep`, with their labels. */
-function ticksBetween(low, high, leastStep) {
+export function ticksBetween(low, high, leastStep) {
   const step = niceStep(leastStep);
   const decimals = Math.min(12, Math.max(0, -Math.floor(Math.log10(step) + 1e-9)));
   const ticks = [];
@@ -29,7 +29,7 @@ function ticksBetween(low, high, leastStep) {
 }
 
 /** The colours that the style sheet gives at this moment. */
-function readColors() {
+export function readColors() {
   const style = getComputedStyle(document.documentElement);
   const colors = {};
   for (const name of ['paper', 'text', 'soft', 'border', 'grid', 'line', 'arc', 'line-tint',
@@ -41,4 +41,4 @@ function readColors() {
 }
 
 /** The colours on paper, whatever the screen has. */
-function isPrinting() { return matchMedia('print').matches; }
+export function isPrinting() { return matchMedia('print').matches; }

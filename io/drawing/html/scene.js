@@ -1,7 +1,9 @@
 // What is drawn: the data of the page and what follows from it and the magnification.
 
+import {placeOn, boxOf, include, PointGrid, distanceTo} from './geometry.js';
+
 /** A place is taken by the first mark that falls on it; later ones would not be seen. */
-class Occupancy {
+export class Occupancy {
   constructor(width, height, cell) {
     this.cell = cell;
     this.columns = Math.ceil(width / cell) + 1;
@@ -20,10 +22,13 @@ class Occupancy {
   }
 }
 
-/** The largest relative deviation that counts as within tolerance, as everywhere here. */
-const LARGEST_RELATIVE = 1 + 1e-9;
+/** So many points may have true shapes and lines to the contour. */
+export const FEW_POINTS = 4000;
 
-class Scene {
+/** The largest relative deviation that counts as within tolerance, as everywhere here. */
+export const LARGEST_RELATIVE = 1 + 1e-9;
+
+export class Scene {
   constructor(data) {
     Object.assign(this, data);
     this.count = data.points.x.length;
@@ -95,6 +100,17 @@ class Scene {
       }
     }
     this.grid = new PointGrid(this.x, this.y);
+  }
+
+  /** Round magnifications up to ten times the one given, which is among them. */
+  magnifications() {
+    const steps = new Set([1, this.magnify]);
+    for (let power = 1; power <= 10 * this.magnify; power *= 10) {
+      for (const factor of [1, 2, 5]) {
+        if (factor * power <= 10 * this.magnify) steps.add(factor * power);
+      }
+    }
+    return [...steps].sort((a, b) => a - b);
   }
 
   /** A box around everything, without what strays far from the points where there are any. */

@@ -1,9 +1,11 @@
 // A canvas as sharp as the screen, and the gestures that every drawing understands.
 
+import {readColors, isPrinting} from './numbers.js';
+
 /** What is between the margins of A4 across, in pixels. */
 const PAPER_WIDTH = 1032;
 
-class Surface {
+export class Surface {
   /** @param paperHeight height on paper in pixels, as the style sheet has it in millimetres */
   constructor(canvas, paperHeight, paint) {
     this.canvas = canvas;
@@ -46,7 +48,7 @@ class Surface {
  * @param actions pan(dx, dy), zoom(px, py, factor), reset(), hover(px, py), leave(), tap(px, py),
  *     step(by)
  */
-function listenToGestures(canvas, actions) {
+export function listenToGestures(canvas, actions) {
   const pointers = new Map();
   let moved = 0;
 
@@ -100,7 +102,10 @@ function listenToGestures(canvas, actions) {
     actions.hover(...place(event));
   }, {passive: false});
   canvas.addEventListener('dblclick', () => actions.reset());
+  listenToKeys(canvas, actions);
+}
 
+function listenToKeys(canvas, actions) {
   const middle = () => [0.5 * canvas.clientWidth, 0.5 * canvas.clientHeight];
   const keys = {
     '+': () => actions.zoom(...middle(), 1.4),

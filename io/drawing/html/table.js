@@ -1,6 +1,9 @@
 // The table of the pieces beside the drawing.
 
-class PieceTable {
+import {short} from './numbers.js';
+import {LARGEST_RELATIVE} from './scene.js';
+
+export class PieceTable {
   /** @param actions hover(index or -1), choose(index) */
   constructor(scene, actions) {
     this.scene = scene;
@@ -82,14 +85,14 @@ class PieceTable {
   }
 }
 
-function element(name, text = '') {
+export function element(name, text = '') {
   const made = document.createElement(name);
   made.textContent = text;
   return made;
 }
 
 /** A small drawing made of our own markup, never of data. */
-function swatch(markup, width, height) {
+export function swatch(markup, width, height) {
   const holder = document.createElement('span');
   holder.innerHTML = `<svg viewBox="0 0 ${width} ${height}" aria-hidden="true">${markup}</svg>`;
   return holder.firstChild;
