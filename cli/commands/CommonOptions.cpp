@@ -20,6 +20,14 @@ Complaint PositiveNumber() {
   };
 }
 
+Complaint FiniteNumber() {
+  return [](std::string const& text) -> std::string {
+    std::optional<double> const value = ParseNumber(text);
+    bool const isGood = value && std::isfinite(*value);
+    return isGood ? "" : Quoted(text) + " is not a finite number";
+  };
+}
+
 Complaint WholeNumber(int least, int most) {
   return [least, most](std::string const& text) -> std::string {
     std::optional<double> const value = ParseNumber(text);
@@ -45,6 +53,12 @@ Option AddPositiveNumber(Command& command, std::string const& name, std::optiona
                          std::string const& valueName, std::string const& help) {
   auto const take = [value](std::string const& text) { *value = ParseNumber(text); };
   return command.AddChecked(name, PositiveNumber(), take, valueName, help);
+}
+
+Option AddNumber(Command& command, std::string const& name, std::optional<double>* value,
+                 std::string const& valueName, std::string const& help) {
+  auto const take = [value](std::string const& text) { *value = ParseNumber(text); };
+  return command.AddChecked(name, FiniteNumber(), take, valueName, help);
 }
 
 Option AddWholeNumber(Command& command, std::string const& name, std::optional<int>* value,

@@ -15,6 +15,10 @@ namespace Vorn::Cli {
 Option AddPositiveNumber(Command& command, std::string const& name, std::optional<double>* value,
                          std::string const& valueName, std::string const& help);
 
+/// An option whose value is a finite number.
+Option AddNumber(Command& command, std::string const& name, std::optional<double>* value,
+                 std::string const& valueName, std::string const& help);
+
 /// An option whose value is a whole number from `least` to `most`.
 Option AddWholeNumber(Command& command, std::string const& name, std::optional<int>* value,
                       int least, int most, std::string const& valueName, std::string const& help);

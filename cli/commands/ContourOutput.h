@@ -9,9 +9,13 @@
 namespace Vorn::Cli {
 
 class Command;
+struct Console;
 
-/// Adds the options that say how a contour is written: --dxf-entities, --feed, --gcode-decimals.
+/// Adds the options that say how a contour is written, in DXF and in G-code.
 void AddWriteOptions(Command& command, WriteOptions* options);
+
+/// Says on standard error that a controller will not cut, if G-code is written without a feed.
+void WarnOfMissingFeed(WriteOptions const& options, bool writesGCode, Console const& console);
 
 /// The format of a file to write: by its ending, else `otherwise`.
 /// @param option what to give when neither tells, for the message

@@ -12,6 +12,7 @@
 #include "io/drawing/Drawing.h"
 #include "io/formats/ContourReader.h"
 #include "io/formats/Format.h"
+#include "io/measure/Departure.h"
 
 namespace Vorn::Cli {
 
@@ -31,17 +32,22 @@ What a format keeps:
   csv    the same, but for what follows from ends, centre and radius
   dxf    R12; one POLYLINE with bulges, or with --dxf-entities LINE and ARC; units in a comment.
          Arcs read back to 2e-15 of the largest coordinate or radius
-  gcode  rounded to --gcode-decimals; mm or inch. G1, G2 and G3 with incremental I and J, G0 over
-         gaps. Arcs are worked out from the rounded numbers, so that the radii at both ends agree
-         within 0.002 mm
+  gcode  rounded; mm or inch. G1, G2 and G3 with incremental I and J or with R, G0 over gaps, M2
+         or M30 at the end. Arcs are worked out from the rounded numbers, so that the radii at both
+         ends agree within 0.002 mm
   wkt    LINESTRING, CIRCULARSTRING or COMPOUNDCURVE, a MULTICURVE over gaps; no units
 Drawings show the pieces, their joints and their order; they cannot be read back. With measured
 points 'contour plot' draws the deviations as well.
 DXF, G-code and WKT hold arcs of more than 315 degrees as two halves. Where pieces do not meet, the
 gap is kept and reported.
 
+Every file that holds the contour is read back. Where it leaves the contour by more than the last
+digits of doubles, the line that names it says how far, and with --tolerance whether that is too
+far; the digits of G-code then follow from the tolerance.
+
 Exit codes:
   0   the files are written
+  1   a file leaves the contour by more than --tolerance (it is written)
   2   wrong usage, or the format cannot hold the contour
   3   a file cannot be read or written, or holds no contour
   70  internal error
@@ -61,6 +67,7 @@ struct Options {
   std::optional<Format> from;
   std::optional<Format> to;
   std::string units;
+  std::optional<double> tolerance;
   WriteOptions write;
 
   std::vector<NamedFile> Written() const {
@@ -87,15 +94,50 @@ std::string Summary(ContourFile const& contour) {
          Counted(arcs, "arc") + (contour.isClosed ? "; closed" : "; open");
 }
 
-void Report(Options const& options, ContourFile const& contour, Console const& console) {
+/// A file with the contour, and how far it leaves it; nothing of a drawing.
+struct Converted {
+  std::string path;
+  Format format = Format::Json;
+  std::string text;
+  std::optional<double> departure;
+};
+
+Converted ConvertTo(Options const& options, ContourFile const& contour, std::string const& path) {
+  Format const format = FormatFor(options, path);
+  if (!HoldsContour(format)) return {path, format, Drawn(DrawingOf(contour), format), {}};
+  Converted file = {path, format, ToText(contour, format, options.write), {}};
+  file.departure = DepartureOf(contour.pieces, ParseContour(file.text, path, format).pieces);
+  return file;
+}
+
+bool IsTooFar(Options const& options, Converted const& file) {
+  // Written so that what is not a number is too far.
+  return file.departure && options.tolerance && !(*file.departure <= *options.tolerance);
+}
+
+std::string LineFor(Options const& options, ContourFile const& contour, Converted const& file) {
+  std::string const text = "wrote       " + file.path;
+  if (!file.departure || *file.departure <= JointTolerance(contour.pieces)) return text + "\n";
+  std::string const units = contour.units.empty() ? "" : " " + contour.units;
+  return text + ", up to " + FormatShort(*file.departure, 2) + units + " from the contour" +
+         (IsTooFar(options, file) ? ": TOO FAR" : "") + "\n";
+}
+
+void Report(Options const& options, ContourFile const& contour, std::vector<Converted> const& files,
+            Console const& console) {
   for (Gap const& gap : FindGaps(contour)) {
     console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
   }
-  bool const isOutTaken =
-      std::find(options.outputs.begin(), options.outputs.end(), "-") != options.outputs.end();
+  for (Converted const& file : files) {
+    if (!IsTooFar(options, file)) continue;
+    console.err << "contour: " << (file.path == "-" ? "the standard output" : file.path)
+                << ": leaves the contour by " << FormatShort(*file.departure) << '\n';
+  }
+  bool const isOutTaken = std::any_of(files.begin(), files.end(),
+                                      [](Converted const& file) { return file.path == "-"; });
   if (isOutTaken) return;
   console.out << "pieces      " << Summary(contour) << '\n';
-  for (std::string const& path : options.outputs) console.out << "wrote       " << path << '\n';
+  for (Converted const& file : files) console.out << LineFor(options, contour, file);
 }
 
 ExitCode Run(Options const& options, Console const& console) {
@@ -103,14 +145,18 @@ ExitCode Run(Options const& options, Console const& console) {
   ContourFile contour = ReadContour(options.input, console.in, options.from);
   if (!options.units.empty()) contour.units = options.units;
   Outputs outputs;
+  std::vector<Converted> files;
   for (std::string const& path : options.outputs) {
-    Format const format = FormatFor(options, path);
-    outputs.Add(path, HoldsContour(format) ? ToText(contour, format, options.write)
-                                           : Drawn(DrawingOf(contour), format));
+    files.push_back(ConvertTo(options, contour, path));
+    outputs.Add(path, files.back().text);
   }
   outputs.Write(console);
-  Report(options, contour, console);
-  return ExitCode::Ok;
+  auto const isGCode = [](Converted const& file) { return file.format == Format::GCode; };
+  WarnOfMissingFeed(options.write, std::any_of(files.begin(), files.end(), isGCode), console);
+  Report(options, contour, files, console);
+  bool const isTooFar = std::any_of(files.begin(), files.end(),
+                                    [&](Converted const& file) { return IsTooFar(options, file); });
+  return isTooFar ? ExitCode::OutsideTolerance : ExitCode::Ok;
 }
 
 void AddFormat(Command& command, std::string const& name, std::vector<std::string> const& words,
@@ -136,6 +182,8 @@ void AddOptions(Command& command, Options* options) {
             &options->to, "Write the outputs as this");
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
+  AddPositiveNumber(command, "-t,--tolerance", &options->tolerance, "T",
+                    "How far a file may leave the contour; G-code gets the digits for it");
   AddWriteOptions(command, &options->write);
   command.SetFooter(kFooter);
 }
@@ -149,6 +197,7 @@ void AddConvertCommand(CommandLine& program, Action* action) {
   command.OnParsed([options, action] {
     RefuseSharedFiles({{"CONTOUR", options->input}}, options->Written());
     for (std::string const& path : options->outputs) FormatFor(*options, path);
+    options->write.gcode.tolerance = options->tolerance;
     *action = [options](Console const& console) { return Run(*options, console); };
   });
 }

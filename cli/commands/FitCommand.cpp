@@ -10,15 +10,14 @@
 
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
+#include "cli/commands/FitFiles.h"
 #include "cli/commands/FitMany.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/terminal/Progress.h"
 #include "cli/texts/FitTable.h"
 #include "io/base/Numbers.h"
-#include "io/drawing/Drawing.h"
 #include "io/fit/ContourFit.h"
-#include "io/fit/FitJson.h"
 #include "io/fit/FitReport.h"
 #include "io/formats/Format.h"
 
@@ -56,8 +55,9 @@ printed as the fit reports them, and as measured again by the program over every
 Outputs: the ending of a file tells its format: .json (the contour with deviations and all),
 .csv, .dxf, .nc or .gcode, .wkt (the contour; see 'contour convert --help' for what each keeps),
 .svg, .png, .html (drawings). --to tells it for - and for other endings. Numbers are written so
-that they read back as the same doubles, but for G-code, which is rounded. With -o - the table
-is not printed.
+that they read back as the same doubles, but for G-code, which is rounded. Every file that holds
+the contour is read back and measured before the word "within" is said. With -o - the table is
+not printed.
 
 Many files: each is fitted by itself, several at once, and has a line with its points, pieces,
 largest deviation, time and result. Those that fail do not stop the others; their whole messages go
@@ -67,7 +67,7 @@ of all files, in the order 70, 3, 2, 4, 5, 1, 0.
 
 Exit codes:
   0   every point is within its tolerance
-  1   the contour leaves the tolerance of a point (table and files are written)
+  1   the contour, or a file of it, leaves the tolerance of a point (table and files are written)
   2   wrong usage
   3   a file cannot be read or written, or a line of the points file is wrong
   4   two neighbouring points are too close for their tolerances
@@ -137,6 +137,15 @@ struct Options {
     return OutputFormat(path, otherwise, "--to");
   }
 
+  bool WritesGCode() const {
+    if (!outFolder.empty()) {
+      return std::find(formats.begin(), formats.end(), Format::GCode) != formats.end();
+    }
+    std::vector<Target> const targets = Targets();
+    return std::any_of(targets.begin(), targets.end(),
+                       [](Target const& target) { return target.format == Format::GCode; });
+  }
+
   std::vector<NamedFile> Written() const {
     std::vector<NamedFile> files;
     for (Target const& target : Targets()) files.push_back(target.file);
@@ -144,50 +153,33 @@ struct Options {
   }
 };
 
-std::string Complaint(Report const& report) {
-  PointFile const& file = report.file;
-  if (report.verdict == Verdict::StopsEarly) {
-    GeometryUtils::Point const& end = report.pieces.back().end;
-    return file.path + ": no fit beyond (" + FormatShort(end.x) + ", " + FormatShort(end.y) +
-           "): the contour stops before the last point, " + file.NameOf(file.points.size() - 1);
+/// The contour in every format that is asked for.
+std::vector<FittedFile> FilesOf(Options const& options, Report const& report) {
+  std::vector<FittedFile> files;
+  for (Target const& target : options.Targets()) {
+    files.push_back(RenderFit(report, target.file.path, target.format, options.write));
   }
-  return file.path + ": the contour leaves the tolerance of " +
-         file.NameOf(report.remeasured.worst) + " (relative deviation " +
-         FormatShort(report.remeasured.Worst().relative) + ")";
+  return files;
 }
 
-ContourFile ContourOf(Report const& report) {
-  return {report.file.path, report.pieces, report.closure.isClosed, report.file.units};
+void PrintResults(Options const& options, Report const& report,
+                  std::vector<FittedFile> const& files, Console const& console) {
+  FittedFile const* const worst = WorstOf(files);
+  console.out << ToTable(report, options.digits,
+                         worst == nullptr ? "" : ReadBackText(report, *worst));
+  for (FittedFile const& file : files) console.out << "wrote       " << file.path << '\n';
 }
 
-std::string TextOf(Report const& report, Format format, WriteOptions const& options) {
-  switch (format) {
-    case Format::Json:
-      return ToJson(report);
-    case Format::Svg:
-      return ToSvg(DrawingOf(report));
-    case Format::Html:
-      return ToHtml(DrawingOf(report));
-    case Format::Png:
-      return ToPng(DrawingOf(report), {});
-    default:
-      return ToText(ContourOf(report), format, options);
-  }
-}
-
-void WriteResults(Options const& options, Report const& report, Console const& console) {
+void WriteResults(Options const& options, Report const& report,
+                  std::vector<FittedFile> const& files, Console const& console) {
   Outputs outputs;
   bool isOutTaken = false;
-  for (Target const& target : options.Targets()) {
-    outputs.Add(target.file.path, TextOf(report, target.format, options.write));
-    isOutTaken = isOutTaken || target.file.path == "-";
+  for (FittedFile const& file : files) {
+    outputs.Add(file.path, file.text);
+    isOutTaken = isOutTaken || file.path == "-";
   }
   outputs.Write(console);
-  if (isOutTaken) return;
-  console.out << ToTable(report, options.digits);
-  for (NamedFile const& file : options.Written()) {
-    console.out << "wrote       " << file.path << '\n';
-  }
+  if (!isOutTaken) PrintResults(options, report, files, console);
 }
 
 Report FitWithProgress(Options const& options, Console const& console) {
@@ -210,27 +202,30 @@ FitMany ManyOf(Options const& options) {
   many.formats = options.formats.empty() ? std::vector{Format::Json} : options.formats;
   many.jobs = options.jobs;
   many.showTime = !options.hideTime;
-  many.render = [&options](Report const& report, Format format) {
-    return TextOf(report, format, options.write);
+  many.render = [&options](Report const& report, std::string const& path, Format format) {
+    return RenderFit(report, path, format, options.write);
   };
-  many.complaint = Complaint;
   return many;
 }
 
 ExitCode RunMany(Options const& options, Console const& console) {
   FitMany many = ManyOf(options);
+  WarnOfMissingFeed(options.write, options.WritesGCode(), console);
   many.fit = [&](std::string const& path) { return FitOneOfMany(options, path, console); };
   return RunFitMany(many, console);
 }
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  Report const report = FitWithProgress(options, console);
-  WriteResults(options, report, console);
-  if (report.verdict != Verdict::WithinTolerance) {
-    console.err << "contour: " << Complaint(report) << '\n';
-  }
-  return ExitCodeOf(report.verdict);
+  Report report = FitWithProgress(options, console);
+  std::vector<FittedFile> const files = FilesOf(options, report);
+  Verdict const verdict = VerdictOf(report, files);
+  std::string const complaint = verdict == Verdict::WithinTolerance ? "" : Complaint(report, files);
+  report.verdict = verdict;
+  WriteResults(options, report, files, console);
+  WarnOfMissingFeed(options.write, options.WritesGCode(), console);
+  if (!complaint.empty()) console.err << "contour: " << complaint << '\n';
+  return ExitCodeOf(verdict);
 }
 
 /// The formats of a list as --to takes it; nothing when a word is none or comes twice.

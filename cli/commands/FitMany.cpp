@@ -38,7 +38,7 @@ struct Outcome {
   std::size_t pieces = 0;
   double deviation = 0.0;  ///< relative
   double seconds = 0.0;
-  std::vector<std::pair<std::string, std::string>> texts;  ///< files to write, and their contents
+  std::vector<FittedFile> files;  ///< to write
 };
 
 /// Grows from what a file says about itself to what is wrong around it.
@@ -74,18 +74,19 @@ Outcome FitFile(FitMany const& many, std::string const& path) {
   Report const report = many.fit(path);
   Outcome outcome;
   outcome.path = path;
-  outcome.code = ExitCodeOf(report.verdict);
-  outcome.verdict = Describe(report.verdict);
-  if (report.verdict != Verdict::WithinTolerance) outcome.message = many.complaint(report);
   outcome.isFitted = true;
   outcome.points = report.file.points.size();
   outcome.pieces = report.pieces.size();
   outcome.deviation = report.remeasured.Worst().relative;
   if (!many.outFolder.empty()) {
     for (Format const format : many.formats) {
-      outcome.texts.emplace_back(OutputOf(many, path, format), many.render(report, format));
+      outcome.files.push_back(many.render(report, OutputOf(many, path, format), format));
     }
   }
+  Verdict const verdict = VerdictOf(report, outcome.files);
+  outcome.code = ExitCodeOf(verdict);
+  outcome.verdict = Describe(verdict);
+  if (verdict != Verdict::WithinTolerance) outcome.message = Complaint(report, outcome.files);
   outcome.seconds = std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count();
   return outcome;
 }
@@ -104,7 +105,7 @@ Outcome Guarded(std::string const& path, Step const& step) {
 
 Outcome Written(Outcome outcome, Console const& console) {
   Outputs outputs;
-  for (auto& [path, text] : outcome.texts) outputs.Add(path, std::move(text));
+  for (FittedFile& file : outcome.files) outputs.Add(file.path, std::move(file.text));
   outputs.Write(console);
   return outcome;
 }

@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "cli/commands/Command.h"
+#include "cli/commands/FitFiles.h"
 #include "io/fit/FitReport.h"
 #include "io/formats/Format.h"
 
@@ -19,8 +20,7 @@ struct FitMany {
   std::optional<int> jobs;  ///< how many files at once; nothing: as many as there are processors
   bool showTime = true;
   std::function<Report(std::string const& path)> fit;
-  std::function<std::string(Report const&, Format)> render;
-  std::function<std::string(Report const&)> complaint;  ///< about a contour that is no good
+  std::function<FittedFile(Report const&, std::string const& path, Format)> render;
 };
 
 /// The file that the fit of `path` is written to: the name of the input with another ending.

@@ -16,6 +16,8 @@ _contour_words() {
     *:--strategy) echo mixed cells arc ;;
     *:--closed) echo auto yes no ;;
     *:--units) echo mm inch ;;
+    *:--end) echo m2 m30 none ;;
+    *:--plane) echo xy xz ;;
     plot:--to) echo svg png html ;;
     plot:--magnify) echo auto ;;
     fit:--to | convert:--to) echo json csv dxf gcode wkt svg png html ;;
@@ -32,6 +34,7 @@ _contour_endings() {
     *:--table | *:--dropped | intersect:-o | intersect:--output) echo csv ;;
     simplify:*) echo csv ;;
     plot:-o | plot:--output) echo svg png html ;;
+    *:--header | *:--footer) echo nc gcode txt ;;
     fit:-o | fit:--output | convert:-o | convert:--output)
       echo json csv dxf nc gcode wkt svg png html
       ;;
@@ -45,7 +48,7 @@ _contour_endings() {
 _contour_takes_number() {
   case $1 in
     -t | --tolerance | --tolerance-column | --tolerance-per-point | --columns | --start | \
-      --digits | --feed | --gcode-decimals | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
+      --digits | --feed | --gcode-decimals | --safe-height | --cut-height | --plunge-feed | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
     *) return 1 ;;
   esac
 }

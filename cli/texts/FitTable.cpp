@@ -129,20 +129,22 @@ std::string CompressionText(Report const& report) {
          FormatFixed(100.0 * pieces / points, 1) + " % of the points";
 }
 
-std::string Summary(Report const& report) {
+std::string Summary(Report const& report, std::string const& readBack) {
   return "points      " + std::to_string(report.file.points.size()) + "\n" + "tolerance   " +
          ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) + "\n" +
          "closed      " + ClosedText(report) + "\n" + "pieces      " +
          std::to_string(report.pieces.size()) + ": " + Counted(report.LineCount(), "line") + ", " +
          Counted(report.ArcCount(), "arc") + "\n" + "compression " + CompressionText(report) +
          "\n" + "reported    " + ReportedText(report) + "\n" + "re-measured " +
-         RemeasuredText(report) + "\n" + "result      " + Describe(report.verdict) + "\n" +
-         "time        " + FormatFixed(report.fit.seconds, 3) + " s\n";
+         RemeasuredText(report) + "\n" +
+         (readBack.empty() ? "" : "read back   " + readBack + "\n") + "result      " +
+         Describe(report.verdict) + "\n" + "time        " + FormatFixed(report.fit.seconds, 3) +
+         " s\n";
 }
 
 }  // namespace
 
-std::string ToTable(Report const& report, std::optional<int> digits) {
+std::string ToTable(Report const& report, std::optional<int> digits, std::string const& readBack) {
   LengthFormat const length(report, digits);
   std::vector<Row> rows = {Header()};
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {
@@ -150,7 +152,7 @@ std::string ToTable(Report const& report, std::optional<int> digits) {
   }
   std::string const units = report.file.units.empty() ? "" : ", lengths in " + report.file.units;
   return report.file.path + units + ", sweeps in degrees\n\n" + Aligned(rows) + "\n" +
-         Summary(report);
+         Summary(report, readBack);
 }
 
 }  // namespace Vorn::Cli

@@ -12,6 +12,8 @@ namespace Vorn::Cli {
 ///
 /// @param digits after the point of coordinates and lengths; nothing: a hundredth of the smallest
 ///        tolerance, as far as columns stay readable
-std::string ToTable(Report const& report, std::optional<int> digits = {});
+/// @param readBack what was found when the files were read back; empty: nothing to say
+std::string ToTable(Report const& report, std::optional<int> digits = {},
+                    std::string const& readBack = "");
 
 }  // namespace Vorn::Cli

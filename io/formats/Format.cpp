@@ -114,7 +114,7 @@ std::string ToText(ContourFile const& contour, Format format, WriteOptions const
     case Format::Dxf:
       return ToDxf(contour, options.dxfEntities ? DxfStyle::Entities : DxfStyle::Polyline);
     case Format::GCode:
-      return ToGCode(contour, {options.feed, options.gcodeDecimals});
+      return ToGCode(contour, options.gcode);
     case Format::Wkt:
       return ToWkt(contour);
     default:

@@ -5,6 +5,7 @@
 #include <string_view>
 #include <vector>
 
+#include "io/formats/GCode.h"
 #include "io/pieces/ContourFile.h"
 
 namespace Vorn::IO {
@@ -29,9 +30,8 @@ bool HoldsContour(Format format);
 
 /// What the user can choose about the files.
 struct WriteOptions {
-  bool dxfEntities = false;          ///< LINE and ARC in place of one POLYLINE
-  std::optional<double> feed;        ///< of G-code, in units a minute
-  std::optional<int> gcodeDecimals;  ///< digits after the point of G-code
+  bool dxfEntities = false;  ///< LINE and ARC in place of one POLYLINE
+  GCodeOptions gcode;
 };
 
 /// The contour as the text of a file.

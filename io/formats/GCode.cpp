@@ -5,147 +5,27 @@
 
 #include "io/base/Failure.h"
 #include "io/base/Numbers.h"
-#include "io/formats/Text.h"
+#include "io/formats/LengthUnits.h"
+#include "io/formats/NamedFields.h"
+#include "io/formats/ToolPath.h"
 #include "io/pieces/Shapes.h"
 
 namespace Vorn::IO {
 
 namespace {
 
-constexpr double kMillimetresPerInch = 25.4;
+using End = GCodeOptions::End;
+using Plane = GCodeOptions::Plane;
 
-/// The radii at both ends of an arc must agree this well, in millimetres. Machines ask for 0.002
-/// to 0.01 before they refuse an arc.
-constexpr double kLargestRadiusError = 0.002;
+constexpr int kDecimalsOfMillimetres = 4;
+constexpr int kDecimalsOfInches = 5;
 
-/// Beyond, a double has no digit left for the rounding to be exact.
-constexpr double kMostUnits = 1e15;
+/// The last digit is at most a tolerance divided by ten so many times.
+constexpr double kDigitsBelowTolerance = 2.0;
 
-bool IsInch(std::string const& units) {
-  std::string const lower = LowerCase(units);
-  return lower == "in" || lower == "inch" || lower == "inches";
-}
-
-bool IsMillimetre(std::string const& units) {
-  std::string const lower = LowerCase(units);
-  return lower == "mm" || lower == "millimetre" || lower == "millimeter";
-}
-
-/// Writes a tool path from rounded numbers only: what it remembers is what the machine knows.
-class ToolPath {
- public:
-  ToolPath(ContourFile const& contour, GCodeOptions const& options)
-      : path_(contour.path),
-        decimals_(options.decimals.value_or(DefaultGCodeDecimals(contour.units))),
-        step_(std::pow(10.0, -decimals_)),
-        largestRadiusError_(IsInch(contour.units) ? kLargestRadiusError / kMillimetresPerInch
-                                                  : kLargestRadiusError) {
-    if (options.feed) feed_ = " F" + FormatShort(*options.feed, 12);
-  }
-
-  void Line(std::string const& line) { text_ += line + "\n"; }
-
-  void MoveTo(XY const& point) {
-    XY const to = Rounded(point);
-    if (isPlaced_ && AreEqual(to, at_)) return;
-    Line("G0" + Words('X', 'Y', to));
-    at_ = to;
-    isPlaced_ = true;
-  }
-
-  void Cut(Piece const& piece, std::size_t number) {
-    XY const to = Rounded(piece.end);
-    if (AreEqual(to, at_)) return;
-    if (!piece.IsArc() || !CutArc(piece, to, number)) CutLine(to);
-    at_ = to;
-    feed_.clear();
-    hasCut_ = true;
-  }
-
-  bool HasCut() const { return hasCut_; }
-  std::string const& Text() const { return text_; }
-
- private:
-  [[noreturn]] void Refuse(std::string const& message) const {
-    throw Failure(FailureKind::BadArgument, path_ + ": " + message);
-  }
-
-  std::string Written(double value) const { return FormatFixed(value, decimals_); }
-
-  /// The number that the machine reads.
-  double Rounded(double value) const {
-    if (!(std::fabs(value) < kMostUnits * step_)) {
-      Refuse("G-code with " + Counted(static_cast<std::size_t>(decimals_), "decimal") +
-             " cannot hold " + FormatShort(value, 12));
-    }
-    return *ParseNumber(Written(value));
-  }
-
-  XY Rounded(XY const& point) const { return {Rounded(point.x), Rounded(point.y)}; }
-
-  std::string Words(char first, char second, XY const& values) const {
-    return std::string(" ") + first + Written(values.x) + " " + second + Written(values.y);
-  }
-
-  void CutLine(XY const& to) { Line("G1" + Words('X', 'Y', to) + feed_); }
-
-  /// The way from the tool to the centre, on the grid of the digits written: of the places around
-  /// the true one that from where both ends are nearest to the true radius.
-  XY WayToCenter(Piece const& arc, XY const& to) const {
-    XY const true_ = {arc.center.x - at_.x, arc.center.y - at_.y};
-    XY best;
-    double leastError = HUGE_VAL;
-    for (int i = -1; i <= 1; ++i) {
-      for (int j = -1; j <= 1; ++j) {
-        XY const way = Rounded({true_.x + i * step_, true_.y + j * step_});
-        double const error = std::fabs(std::hypot(way.x, way.y) - arc.radius) +
-                             std::fabs(RadiusAt(to, way) - arc.radius);
-        if (error < leastError) {
-          leastError = error;
-          best = way;
-        }
-      }
-    }
-    return best;
-  }
-
-  double RadiusAt(XY const& to, XY const& way) const {
-    return std::hypot(to.x - (at_.x + way.x), to.y - (at_.y + way.y));
-  }
-
-  /// False when the arc is better written as a line.
-  bool CutArc(Piece const& arc, XY const& to, std::size_t number) {
-    double const quarter = std::sin(arc.sweep / 4.0);
-    double const rise = 2.0 * arc.radius * quarter * quarter;
-    if (rise < step_ / 2.0) return false;
-    XY const way = WayToCenter(arc, to);
-    double const radius = std::hypot(way.x, way.y);
-    if (radius == 0.0) return false;
-    Piece const written =
-        MakeArc(at_, to, {at_.x + way.x, at_.y + way.y}, radius, arc.counterClockwise);
-    // Rounding can carry the end of a tiny arc past its start, and the machine would go all the
-    // way round.
-    if (std::fabs(written.sweep - arc.sweep) > kWidestArc / 2.0) return false;
-    double const error = std::fabs(RadiusAt(to, way) - radius);
-    if (!(error <= largestRadiusError_)) {
-      Refuse("G-code with " + Counted(static_cast<std::size_t>(decimals_), "decimal") +
-             " is too coarse for piece " + std::to_string(number) +
-             ": the radii at its ends would differ by " + FormatShort(error));
-    }
-    Line((arc.counterClockwise ? "G3" : "G2") + Words('X', 'Y', to) + Words('I', 'J', way) + feed_);
-    return true;
-  }
-
-  std::string path_;
-  int decimals_;
-  double step_;
-  double largestRadiusError_;
-  std::string text_;
-  std::string feed_;  ///< for the next cut; empty once it is said
-  XY at_;
-  bool isPlaced_ = false;
-  bool hasCut_ = false;
-};
+/// The R of an arc near half a circle says little about where the centre is; at this sweep an error
+/// of R moves the centre by not more than twice as much.
+constexpr double kWidestRadiusArc = 2.0943951023931953;  // 120 degrees
 
 void WriteUnits(ContourFile const& contour, ToolPath* tool) {
   if (IsInch(contour.units)) {
@@ -161,25 +41,74 @@ void WriteUnits(ContourFile const& contour, ToolPath* tool) {
   }
 }
 
-}  // namespace
+void Halve(Piece const& arc, double widest, std::vector<Piece>* parts) {
+  if (!arc.IsArc() || arc.sweep <= widest) {
+    parts->push_back(arc);
+    return;
+  }
+  for (Piece const& half : Halves(arc)) Halve(half, widest, parts);
+}
 
-int DefaultGCodeDecimals(std::string const& units) { return IsInch(units) ? 5 : 4; }
-
-std::string ToGCode(ContourFile const& contour, GCodeOptions const& options) {
-  ToolPath tool(contour, options);
-  WriteUnits(contour, &tool);
-  tool.Line("G17 G90 G91.1");
+void CutPieces(ContourFile const& contour, GCodeOptions const& options, ToolPath* tool) {
   double const tolerance = JointTolerance(contour.pieces);
+  double const widest = options.useRadiusWords ? kWidestRadiusArc : kWidestArc;
   for (std::size_t i = 0; i < contour.pieces.size(); ++i) {
     Piece const& piece = contour.pieces[i];
     bool const isJoined = i > 0 && Distance(contour.pieces[i - 1].end, piece.start) <= tolerance;
-    if (!isJoined) tool.MoveTo(piece.start);
-    for (Piece const& part : WithoutWideArcs({piece})) tool.Cut(part, i + 1);
+    if (!isJoined) tool->MoveTo(piece.start);
+    std::vector<Piece> parts;
+    Halve(piece, widest, &parts);
+    for (Piece const& part : parts) tool->Cut(part, i + 1);
   }
+}
+
+std::vector<NamedField> FieldsOf(ContourFile const& contour, GCodeOptions const& options) {
+  double length = 0.0;
+  for (Piece const& piece : contour.pieces) length += piece.length;
+  auto const number = [](std::optional<double> const& value) {
+    return value ? FormatShort(*value) : std::string();
+  };
+  return {{"name", contour.path},
+          {"units", contour.units},
+          {"tolerance", number(options.tolerance)},
+          {"feed", number(options.feed)},
+          {"pieces", std::to_string(contour.pieces.size())},
+          {"length", FormatShort(length)},
+          {"date", Today()}};
+}
+
+void WriteText(std::string const& text, ToolPath* tool) {
+  if (text.empty()) return;
+  tool->Line(text.back() == '\n' ? text.substr(0, text.size() - 1) : text);
+}
+
+}  // namespace
+
+int GCodeDecimals(std::string const& units, std::optional<double> tolerance) {
+  int const usual = IsInch(units) ? kDecimalsOfInches : kDecimalsOfMillimetres;
+  if (!tolerance) return usual;
+  double const needed = std::ceil(kDigitsBelowTolerance - std::log10(*tolerance));
+  return std::max(usual, static_cast<int>(std::min<double>(needed, kMostGCodeDecimals)));
+}
+
+std::string ToGCode(ContourFile const& contour, GCodeOptions const& options) {
+  if (options.plane == Plane::G18 && options.safeHeight) {
+    throw Failure(FailureKind::BadArgument,
+                  contour.path + ": heights are for the plane of X and Y, not for X and Z");
+  }
+  std::vector<NamedField> const fields = FieldsOf(contour, options);
+  ToolPath tool(contour, options);
+  WriteText(FilledIn(options.header, fields), &tool);
+  WriteUnits(contour, &tool);
+  tool.Line(options.plane == Plane::G18 ? "G18 G90 G91.1" : "G17 G90 G91.1");
+  CutPieces(contour, options, &tool);
   if (!tool.HasCut()) {
     throw Failure(FailureKind::BadArgument,
                   contour.path + ": is smaller than the last digit of the G-code");
   }
+  tool.Retract();
+  WriteText(FilledIn(options.footer, fields), &tool);
+  if (options.end != End::None) tool.Line(options.end == End::M30 ? "M30" : "M2");
   return tool.Text();
 }
 

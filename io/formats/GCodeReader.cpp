@@ -2,11 +2,14 @@
 #include <algorithm>
 #include <array>
 #include <cmath>
+#include <iterator>
 #include <optional>
 #include <vector>
 
 #include "io/base/Numbers.h"
 #include "io/formats/GCode.h"
+#include "io/formats/GCodeBlocks.h"
+#include "io/formats/LengthUnits.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
 
@@ -14,112 +17,48 @@ namespace Vorn::IO {
 
 namespace {
 
-constexpr double kMillimetresPerInch = 25.4;
-
 /// How far the radii at the ends of an arc may differ: files with two decimals still pass.
 constexpr double kLargestRadiusError = 0.01;
 constexpr double kLargestRelativeRadiusError = 1e-3;
 
-struct Word {
-  char letter = ' ';
-  double value = 0.0;
-  std::string_view text;
+/// The axes of a machine, as its words name them.
+constexpr char kAxes[] = {'X', 'Y', 'Z'};
+
+/// One coordinate for each axis; nothing where it is not known.
+using Place = std::array<std::optional<double>, std::size(kAxes)>;
+
+/// The axes that the first and the second coordinate of a contour are, the words for their ways to
+/// the centre of an arc, and the axis across.
+struct Plane {
+  std::size_t first = 0;
+  std::size_t second = 1;
+  char firstOffset = 'I';
+  char secondOffset = 'J';
+  std::size_t across = 2;
+  bool isMirrored = false;  ///< G2 and G3 are told from the side where the two are exchanged
 };
 
-/// One block: the words of a line, by letter. Only G and M may be repeated.
-struct Block {
-  std::vector<Word> codes;
-  std::array<std::optional<double>, 26> values;
-
-  std::optional<double> const& operator[](char letter) const {
-    return values[static_cast<std::size_t>(letter - 'A')];
-  }
-  std::optional<double>& operator[](char letter) {
-    return values[static_cast<std::size_t>(letter - 'A')];
-  }
-};
-
-/// Takes a line apart.
-class Scanner {
- public:
-  Scanner(std::string_view line, std::size_t number, std::string const& path)
-      : line_(line), number_(number), path_(path) {}
-
-  Block Read() {
-    Block block;
-    for (SkipComments(); at_ < line_.size(); SkipComments()) Sort(NextWord(), &block);
-    return block;
-  }
-
- private:
-  [[noreturn]] void Refuse(std::string_view text, std::string const& complaint) const {
-    RefuseLine(path_, number_, Quoted(text) + " " + complaint);
-  }
-
-  void SkipBlanks() { at_ = std::min(line_.find_first_not_of(" \t", at_), line_.size()); }
-
-  void SkipComments() {
-    for (SkipBlanks(); at_ < line_.size(); SkipBlanks()) {
-      if (line_[at_] == ';' || (line_[at_] == '%' && Trimmed(line_) == "%")) {
-        at_ = line_.size();
-      } else if (line_[at_] == '(') {
-        std::size_t const end = line_.find(')', at_);
-        if (end == std::string_view::npos) Refuse(line_.substr(at_), "is a comment without end");
-        at_ = end + 1;
-      } else {
-        return;
-      }
-    }
-  }
-
-  Word NextWord() {
-    std::size_t const begin = at_;
-    char const letter = LowerCase(line_.substr(at_, 1)).front();
-    if (letter < 'a' || letter > 'z') Refuse(line_.substr(begin), "is no word of G-code");
-    ++at_;
-    SkipBlanks();
-    std::size_t const digits = at_;
-    at_ = std::min(line_.find_first_not_of("+-.0123456789", at_), line_.size());
-    std::string_view const text = line_.substr(begin, at_ - begin);
-    std::optional<double> const value = ParseNumber(line_.substr(digits, at_ - digits));
-    if (!value) Refuse(text.size() > 1 ? text : line_.substr(begin), "is no word of G-code");
-    if (!IsUsable(*value)) Refuse(text, "is too large");
-    return {static_cast<char>(letter - 'a' + 'A'), *value, text};
-  }
-
-  void Sort(Word const& word, Block* block) const {
-    constexpr std::string_view kKnown = "FGIJMNOPRSTXYZ";
-    if (kKnown.find(word.letter) == std::string_view::npos) Refuse(word.text, "is not supported");
-    if (word.letter == 'G' || word.letter == 'M') {
-      block->codes.push_back(word);
-      return;
-    }
-    std::optional<double>& value = (*block)[word.letter];
-    if (value) Refuse(word.text, "is the second such word in its line");
-    value = word.value;
-  }
-
-  std::string_view line_;
-  std::size_t number_;
-  std::string path_;
-  std::size_t at_ = 0;
-};
+constexpr Plane kPlaneXY = {};
+constexpr Plane kPlaneXZ = {0, 2, 'I', 'K', 1, true};
 
 /// What a machine would remember, and the pieces it has cut.
 class Machine {
  public:
   explicit Machine(std::string const& path) : path_(path) {}
 
-  void Run(Block const& block, std::size_t line) {
+  void Run(GCodeBlock const& block, std::size_t line) {
     line_ = line;
     isDwell_ = false;
-    for (Word const& word : block.codes) word.letter == 'G' ? TakeG(word) : TakeM(word);
-    bool const moves = block['X'] || block['Y'] || block['Z'];
-    bool const turns = block['I'] || block['J'] || block['R'];
+    isElsewhere_ = false;
+    takesP_ = false;
+    for (GCodeWord const& word : block.codes) word.letter == 'G' ? TakeG(word) : TakeM(word);
     if (isDwell_) return;
-    if (block['P']) Refuse("a P word belongs to G4 only");
-    if (moves || turns) Move(block);
+    if (isElsewhere_) return Forget(block);
+    if (block['P'] && !takesP_) Refuse("a P word belongs to G4 and G64 only");
+    if (Moves(block)) Move(block);
   }
+
+  bool HasEnded() const { return hasEnded_; }
 
   ContourFile Result() const {
     ContourFile contour;
@@ -132,15 +71,23 @@ class Machine {
  private:
   [[noreturn]] void Refuse(std::string const& message) const { RefuseLine(path_, line_, message); }
 
-  void TakeM(Word const& word) const {
+  static bool Moves(GCodeBlock const& block) {
+    constexpr std::string_view kWords = "XYZIJKR";
+    return std::any_of(kWords.begin(), kWords.end(),
+                       [&](char letter) { return block[letter].has_value(); });
+  }
+
+  void TakeM(GCodeWord const& word) {
     constexpr double kKnown[] = {0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 30, 48, 49};
     if (std::find(std::begin(kKnown), std::end(kKnown), word.value) == std::end(kKnown)) {
       Refuse(Quoted(word.text) + " is not supported");
     }
+    hasEnded_ = hasEnded_ || word.value == 2 || word.value == 30;
   }
 
-  void TakeG(Word const& word) {
-    switch (static_cast<int>(std::lround(std::clamp(word.value * 10.0, -1.0, 1e4)))) {
+  void TakeG(GCodeWord const& word) {
+    int const code = static_cast<int>(std::lround(std::clamp(word.value * 10.0, -1.0, 1e4)));
+    switch (code) {
       case 0:
       case 10:
       case 20:
@@ -150,11 +97,25 @@ class Machine {
       case 40:
         isDwell_ = true;
         break;
+      case 170:
+        TakePlane(kPlaneXY);
+        break;
+      case 180:
+        TakePlane(kPlaneXZ);
+        break;
       case 200:
         TakeUnits("inch");
         break;
       case 210:
         TakeUnits("mm");
+        break;
+      case 280:
+      case 300:
+      case 530:
+        isElsewhere_ = true;
+        break;
+      case 640:
+        takesP_ = true;
         break;
       case 900:
         isIncremental_ = false;
@@ -169,23 +130,25 @@ class Machine {
       case 911:
         isCenterAbsolute_ = false;
         break;
-      case 170:  // the plane of x and y
-      case 400:  // no cutter compensation
-      case 490:  // no tool length compensation
-      case 540:  // the six coordinate systems of the work
-      case 550:
-      case 560:
-      case 570:
-      case 580:
-      case 590:
-      case 610:  // ways to follow the path
-      case 640:
-      case 800:  // no cycle
-      case 940:  // feed in units a minute
-        break;
       default:
-        Refuse(Quoted(word.text) + " is not supported");
+        if (!IsPassedOver(code)) Refuse(Quoted(word.text) + " is not supported");
     }
+  }
+
+  /// Codes, ten times each, that leave the path as it is.
+  static bool IsPassedOver(int code) {
+    constexpr int kKnown[] = {400, 430, 490,                       // compensation off, tool length
+                              540, 550, 560, 570, 580, 590,        // coordinates of the work
+                              610, 800,                            // exact path, no cycle
+                              930, 940, 950, 960, 970, 980, 990};  // feed, speed, return
+    return std::find(std::begin(kKnown), std::end(kKnown), code) != std::end(kKnown);
+  }
+
+  void TakePlane(Plane const& plane) {
+    if (!pieces_.empty() && plane.second != plane_.second) {
+      Refuse("the plane changes within the contour");
+    }
+    plane_ = plane;
   }
 
   void TakeUnits(char const* units) {
@@ -195,42 +158,54 @@ class Machine {
 
   /// Only a difference is known of where an incremental path begins.
   void PlaceAtOrigin() {
-    if (!x_) x_ = 0.0;
-    if (!y_) y_ = 0.0;
+    for (std::size_t const axis : {plane_.first, plane_.second}) {
+      if (!at_[axis]) at_[axis] = 0.0;
+    }
   }
 
-  std::optional<double> Target(std::optional<double> const& from,
-                               std::optional<double> const& word) const {
-    if (!word) return from;
-    return isIncremental_ ? from.value_or(0.0) + *word : *word;
+  /// A move in the coordinates of the machine: where the tool is then, those of the work do not
+  /// tell.
+  void Forget(GCodeBlock const& block) {
+    for (std::size_t axis = 0; axis < at_.size(); ++axis) {
+      if (block[kAxes[axis]]) at_[axis].reset();
+    }
   }
 
-  void Move(Block const& block) {
+  Place Target(GCodeBlock const& block) const {
+    Place target = at_;
+    for (std::size_t axis = 0; axis < at_.size(); ++axis) {
+      std::optional<double> const& word = block[kAxes[axis]];
+      if (word) target[axis] = isIncremental_ ? at_[axis].value_or(0.0) + *word : *word;
+    }
+    return target;
+  }
+
+  void Move(GCodeBlock const& block) {
     if (!motion_) Refuse("a move before any of G0 to G3");
-    std::optional<double> const x = Target(x_, block['X']);
-    std::optional<double> const y = Target(y_, block['Y']);
-    std::optional<double> const z = Target(z_, block['Z']);
-    if (*motion_ >= 1 && x_ && y_) {
-      Cut(block, {*x, *y}, z_ && z != z_);
+    Place const target = Target(block);
+    if (*motion_ >= 1 && at_[plane_.first] && at_[plane_.second]) {
+      bool const movesAcross = at_[plane_.across] && target[plane_.across] != at_[plane_.across];
+      Cut(block, {*target[plane_.first], *target[plane_.second]}, movesAcross);
     } else if (*motion_ >= 2) {
       Refuse("an arc before the place of the tool is known");
     }
-    x_ = x;
-    y_ = y;
-    z_ = z;
+    at_ = target;
   }
 
-  void Cut(Block const& block, XY const& to, bool movesInZ) {
-    XY const from = {*x_, *y_};
+  void Cut(GCodeBlock const& block, XY const& to, bool movesAcross) {
+    XY const from = {*at_[plane_.first], *at_[plane_.second]};
     bool const isArc = *motion_ >= 2;
     if (!isArc && AreEqual(from, to)) return;
-    if (movesInZ) Refuse("a cut that leaves the plane: z changes with x and y");
-    if (isArc) {
-      CutArc(block, from, to);
-    } else {
-      if (block['I'] || block['J'] || block['R']) Refuse("I, J and R belong to G2 and G3 only");
-      pieces_.push_back(MakeLine(from, to));
+    if (movesAcross) {
+      Refuse(std::string("a cut that leaves the plane: ") + LowerCase({&kAxes[plane_.across], 1}) +
+             " changes with " + LowerCase({&kAxes[plane_.first], 1}) + " and " +
+             LowerCase({&kAxes[plane_.second], 1}));
     }
+    if (isArc) return CutArc(block, from, to);
+    if (block['I'] || block['J'] || block['K'] || block['R']) {
+      Refuse("I, J, K and R belong to G2 and G3 only");
+    }
+    pieces_.push_back(MakeLine(from, to));
   }
 
   double LargestError(double radius) const {
@@ -238,11 +213,12 @@ class Machine {
     return kLargestRadiusError / unit + kLargestRelativeRadiusError * radius;
   }
 
-  void CutArc(Block const& block, XY const& from, XY const& to) {
-    bool const hasOffset = block['I'] || block['J'];
-    if (hasOffset && block['R']) Refuse("an arc has both R and I or J");
-    if (!hasOffset && !block['R']) Refuse("an arc has neither R nor I and J");
-    bool const isCounterClockwise = *motion_ == 3;
+  void CutArc(GCodeBlock const& block, XY const& from, XY const& to) {
+    bool const hasOffset = block[plane_.firstOffset] || block[plane_.secondOffset];
+    std::string const second(1, plane_.secondOffset);
+    if (hasOffset && block['R']) Refuse("an arc has both R and I or " + second);
+    if (!hasOffset && !block['R']) Refuse("an arc has neither R nor I and " + second);
+    bool const isCounterClockwise = (*motion_ == 3) != plane_.isMirrored;
     XY const center = hasOffset ? CenterByOffset(block, from)
                                 : CenterByRadius(*block['R'], from, to, isCounterClockwise);
     double const atStart = Distance(from, center);
@@ -261,12 +237,14 @@ class Machine {
     }
   }
 
-  XY CenterByOffset(Block const& block, XY const& from) const {
-    if (!isCenterAbsolute_) {
-      return {from.x + block['I'].value_or(0.0), from.y + block['J'].value_or(0.0)};
+  XY CenterByOffset(GCodeBlock const& block, XY const& from) const {
+    std::optional<double> const& first = block[plane_.firstOffset];
+    std::optional<double> const& second = block[plane_.secondOffset];
+    if (!isCenterAbsolute_) return {from.x + first.value_or(0.0), from.y + second.value_or(0.0)};
+    if (!first || !second) {
+      Refuse(std::string("an absolute centre (G90.1) needs both I and ") + plane_.secondOffset);
     }
-    if (!block['I'] || !block['J']) Refuse("an absolute centre (G90.1) needs both I and J");
-    return {*block['I'], *block['J']};
+    return {*first, *second};
   }
 
   /// A negative radius asks for the longer of the two arcs.
@@ -290,10 +268,12 @@ class Machine {
   std::vector<Piece> pieces_;
   std::string units_;
   std::optional<int> motion_;
-  std::optional<double> x_;
-  std::optional<double> y_;
-  std::optional<double> z_;
-  bool isDwell_ = false;
+  Plane plane_ = kPlaneXY;
+  Place at_;
+  bool isDwell_ = false;      ///< the words of this block say how long to wait
+  bool isElsewhere_ = false;  ///< the words of this block are coordinates of the machine
+  bool takesP_ = false;
+  bool hasEnded_ = false;
   bool isIncremental_ = false;
   bool isCenterAbsolute_ = false;
 };
@@ -305,7 +285,8 @@ ContourFile ParseGCode(std::string_view text, std::string const& path) {
   Lines lines(text);
   std::string_view line;
   while (lines.Next(&line)) {
-    machine.Run(Scanner(line, lines.Number(), path).Read(), lines.Number());
+    machine.Run(ReadGCodeBlock(line, lines.Number(), path), lines.Number());
+    if (machine.HasEnded()) break;
   }
   return machine.Result();
 }

@@ -10,6 +10,7 @@
 #include <vector>
 
 #include "io/base/Failure.h"
+#include "io/formats/GCode.h"
 #include "io/measure/Remeasure.h"
 #include "io/pieces/ContourFile.h"
 #include "io/pieces/Shapes.h"
@@ -147,6 +148,12 @@ inline std::string Refusal(std::function<void()> const& read,
                                   : std::string("other exit code: ") + failure.what();
   }
   return "";
+}
+
+inline GCodeOptions WithDecimals(int decimals) {
+  GCodeOptions options;
+  options.decimals = decimals;
+  return options;
 }
 
 /// Texts that no reader may take, whatever its format.

@@ -131,7 +131,7 @@ double LargestRadiusDifference(std::string const& gcode) {
 TEST(ToGCode, StaysWithinThreeUnitsOfItsLastDigit) {
   ForRandomContours([](ContourFile const& contour) {
     for (int const decimals : {4, 6}) {
-      std::string const text = ToGCode(contour, {{}, decimals});
+      std::string const text = ToGCode(contour, WithDecimals(decimals));
       ExpectSameCurve(contour, ParseGCode(text, "p.nc"), 3.0 * std::pow(10.0, -decimals));
     }
   });
@@ -143,7 +143,7 @@ TEST(ToGCode, RadiiAtBothEndsAgreeForTheMachine) {
     double const difference = LargestRadiusDifference(ToGCode(contour));
     if (difference >= 0.0) ++contoursWithArcs;
     EXPECT_LE(difference, 0.0002);  // a tenth of what machines bear
-    EXPECT_LE(LargestRadiusDifference(ToGCode(contour, {{}, 6})), 0.000002);
+    EXPECT_LE(LargestRadiusDifference(ToGCode(contour, WithDecimals(6))), 0.000002);
   });
   EXPECT_GT(contoursWithArcs, 190);
 }

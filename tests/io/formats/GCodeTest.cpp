@@ -28,8 +28,10 @@ ContourFile Of(std::vector<Piece> pieces, std::string units = "mm") {
 std::string Path(std::vector<Piece> const& pieces) {
   std::string const text = ToGCode(Of(pieces));
   std::string const head = "G21\nG17 G90 G91.1\n";
+  std::string const end = "M2\n";
   EXPECT_TRUE(text.starts_with(head));
-  return text.substr(head.size());
+  EXPECT_TRUE(text.ends_with(end));
+  return text.substr(head.size(), text.size() - head.size() - end.size());
 }
 
 TEST(ToGCode, WritesMovesLinesAndArcs) {
@@ -51,17 +53,19 @@ TEST(ToGCode, MovesOverGapsWithoutCutting) {
 TEST(ToGCode, UnitsChooseTheWordAndTheDigits) {
   std::vector<Piece> const line = {MakeLine({0, 0}, {1, 0})};
   EXPECT_EQ(ToGCode(Of(line, "inch")),
-            "G20\nG17 G90 G91.1\nG0 X0.00000 Y0.00000\nG1 X1.00000 Y0.00000\n");
+            "G20\nG17 G90 G91.1\nG0 X0.00000 Y0.00000\nG1 X1.00000 Y0.00000\nM2\n");
   EXPECT_TRUE(ToGCode(Of(line, "")).starts_with("(units not known: neither G20 nor G21)\n"));
   EXPECT_EQ(Refusal([&] { ToGCode(Of(line, "m")); }, FailureKind::BadArgument),
             "p.json: G-code is in mm or inch, and the contour is in 'm'; see --units");
 }
 
 TEST(ToGCode, FeedStandsOnTheFirstCut) {
-  std::string const text = ToGCode(Wedge(), {600.0, 1});
+  GCodeOptions options = WithDecimals(1);
+  options.feed = 600.0;
+  std::string const text = ToGCode(Wedge(), options);
   EXPECT_EQ(text,
             "G21\nG17 G90 G91.1\n"
-            "G0 X0.0 Y0.0\nG1 X4.0 Y0.0 F600\nG2 X5.0 Y-1.0 I0.0 J-1.0\nG1 X0.0 Y0.0\n");
+            "G0 X0.0 Y0.0\nG1 X4.0 Y0.0 F600\nG2 X5.0 Y-1.0 I0.0 J-1.0\nG1 X0.0 Y0.0\nM2\n");
 }
 
 TEST(ToGCode, SplitsWhatIsNearlyAFullCircle) {
@@ -115,14 +119,10 @@ TEST(ToGCode, RefusesDigitsTooCoarseForTheMachine) {
   double const radius = std::hypot(0.3, 0.27);
   XY const end = {0.3 + radius * std::cos(1.4), -0.27 + radius * std::sin(1.4)};
   ContourFile const contour = Of({MakeArc({0, 0}, end, {0.3, -0.27}, radius, false)});
-  EXPECT_TRUE(Refusal(
-                  [&] {
-                    ToGCode(contour, {{}, 1});
-                  },
-                  FailureKind::BadArgument)
+  EXPECT_TRUE(Refusal([&] { ToGCode(contour, WithDecimals(1)); }, FailureKind::BadArgument)
                   .starts_with("p.json: G-code with 1 decimal is too coarse for piece 1: the radii "
                                "at its ends would differ by 0.0"));
-  EXPECT_NO_THROW(ToGCode(contour, {{}, 4}));
+  EXPECT_NO_THROW(ToGCode(contour, WithDecimals(4)));
 }
 
 TEST(ToGCode, RefusesNumbersBeyondExactRounding) {
@@ -183,12 +183,12 @@ TEST(ParseGCode, InchesAreKept) {
 
 TEST(ParseGCode, NamesLineAndWord) {
   EXPECT_EQ(Complaint("G21\nG41 X1"), "p.nc:2: 'G41' is not supported");
-  EXPECT_EQ(Complaint("G18"), "p.nc:1: 'G18' is not supported");
+  EXPECT_EQ(Complaint("G19"), "p.nc:1: 'G19' is not supported");
   EXPECT_EQ(Complaint("G1.5 X1"), "p.nc:1: 'G1.5' is not supported");
   EXPECT_EQ(Complaint("G-1 X1"), "p.nc:1: 'G-1' is not supported");
   EXPECT_EQ(Complaint("M98 P1"), "p.nc:1: 'M98' is not supported");
   EXPECT_EQ(Complaint("G1 X1 A90"), "p.nc:1: 'A90' is not supported");
-  EXPECT_EQ(Complaint("G1 X1 K2"), "p.nc:1: 'K2' is not supported");
+  EXPECT_EQ(Complaint("G0 X0 Y0\nG1 X1 K2"), "p.nc:2: I, J, K and R belong to G2 and G3 only");
   EXPECT_EQ(Complaint("G1 X#1"), "p.nc:1: 'X#1' is no word of G-code");
   EXPECT_EQ(Complaint("G1 Xnan"), "p.nc:1: 'Xnan' is no word of G-code");
   EXPECT_EQ(Complaint("G1 X1.2.3"), "p.nc:1: 'X1.2.3' is no word of G-code");
@@ -206,7 +206,7 @@ TEST(ParseGCode, NamesLineAndWord) {
   EXPECT_EQ(Complaint("G0 X0 Y0\nG2 X0 Y0 R1"), "p.nc:2: an arc by R ends where it starts");
   EXPECT_EQ(Complaint("G0 X0 Y0 Z0\nG1 X1 Z-1"),
             "p.nc:2: a cut that leaves the plane: z changes with x and y");
-  EXPECT_EQ(Complaint("G0 X0 Y0\nG1 X1 I1"), "p.nc:2: I, J and R belong to G2 and G3 only");
+  EXPECT_EQ(Complaint("G0 X0 Y0\nG1 X1 I1"), "p.nc:2: I, J, K and R belong to G2 and G3 only");
   EXPECT_EQ(Complaint("G21\nG0 X0 Y0\nG1 X1\nG20"), "p.nc:4: the units change within the contour");
   EXPECT_EQ(Complaint("G90.1\nG0 X0 Y0\nG2 X2 I1"),
             "p.nc:3: an absolute centre (G90.1) needs both I and J");

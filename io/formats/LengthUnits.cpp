@@ -1,0 +1,17 @@
+#include "io/formats/LengthUnits.h"
+
+#include "io/base/Numbers.h"
+
+namespace Vorn::IO {
+
+bool IsInch(std::string const& units) {
+  std::string const lower = LowerCase(units);
+  return lower == "in" || lower == "inch" || lower == "inches";
+}
+
+bool IsMillimetre(std::string const& units) {
+  std::string const lower = LowerCase(units);
+  return lower == "mm" || lower == "millimetre" || lower == "millimeter";
+}
+
+}  // namespace Vorn::IO
