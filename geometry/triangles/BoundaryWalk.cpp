@@ -116,15 +116,6 @@ void FindContained(Triangle const& first, Triangle const& second, VertexStatuses
 
 }  // namespace
 
-bool HasUndefined(VertexStatuses const& statuses) {
-  for (auto const& ofTriangle : statuses) {
-    for (PointStatus const status : ofTriangle) {
-      if (status == PointStatus::Undefined) return true;
-    }
-  }
-  return false;
-}
-
 void Divide(OverlapPolygon* polygon, Overlap* overlap) {
   CutEars(polygon->data(), static_cast<int>(polygon->size()),
           [overlap](Triangle const& ear) { overlap->parts.push_back(ear); });

@@ -18,7 +18,14 @@ namespace Vorn::Triangles {
 using VertexStatuses = std::array<std::array<PointStatus, 3>, 2>;
 
 /// Whether one of the vertices has no defined status.
-bool HasUndefined(VertexStatuses const& statuses);
+inline bool HasUndefined(VertexStatuses const& statuses) {
+  for (auto const& ofTriangle : statuses) {
+    for (PointStatus const status : ofTriangle) {
+      if (status == PointStatus::Undefined) return true;
+    }
+  }
+  return false;
+}
 
 /// The corners of an overlap: at most four points on each of three sides.
 using OverlapPolygon = InlineVector<Point, kMostParts + 2>;

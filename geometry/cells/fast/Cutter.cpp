@@ -49,7 +49,10 @@ constexpr double kFarRatio = 256.0;
 static_assert(2.0 * kFarRatio < 2.0 * kClearance, "steps 5 and 6 of the proof contradict");
 
 /// The first of three bits of each line; the second pair repeats line 0, whose bits are there.
-constexpr PairBits kLineBits[2] = {{1, 8}, {64, 0}};
+constexpr PairBits kLineBits[2] = {PairBits{1, 8}, PairBits{64, 0}};
+
+/// The bits of the vertices that the lines of a pair start at.
+constexpr PairBits kVertexBits[2] = {PairBits{1, 2}, PairBits{4, 0}};
 
 }  // namespace
 
@@ -69,8 +72,11 @@ struct Cutter::Offsets {
     return ((o0 > 0.0) & bits) | ((o1 > 0.0) & (bits << 1)) | ((o2 > 0.0) & (bits << 2));
   }
 
+  /// How little the ends of a side differ.
+  Pair Flattest() const { return Least(Least(Sizes(o0 - o1), Sizes(o1 - o2)), Sizes(o2 - o0)); }
+
   /// As InnerBits, where the ends of the side from a vertex differ by no more than a bound.
-  PairBits FlatBits(PairBits const& bits, Pair const& bound) const {
+  PairBits FlatBits(PairBits const& bits, double bound) const {
     return ((Sizes(o0 - o1) <= bound) & bits) | ((Sizes(o1 - o2) <= bound) & (bits << 1)) |
            ((Sizes(o2 - o0) <= bound) & (bits << 2));
   }
@@ -122,10 +128,13 @@ Cutter::Place Cutter::PlaceOf(BoxedTriangle const& other, Sight* sight) const {
   Pair const least = Least(smallest[0], smallest[1]);
   bool const isClear = (least[0] > clear_) & (least[1] > clear_);
   if (!isClear) return Place::Unclear;
-  Pair const skew = {skew_, skew_};
-  PairBits const flat =
-      offsets[0].FlatBits(kLineBits[0], skew) | offsets[1].FlatBits(kLineBits[1], skew);
-  if (Union(flat) != 0 && HasSideAlong(Union(flat), other.triangle)) return Place::Unclear;
+  Pair const flattest = Least(offsets[0].Flattest(), offsets[1].Flattest());
+  bool const isAnyFlat = (flattest[0] <= skew_) | (flattest[1] <= skew_);
+  if (isAnyFlat) {
+    PairBits const flat =
+        offsets[0].FlatBits(kLineBits[0], skew_) | offsets[1].FlatBits(kLineBits[1], skew_);
+    if (HasSideAlong(Union(flat), other.triangle)) return Place::Unclear;
+  }
 
   PairBits const inner = offsets[0].InnerBits(kLineBits[0]) | offsets[1].InnerBits(kLineBits[1]);
   CutSigns const& signs = kCutSigns[Union(inner)];
@@ -156,7 +165,7 @@ unsigned Cutter::VerticesOutside(BoxedTriangle const& other) const {
     return (box.xMin > lines.x) | (lines.x > box.xMax) | (box.yMin > lines.y) |
            (lines.y > box.yMax);
   };
-  return Union((outOfBox(lines_[0]) & PairBits{1, 2}) | (outOfBox(lines_[1]) & PairBits{4, 0}));
+  return Union((outOfBox(lines_[0]) & kVertexBits[0]) | (outOfBox(lines_[1]) & kVertexBits[1]));
 }
 
 }  // namespace Vorn::Cells

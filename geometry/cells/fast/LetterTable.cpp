@@ -1,7 +1,6 @@
 #include "geometry/cells/fast/LetterTable.h"
 
 #include <bit>
-#include <cstring>
 #include <utility>
 
 namespace Vorn::Cells {
@@ -35,10 +34,6 @@ std::uint32_t HashOf(Triangle const& triangle) {
 }
 
 }  // namespace
-
-bool AreIdentical(Triangle const& a, Triangle const& b) {
-  return std::memcmp(&a, &b, sizeof(Triangle)) == 0;
-}
 
 LetterTable::LetterTable(std::size_t expectedLetters)
     : slots_(std::bit_ceil(kSlotsPerLetter * expectedLetters)) {}

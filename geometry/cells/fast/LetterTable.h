@@ -4,6 +4,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <cstring>
 #include <vector>
 
 #include "geometry/cells/fast/BoxedTriangle.h"
@@ -13,7 +14,9 @@ namespace Vorn::Cells {
 
 /// Whether all bits of two triangles are equal: a zero and a negative zero are not. Only such
 /// triangles share a letter.
-bool AreIdentical(Triangle const& a, Triangle const& b);
+inline bool AreIdentical(Triangle const& a, Triangle const& b) {
+  return std::memcmp(&a, &b, sizeof(Triangle)) == 0;
+}
 
 /// Finds letters by triangle. The triangles themselves stand in a vector that the caller keeps,
 /// each at the position that is its letter.

@@ -1,5 +1,6 @@
 #include "geometry/cells/fast/SightedOverlap.h"
 
+#include <bit>
 #include <cstddef>
 
 #include "geometry/intersections/SegmentPair.h"

@@ -3,8 +3,6 @@
 
 #pragma once
 
-#include <bit>
-
 #include "geometry/cells/fast/BoxedTriangle.h"
 #include "geometry/triangles/CrossingPoints.h"
 #include "geometry/triangles/Overlap.h"
@@ -26,7 +24,8 @@ struct Sight {
   /// Whether one side of the second triangle cuts off one or two vertices of the first, and there
   /// is nothing else to it.
   bool IsOneCut() const {
-    bool const hasTwoCrossings = std::has_single_bit(mayCross & (mayCross - 1));
+    Triangles::SidePairs const afterFirst = mayCross & (mayCross - 1);
+    bool const hasTwoCrossings = afterFirst != 0 && (afterFirst & (afterFirst - 1)) == 0;
     return inside != 0 && hasTwoCrossings && IsSecondOutside();
   }
 };
