@@ -1,7 +1,5 @@
 // Bounds are formed from those of the children: a parent's trapezium goes around those of its two
-// children, along the longer one, and takes its slopes from their outer sides, so that every node
-// costs the same.
-//   D. Ballard, "Strip Trees: A Hierarchical Representation for Curves", CACM 24(5), 1981.
+// children, so that every node costs the same.
 
 #include "geometry/contours/near/BoxTree.h"
 
@@ -9,134 +7,39 @@
 
 namespace Vorn::Contours {
 
-namespace {
-
-using Point = GeometryUtils::Point;
-
-/// Axes turned by an angle of which the cosine and sine are known.
-class Frame {
- public:
-  Frame(double cosine, double sine) : cosine_(cosine), sine_(sine) {}
-
-  Point Turn(Point const& p) const {
-    return {cosine_ * p.x + sine_ * p.y, cosine_ * p.y - sine_ * p.x};
-  }
-  Point TurnBack(Point const& p) const {
-    return {cosine_ * p.x - sine_ * p.y, sine_ * p.x + cosine_ * p.y};
-  }
-
-  /// Seen from these axes, with lower below upper.
-  Trapezium Turn(Trapezium const& t) const {
-    Trapezium const turned{{Turn(t.lower.from), Turn(t.lower.to)},
-                           {Turn(t.upper.from), Turn(t.upper.to)}};
-    bool const isUpright = turned.lower.from.x <= turned.lower.to.x;
-    return isUpright ? turned : Trapezium{turned.upper, turned.lower};
-  }
-  Trapezium TurnBack(Trapezium const& t) const {
-    return {{TurnBack(t.lower.from), TurnBack(t.lower.to)},
-            {TurnBack(t.upper.from), TurnBack(t.upper.to)}};
-  }
-
- private:
-  double cosine_;
-  double sine_;
-};
-
-Frame FrameAlongTheLongest(Trapezium const* parts, std::size_t count) {
-  double longest2 = 0.0;
-  Point direction{1.0, 0.0};
-  for (std::size_t i = 0; i < count; ++i) {
-    Trapezium::Side const& side = parts[i].lower;
-    double const dx = side.to.x - side.from.x;
-    double const dy = side.to.y - side.from.y;
-    double const length2 = dx * dx + dy * dy;
-    if (length2 > longest2) {
-      longest2 = length2;
-      direction = {dx, dy};
-    }
-  }
-  if (longest2 == 0.0) return {1.0, 0.0};
-  double const length = std::sqrt(longest2);
-  return {direction.x / length, direction.y / length};
-}
-
-double WidthOf(Trapezium::Side const& side) { return std::fabs(side.to.x - side.from.x); }
-
-double LargestWidth(Trapezium const* begin, Trapezium const* end) {
-  double width = 0.0;
-  for (Trapezium const* part = begin; part != end; ++part) {
-    width = std::max(width, WidthOf(part->lower));
-  }
-  return width;
-}
-
-double DoubleHeight(Trapezium::Side const& side) { return side.from.y + side.to.y; }
-
-/// Steep sides tell nothing about the outline along the frame.
-double SlopeOf(Trapezium::Side const& side) {
-  double const dx = side.to.x - side.from.x;
-  double const dy = side.to.y - side.from.y;
-  return std::fabs(dy) < std::fabs(dx) ? dy / dx : 0.0;
-}
-
-/// The trapezium around points whose long sides have given slopes.
-class Outline {
- public:
-  Outline(double lowerSlope, double upperSlope)
-      : lowerSlope_(lowerSlope), upperSlope_(upperSlope) {}
-
-  void Include(Point const& p) {
-    left_ = std::min(left_, p.x);
-    right_ = std::max(right_, p.x);
-    lowest_ = std::min(lowest_, p.y - lowerSlope_ * p.x);
-    highest_ = std::max(highest_, p.y - upperSlope_ * p.x);
-  }
-
-  Trapezium Get() const {
-    auto const lower = [&](double x) { return Point{x, lowest_ + lowerSlope_ * x}; };
-    auto const upper = [&](double x) { return Point{x, highest_ + upperSlope_ * x}; };
-    return {{lower(left_), lower(right_)}, {upper(right_), upper(left_)}};
-  }
-
- private:
-  static constexpr double kInfinity = std::numeric_limits<double>::infinity();
-
-  double lowerSlope_;
-  double upperSlope_;
-  double left_ = kInfinity;
-  double right_ = -kInfinity;
-  double lowest_ = kInfinity;
-  double highest_ = -kInfinity;
-};
-
-}  // namespace
-
-void Box::Include(Box const& other) {
-  xLow = std::min(xLow, other.xLow);
-  xHigh = std::max(xHigh, other.xHigh);
-  yLow = std::min(yLow, other.yLow);
-  yHigh = std::max(yHigh, other.yHigh);
-}
-
 BoxTree::BoxTree(std::vector<Extent> extents, double margin)
     : extents_(std::move(extents)), margin_(margin) {
   if (extents_.empty()) return;
-  boxes_.emplace_back((extents_.size() + kPiecesPerLeaf - 1) / kPiecesPerLeaf);
-  for (std::size_t i = 0; i < extents_.size(); ++i) {
-    boxes_[0][i / kPiecesPerLeaf].Include(extents_[i].box);
+  levels_.push_back(MakeLeaves());
+  while (levels_.back().size() > 1) levels_.push_back(MakeParents(levels_.back()));
+  trapezia_.resize(levels_.size());
+}
+
+std::vector<BoxTree::Node> BoxTree::MakeLeaves() const {
+  std::vector<Node> leaves;
+  leaves.reserve((extents_.size() + kPiecesPerLeaf - 1) / kPiecesPerLeaf);
+  for (std::size_t first = 0; first < extents_.size(); first += kPiecesPerLeaf) {
+    Node leaf(extents_[first]);
+    std::size_t const end = std::min(first + kPiecesPerLeaf, extents_.size());
+    for (std::size_t i = first + 1; i < end; ++i) leaf.Append(Node(extents_[i]));
+    leaves.push_back(leaf);
   }
-  while (boxes_.back().size() > 1) {
-    std::vector<Box> const& below = boxes_.back();
-    std::vector<Box> level((below.size() + 1) / 2);
-    for (std::size_t j = 0; j < below.size(); ++j) level[j / 2].Include(below[j]);
-    boxes_.push_back(std::move(level));
+  return leaves;
+}
+
+std::vector<BoxTree::Node> BoxTree::MakeParents(std::vector<Node> const& children) {
+  std::vector<Node> parents;
+  parents.reserve((children.size() + 1) / 2);
+  for (std::size_t j = 0; j < children.size(); j += 2) {
+    parents.push_back(children[j]);
+    if (j + 1 < children.size()) parents.back().Append(children[j + 1]);
   }
-  trapezia_.resize(boxes_.size());
+  return parents;
 }
 
 Trapezium const& BoxTree::TrapeziumAt(Place const& place) {
   std::vector<std::optional<Trapezium>>& level = trapezia_[place.level];
-  if (level.empty()) level.resize(boxes_[place.level].size());
+  if (level.empty()) level.resize(levels_[place.level].size());
   std::optional<Trapezium>& trapezium = level[place.number];
   if (!trapezium) trapezium = FormTrapezium(place);
   return *trapezium;
@@ -152,56 +55,40 @@ Trapezium BoxTree::FormTrapezium(Place const& place) {
     return Around(parts, count);
   }
   auto const take = [&](Place const& child) {
-    if (!BoxAt(child).IsEmpty()) parts[count++] = TrapeziumAt(child);
+    if (!NodeAt(child).box.IsEmpty()) parts[count++] = TrapeziumAt(child);
   };
   take(FirstChild(place));
   if (HasSecondChild(place)) take(SecondChild(place));
   return Around(parts, count);
 }
 
-/// Of a segment both long sides are the segment itself; those of a box are the longer ones.
-Trapezium BoxTree::TrapeziumOf(Extent const& extent) {
-  Box const& box = extent.box;
-  Point const lowerLeft{box.xLow, box.yLow};
-  Point const lowerRight{box.xHigh, box.yLow};
-  Point const upperLeft{box.xLow, box.yHigh};
-  Point const upperRight{box.xHigh, box.yHigh};
-  if (extent.isSegment) {
-    Point const& left = extent.isRising ? lowerLeft : upperLeft;
-    Point const& right = extent.isRising ? upperRight : lowerRight;
-    return {{left, right}, {right, left}};
-  }
-  bool const isWide = box.xHigh - box.xLow > box.yHigh - box.yLow;
-  if (isWide) return {{lowerLeft, lowerRight}, {upperRight, upperLeft}};
-  return {{lowerRight, upperRight}, {upperLeft, lowerLeft}};
+bool BoxTree::AreApart(Place const& mine, BoxTree& other, Place const& theirs) {
+  Node const& a = NodeAt(mine);
+  Node const& b = other.NodeAt(theirs);
+  if (a.box.IsApartFrom(b.box)) return true;
+  // Next to each other on the chain means a common joint.
+  bool const areNeighbours =
+      this == &other && mine.level == theirs.level && mine.number + 1 == theirs.number;
+  if (areNeighbours || a.hasPoint || b.hasPoint) return false;
+  Trapezium const& first = TrapeziumAt(mine);
+  Trapezium const& second = other.TrapeziumAt(theirs);
+  return IsOutside(first, second, margin_) || IsOutside(second, first, margin_);
 }
 
-Trapezium BoxTree::Around(Trapezium const* parts, std::size_t count) {
-  Frame const frame = FrameAlongTheLongest(parts, count);
-  Trapezium turned[kPiecesPerLeaf];
-  for (std::size_t i = 0; i < count; ++i) turned[i] = frame.Turn(parts[i]);
-  Trapezium* const end = turned + count;
-  // Short parts are not asked: their slopes would carry far beyond them.
-  Trapezium const* lowest = nullptr;
-  Trapezium const* highest = nullptr;
-  double const leastWidth = 0.5 * LargestWidth(turned, end);
-  for (Trapezium const* part = turned; part != end; ++part) {
-    if (WidthOf(part->lower) < leastWidth) continue;
-    if (lowest == nullptr || DoubleHeight(part->lower) < DoubleHeight(lowest->lower)) {
-      lowest = part;
-    }
-    if (highest == nullptr || DoubleHeight(part->upper) > DoubleHeight(highest->upper)) {
-      highest = part;
-    }
+std::size_t* BoxTree::CollectNear(Place const& mine, BoxTree& other, Place const& theirs,
+                                  std::size_t* near) const {
+  Node const& theirNode = other.NodeAt(theirs);
+  std::size_t* end = near;
+  for (std::size_t i = FirstPiece(mine); i < EndOfPieces(mine); ++i) {
+    if (!extents_[i].box.IsApartFrom(theirNode.box)) *end++ = i;
   }
-  Outline outline(SlopeOf(lowest->lower), SlopeOf(highest->upper));
-  for (Trapezium const* part = turned; part != end; ++part) {
-    for (Trapezium::Side const& side : {part->lower, part->upper}) {
-      outline.Include(side.from);
-      outline.Include(side.to);
-    }
-  }
-  return frame.TurnBack(outline.Get());
+  // Single pieces at a joint are not worth a trapezium.
+  constexpr std::ptrdiff_t kFew = 2;
+  if (end - near <= kFew || theirNode.hasPoint) return end;
+  Trapezium const& trapezium = other.TrapeziumAt(theirs);
+  return std::remove_if(near, end, [&](std::size_t i) {
+    return !extents_[i].box.IsPoint() && IsOutside(trapezium, TrapeziumOf(extents_[i]), margin_);
+  });
 }
 
 }  // namespace Vorn::Contours

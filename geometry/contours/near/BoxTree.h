@@ -1,49 +1,21 @@
+// A hierarchy of bounds over the pieces of a contour, known as a strip tree, which finds the pairs
+// of pieces that come near each other without looking at all pairs. It stands for the plain loop
+// over all pairs.
+
 #pragma once
 
 #include <algorithm>
-#include <cmath>
 #include <cstddef>
-#include <cstdint>
-#include <limits>
 #include <optional>
 #include <vector>
 
-#include "vorn/GeometryUtils.h"
+#include "geometry/contours/near/Box.h"
+#include "geometry/contours/near/Trapezium.h"
 
-/// Finding the pairs of pieces that come near each other without looking at all pairs.
 namespace Vorn::Contours {
 
-/// An axis-parallel box, its sides included. Starts out empty: apart from every box.
-struct Box {
-  double xLow = std::numeric_limits<double>::infinity();
-  double xHigh = -std::numeric_limits<double>::infinity();
-  double yLow = std::numeric_limits<double>::infinity();
-  double yHigh = -std::numeric_limits<double>::infinity();
-
-  bool IsEmpty() const { return xLow > xHigh; }
-  bool IsApartFrom(Box const& other) const {
-    return xLow > other.xHigh || other.xLow > xHigh || yLow > other.yHigh || other.yLow > yHigh;
-  }
-  void Include(Box const& other);
-};
-
-/// The region that holds a piece: a segment, a box around a curved piece, or none (an empty box)
-/// for a piece that the search is to pass over.
-struct Extent {
-  Box box;
-  bool isRising = true;    ///< of a segment: does y grow with x?
-  bool isSegment = false;  ///< the region is one diagonal of the box, not all of it
-};
-
-/// The region on the left of two sides that run in opposite senses, between their ends.
-struct Trapezium {
-  struct Side {
-    GeometryUtils::Point from;
-    GeometryUtils::Point to;
-  };
-  Side lower;
-  Side upper;
-};
+/// Whether a search within one set of pieces looks at each piece and the one right after it.
+enum class Neighbours { Tested, LeftOut };
 
 /// A binary tree over pieces in the order of their contour. A node holds a run of consecutive
 /// pieces, which lie near each other because the pieces form a chain, and is bounded twice: by an
@@ -51,17 +23,22 @@ struct Trapezium {
 /// The trapezia keep bundles and fans of long slanted pieces apart, whose boxes all overlap; they
 /// are formed when they are first asked for, which most contours do for few nodes.
 ///
+/// A node whose boxes form a staircase is not looked into when neighbours are left out: the rest of
+/// its pairs are apart. On a smooth outline that holds for all but the nodes around its extremes.
+///
 /// Memory is linear in the number of pieces. Empty extents are in no pair.
 class BoxTree {
  public:
-  /// Trapezia count as apart only when the gap exceeds margin; boxes need no gap.
+  /// Trapezia count as apart only when the gap exceeds margin; boxes need no gap. Pieces that are
+  /// points are told apart by boxes only.
   BoxTree(std::vector<Extent> extents, double margin);
 
   /// Calls test(i, k) for pairs i < k until it answers true, and returns whether it did. Every pair
-  /// is tested but for those of which some bounds are apart; the order of the pairs is not defined.
+  /// is tested but for those of which some bounds are apart and, if they are to be left out, some
+  /// or all pairs (i, i + 1). The order of the pairs is not defined.
   template <typename Test>
-  bool AnyPair(Test const& test) {
-    return !extents_.empty() && AnyPairWithin(Root(), test);
+  bool AnyPair(Test const& test, Neighbours neighbours = Neighbours::Tested) {
+    return !extents_.empty() && AnyPairWithin(Root(), neighbours, test);
   }
 
   /// The same for all pairs of a piece i of this tree and a piece k of the other.
@@ -72,55 +49,44 @@ class BoxTree {
   }
 
  private:
-  using Point = GeometryUtils::Point;
-
   /// Level 0 holds the leaves; node j of a level has the children 2j and 2j + 1 one level below.
   struct Place {
     std::size_t level;
     std::size_t number;
   };
 
-  static constexpr std::size_t kPiecesPerLeaf = 6;
+  struct Node {
+    explicit Node(Extent const& extent)
+        : box(extent.box), stairs(Stairs::Of(extent.box)), hasPoint(extent.box.IsPoint()) {}
 
-  static Trapezium TrapeziumOf(Extent const& extent);
-  static Trapezium Around(Trapezium const* parts, std::size_t count);
+    /// Takes in the pieces that come right after its own.
+    void Append(Node const& next) {
+      stairs = Stairs::Join(stairs, box, next.stairs, next.box);
+      box.Include(next.box);
+      hasPoint = hasPoint || next.hasPoint;
+    }
 
-  /// Of a node whose box is not empty.
+    Box box;
+    Stairs stairs;
+    bool hasPoint;
+  };
+
+  static constexpr std::size_t kPiecesPerLeaf = kMostParts;
+
+  std::vector<Node> MakeLeaves() const;
+  static std::vector<Node> MakeParents(std::vector<Node> const& children);
+
+  /// Of a node whose box is not empty. Amortised O(1): each is formed once.
   Trapezium const& TrapeziumAt(Place const& place);
   Trapezium FormTrapezium(Place const& place);
 
-  bool AreApart(Place const& mine, BoxTree& other, Place const& theirs) {
-    if (BoxAt(mine).IsApartFrom(other.BoxAt(theirs))) return true;
-    // Next to each other on the chain means a common joint.
-    bool const areNeighbours =
-        this == &other && mine.level == theirs.level && mine.number + 1 == theirs.number;
-    if (areNeighbours) return false;
-    Trapezium const& a = TrapeziumAt(mine);
-    Trapezium const& b = other.TrapeziumAt(theirs);
-    return IsOutside(a, b) || IsOutside(b, a);
-  }
+  bool AreApart(Place const& mine, BoxTree& other, Place const& theirs);
 
-  /// Is the second one beyond a long side of the first?
-  bool IsOutside(Trapezium const& first, Trapezium const& second) const {
-    return IsBeyond(first.lower, second) || IsBeyond(first.upper, second);
-  }
-
-  bool IsBeyond(Trapezium::Side const& side, Trapezium const& t) const {
-    double const dx = side.to.x - side.from.x;
-    double const dy = side.to.y - side.from.y;
-    double const gap = margin_ * (std::fabs(dx) + std::fabs(dy));
-    auto const isBeyond = [&](Point const& p) {
-      return dy * (p.x - side.from.x) - dx * (p.y - side.from.y) > gap;
-    };
-    return isBeyond(t.lower.from) && isBeyond(t.lower.to) && isBeyond(t.upper.from) &&
-           isBeyond(t.upper.to);
-  }
-
-  Place Root() const { return {boxes_.size() - 1, 0}; }
-  Box const& BoxAt(Place const& place) const { return boxes_[place.level][place.number]; }
+  Place Root() const { return {levels_.size() - 1, 0}; }
+  Node const& NodeAt(Place const& place) const { return levels_[place.level][place.number]; }
   static Place FirstChild(Place const& place) { return {place.level - 1, 2 * place.number}; }
   bool HasSecondChild(Place const& place) const {
-    return 2 * place.number + 1 < boxes_[place.level - 1].size();
+    return 2 * place.number + 1 < levels_[place.level - 1].size();
   }
   static Place SecondChild(Place const& place) { return {place.level - 1, 2 * place.number + 1}; }
   static std::size_t FirstPiece(Place const& leaf) { return leaf.number * kPiecesPerLeaf; }
@@ -129,19 +95,21 @@ class BoxTree {
   }
 
   template <typename Test>
-  bool AnyPairWithin(Place const& place, Test const& test) {
-    if (place.level == 0) return AnyPairOfLeaf(place, test);
-    if (AnyPairWithin(FirstChild(place), test)) return true;
+  bool AnyPairWithin(Place const& place, Neighbours neighbours, Test const& test) {
+    if (neighbours == Neighbours::LeftOut && NodeAt(place).stairs.AreMonotone()) return false;
+    if (place.level == 0) return AnyPairOfLeaf(place, neighbours, test);
+    if (AnyPairWithin(FirstChild(place), neighbours, test)) return true;
     if (!HasSecondChild(place)) return false;
-    return AnyPairWithin(SecondChild(place), test) ||
+    return AnyPairWithin(SecondChild(place), neighbours, test) ||
            AnyPairBetween(FirstChild(place), *this, SecondChild(place), test);
   }
 
   template <typename Test>
-  bool AnyPairOfLeaf(Place const& leaf, Test const& test) const {
+  bool AnyPairOfLeaf(Place const& leaf, Neighbours neighbours, Test const& test) const {
+    std::size_t const leastStep = neighbours == Neighbours::LeftOut ? 2 : 1;
     std::size_t const end = EndOfPieces(leaf);
     for (std::size_t i = FirstPiece(leaf); i < end; ++i) {
-      for (std::size_t k = i + 1; k < end; ++k) {
+      for (std::size_t k = i + leastStep; k < end; ++k) {
         if (!extents_[i].box.IsApartFrom(extents_[k].box) && test(i, k)) return true;
       }
     }
@@ -184,24 +152,12 @@ class BoxTree {
 
   /// Writes the numbers of my pieces that are not apart from all of their leaf; returns their end.
   std::size_t* CollectNear(Place const& mine, BoxTree& other, Place const& theirs,
-                           std::size_t* near) const {
-    Box const& theirBox = other.BoxAt(theirs);
-    std::size_t* end = near;
-    for (std::size_t i = FirstPiece(mine); i < EndOfPieces(mine); ++i) {
-      if (!extents_[i].box.IsApartFrom(theirBox)) *end++ = i;
-    }
-    // Single pieces at a joint are not worth a trapezium.
-    constexpr std::ptrdiff_t kFew = 2;
-    if (end - near <= kFew) return end;
-    Trapezium const& trapezium = other.TrapeziumAt(theirs);
-    return std::remove_if(
-        near, end, [&](std::size_t i) { return IsOutside(trapezium, TrapeziumOf(extents_[i])); });
-  }
+                           std::size_t* near) const;
 
   std::vector<Extent> extents_;
   double margin_;
-  std::vector<std::vector<Box>> boxes_;  ///< by level and number
-  std::vector<std::vector<std::optional<Trapezium>>> trapezia_;
+  std::vector<std::vector<Node>> levels_;
+  std::vector<std::vector<std::optional<Trapezium>>> trapezia_;  ///< by level and number
 };
 
 }  // namespace Vorn::Contours

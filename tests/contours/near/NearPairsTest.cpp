@@ -5,8 +5,9 @@
 #include <map>
 #include <vector>
 
-#include "geometry/contours/SelfIntersectionSteps.h"
-#include "geometry/contours/near/PieceExtents.h"
+#include "geometry/contours/FlatSelfIntersection.h"
+#include "geometry/contours/SelfIntersection.h"
+#include "geometry/contours/near/NearPairs.h"
 #include "gtest/gtest.h"
 #include "support/Bits.h"
 #include "support/ContourBuilder.h"
@@ -28,11 +29,8 @@ constexpr std::size_t kAlwaysSearch = 0;
 constexpr std::size_t kNeverSearch = std::numeric_limits<std::size_t>::max();
 double const kPi = std::acos(-1.0);
 
-ArcSteps const kArcSteps{&GeometryUtils::GetLineSegmentAndCircleArcIntersection,
-                         &GeometryUtils::GetCircleArcAndCircleArcIntersection};
-
 ErrorCode CheckContour(Contour const& contour, std::size_t plainSize) {
-  return Contours::CheckContour(contour, {&GeometryUtils::GetNextIter, kArcSteps}, plainSize);
+  return Contours::CheckContour(contour, plainSize);
 }
 
 class ContourComparison {
@@ -375,24 +373,12 @@ int AnswerOf(ErrorCode code, bool isCrossing) {
                                              : static_cast<int>(code);
 }
 
-std::vector<Contours::FlatRun> RunsOf(std::vector<std::int32_t> const& indices) {
-  std::vector<Contours::FlatRun> runs;
-  std::int64_t begin = 0;
-  for (std::int32_t const entry : indices) {
-    std::int64_t const end = std::abs(std::int64_t{entry});
-    runs.push_back({entry < 1 ? 1 : 0, entry < 1 ? 8 : 2, begin, end});
-    begin = end;
-  }
-  return runs;
-}
-
 class FlatComparison {
  public:
   void Compare(std::vector<double> coords, std::vector<std::int32_t> const& indices) {
     int const expected = ReferenceFlatCheck(coords, indices).Answer();
     for (std::size_t const plainSize : {kAlwaysSearch, kNeverSearch}) {
-      auto const verdict =
-          Contours::CheckRuns(Flat::Data(coords), RunsOf(indices), kArcSteps, plainSize);
+      auto const verdict = Flat::CheckRuns(Flat::Data(coords), Flat::RunsOf(indices), plainSize);
       ASSERT_EQ(AnswerOf(verdict.code, verdict.isCrossing), expected);
     }
     bool found = false;
