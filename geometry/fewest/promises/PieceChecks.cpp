@@ -36,7 +36,11 @@ struct Station {
   double along = 0.0;
 };
 
-double Distance(Point const& p, Point const& q) { return std::hypot(p.x - q.x, p.y - q.y); }
+double Distance(Point const& p, Point const& q) {
+  double const dx = p.x - q.x;
+  double const dy = p.y - q.y;
+  return std::sqrt(dx * dx + dy * dy);
+}
 
 class PointChecks {
  public:
@@ -55,8 +59,10 @@ class PointChecks {
       WPoint const& p = coverage_.PointOf(number);
       Place const place = PlaceOf(drawn_, {p.x, p.y});
       TakeDistance(place, p, number, report);
-      TakeOrder(place.along, p.w, number);
-      if (hasLimits_) TakeStep({{p.x, p.y}, p.w, place.along}, number);
+      double const along = AlongInOrder(place, p);
+      TakeOrder(along, p.w, number);
+      if (hasLimits_) TakeStep({{p.x, p.y}, p.w, along}, number);
+      lastAlong_ = along;
     }
     if (hasLimits_) TakeStep({drawn_.end, 0.0, drawn_.length}, range.last);
     Add(outside_, Promise::WithinTolerance, report);
@@ -76,6 +82,16 @@ class PointChecks {
       report->largestRatio = shown;
       report->largestIndex = coverage_.IndexOf(number);
     }
+  }
+
+  /// A point in the gap of an almost full circle, within tolerance of both ends, is where the
+  /// points before it are.
+  double AlongInOrder(Place const& place, WPoint const& p) const {
+    if (!drawn_.isArc || Distance(drawn_.start, {p.x, p.y}) > p.w ||
+        Distance(drawn_.end, {p.x, p.y}) > p.w) {
+      return place.along;
+    }
+    return 2.0 * lastAlong_ > drawn_.length ? drawn_.length : 0.0;
   }
 
   /// The farthest that an earlier point reaches, less its own allowance, is compared with the
@@ -116,6 +132,7 @@ class PointChecks {
   DrawnPiece drawn_;
   bool hasLimits_;
   Station last_;
+  double lastAlong_ = 0.0;
   double farthest_ = -std::numeric_limits<double>::infinity();
   Worst outside_;
   Worst back_;

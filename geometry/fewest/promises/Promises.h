@@ -39,7 +39,9 @@ enum class Promise {
   /// measured to that end. Decided exactly.
   WithinTolerance,
   /// No point lies farther back along its piece than an earlier one by more than
-  /// kNoiseStepBack times the sum of the two tolerances.
+  /// kNoiseStepBack times the sum of the two tolerances. A point within tolerance of both ends of
+  /// an
+  /// arc counts at the one where the points before it are.
   InOrder,
   /// Neighbours on one arc, its joints counted in, are at most the largest step apart, unless they
   /// are no farther apart than their tolerances.

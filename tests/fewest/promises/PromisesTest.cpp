@@ -266,6 +266,18 @@ TEST(MeasurePromises, OrderAlongAnArcIsAlongItsLength) {
   EXPECT_TRUE(BrokenIn(c).empty());
 }
 
+TEST(MeasurePromises, APointInTheGapOfAnAlmostFullCircleIsWhereThePathIs) {
+  // The last point repeats the first, which is nearer to the start of the arc.
+  Point const end{std::sqrt(25 - 1e-4), -0.01};
+  Case c{Points({{5, 0.001}, {0, 5}, {-5, 0}, {0, -5}, {5, 0.001}}, 0.0125),
+         ContourBuilder(5, 0).Around({0, 0}, end.x, end.y, 1).Build(), RangesUpTo({4})};
+  c.largestStep = 2.0;
+  EXPECT_TRUE(BrokenIn(c).empty());
+  c.points.push_back({0, 5, 0.0125});
+  c.ranges = RangesUpTo({5});
+  EXPECT_EQ(BrokenIn(c), (std::vector<Promise>{Promise::InOrder, Promise::SmallSteps}));
+}
+
 // --- Steps ---------------------------------------------------------------------------------------
 
 TEST(MeasurePromises, NeighboursOnAnArcAreAtMostTheStepApart) {

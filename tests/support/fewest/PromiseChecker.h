@@ -63,6 +63,9 @@ Vec ToVec(AnyPoint const& p) {
   return {static_cast<Real>(p.x), static_cast<Real>(p.y)};
 }
 
+/// Enough to see what is wrong.
+constexpr std::size_t kMostComplaints = 12;
+
 inline Real const kPi = std::acos(Real{-1});
 
 /// A piece with its own way of telling places: by angle about the centre, or along the segment.
@@ -183,6 +186,7 @@ class Run {
 
   template <typename... Parts>
   void Complain(Parts const&... parts) {
+    if (result_.complaints.size() == kMostComplaints) return;
     std::ostringstream text;
     text.precision(17);
     (text << ... << parts);
@@ -215,6 +219,7 @@ class Run {
   void CheckPoints(std::size_t k) {
     Piece const& piece = pieces_[k];
     Real reach = -std::numeric_limits<Real>::infinity();
+    Real last = 0;
     for (std::size_t i = spans_[k].first; i <= spans_[k].second; ++i) {
       Real const w = ToleranceAt(i);
       Real const ratio = piece.Distance(PointAt(i)) / w;
@@ -225,7 +230,8 @@ class Run {
       // Extended precision itself rounds where the centre is far away.
       Real const allowed = 1 + kSlack + 1e-18L * piece.Magnitude() / w;
       if (ratio > allowed) Complain("point ", i % Count(), " is ", ratio, " off piece ", k);
-      Real const along = piece.Along(PointAt(i));
+      Real const along = AlongAfter(piece, last, i);
+      last = along;
       if (reach - along > 1.65L * w * (1 + kSlack)) {
         Complain("point ", i % Count(), " steps back on piece ", k, " by ", reach - along);
       }
@@ -234,12 +240,24 @@ class Run {
     if (piece.isArc && std::isfinite(chain_.largestStep)) CheckSteps(k);
   }
 
+  /// A point may be taken for any place of the piece within its tolerance. Where both ends are,
+  /// that of the two is right which is nearer to the point before.
+  Real AlongAfter(Piece const& piece, Real last, std::size_t i) const {
+    Vec const p = PointAt(i);
+    bool const isAtBothEnds = Norm(p - piece.start) <= ToleranceAt(i) * (1 + kSlack) &&
+                              Norm(p - piece.end) <= ToleranceAt(i) * (1 + kSlack);
+    if (!piece.isArc || !isAtBothEnds) return piece.Along(p);
+    return last < piece.Length() - last ? 0 : piece.Length();
+  }
+
   void CheckSteps(std::size_t k) {
     Piece const& piece = pieces_[k];
     Vec last = piece.start;
+    Real lastAlong = 0;
     Real lastTolerance = 0;
-    auto const step = [&](Vec p, Real w, std::size_t i) {
-      Real const angle = std::fabs(piece.Along(p) - piece.Along(last)) / piece.radius;
+    auto const step = [&](Vec p, Real along, Real w, std::size_t i) {
+      Real const angle = std::fabs(along - lastAlong) / piece.radius;
+      lastAlong = along;
       bool const isFar = Norm(p - last) > w + lastTolerance;
       if (isFar && angle > static_cast<Real>(chain_.largestStep) + kSlack) {
         Complain("a step of ", angle, " to point ", i % Count(), " on piece ", k);
@@ -248,9 +266,9 @@ class Run {
       lastTolerance = w;
     };
     for (std::size_t i = spans_[k].first; i <= spans_[k].second; ++i) {
-      step(PointAt(i), ToleranceAt(i), i);
+      step(PointAt(i), AlongAfter(piece, lastAlong, i), ToleranceAt(i), i);
     }
-    step(piece.end, 0, spans_[k].second);
+    step(piece.end, piece.Length(), 0, spans_[k].second);
   }
 
   void CheckArc(std::size_t k) {
