@@ -4,12 +4,14 @@
 // standard library differ between implementations, and the numbers are cut to five decimals, far
 // above the last-bit differences of sin and cos. So the files are the same everywhere.
 
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <cstdio>
 #include <fstream>
 #include <functional>
 #include <iostream>
+#include <iterator>
 #include <numbers>
 #include <random>
 #include <string>
@@ -220,7 +222,7 @@ std::vector<Stretch> HalfTooth() {
 std::vector<Vec> GearTooth() {
   std::vector<Stretch> const half = HalfTooth();
   std::vector<Stretch> path;
-  for (auto it = half.rbegin(); it != half.rend(); ++it) path.push_back(Mirrored(*it));
+  std::transform(half.rbegin(), half.rend(), std::back_inserter(path), Mirrored);
   path.insert(path.end(), half.begin(), half.end());
   return Sample(path, 0.12);
 }

@@ -52,8 +52,8 @@ class VORN_EXPORT Matrix {
   /// @param[in] other the matrix to copy
   Matrix(Matrix const& other) = default;
 
-  /// Nothing to release.
-  ~Matrix();
+  /// Nothing to release; exported, so it stays out of the header.
+  ~Matrix();  // NOLINT(performance-trivially-destructible)
 
   /// Copies the nine elements; assigning a matrix to itself changes nothing.
   /// @param[in] other the matrix to copy
