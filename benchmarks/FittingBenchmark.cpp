@@ -4,7 +4,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <functional>
 #include <memory>
 #include <optional>
 #include <string>
@@ -15,6 +14,7 @@
 #include "benchmarks/MeasuredContours.h"
 #include "benchmarks/Profiles.h"
 #include "benchmarks/Registration.h"
+#include "benchmarks/Subjects.h"
 #include "support/ReferenceFitting.h"
 
 namespace Vorn::Benchmarks {
@@ -71,26 +71,6 @@ bool AreSame(Fit const& a, Fit const& b) {
          std::equal(a.contour.begin(), a.contour.end(), b.contour.begin(), b.contour.end(),
                     [](Elem const& p, Elem const& q) { return AreSame(p, q); });
 }
-
-/// One profile of one size; made when first asked for, since most of them are large.
-class Subject {
- public:
-  explicit Subject(std::function<Profile()> make) : make_(std::move(make)) {}
-
-  Profile const& Get() {
-    if (!profile_) profile_ = make_();
-    return *profile_;
-  }
-
- private:
-  std::function<Profile()> make_;
-  std::optional<Profile> profile_;
-};
-
-struct SubjectOfSize {
-  std::int64_t size;
-  std::shared_ptr<Subject> subject;
-};
 
 /// What the fit answers and needs. The first run finds it; it is the only one when a run is long.
 struct Outcome {
@@ -183,24 +163,9 @@ double SecondsForPlain(Scale scale) { return scale == Scale::Quick ? 1.0 : 60.0;
 
 constexpr std::int64_t kLargestPlainSize = 1000;
 
-struct Maker {
-  char const* name;
-  Profile (*make)(std::int64_t count, bool isNoisy);
-  bool isNoisy;
-};
-
-constexpr Maker kMakers[] = {
-    {"line", MakeLine, false},    {"line_noisy", MakeLine, true}, {"arc", MakeArc, false},
-    {"arc_noisy", MakeArc, true}, {"mixed", MakeMixed, false},    {"mixed_noisy", MakeMixed, true},
-};
-
 void RegisterMadeProfiles(Scale scale) {
   for (Maker const& maker : kMakers) {
-    std::vector<SubjectOfSize> subjects;
-    for (std::int64_t const size : SizesFor(scale)) {
-      subjects.push_back(
-          {size, std::make_shared<Subject>([=] { return maker.make(size, maker.isNoisy); })});
-    }
+    std::vector<SubjectOfSize> const subjects = SubjectsOf(maker, SizesFor(scale));
     for (NamedStrategy const& strategy : kStrategies) {
       auto const budget = std::make_shared<TimeBudget>(SecondsForLibrary(scale));
       auto const plainBudget = std::make_shared<TimeBudget>(SecondsForPlain(scale));
