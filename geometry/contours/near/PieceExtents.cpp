@@ -48,6 +48,7 @@ constexpr double kSideError = 2.0 * kCrossProductError;
 // sqrt(2) * 24 < 34 u M is enough. It does not hold for segments that are points: BoxTree tells
 // those apart by boxes only.
 constexpr double kSegmentDistance = 34.0;
+static_assert(kSegmentDistance * kSegmentDistance > 2.0 * kSideError * kSideError);
 
 // The computed trapezia, M being the largest coordinate plus the largest radius, so that no point
 // is farther than sqrt(2) M from the origin. One level of the tree adds, in u times that distance:
@@ -72,18 +73,22 @@ static_assert(2.0 * kMostLevels * kTrapeziumError + kCrossProductError + kSegmen
 // A common point of two circles is at q along and h across the line of centres. Seen from the
 // bigger circle the squares of q and h are wrong by 11 u R^2 each; seen from the smaller one the
 // numerator of q adds 3 R^2 + 9 d^2 + 3 rho^2 and its quotient 8 d R. Together 45 u D^2.
-//
+constexpr double kCircleCutError = 45.0;
+
 // A half chord h that counts as tangency is dropped; then the squared distance from the smaller
 // circle is wrong by 2 d h^2 / (2 R) <= 2 h^2.
 constexpr double kSquareError = 128.0;
 constexpr double kSquaredTangencies = 8.0;
-static_assert(2.0 * 45.0 < kSquareError && 2.0 < kSquaredTangencies);
+static_assert(2.0 * kCircleCutError < kSquareError && 2.0 < kSquaredTangencies);
 
-// The point itself, in u: 7 D for x1 + t dx, 12 D for the point of two circles. It counts by its
-// angle, which is wrong by 2 for the differences and 8 for atan2; the ends of the box by 8 for
-// cosine or sine, product and sum.
+// The point itself is rounded by 7 u D where it is x1 + t dx and by 12 u D where two circles cut.
+// It counts by its angle, which is wrong by 2 u for the differences and 8 u for atan2. The ends of
+// the box lie where cosine or sine, product and sum put them: 8 u.
+constexpr double kPlaceError = 12.0;
+constexpr double kAngleError = 2.0 + 8.0;
+constexpr double kEndError = 8.0;
 constexpr double kPointError = 128.0;
-static_assert(12.0 + 2.0 + 8.0 + 8.0 < kPointError);
+static_assert(kPlaceError + kAngleError + kEndError < kPointError);
 
 /// Magnitudes whose fourth powers neither overflow nor vanish.
 constexpr double kSmallestRegular = 0x1p-200;

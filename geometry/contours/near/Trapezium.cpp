@@ -59,12 +59,10 @@ Frame FrameAlongTheLongest(Trapezium const* parts, std::size_t count) {
 
 double WidthOf(Trapezium::Side const& side) { return std::fabs(side.to.x - side.from.x); }
 
-double LargestWidth(Trapezium const* begin, Trapezium const* end) {
-  double width = 0.0;
-  for (Trapezium const* part = begin; part != end; ++part) {
-    width = std::max(width, WidthOf(part->lower));
-  }
-  return width;
+Trapezium const* WidestOf(Trapezium const* begin, Trapezium const* end) {
+  return std::max_element(begin, end, [](Trapezium const& a, Trapezium const& b) {
+    return WidthOf(a.lower) < WidthOf(b.lower);
+  });
 }
 
 double DoubleHeight(Trapezium::Side const& side) { return side.from.y + side.to.y; }
@@ -109,19 +107,17 @@ class Outline {
 /// The outermost of the long parts, whose slopes the bounds take. Short parts are not asked: their
 /// slopes would carry far beyond them.
 struct Outermost {
-  Trapezium const* lowest = nullptr;
-  Trapezium const* highest = nullptr;
+  Trapezium const* lowest;
+  Trapezium const* highest;
 
-  Outermost(Trapezium const* begin, Trapezium const* end) {
-    double const leastWidth = 0.5 * LargestWidth(begin, end);
+  /// Of at least one part.
+  Outermost(Trapezium const* begin, Trapezium const* end)
+      : lowest(WidestOf(begin, end)), highest(lowest) {
+    double const leastWidth = 0.5 * WidthOf(lowest->lower);
     for (Trapezium const* part = begin; part != end; ++part) {
       if (WidthOf(part->lower) < leastWidth) continue;
-      if (lowest == nullptr || DoubleHeight(part->lower) < DoubleHeight(lowest->lower)) {
-        lowest = part;
-      }
-      if (highest == nullptr || DoubleHeight(part->upper) > DoubleHeight(highest->upper)) {
-        highest = part;
-      }
+      if (DoubleHeight(part->lower) < DoubleHeight(lowest->lower)) lowest = part;
+      if (DoubleHeight(part->upper) > DoubleHeight(highest->upper)) highest = part;
     }
   }
 };
