@@ -1,5 +1,5 @@
-// Elementary intersections of random pairs. Each repetition answers a whole batch of them, so the
-// branches cannot be learnt from one pair.
+// Elementary intersections of random pairs. Each repetition answers a whole batch of them, so that
+// the processor cannot predict the branches from one pair.
 
 #include <benchmark/benchmark.h>
 

@@ -9,6 +9,7 @@
 
 namespace Vorn::Benchmarks {
 
+/// A kind of outline that does not cross itself.
 struct OutlineCase {
   char const* name;
   std::vector<GeometryUtils::Elem> (*make)(std::int64_t count, bool hasArcs);
@@ -21,6 +22,7 @@ constexpr OutlineCase kOutlineCases[] = {
     {"teeth_arcs", MakeTeeth, true}, {"needles_arcs", MakeNeedles, true},
 };
 
+/// The name of a benchmark: function, outline and number of pieces.
 inline std::string NameOf(char const* function, OutlineCase const& outline, std::int64_t size) {
   return std::string(function) + '/' + outline.name + '/' + std::to_string(size);
 }
@@ -34,6 +36,7 @@ inline std::vector<GeometryUtils::Point> VerticesOf(OutlineCase const& outline,
   return vertices;
 }
 
+/// How long a series of sizes may take.
 inline double SecondsForOutlines(Scale scale) { return scale == Scale::Quick ? 0.5 : 10.0; }
 
 }  // namespace Vorn::Benchmarks

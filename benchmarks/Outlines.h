@@ -18,14 +18,17 @@ class OutlineBuilder {
 
   explicit OutlineBuilder(Point const& start) { To(start); }
 
+  /// Appends a segment.
   void To(Point const& end) { GeometryUtils::AddSegm(&contour_, end); }
 
+  /// Appends an arc about a centre.
   void Around(Point const& center, Point const& end, bool clockwise) {
     Point const start = contour_.back().end;
     double const radius = std::hypot(start.x - center.x, start.y - center.y);
     GeometryUtils::AddArc(&contour_, start, end, center, radius, clockwise);
   }
 
+  /// Appends a segment back to the start and hands the contour out.
   std::vector<GeometryUtils::Elem> Close() {
     To(contour_.front().end);
     return std::move(contour_);
@@ -101,6 +104,7 @@ inline std::vector<GeometryUtils::Elem> MakeComb(std::int64_t count, bool hasArc
   return outline.Close();
 }
 
+/// Upright teeth of up to two units, one beside the other.
 inline std::vector<GeometryUtils::Elem> MakeTeeth(std::int64_t count, bool hasArcs) {
   return MakeComb(count, hasArcs, {2.0, 0.0});
 }
