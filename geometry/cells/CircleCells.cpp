@@ -16,20 +16,21 @@ namespace {
 using Elementary::Circle;
 
 /// Which of the eight candidate points an extreme circle passes through.
-enum Candidate {
-  kFirstInner,
-  kFirstOuter,
-  kMiddleInner,
-  kMiddleOuter,
-  kLastInner,
-  kLastOuter,
-  kFirst,
-  kLast,
-  kCandidates
+enum Candidate : std::size_t {
+  FirstInner,
+  FirstOuter,
+  MiddleInner,
+  MiddleOuter,
+  LastInner,
+  LastOuter,
+  First,
+  Last
 };
 
-using Candidates = std::array<Point, kCandidates>;
+/// Every candidate point.
+using Candidates = std::array<Point, 8>;
 
+/// The points that one extreme circle passes through.
 struct Row {
   Candidate start;
   Candidate middle;
@@ -39,21 +40,21 @@ struct Row {
 // Consecutive rows differ in one choice only, so the centres come out in cyclic order. All inner
 // and all outer are never extreme.
 constexpr Row kBothFree[] = {
-    {kFirstInner, kMiddleInner, kLastOuter}, {kFirstInner, kMiddleOuter, kLastOuter},
-    {kFirstInner, kMiddleOuter, kLastInner}, {kFirstOuter, kMiddleOuter, kLastInner},
-    {kFirstOuter, kMiddleInner, kLastInner}, {kFirstOuter, kMiddleInner, kLastOuter}};
-constexpr Row kFirstFixed[] = {{kFirst, kMiddleInner, kLastOuter},
-                               {kFirst, kMiddleOuter, kLastOuter},
-                               {kFirst, kMiddleOuter, kLastInner},
-                               {kFirst, kMiddleInner, kLastInner}};
-constexpr Row kLastFixed[] = {{kFirstInner, kMiddleInner, kLast},
-                              {kFirstInner, kMiddleOuter, kLast},
-                              {kFirstOuter, kMiddleOuter, kLast},
-                              {kFirstOuter, kMiddleInner, kLast}};
+    {FirstInner, MiddleInner, LastOuter}, {FirstInner, MiddleOuter, LastOuter},
+    {FirstInner, MiddleOuter, LastInner}, {FirstOuter, MiddleOuter, LastInner},
+    {FirstOuter, MiddleInner, LastInner}, {FirstOuter, MiddleInner, LastOuter}};
+constexpr Row kFirstFixed[] = {{First, MiddleInner, LastOuter},
+                               {First, MiddleOuter, LastOuter},
+                               {First, MiddleOuter, LastInner},
+                               {First, MiddleInner, LastInner}};
+constexpr Row kLastFixed[] = {{FirstInner, MiddleInner, Last},
+                              {FirstInner, MiddleOuter, Last},
+                              {FirstOuter, MiddleOuter, Last},
+                              {FirstOuter, MiddleInner, Last}};
 // Deliberate: the last row repeats the one before it. The centres of circles through both ends lie
 // on one line, and a polygon needs three corners.
 constexpr Row kBothFixed[] = {
-    {kFirst, kMiddleInner, kLast}, {kFirst, kMiddleOuter, kLast}, {kFirst, kMiddleOuter, kLast}};
+    {First, MiddleInner, Last}, {First, MiddleOuter, Last}, {First, MiddleOuter, Last}};
 
 std::span<Row const> RowsFor(ArcTriple const& triple) {
   if (triple.firstFixed && triple.lastFixed) return kBothFixed;
@@ -89,8 +90,8 @@ Candidates CandidatesOf(ArcTriple const& triple, Circle const& circle) {
     candidates[2 * i] = MovedAlongRadius(p, circle, circle.radius - p.w);
     candidates[2 * i + 1] = MovedAlongRadius(p, circle, circle.radius + p.w);
   }
-  candidates[kFirst] = {triple.first.x, triple.first.y};
-  candidates[kLast] = {triple.last.x, triple.last.y};
+  candidates[First] = {triple.first.x, triple.first.y};
+  candidates[Last] = {triple.last.x, triple.last.y};
   return candidates;
 }
 

@@ -41,6 +41,7 @@ inline bool AreApart(double p1, double p2, double p3, double p4) {
 /// Two segments (x1, y1)-(x2, y2) and (x3, y3)-(x4, y4) and the differences that every step of
 /// their intersection uses: d1 = P2 - P1 and d2 = P3 - P4, reversed, as the scheme wants it.
 struct SegmentPair {
+  /// The pair of two segments.
   SegmentPair(Segment const& first, Segment const& second)
       : x1(first.start.x),
         y1(first.start.y),

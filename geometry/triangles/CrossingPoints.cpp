@@ -166,7 +166,7 @@ void FindCrossingPoints(Triangle const& first, Triangle const& second, SidePairs
       if ((ofSide >> j & 1U) != 0) TakeCommonPoints(first, i, second, j, &onSide);
     }
     onSide.Finish();
-    if (points->size() - begin >= 3) KeepFarthestTwo(first.pts[i], i, begin, points);
+    if (points->size() - begin > kKeptOnSide) KeepFarthestTwo(first.pts[i], i, begin, points);
   }
 }
 

@@ -16,9 +16,14 @@ namespace Vorn::Triangles {
 
 using CrossingPoint = GeometryUtils::CrossingPoint;
 
-/// On one side at most three crossings and three shared stretches of two ends each are found, of
-/// which two stay.
-using CrossingPoints = InlineVector<CrossingPoint, 12>;
+/// How many points stay on a side of the first triangle.
+inline constexpr std::size_t kKeptOnSide = 2;
+
+/// How many points are found on a side: the ends of the stretches shared with three others.
+inline constexpr std::size_t kMostOnSide = 3 * 2;
+
+/// Crossing points, with room for two sides done and one that is being searched.
+using CrossingPoints = InlineVector<CrossingPoint, 2 * kKeptOnSide + kMostOnSide>;
 
 /// A set of pairs of sides: bit 3 i + j stands for side i of the first triangle and side j of the
 /// second.

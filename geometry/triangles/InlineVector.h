@@ -43,18 +43,22 @@ class InlineVector {
 
   /// The value at a position, which must hold one.
   T& operator[](std::size_t i) { return items_[i]; }
+  /// As above.
   T const& operator[](std::size_t i) const { return items_[i]; }
 
   /// The first value; the others follow it.
   T* data() { return items_; }
+  /// As above.
   T const* data() const { return items_; }
 
-  /// Where the values begin and end.
+  /// The first value.
   T const* begin() const { return items_; }
+  /// Behind the last value.
   T const* end() const { return items_ + size_; }
 
  private:
   union {
+    // NOLINTNEXTLINE(readability-identifier-naming): a private member of the class
     T items_[kCapacity];
   };
   std::size_t size_ = 0;

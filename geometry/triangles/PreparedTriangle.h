@@ -11,6 +11,7 @@ using PointStatus = GeometryUtils::PointStatus;
 
 /// A triangle with what every overlap asks of it.
 struct PreparedTriangle {
+  /// Prepares a triangle.
   explicit PreparedTriangle(Triangle const& from);
 
   /// Whether the boxes have no point in common. False when a coordinate is not a number.

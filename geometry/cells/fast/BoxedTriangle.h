@@ -11,6 +11,7 @@ using Triangles::Triangle;
 
 /// A triangle with its box.
 struct BoxedTriangle {
+  /// The triangle and its box.
   explicit BoxedTriangle(Triangle const& from) : triangle(from), box(Triangles::BoxOf(from)) {}
 
   /// Whether a point is beyond the box. False when a coordinate is not a number.

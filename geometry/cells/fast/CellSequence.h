@@ -90,7 +90,9 @@ class CellSequence {
   std::vector<Triangle> Expand() const;
 
  private:
+  /// The level that the cell is at; there must be one.
   CellLevel const& Last() const { return levels_[depth_ - 1]; }
+  /// The levels up to that one.
   std::span<CellLevel const> Levels() const { return {levels_.data(), depth_}; }
 
   /// The words of all levels, with room for one more.

@@ -15,7 +15,10 @@ namespace Vorn::Cells {
 /// Whether all bits of two triangles are equal: a zero and a negative zero are not. Only such
 /// triangles share a letter.
 inline bool AreIdentical(Triangle const& a, Triangle const& b) {
-  return std::memcmp(&a, &b, sizeof(Triangle)) == 0;
+  // Bits are meant, and a triangle is six doubles without padding.
+  static_assert(sizeof(Triangle) == 6 * sizeof(double));
+  return std::memcmp(&a, &b, sizeof(Triangle)) ==
+         0;  // NOLINT(bugprone-suspicious-memory-comparison)
 }
 
 /// Finds letters by triangle. The triangles themselves stand in a vector that the caller keeps,

@@ -16,14 +16,18 @@ namespace Vorn::Cells {
 struct PlainBits {
   std::int64_t lanes[2];
 
+  /// The bits of a lane.
   std::int64_t operator[](int lane) const { return lanes[lane]; }
 
+  /// The bits that both have, lane by lane.
   friend PlainBits operator&(PlainBits const& a, PlainBits const& b) {
     return {{a[0] & b[0], a[1] & b[1]}};
   }
+  /// The bits that one of them has, lane by lane.
   friend PlainBits operator|(PlainBits const& a, PlainBits const& b) {
     return {{a[0] | b[0], a[1] | b[1]}};
   }
+  /// The bits moved up, lane by lane.
   friend PlainBits operator<<(PlainBits const& a, int count) {
     return {{a[0] << count, a[1] << count}};
   }
@@ -34,22 +38,30 @@ struct PlainBits {
 struct PlainPair {
   double lanes[2];
 
+  /// The value of a lane.
   double operator[](int lane) const { return lanes[lane]; }
+  /// The value of a lane, to be written.
   double& operator[](int lane) { return lanes[lane]; }
 
+  /// The differences, lane by lane.
   friend PlainPair operator-(PlainPair const& a, PlainPair const& b) {
     return {{a[0] - b[0], a[1] - b[1]}};
   }
+  /// The differences of a number and each lane.
   friend PlainPair operator-(double a, PlainPair const& b) { return {{a - b[0], a - b[1]}}; }
+  /// The products, lane by lane.
   friend PlainPair operator*(PlainPair const& a, PlainPair const& b) {
     return {{a[0] * b[0], a[1] * b[1]}};
   }
+  /// The lanes above a number.
   friend PlainBits operator>(PlainPair const& a, double b) {
     return {{-std::int64_t{a[0] > b}, -std::int64_t{a[1] > b}}};
   }
+  /// The lanes below a number.
   friend PlainBits operator>(double a, PlainPair const& b) {
     return {{-std::int64_t{a > b[0]}, -std::int64_t{a > b[1]}}};
   }
+  /// The lanes not above a number.
   friend PlainBits operator<=(PlainPair const& a, double b) {
     return {{-std::int64_t{a[0] <= b}, -std::int64_t{a[1] <= b}}};
   }

@@ -98,18 +98,24 @@ double SequenceSum::Sum(std::vector<double> const& terms, std::vector<bool> cons
   return sum_;
 }
 
+double SequenceSum::TotalOf(Place const& place) const {
+  auto const& [level, letter] = place;
+  double total = 0.0;
+  for (Letter const next : levels_[level]->Of(letter)) {
+    if (!IsLast(level)) {
+      total += totals_[level + 1][next];
+    } else if (!(*isSkipped_)[next]) {
+      total += (*terms_)[next];
+    }
+  }
+  return total;
+}
+
 void SequenceSum::FindTotals() {
   for (std::size_t level = levels_.size(); level-- > 0;) {
-    for (Letter letter = 0; letter < totals_[level].size(); ++letter) {
-      double total = 0.0;
-      for (Letter const next : levels_[level]->Of(letter)) {
-        if (!IsLast(level)) {
-          total += totals_[level + 1][next];
-        } else if (!(*isSkipped_)[next]) {
-          total += (*terms_)[next];
-        }
-      }
-      totals_[level][letter] = total;
+    std::vector<double>& totals = totals_[level];
+    for (Letter letter = 0; letter < totals.size(); ++letter) {
+      totals[letter] = TotalOf({level, letter});
     }
   }
 }

@@ -70,6 +70,9 @@ class SequenceSum {
   /// Fills lengths_ and costs_ of one level from those of the next.
   void MeasureLevel(std::size_t level);
 
+  /// The sum of the expansion of a letter by that of the next level, which must be in totals_.
+  double TotalOf(Place const& place) const;
+
   /// Fills totals_.
   void FindTotals();
 
@@ -92,6 +95,7 @@ class SequenceSum {
   /// The path of a single step.
   static Path Step(std::int64_t units);
 
+  /// Whether the letters of a level are replaced by terms.
   bool IsLast(std::size_t level) const { return level + 1 == levels_.size(); }
 
   std::vector<Words const*> levels_;

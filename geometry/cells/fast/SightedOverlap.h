@@ -9,6 +9,9 @@
 
 namespace Vorn::Cells {
 
+/// The bits of the three vertices of a triangle.
+inline constexpr unsigned kAllVertices = 0x7;
+
 /// What is known beforehand of two triangles.
 struct Sight {
   /// Bit v: vertex v of the first triangle is inside the second one, otherwise outside.
@@ -19,7 +22,7 @@ struct Sight {
   Triangles::SidePairs mayCross = 0;
 
   /// Whether every vertex of the second triangle is outside the first one.
-  bool IsSecondOutside() const { return outside == 7U; }
+  bool IsSecondOutside() const { return outside == kAllVertices; }
 
   /// Whether one side of the second triangle cuts off one or two vertices of the first, and there
   /// is nothing else to it.
