@@ -50,7 +50,19 @@ OwnPath::OwnPath(Coverage const& coverage)
   }
 }
 
+/// Do the first and the last point of an open path, but not all of its points, lie within their
+/// tolerances of p?
+bool OwnPath::IsWhereThePathCloses(Point const& p) const {
+  auto const isWithin = [&p](WPoint const& other) {
+    return std::hypot(other.x - p.x, other.y - p.y) <= other.w;
+  };
+  std::vector<WPoint> const& points = coverage_.GetChain().points;
+  return !coverage_.IsClosed() && isWithin(points.front()) && isWithin(points.back()) &&
+         !std::all_of(points.begin(), points.end(), isWithin);
+}
+
 bool OwnPath::Crosses(std::size_t first, std::size_t second, Meeting const& meeting) {
+  if (IsWhereThePathCloses(meeting.at)) return true;
   Passage const ofFirst = Follow(first, meeting.alongFirst, second);
   if (ofFirst.IsJoined() || ofFirst.StaysOnOneSide()) return false;
   Passage const ofSecond = Follow(second, meeting.alongSecond, first);
@@ -60,8 +72,9 @@ bool OwnPath::Crosses(std::size_t first, std::size_t second, Meeting const& meet
 
 OwnPath::Passage OwnPath::Follow(std::size_t piece, double along, std::size_t other) {
   std::int64_t const beyond = FirstNumberBeyond(piece, along);
-  Strand back{beyond, -1, piece, other};
-  Strand forth{beyond - 1, 1, piece, other};
+  DrawnPiece const drawnOther = coverage_.Drawn(other);
+  Strand back{beyond, -1, piece, other, drawnOther};
+  Strand forth{beyond - 1, 1, piece, other, drawnOther};
   Side const before = FollowOneWay(&back);
   Side const after = before == Side::Joined ? Side::Joined : FollowOneWay(&forth);
   return {back.number, forth.number, before, after};
@@ -120,18 +133,20 @@ bool OwnPath::StepOn(Strand* strand) const {
 /// False when this leads to the piece that covers p itself: the strands run into each other.
 bool OwnPath::MoveToNearest(Strand* strand, Point const& p, Place* place) const {
   if (strand->other == strand->piece) return false;
-  *place = PlaceOf(coverage_.Drawn(strand->other), p);
+  *place = PlaceOf(strand->drawnOther, p);
   for (int moves = 0; moves < 2 && place->beside != Beside::Piece; ++moves) {
     bool const isForward = place->beside == Beside::End;
     std::size_t const neighbour =
         isForward ? coverage_.Next(strand->other) : coverage_.Previous(strand->other);
     if (neighbour == kNone) return true;
     if (neighbour == strand->piece) return false;
-    Place const there = PlaceOf(coverage_.Drawn(neighbour), p);
+    DrawnPiece const drawnNeighbour = coverage_.Drawn(neighbour);
+    Place const there = PlaceOf(drawnNeighbour, p);
     bool const isNearer =
         isForward ? there.distance <= place->distance : there.distance < place->distance;
     if (!isNearer) return true;
     strand->other = neighbour;
+    strand->drawnOther = drawnNeighbour;
     *place = there;
   }
   return true;

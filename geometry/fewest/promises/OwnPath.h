@@ -29,6 +29,7 @@ class OwnPath {
     std::int64_t step;  ///< +1 or -1
     std::size_t piece;  ///< that covers the point
     std::size_t other;
+    DrawnPiece drawnOther;
   };
 
   /// The points of a strand up to where it comes apart from the other, and the sides there.
@@ -44,6 +45,7 @@ class OwnPath {
     }
   };
 
+  bool IsWhereThePathCloses(GeometryUtils::Point const& p) const;
   Passage Follow(std::size_t piece, double along, std::size_t other);
   Side FollowOneWay(Strand* strand);
   bool StepOn(Strand* strand) const;

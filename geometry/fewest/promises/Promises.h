@@ -62,7 +62,9 @@ enum class Promise {
   /// crossing is the path's own
   /// - when they come apart on opposite sides, or
   /// - when the path ends before they come apart, and the straight lines through the points of the
-  ///   two strands meet.
+  ///   two strands meet, or
+  /// - when an open path begins and ends there: X is within tolerance of its first and last point,
+  ///   though not of all points.
   /// It is not when they come apart on one side, or never do before the strands run into each
   /// other, as at a loop beside a joint. Pieces that fold back on each other without passing to the
   /// other side do not cross. Pieces that are nearer than rounding count as touching.

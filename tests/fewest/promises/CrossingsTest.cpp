@@ -116,6 +116,38 @@ TEST(CheckCrossings, ALapOverAnEarlierOneMayBeFollowed) {
   EXPECT_TRUE(CrossingsOf(c).empty());
 }
 
+TEST(CheckCrossings, AnOpenContourMayEndWhereItBegins) {
+  Case c = AlongCorners({{0, 0}, {10, 0}, {10, 10}, {0, 10}, {0, 0}}, 4, 0.25);
+  EXPECT_TRUE(CrossingsOf(c).empty());
+  // The last side pokes through the first one, once by less than the tolerance.
+  c.contour.back().end = {0.1, -0.1};
+  EXPECT_TRUE(CrossingsOf(c).empty());
+  c.points.back() = {0, 0.5, 0.25};
+  EXPECT_EQ(CrossingsOf(c), Pair(0, 3));
+}
+
+TEST(CheckCrossings, LapsOnOneCircleAreFollowedInTimeThatTheirNumberAllows) {
+  // Three arcs of the same circle, twice around, dense.
+  Case c;
+  std::int32_t const count = 60000;
+  RandomGeometry random(4202);
+  for (std::int32_t i = 0; i < count; ++i) {
+    double const t = 4 * std::numbers::pi * i / (count - 1);
+    double const r = 5 + random.Uniform(-0.01, 0.01);
+    c.points.push_back({r * std::cos(t), r * std::sin(t), 0.02});
+  }
+  auto const at = [](double t) { return Point{5 * std::cos(t), 5 * std::sin(t)}; };
+  Point const first = at(5.0 / 3.0 * std::numbers::pi);
+  Point const second = at(10.0 / 3.0 * std::numbers::pi);
+  c.contour = ContourBuilder(5, 0)
+                  .Around({0, 0}, first.x, first.y, 1)
+                  .Around({0, 0}, second.x, second.y, 1)
+                  .Around({0, 0}, 5, 0, 1)
+                  .Build();
+  c.ranges = {{0, 24999}, {25000, 49999}, {50000, count - 1}};
+  EXPECT_TRUE(CrossingsOf(c).empty());
+}
+
 // --- The path does not ---------------------------------------------------------------------------
 
 TEST(CheckCrossings, PiecesThatCrossWhereThePathPassesByAreReported) {
