@@ -34,9 +34,8 @@ std::string Heading(ContourArea const& area) {
 }
 
 std::string CrossingText(ContourArea const& area) {
-  std::string const text = Describe(area.crossing);
-  if (area.crossing != Crossing::Found) return text;
-  return text + ": the area is the sum of its loops, each with its sign";
+  if (!area.crossesItself) return "the contour does not cross itself";
+  return "THE CONTOUR CROSSES ITSELF: the area is the sum of its loops, each with its sign";
 }
 
 }  // namespace

@@ -1,6 +1,7 @@
 #include "cli/texts/CheckText.h"
 
 #include <algorithm>
+#include <cmath>
 
 #include "io/base/Numbers.h"
 
@@ -8,7 +9,8 @@ namespace Vorn::Cli {
 
 namespace {
 
-constexpr std::size_t kMostGaps = 10;
+/// Gaps and places where the contour meets itself are listed up to here.
+constexpr std::size_t kMostPlaces = 10;
 constexpr std::size_t kNameWidth = 12;
 constexpr int kRelativeDecimals = 6;
 
@@ -59,24 +61,44 @@ std::string ToleranceText(CheckReport const& report) {
   return text + " (" + report.toleranceSource + ")";
 }
 
-std::string JointFacts(CheckReport const& report) {
-  std::vector<Gap> const& gaps = report.gaps;
-  if (gaps.empty()) return Fact("joints", "the pieces meet");
-  std::string text = Fact("joints", Counted(gaps.size(), "gap"));
-  for (std::size_t i = 0; i < std::min(gaps.size(), kMostGaps); ++i) {
-    text += Fact("", Describe(gaps[i]));
+/// A line for each, aligned below a fact; the last one counts what is left out.
+template <typename T, typename ToLine>
+std::string Listed(std::vector<T> const& places, ToLine const& toLine) {
+  std::string text;
+  for (std::size_t i = 0; i < std::min(places.size(), kMostPlaces); ++i) {
+    text += Fact("", toLine(places[i]));
   }
-  if (gaps.size() > kMostGaps) {
-    text += Fact("", "and " + std::to_string(gaps.size() - kMostGaps) + " more");
+  if (places.size() > kMostPlaces) {
+    text += Fact("", "and " + std::to_string(places.size() - kMostPlaces) + " more");
   }
   return text;
 }
 
+std::string JointFacts(CheckReport const& report) {
+  std::vector<Gap> const& gaps = report.gaps;
+  if (gaps.empty()) return Fact("joints", "the pieces meet");
+  return Fact("joints", Counted(gaps.size(), "gap")) +
+         Listed(gaps, [](Gap const& gap) { return Describe(gap); });
+}
+
+std::string PlaceOf(Intersection const& one) {
+  return NameOf(one.kind) + " at (" + FormatShort(one.at.x) + ", " + FormatShort(one.at.y) +
+         ") of pieces " + std::to_string(one.a.piece + 1) + " and " +
+         std::to_string(one.b.piece + 1);
+}
+
+std::string CrossingFacts(CheckReport const& report) {
+  std::vector<Intersection> const& meetings = report.meetings;
+  if (meetings.empty()) return Fact("crossing", "the contour does not cross itself");
+  return Fact("crossing", "THE CONTOUR CROSSES OR TOUCHES ITSELF: " + Describe(Tally(meetings))) +
+         Listed(meetings, [](Intersection const& one) { return PlaceOf(one); });
+}
+
 std::string AreaText(CheckReport const& report) {
   if (!report.contour.isClosed) return "none: the contour is open";
-  if (!report.enclosed) return "not known: the contour crosses itself or cannot be tested";
-  return FormatShort(report.enclosed->area) + ", " +
-         (report.enclosed->isCounterClockwise ? "counter-clockwise" : "clockwise") + " (y up)";
+  if (!report.signedArea) return "none: the contour crosses itself";
+  return FormatShort(std::fabs(*report.signedArea)) + ", " +
+         (*report.signedArea > 0.0 ? "counter-clockwise" : "clockwise") + " (y up)";
 }
 
 std::string ResultText(CheckReport const& report) {
@@ -87,7 +109,7 @@ std::string ResultText(CheckReport const& report) {
 std::string Summary(CheckReport const& report) {
   return Fact("points", std::to_string(report.file.points.size())) +
          Fact("pieces", PiecesText(report)) + Fact("tolerance", ToleranceText(report)) +
-         DeviationFacts(report) + JointFacts(report) + Fact("crossing", Describe(report.crossing)) +
+         DeviationFacts(report) + JointFacts(report) + CrossingFacts(report) +
          Fact("area", AreaText(report)) + Fact("result", ResultText(report));
 }
 

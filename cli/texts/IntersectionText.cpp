@@ -22,19 +22,11 @@ std::string PieceText(ContourFile const& contour, OnContour const& place) {
   return std::to_string(place.piece + 1) + " " + KindOfPiece(contour, place.piece);
 }
 
-std::size_t CountOf(std::vector<Intersection> const& found, Intersection::Kind kind) {
-  return static_cast<std::size_t>(std::count_if(
-      found.begin(), found.end(), [kind](Intersection const& one) { return one.kind == kind; }));
-}
-
 std::string Heading(std::vector<Intersection> const& found, ContourFile const& a,
                     ContourFile const* b) {
-  using Kind = Intersection::Kind;
   std::string const who = b == nullptr ? a.path + " with itself" : a.path + " with " + b->path;
   if (found.empty()) return who + ": no intersections\n";
-  return who + ": " + Counted(CountOf(found, Kind::Crossing), "crossing") + ", " +
-         std::to_string(CountOf(found, Kind::Touching)) + " touching, " +
-         Counted(CountOf(found, Kind::Overlap), "overlap") + "\n";
+  return who + ": " + Describe(Tally(found)) + "\n";
 }
 
 std::string Aligned(std::vector<Row> const& rows) {

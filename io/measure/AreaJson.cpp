@@ -13,13 +13,6 @@ constexpr int kSchemaVersion = 1;
 
 Json PointJson(XY const& point) { return {{"x", point.x}, {"y", point.y}}; }
 
-/// Whether it crosses itself, as far as that is known.
-Json CrossesJson(Crossing crossing) {
-  if (crossing == Crossing::Found) return true;
-  if (crossing == Crossing::None) return false;
-  return nullptr;
-}
-
 Json AreaJson(ContourArea const& area) {
   Json gaps = Json::array();
   for (Gap const& gap : area.gaps) {
@@ -36,7 +29,7 @@ Json AreaJson(ContourArea const& area) {
       {"perimeter", area.perimeter},
       {"centroid", area.centroid ? PointJson(*area.centroid) : Json(nullptr)},
       {"box", {{"low", PointJson(area.extent.low)}, {"high", PointJson(area.extent.high)}}},
-      {"crossesItself", CrossesJson(area.crossing)},
+      {"crossesItself", area.crossesItself},
       {"gaps", gaps},
   };
 }

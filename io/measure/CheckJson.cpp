@@ -1,4 +1,5 @@
 #include <algorithm>
+#include <cmath>
 #include <nlohmann/json.hpp>
 
 #include "io/measure/CheckReport.h"
@@ -62,16 +63,21 @@ Json GapsJson(CheckReport const& report) {
   return gaps;
 }
 
-/// Whether the contour crosses or touches itself; null where that cannot be told.
-Json CrossingJson(CheckReport const& report) {
-  bool const isKnown = report.crossing == Crossing::None || report.crossing == Crossing::Found;
-  return isKnown ? Json(report.crossing == Crossing::Found) : Json(nullptr);
+Json MeetingsJson(CheckReport const& report) {
+  Json meetings = Json::array();
+  for (Intersection const& one : report.meetings) {
+    meetings.push_back({{"kind", NameOf(one.kind)},
+                        {"x", one.at.x},
+                        {"y", one.at.y},
+                        {"pieces", {one.a.piece + 1, one.b.piece + 1}}});
+  }
+  return meetings;
 }
 
 Json AreaJson(CheckReport const& report) {
-  if (!report.enclosed) return nullptr;
-  return {{"value", report.enclosed->area},
-          {"direction", report.enclosed->isCounterClockwise ? "ccw" : "cw"}};
+  if (!report.signedArea) return nullptr;
+  return {{"value", std::fabs(*report.signedArea)},
+          {"direction", *report.signedArea > 0.0 ? "ccw" : "cw"}};
 }
 
 char const* ResultName(CheckReport const& report) {
@@ -102,8 +108,8 @@ std::string ToJson(CheckReport const& report) {
       {"relative", worst},
       {"outside", outside},
       {"gaps", GapsJson(report)},
-      {"crosses", CrossingJson(report)},
-      {"crossing", Describe(report.crossing)},
+      {"crosses", !report.meetings.empty()},
+      {"meetings", MeetingsJson(report)},
       {"area", AreaJson(report)},
       {"deviations", deviations},
   };

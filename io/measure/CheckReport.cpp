@@ -4,6 +4,8 @@
 #include <numeric>
 #include <utility>
 
+#include "io/measure/ContourArea.h"
+
 namespace Vorn::IO {
 
 namespace {
@@ -61,10 +63,10 @@ CheckReport MakeCheckReport(PointFile file, std::string toleranceSource, Contour
   report.furthest = IndexOfFurthest(report.deviations);
   if (report.HasTolerances()) report.outside = IndicesOutside(report.deviations);
   report.gaps = FindGaps(report.contour);
-  std::vector<GeometryUtils::Elem> const elements = ElementsOf(report.contour);
-  bool const endsMeet = report.contour.isClosed || ReturnsToStart(report.contour.pieces);
-  report.crossing = FindCrossing(elements, endsMeet);
-  report.enclosed = EnclosedBy(report.contour, elements);
+  report.meetings = SelfIntersectionsOf(report.contour);
+  if (report.contour.isClosed && Tally(report.meetings).crossings == 0) {
+    report.signedArea = SignedAreaOf(report.contour);
+  }
   return report;
 }
 

@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "io/measure/Crossing.h"
+#include "io/measure/Intersections.h"
 #include "io/measure/Remeasure.h"
 #include "io/pieces/ContourFile.h"
 #include "io/points/CsvReader.h"
@@ -22,8 +22,8 @@ struct CheckReport {
   std::size_t worst = 0;             ///< index of the largest relative deviation; likewise
   std::vector<std::size_t> outside;  ///< indices of the points beyond their tolerance
   std::vector<Gap> gaps;
-  Crossing crossing = Crossing::NotTestable;
-  std::optional<Enclosed> enclosed;
+  std::vector<Intersection> meetings;  ///< where the contour meets itself, but for its joints
+  std::optional<double> signedArea;    ///< of a closed contour that does not cross itself
 
   bool HasTolerances() const { return !toleranceSource.empty(); }
 

@@ -10,6 +10,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "io/measure/Intersections.h"
+
 namespace Vorn::IO {
 
 namespace {
@@ -78,6 +80,27 @@ ContourFile SeenFrom(XY const& origin, ContourFile contour) {
   return contour;
 }
 
+/// The middle of the box: products of coordinates seen from here stay small.
+XY MiddleOf(Extent const& extent) {
+  return {0.5 * (extent.low.x + extent.high.x), 0.5 * (extent.low.y + extent.high.y)};
+}
+
+/// With a line across every gap.
+ContourFile Bridged(ContourFile contour) {
+  std::vector<Piece> const pieces = std::move(contour.pieces);
+  contour.pieces.clear();
+  XY at = pieces.back().end;
+  double const tolerance = JointTolerance(pieces);
+  for (Piece const& piece : pieces) {
+    if (Distance(at, piece.start) > tolerance) {
+      contour.pieces.push_back(MakeLine(at, piece.start));
+    }
+    contour.pieces.push_back(piece);
+    at = piece.end;
+  }
+  return contour;
+}
+
 double LengthOf(ContourArea const& area) {
   double length = 0.0;
   for (Piece const& piece : area.contour.pieces) length += piece.length;
@@ -107,6 +130,10 @@ ContourFile Closed(ContourFile contour) {
   return contour;
 }
 
+double SignedAreaOf(ContourFile const& contour) {
+  return MomentsOf(SeenFrom(MiddleOf(ExtentOf(contour.pieces)), contour).pieces).area;
+}
+
 ContourArea MeasureArea(ContourFile contour) {
   ContourArea result;
   result.contour = std::move(contour);
@@ -114,10 +141,9 @@ ContourArea MeasureArea(ContourFile contour) {
   result.gaps = FindGaps(result.contour);
   result.extent = ExtentOf(result.contour.pieces);
   result.perimeter = LengthOf(result);
-  XY const origin = {0.5 * (result.extent.low.x + result.extent.high.x),
-                     0.5 * (result.extent.low.y + result.extent.high.y)};
+  XY const origin = MiddleOf(result.extent);
   ContourFile const local = SeenFrom(origin, result.contour);
-  result.crossing = FindCrossing(ElementsOf(local), true);
+  result.crossesItself = Tally(SelfIntersectionsOf(Bridged(local))).crossings > 0;
   Moments const moments = MomentsOf(local.pieces);
   result.signedArea = moments.area;
   if (result.IsSimple()) result.centroid = CentroidOf(moments, origin, result.extent);

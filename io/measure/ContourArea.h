@@ -4,7 +4,6 @@
 #include <string>
 #include <vector>
 
-#include "io/measure/Crossing.h"
 #include "io/pieces/ContourFile.h"
 #include "io/pieces/Shapes.h"
 
@@ -12,16 +11,16 @@ namespace Vorn::IO {
 
 /// What a closed contour encloses.
 struct ContourArea {
-  ContourFile contour;    ///< as it was measured
-  std::vector<Gap> gaps;  ///< bridged by straight lines
-  Crossing crossing = Crossing::NotTestable;
+  ContourFile contour;         ///< as it was measured
+  std::vector<Gap> gaps;       ///< bridged by straight lines
+  bool crossesItself = false;  ///< where it only touches itself it still borders a region
   double signedArea = 0.0;     ///< positive counter-clockwise; every loop with its own sign
   double perimeter = 0.0;      ///< with the bridges
   std::optional<XY> centroid;  ///< of a contour that does not cross itself and encloses something
   Extent extent;
 
   /// Whether the contour is the border of one region, so that its area is that of the region.
-  bool IsSimple() const { return crossing == Crossing::None; }
+  bool IsSimple() const { return !crossesItself; }
 };
 
 /// Whether the contour says that it is closed or ends where it begins.
@@ -29,6 +28,11 @@ bool IsClosed(ContourFile const& contour);
 
 /// With a line from the end to the start, unless the contour ends there anyway.
 ContourFile Closed(ContourFile contour);
+
+/// The area of a contour that is closed, positive counter-clockwise, gaps bridged by straight
+/// lines. That of one that crosses itself is the sum of the areas of its loops, as often as each is
+/// run round.
+double SignedAreaOf(ContourFile const& contour);
 
 /// Measures a contour that is closed. The area of one that crosses itself is the sum of the areas
 /// of its loops, each positive where it runs counter-clockwise and counted as often as it is run

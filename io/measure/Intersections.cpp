@@ -5,6 +5,7 @@
 #include <cmath>
 #include <numbers>
 
+#include "io/base/Numbers.h"
 #include "io/measure/PieceMeetings.h"
 #include "io/pieces/BoxIndex.h"
 
@@ -242,6 +243,20 @@ std::vector<Intersection> SelfIntersectionsOf(ContourFile const& contour) {
     });
   }
   return Sorted(path, path, std::move(found));
+}
+
+IntersectionTally Tally(std::vector<Intersection> const& found) {
+  auto const countOf = [&found](Intersection::Kind kind) {
+    return static_cast<std::size_t>(std::count_if(
+        found.begin(), found.end(), [kind](Intersection const& one) { return one.kind == kind; }));
+  };
+  return {countOf(Intersection::Kind::Crossing), countOf(Intersection::Kind::Touching),
+          countOf(Intersection::Kind::Overlap)};
+}
+
+std::string Describe(IntersectionTally const& tally) {
+  return Counted(tally.crossings, "crossing") + ", " + std::to_string(tally.touches) +
+         " touching, " + Counted(tally.overlaps, "overlap");
 }
 
 std::string NameOf(Intersection::Kind kind) {

@@ -39,6 +39,18 @@ std::vector<Intersection> IntersectionsOf(ContourFile const& a, ContourFile cons
 /// The places where the contour meets itself, but for the joints of pieces that follow each other.
 std::vector<Intersection> SelfIntersectionsOf(ContourFile const& contour);
 
+/// How many there are of each kind.
+struct IntersectionTally {
+  std::size_t crossings = 0;
+  std::size_t touches = 0;
+  std::size_t overlaps = 0;
+};
+
+IntersectionTally Tally(std::vector<Intersection> const& found);
+
+/// "1 crossing, 0 touching, 2 overlaps".
+std::string Describe(IntersectionTally const& tally);
+
 /// "crossing", "touching", "overlap".
 std::string NameOf(Intersection::Kind kind);
 

@@ -60,7 +60,7 @@ TEST(AreaCommand, SaysWhenTheContourCrossesItself) {
   EXPECT_EQ(run.code, ExitCode::Ok);
   EXPECT_NE(run.out.find("area        6\n"), std::string::npos) << run.out;
   EXPECT_NE(run.out.find("centroid    none\n"), std::string::npos) << run.out;
-  EXPECT_NE(run.out.find("crossing    THE CONTOUR CROSSES OR TOUCHES ITSELF: the area is the sum "
+  EXPECT_NE(run.out.find("crossing    THE CONTOUR CROSSES ITSELF: the area is the sum "
                          "of its loops, each with its sign\n"),
             std::string::npos)
       << run.out;

@@ -90,6 +90,21 @@ ContourFile Reverse(ContourFile contour) {
   return contour;
 }
 
+/// The contour as the library holds one.
+std::vector<GeometryUtils::Elem> ElementsOf(ContourFile const& contour) {
+  std::vector<GeometryUtils::Elem> elements;
+  GeometryUtils::AddSegm(&elements, contour.pieces.front().start);
+  for (Piece const& piece : contour.pieces) {
+    if (piece.IsArc()) {
+      GeometryUtils::AddArc(&elements, piece.start, piece.end, piece.center, piece.radius,
+                            !piece.counterClockwise);
+    } else {
+      GeometryUtils::AddSegm(&elements, piece.end);
+    }
+  }
+  return elements;
+}
+
 TEST(MeasureArea, OfARectangle) {
   ContourArea const area = MeasureArea(Polygon({{1, 2}, {5, 2}, {5, 5}, {1, 5}}));
   EXPECT_EQ(area.signedArea, 12.0);
@@ -99,7 +114,7 @@ TEST(MeasureArea, OfARectangle) {
   EXPECT_EQ(area.centroid->y, 3.5);
   EXPECT_EQ(area.extent.low.x, 1.0);
   EXPECT_EQ(area.extent.high.y, 5.0);
-  EXPECT_EQ(area.crossing, Crossing::None);
+  EXPECT_FALSE(area.crossesItself);
   EXPECT_TRUE(area.gaps.empty());
   EXPECT_EQ(MeasureArea(Polygon({{1, 5}, {5, 5}, {5, 2}, {1, 2}})).signedArea, -12.0);
 }
@@ -144,13 +159,14 @@ TEST(MeasureArea, OfARingIsThatOfItsOutlines) {
   for (Piece const& piece : MakeCircle({2, 0}, {0, 0}, 2, false)) ring.pieces.push_back(piece);
   ring.pieces.push_back(MakeLine({2, 0}, {5, 0}));
   EXPECT_NEAR(MeasureArea(ring).signedArea, 21.0 * pi, 1e-12);
+  EXPECT_FALSE(MeasureArea(ring).crossesItself) << "a slit run along twice is no crossing";
 }
 
 TEST(MeasureArea, AgreesWithAnIntegralInSmallSteps) {
   for (std::uint64_t seed = 1; seed <= 50; ++seed) {
     ContourFile const contour = RandomStar(seed);
     ContourArea const area = MeasureArea(contour);
-    ASSERT_EQ(area.crossing, Crossing::None) << "seed " << seed;
+    ASSERT_FALSE(area.crossesItself) << "seed " << seed;
     Integrals const expected = Integrate(contour.pieces);
     EXPECT_NEAR(area.signedArea, expected.area, 2e-5) << "seed " << seed;
     ASSERT_TRUE(area.centroid.has_value());
@@ -163,12 +179,11 @@ TEST(MeasureArea, AgreesWithTheLibrary) {
   int compared = 0;
   for (std::uint64_t seed = 1; seed <= 50; ++seed) {
     ContourFile const contour = RandomStar(seed);
-    auto const enclosed = EnclosedBy(contour, ElementsOf(contour));
+    double clockwise = 0.0;
     // With coordinates far from the origin joints of arcs may look like crossings.
-    if (!enclosed) continue;
+    if (GeometryUtils::GetArea(ElementsOf(contour), &clockwise) != ErrorCode::Ok) continue;
     ++compared;
-    EXPECT_TRUE(enclosed->isCounterClockwise) << "seed " << seed;
-    EXPECT_NEAR(MeasureArea(contour).signedArea, enclosed->area, 1e-6) << "seed " << seed;
+    EXPECT_NEAR(MeasureArea(contour).signedArea, -clockwise, 1e-6) << "seed " << seed;
   }
   EXPECT_GE(compared, 45);
 }
@@ -197,11 +212,11 @@ TEST(MeasureArea, OfACrossingContourIsTheSumOfItsLoops) {
   // A bow tie that crosses at (0, 0): 8 on the left run round one way, 2 on the right
   // the other.
   ContourArea const tie = MeasureArea(Polygon({{-4, -2}, {2, 1}, {2, -1}, {-4, 2}}));
-  EXPECT_EQ(tie.crossing, Crossing::Found);
+  EXPECT_TRUE(tie.crossesItself);
   EXPECT_NEAR(std::fabs(tie.signedArea), 8.0 - 2.0, 1e-12);
   EXPECT_FALSE(tie.centroid.has_value());
   ContourArea const even = MeasureArea(Polygon({{0, 0}, {6, 3}, {6, 0}, {0, 3}}));
-  EXPECT_EQ(even.crossing, Crossing::Found);
+  EXPECT_TRUE(even.crossesItself);
   EXPECT_NEAR(even.signedArea, 0.0, 1e-12);
 }
 

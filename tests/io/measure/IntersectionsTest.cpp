@@ -142,6 +142,34 @@ TEST(SelfIntersectionsOf, FindsWhatIsNoJoint) {
   EXPECT_EQ(OfItself(bay), "crossing 4,3") << "neighbours may meet elsewhere";
 }
 
+TEST(SelfIntersectionsOf, TheJointOfALineAndAnArcIsNoneWhereTheRadiusIsRounded) {
+  // The line runs into the circle of the last arc from inside, and comes to the joint from within
+  // its rounding: seen from the arc of this radius the joint lies just after its start.
+  XY const joint{15.216896293086625, 27.595506452317007};
+  XY const corner{16.080436589371594, 27.881008833133762};
+  ContourFile chain;
+  chain.pieces = {MakeArc({9.603293131044769, 26.01778024618891}, corner,
+                          {17.446659285356198, 10.941742930637318}, 16.994272381320187, false),
+                  MakeLine(corner, joint),
+                  MakeArc(joint, {16.1708426089926, 27.490280786453326},
+                          {15.846523852011382, 28.9268155192238}, 1.4726896124390176, true)};
+  EXPECT_EQ(OfItself(chain), "");
+  chain.pieces.push_back(MakeLine(chain.pieces.back().end, {15.5, 28.5}));
+  EXPECT_EQ(OfItself(chain), "crossing 15.9203,27.8673; crossing 15.9417,27.8351")
+      << "through the arc and the line";
+}
+
+TEST(SelfIntersectionsOf, TheEndOfAnOpenWayMayCrossItsBeginning) {
+  EXPECT_EQ(OfItself(Way({{0, 0}, {4, 0}, {4, 3}, {2, 0.01}})), "");
+  EXPECT_EQ(OfItself(Way({{0, 0}, {4, 0}, {4, 3}, {2, -0.01}})), "crossing 2.00664,0");
+  ContourFile arcs;
+  arcs.pieces = {MakeArc({0, 0}, {4, 0}, {2, 0}, 2.0, true), MakeLine({4, 0}, {4, -5})};
+  arcs.pieces.push_back(MakeLine({4, -5}, {2, -2.01}));
+  EXPECT_EQ(OfItself(arcs), "");
+  arcs.pieces.back() = MakeLine({4, -5}, {2, -1.99});
+  EXPECT_EQ(SelfIntersectionsOf(arcs).size(), 1u);
+}
+
 TEST(SelfIntersectionsOf, EightIsFoundOnce) {
   EXPECT_EQ(OfItself(Way({{-2, -1}, {0, 0}, {2, 1}, {2, -1}, {0, 0}, {-2, 1}, {-2, -1}})),
             "crossing 0,0");
