@@ -12,8 +12,9 @@ namespace {
 
 using Point = GeometryUtils::Point;
 
-/// How many times all points may be looked at.
+/// How many times all points may be looked at, and how many more looks short paths have.
 constexpr std::int64_t kRounds = 64;
+constexpr std::int64_t kLeastBudget = 1 << 20;
 
 Point At(WPoint const& p) { return {p.x, p.y}; }
 
@@ -38,7 +39,8 @@ struct Bounds {
 
 OwnPath::OwnPath(Coverage const& coverage)
     : coverage_(coverage),
-      budget_(kRounds * static_cast<std::int64_t>(coverage.GetChain().points.size())) {
+      budget_(kLeastBudget +
+              kRounds * static_cast<std::int64_t>(coverage.GetChain().points.size())) {
   widest_.reserve(coverage.PieceCount());
   for (std::size_t piece = 0; piece < coverage.PieceCount(); ++piece) {
     NumberRange const& range = coverage.RangeOf(piece);

@@ -148,6 +148,28 @@ TEST(CheckCrossings, LapsOnOneCircleAreFollowedInTimeThatTheirNumberAllows) {
   EXPECT_TRUE(CrossingsOf(c).empty());
 }
 
+TEST(CheckCrossings, ManyShortPiecesOnTwoLapsMayBeFollowed) {
+  // Chords over four points: those of the second lap cross those of the first.
+  Case c;
+  RandomGeometry random(4203);
+  ContourBuilder builder(5, 0);
+  std::int32_t const count = 400;
+  for (std::int32_t i = 0; i <= count; ++i) {
+    double const t = 4 * std::numbers::pi * i / count;
+    double const r = 5 + random.Uniform(-0.004, 0.004);
+    Point const p{r * std::cos(t), r * std::sin(t)};
+    c.points.push_back({p.x, p.y, 0.02});
+    if (i % 4 == 3) {
+      builder.To(p.x, p.y);
+      c.ranges.push_back({i - 3, i});
+    }
+  }
+  builder.To(5, 0);
+  c.ranges.push_back({count, count});
+  c.contour = builder.Build();
+  EXPECT_TRUE(CrossingsOf(c).empty());
+}
+
 // --- The path does not ---------------------------------------------------------------------------
 
 TEST(CheckCrossings, PiecesThatCrossWhereThePathPassesByAreReported) {
