@@ -1,0 +1,29 @@
+// A run grows by the circle found last: as long as it holds, the run reaches as far as the circle.
+// Where it fails, the run is tried twice as long; what cannot be covered narrows the search. Only
+// the last failure, one point beyond the run, is proven.
+
+#include "geometry/fewest/Bound.h"
+
+#include <algorithm>
+
+#include "geometry/fewest/Growth.h"
+
+namespace Vorn::Fewest {
+
+Cover CoverGreedily(std::span<WPoint const> points, Limits const& limits,
+                    std::function<void(std::int32_t)> const& tell) {
+  Cover cover;
+  auto const count = static_cast<std::int32_t>(points.size());
+  FreeRun run(points, limits);
+  std::int32_t expected = 8;
+  for (std::int32_t start = 0; start < count;) {
+    cover.starts.push_back(start);
+    std::int32_t const end = run.FindEnd(start, expected);
+    expected = end - start;
+    start = end;
+    tell(start);
+  }
+  return cover;
+}
+
+}  // namespace Vorn::Fewest

@@ -1,0 +1,341 @@
+#include "geometry/fewest/Chain.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace Vorn::Fewest {
+
+namespace {
+
+struct State {
+  Opening opening;
+  /// The pieces before it that end at the ends of the opening.
+  Circle atLow;
+  Circle atHigh;
+  std::int32_t previous = -1;  ///< position in the level before
+  Reach reach;
+};
+
+using Level = std::vector<State>;
+
+double Cross(Place const& a, Place const& b) { return a.x * b.y - a.y * b.x; }
+
+/// The crossing of two circles that is nearest to a place, by Newton's method.
+bool FindMeeting(Circle const& one, Circle const& other, Place start, Place* meeting) {
+  for (int i = 0; i < 20; ++i) {
+    double const f = ValueAt(one, start);
+    double const g = ValueAt(other, start);
+    Place const df = GradientAt(one, start);
+    Place const dg = GradientAt(other, start);
+    double const determinant = Cross(df, dg);
+    if (!(std::fabs(determinant) > 1e-3)) return false;
+    double const dx = (f * dg.y - g * df.y) / determinant;
+    double const dy = (df.x * g - dg.x * f) / determinant;
+    start = {start.x - dx, start.y - dy};
+    if (dx * dx + dy * dy == 0.0) break;
+  }
+  *meeting = start;
+  return true;
+}
+
+std::int32_t FirstOf(Opening const& opening) { return opening.isFree ? 0 : opening.gate.split; }
+
+Opening StartOn(Gate const& gate, Interval const& interval) {
+  Gate const behind = SeenFromBehind(gate);
+  return gate.isCusp ? Opening{behind, -interval.high, -interval.low, false}
+                     : Opening{behind, interval.low, interval.high, false};
+}
+
+/// Where a piece may start.
+struct Link {
+  Opening opening;
+  /// A circle that covers the points of the piece.
+  Circle guess;
+  /// The pieces before it that end at the ends of the opening.
+  Circle atLow;
+  Circle atHigh;
+};
+
+/// A ratio that counts as 1: the tolerances of the search are smaller than the true ones by more.
+constexpr double kWholeTolerance = 1.0 + 2e-7;
+
+/// How often a piece behind is asked for a joint nearer to the middle of its interval.
+constexpr int kMostRetries = 6;
+
+/// Determines the pieces from the last to the first, each of the smallest largest ratio that ends
+/// where the piece behind begins.
+class BackwardPass {
+ public:
+  BackwardPass(Path const& path, std::vector<Link> links, PieceSearch* search)
+      : path_(path), links_(std::move(links)), search_(*search) {}
+
+  /// Empty when a piece cannot end where it has to.
+  Chain Run() {
+    std::size_t const count = links_.size();
+    chain_.pieces.resize(count);
+    chain_.gates.resize(count - 1);
+    chain_.offsets.resize(count - 1);
+    std::vector<int> retries(count);
+    for (std::size_t k = count; k-- > 0;) {
+      if (Place(k)) continue;
+      if (k + 1 == count || ++retries[k] > kMostRetries) return {};
+      // Try the piece behind again, from a joint nearer to the middle.
+      Opening& behind = links_[k + 1].opening;
+      double const quarter = 0.25 * (behind.high - behind.low);
+      behind.low += quarter;
+      behind.high -= quarter;
+      k += 2;
+    }
+    return chain_;
+  }
+
+ private:
+  bool Place(std::size_t k) {
+    Link const& link = links_[k];
+    Opening end;
+    if (k + 1 < links_.size()) {
+      end = {chain_.gates[k], chain_.offsets[k], chain_.offsets[k], false};
+    }
+    std::int32_t const first = FirstOf(link.opening);
+    std::int32_t const last = end.isFree ? path_.Count() : end.gate.split;
+    search_.MoveTo(first, last);
+    RunFit const fit = search_.FindBest(link.opening, end, StartFor(k));
+    if (!fit.isFound || fit.ratio > kWholeTolerance) return false;
+    chain_.pieces[k] = {first, last, fit.circle, fit.ratio};
+    if (k == 0) return true;
+    double offset = 0.0;
+    if (!FindCrossing(fit.circle, link.opening.gate, &offset)) return false;
+    chain_.gates[k - 1] = SeenFromBehind(link.opening.gate);
+    chain_.offsets[k - 1] = link.opening.gate.isCusp ? -offset : offset;
+    return true;
+  }
+
+  /// Between two pieces that end on both sides of a joint there is one that ends there.
+  RunFit StartFor(std::size_t k) const {
+    if (k + 1 == links_.size()) return {links_[k].guess, 0.0, false};
+    Link const& next = links_[k + 1];
+    Fewest::Place const joint = PlaceOn(chain_.gates[k], chain_.offsets[k]);
+    double const low = ValueAt(next.atLow, joint);
+    double const high = ValueAt(next.atHigh, joint);
+    double const share = low != high ? low / (low - high) : 0.5;
+    Circle const circle = Between(next.atLow, next.atHigh, std::clamp(share, 0.0, 1.0));
+    double const form = Form(circle, circle);
+    if (!(form > 0.0)) return {links_[k].guess, 0.0, false};
+    double const ratio = 1.0 / std::sqrt(form);
+    return {Scaled(circle, ratio), std::max(ratio, 1.0), true};
+  }
+
+  Path const& path_;
+  std::vector<Link> links_;
+  PieceSearch& search_;
+  Chain chain_;
+};
+
+constexpr std::size_t kMostSources = 2;
+
+/// In gaps wider than this many times the sum of the tolerances the joint may lie at either point.
+constexpr double kWideGap = 8.0;
+
+class ChainSearch {
+ public:
+  ChainSearch(Path const& path, double share, std::function<void(std::int32_t)> const& tell)
+      : path_(path), search_(path, share), tell_(tell) {}
+
+  Chain Run() {
+    levels_.push_back({State()});
+    std::int32_t expected = std::min(path_.Count(), 8);
+    std::int32_t before = 0;
+    while (true) {
+      Level& level = levels_.back();
+      std::int32_t farthest = 0;
+      std::int32_t first = path_.Count() - 1;
+      for (State const& state : level) first = std::min(first, FirstOf(state.opening));
+      search_.MoveTo(first, std::min(path_.Count(), std::max(expected, first + 2)));
+      Reach rival;
+      for (State& state : level) {
+        state.reach = rival.end == 0
+                          ? search_.FindReach(state.opening, std::min(path_.Count(), expected))
+                          : search_.FindReachBeyond(state.opening, rival);
+        if (state.reach.end > rival.end) rival = state.reach;
+      }
+      farthest = rival.end;
+      tell_(farthest);
+      if (farthest == path_.Count()) return Backwards();
+      Level next = MakeStates(level, before, farthest);
+      if (next.empty() || farthest <= before) return {};
+      expected = farthest + std::max(4, farthest - before);
+      before = farthest;
+      levels_.push_back(std::move(next));
+    }
+  }
+
+ private:
+  Level MakeStates(Level const& level, std::int32_t before, std::int32_t farthest) {
+    Level next;
+    std::int32_t const half = std::max(before + 1, farthest - (farthest - before) / 2 - 1);
+    for (std::int32_t back = 0; farthest - back >= half; back = back < 4 ? back + 1 : back * 2) {
+      AddGates(level, farthest - back, &next);
+    }
+    return next;
+  }
+
+  void AddGates(Level const& level, std::int32_t split, Level* next) {
+    std::size_t const before = next->size();
+    Gate corner;
+    bool const isCorner = MakeCornerGate(level, split, &corner);
+    if (isCorner) AddState(level, corner, next);
+    if (!isCorner) AddState(level, MiddleGate(path_, split), next);
+    WPoint const& last = path_.At(split - 1);
+    WPoint const& first = path_.At(split);
+    bool const isWide = DistanceBetween(last, first) > kWideGap * (last.w + first.w);
+    if (next->size() == before || isCorner || isWide) AddPointGates(level, split, next);
+  }
+
+  /// Gates at the points beside a gap, square to the piece before and to the path behind.
+  void AddPointGates(Level const& level, std::int32_t split, Level* next) {
+    State const* from = BestFor(level, split);
+    if (from == nullptr) return;
+    for (std::int32_t point = split - 1; point <= split; ++point) {
+      WPoint const& at = path_.At(point);
+      Place const place{at.x, at.y};
+      Place const out = LeftNormal(at, path_.At(std::min(point + 1, path_.Count() - 1)));
+      Gate gate = BisectorGate(place, GradientAt(from->reach.circle, place), out);
+      gate.split = split;
+      gate.least = -at.w;
+      gate.greatest = at.w;
+      AddState(level, gate, next);
+    }
+  }
+
+  bool MakeCornerGate(Level const& level, std::int32_t split, Gate* gate) {
+    State const* from = BestFor(level, split);
+    if (from == nullptr) return false;
+    RunFit behind;
+    for (std::int32_t length = 16; length >= 2; length /= 2) {
+      std::int32_t const end = std::min(split + length, path_.Count());
+      if (end - split < 2) continue;
+      behind = search_.FitAlone(split, end);
+      if (behind.isFound && behind.ratio <= 1.0) break;
+    }
+    if (!behind.isFound || behind.ratio > 1.0) return false;
+    Gate const middle = MiddleGate(path_, split);
+    Place const in = GradientAt(from->reach.circle, middle.origin);
+    Place const out = GradientAt(behind.circle, middle.origin);
+    if (!(std::fabs(Cross(in, out)) > 0.2)) return false;
+    Place meeting;
+    if (!FindMeeting(from->reach.circle, behind.circle, middle.origin, &meeting)) return false;
+    double const dx = meeting.x - middle.origin.x;
+    double const dy = meeting.y - middle.origin.y;
+    double const room = 2.0 * middle.greatest;
+    if (!(dx * dx + dy * dy < room * room)) return false;
+    Place const first = GradientAt(from->reach.circle, meeting);
+    Place const second = GradientAt(behind.circle, meeting);
+    *gate = BisectorGate(meeting, first, second);
+    gate->split = split;
+    gate->least = -room;
+    gate->greatest = room;
+    return true;
+  }
+
+  static State const* BestFor(Level const& level, std::int32_t split) {
+    State const* best = nullptr;
+    for (State const& state : level) {
+      if (state.reach.end < split || (!state.opening.isFree && state.opening.gate.split >= split)) {
+        continue;
+      }
+      if (best == nullptr || state.reach.end > best->reach.end) best = &state;
+    }
+    return best;
+  }
+
+  /// Adds the gate with the offsets that the pieces before it can reach: first from the state that
+  /// reaches farthest, then from others as far as they add offsets.
+  void AddState(Level const& level, Gate const& gate, Level* next) {
+    std::vector<State const*> order;
+    for (State const& state : level) {
+      if (state.reach.end >= gate.split && FirstOf(state.opening) < gate.split) {
+        order.push_back(&state);
+      }
+    }
+    std::stable_sort(order.begin(), order.end(), [](State const* one, State const* other) {
+      return one->reach.end > other->reach.end;
+    });
+    std::size_t const begin = next->size();
+    for (State const* from : order) {
+      Interval const interval = search_.FindInterval(from->opening, gate, from->reach.circle);
+      if (!interval.isFound) continue;
+      State state;
+      state.opening = StartOn(gate, interval);
+      state.atLow = interval.atLow;
+      state.atHigh = interval.atHigh;
+      state.previous = static_cast<std::int32_t>(from - level.data());
+      bool isNew = true;
+      for (std::size_t i = begin; i < next->size(); ++i) {
+        Opening& held = (*next)[i].opening;
+        if (held.low <= state.opening.low && state.opening.high <= held.high) isNew = false;
+        if (isNew && held.low >= state.opening.low && state.opening.high >= held.high) {
+          (*next)[i] = state;
+          isNew = false;
+        }
+      }
+      if (isNew) next->push_back(state);
+      if (next->size() - begin >= kMostSources) break;
+    }
+  }
+
+  Chain Backwards() {
+    Level const& last = levels_.back();
+    double least = 0.0;
+    std::int32_t at = -1;
+    search_.MoveTo(FirstOf(last.front().opening), path_.Count());
+    for (std::size_t i = 0; i < last.size(); ++i) {
+      if (last[i].reach.end < path_.Count()) continue;
+      RunFit const fit =
+          search_.FindBest(last[i].opening, Opening(), {last[i].reach.circle, 1.0, true});
+      if (fit.isFound && (at < 0 || fit.ratio < least)) {
+        least = fit.ratio;
+        at = static_cast<std::int32_t>(i);
+      }
+    }
+    if (at < 0) return {};
+    std::vector<Link> links(levels_.size());
+    for (std::size_t k = levels_.size(); k-- > 0;) {
+      State const& state = levels_[k][static_cast<std::size_t>(at)];
+      links[k] = {state.opening, state.reach.circle, state.atLow, state.atHigh};
+      at = state.previous;
+    }
+    return BackwardPass(path_, std::move(links), &search_).Run();
+  }
+
+  Path const& path_;
+  PieceSearch search_;
+  std::function<void(std::int32_t)> const& tell_;
+  std::vector<Level> levels_;
+};
+
+}  // namespace
+
+Chain FindChain(Path const& path, double share, std::function<void(std::int32_t)> const& tell) {
+  return ChainSearch(path, share, tell).Run();
+}
+
+Chain FollowGates(Path const& path, double share, Chain const& known) {
+  PieceSearch search(path, share);
+  std::vector<Link> links;
+  Link link;
+  for (std::size_t k = 0; k < known.pieces.size(); ++k) {
+    link.guess = known.pieces[k].circle;
+    links.push_back(link);
+    if (k + 1 == known.pieces.size()) break;
+    Gate const& gate = known.gates[k];
+    search.MoveTo(FirstOf(link.opening), gate.split);
+    Interval const interval = search.FindInterval(link.opening, gate, link.guess);
+    if (!interval.isFound) return {};
+    link.opening = StartOn(gate, interval);
+    link.atLow = interval.atLow;
+    link.atHigh = interval.atHigh;
+  }
+  return BackwardPass(path, std::move(links), &search).Run();
+}
+
+}  // namespace Vorn::Fewest

@@ -1,0 +1,155 @@
+// The service: checks what it is given, moves the points near the origin, finds the bound and the
+// chain, and hands out what was measured.
+
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <numbers>
+
+#include "geometry/fewest/Assembly.h"
+#include "geometry/fewest/Bound.h"
+#include "geometry/fewest/Centring.h"
+#include "geometry/fewest/Chain.h"
+#include "geometry/fewest/LocalFrame.h"
+#include "geometry/fewest/Progress.h"
+#include "geometry/fewest/promises/Promises.h"
+#include "vorn/FewestPieces.h"
+
+namespace Vorn {
+
+namespace {
+
+using Fewest::Chain;
+using Fewest::Path;
+using Options = FewestPieces::Options;
+using Result = FewestPieces::Result;
+
+/// The search works within this share of the tolerances, so that its rounding and its second order
+/// terms stay within the true ones.
+constexpr double kSearchShare = 1.0 - 1e-6;
+
+bool IsMeasured(WPoint const& p) {
+  return std::isfinite(p.x) && std::isfinite(p.y) && std::isfinite(p.w) && p.w > 0.0;
+}
+
+bool AreValid(std::vector<WPoint> const& points) {
+  return points.size() >= 2 &&
+         points.size() <= static_cast<std::size_t>(std::numeric_limits<std::int32_t>::max()) &&
+         std::all_of(points.begin(), points.end(), IsMeasured);
+}
+
+bool IsValid(Options const& options) {
+  auto const effort = static_cast<std::int32_t>(options.effort);
+  return effort >= 0 && effort <= 2 && options.largestStep > 0.0 &&
+         options.largestStep <= std::numbers::pi && options.smallestRadius >= 0.0 &&
+         std::isfinite(options.smallestRadius) && options.largestRadius > 0.0 &&
+         options.largestRadius >= options.smallestRadius && options.farthestBetweenPoints >= 0.0;
+}
+
+Fewest::Limits LimitsOf(Options const& options, double scale) {
+  return {options.smallestRadius * scale, options.largestRadius * scale, options.segmentsOnly,
+          std::sin(0.5 * options.largestStep), options.farthestBetweenPoints * scale};
+}
+
+/// The point of least tolerance lies within the tolerance of every other: one place stands for all.
+bool DoCoincide(std::vector<WPoint> const& points) {
+  WPoint const& tightest = *std::min_element(
+      points.begin(), points.end(), [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
+  return std::all_of(points.begin(), points.end(),
+                     [&](WPoint const& p) { return Fewest::DistanceBetween(p, tightest) <= p.w; });
+}
+
+/// A contour in the coordinates of the caller.
+struct Answer {
+  std::vector<GeometryUtils::Elem> contour;
+  std::vector<FewestPieces::Range> ranges;
+};
+
+Answer Restore(Fewest::Shift const& shift, Chain const& chain,
+               std::vector<Fewest::BuiltPiece> const& pieces) {
+  Answer answer;
+  answer.contour.push_back(Fewest::BuildSegment({}, shift.Restore(pieces.front().start)).elem);
+  for (std::size_t k = 0; k < pieces.size(); ++k) {
+    GeometryUtils::Elem const& elem = pieces[k].elem;
+    GeometryUtils::Point const start = answer.contour.back().end;
+    GeometryUtils::Point const end = shift.Restore(elem.end);
+    bool const isSegment = elem.type == GeometryUtils::ElemType::Segment;
+    Fewest::BuiltPiece const restored =
+        isSegment ? Fewest::BuildSegment(start, end)
+                  : Fewest::BuildArc(start, end, shift.Restore(elem.center), elem.direction);
+    answer.contour.push_back(restored.elem);
+    answer.ranges.push_back({chain.pieces[k].first, chain.pieces[k].end - 1});
+  }
+  return answer;
+}
+
+/// Looks for contours and measures what they promise.
+class Fitter {
+ public:
+  Fitter(std::vector<WPoint> const& points, Options const& options, Fewest::Shift const& shift,
+         Path const& path, Fewest::Progress* progress)
+      : points_(points), options_(options), shift_(shift), path_(path), progress_(*progress) {}
+
+  /// The first contour found that keeps every promise; false when there is none.
+  bool Run(Answer* answer, Promises::Report* report) {
+    // Where a promise fails at the full tolerances, smaller ones leave room for it.
+    for (double const share : {1.0, 0.9, 0.7, 0.5, 0.3}) {
+      Chain const chain = Fewest::FindChain(
+          path_, share * kSearchShare, [&](std::int32_t done) { progress_.Tell(20, 80, done); });
+      if (chain.pieces.empty()) continue;
+      if (options_.centre && Keeps(Fewest::Centre(path_, chain), answer, report)) return true;
+      if (Keeps(chain, answer, report)) return true;
+    }
+    return false;
+  }
+
+ private:
+  bool Keeps(Chain const& chain, Answer* answer, Promises::Report* report) const {
+    *answer = Restore(shift_, chain, Fewest::BuildPieces(path_, chain));
+    std::vector<Promises::PieceRange> ranges;
+    for (FewestPieces::Range const& range : answer->ranges) {
+      ranges.push_back({range.first, range.last});
+    }
+    *report = Promises::Measure({points_, answer->contour, ranges, options_.closed,
+                                 options_.largestStep, options_.farthestBetweenPoints});
+    return report->violations.empty();
+  }
+
+  std::vector<WPoint> const& points_;
+  Options const& options_;
+  Fewest::Shift const& shift_;
+  Path const& path_;
+  Fewest::Progress& progress_;
+};
+
+}  // namespace
+
+ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& options,
+                            Result* result, ExecutionState* executionState,
+                            std::int32_t maxPercent) {
+  if (result == nullptr || !AreValid(points) || !IsValid(options)) return ErrorCode::Failed;
+  if (DoCoincide(points)) return ErrorCode::NoFit;
+  Fewest::Progress progress(executionState, maxPercent, static_cast<std::int32_t>(points.size()));
+  Fewest::Shift const shift = Fewest::ShiftFor(points);
+  Path path;
+  path.points = shift.Apply(points);
+  path.limits = LimitsOf(options, shift.scale);
+
+  Fewest::Cover const cover = Fewest::CoverGreedily(
+      path.points, path.limits, [&](std::int32_t done) { progress.Tell(0, 20, done); });
+  Answer answer;
+  Promises::Report report;
+  if (!Fitter(points, options, shift, path, &progress).Run(&answer, &report)) {
+    return ErrorCode::NoFit;
+  }
+  progress.Finish();
+  result->contour = std::move(answer.contour);
+  result->ranges = std::move(answer.ranges);
+  result->largestDeviation = report.largestRatio;
+  result->largestDeviationIndex = static_cast<std::int32_t>(report.largestIndex);
+  result->fewestPossible = static_cast<std::int32_t>(cover.starts.size());
+  result->isFewest = static_cast<std::int32_t>(result->ranges.size()) == result->fewestPossible;
+  return ErrorCode::Ok;
+}
+
+}  // namespace Vorn

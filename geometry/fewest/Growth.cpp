@@ -1,0 +1,103 @@
+#include "geometry/fewest/Growth.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace Vorn::Fewest {
+
+namespace {
+
+/// A circle through the first, the middle and the last of a run, or the line of its ends.
+Circle FirstGuess(Sample const& first, Sample const& last) {
+  double const dx = last.x - first.x;
+  double const dy = last.y - first.y;
+  double const length = std::sqrt(dx * dx + dy * dy);
+  if (!(length > 0.0)) return {0.0, 0.0, 1.0, -first.y};
+  Circle line{0.0, -dy / length, dx / length, 0.0};
+  line.d = -(line.bx * first.x + line.by * first.y);
+  return line;
+}
+
+}  // namespace
+
+void FreeRun::Begin(std::int32_t start, std::int32_t expected) {
+  start_ = start;
+  auto const count = static_cast<std::int32_t>(points_.size());
+  std::int32_t const probe = std::min(count, start + expected);
+  auto const first = points_.subspan(static_cast<std::size_t>(start));
+  frame_.originX = first.front().x;
+  frame_.originY = first.front().y;
+  frame_.scale = ScaleOf(ExtentOf(first.first(static_cast<std::size_t>(probe - start))));
+  columns_.Clear();
+  basis_ = Basis();
+  programme_ = Programme();
+  programme_.columns = &columns_;
+  if (limits_.segmentsOnly) {
+    programme_.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0});
+  } else if (limits_.smallestRadius > 0.0) {
+    double const limit = 0.5 / (limits_.smallestRadius * frame_.scale);
+    programme_.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Slab, limit});
+  }
+}
+
+void FreeRun::Extend(std::int32_t end) {
+  for (std::int32_t i = start_ + columns_.Size(); i < end; ++i) {
+    columns_.Append(frame_.ToLocal(points_[static_cast<std::size_t>(i)]));
+  }
+  programme_.first = 0;
+  programme_.last = end - start_;
+}
+
+RunFit FreeRun::Try(std::int32_t end) {
+  Extend(end);
+  Simplex simplex(SlackFor(0.0));
+  Basis basis = basis_;
+  RunFit const fit = FitRun(programme_, {circle_, 0.0, false}, true, &simplex, &basis);
+  if (fit.isFound && fit.ratio <= 1.0 + simplex.Slack()) {
+    basis_ = basis;
+    circle_ = fit.circle;
+  }
+  return fit;
+}
+
+std::int32_t FreeRun::FindEnd(std::int32_t start, std::int32_t expected) {
+  auto const count = static_cast<std::int32_t>(points_.size());
+  Begin(start, std::max(expected, 2));
+  if (count - start <= 3) return count;
+  std::int32_t const probe = std::min(count - 1, start + std::max(expected / 2, 2));
+  circle_ = FirstGuess(frame_.ToLocal(points_[static_cast<std::size_t>(start)]),
+                       frame_.ToLocal(points_[static_cast<std::size_t>(probe)]));
+  std::int32_t good = start + 2;
+  std::int32_t bad = count + 1;
+  std::int32_t target = std::min(count, std::max(good + 2, start + expected));
+  Simplex simplex(SlackFor(0.0));
+  while (good < count) {
+    RunFit const fit = Try(target);
+    if (fit.isFound && fit.ratio <= 1.0 + simplex.Slack()) {
+      // The circle may hold for more points than it was asked for.
+      good = target;
+      while (good + 1 < bad && good < count) {
+        Extend(good + 1);
+        if (columns_.FindFirstAbove(good - start, good + 1 - start, circle_, 1.0) <= good - start) {
+          break;
+        }
+        ++good;
+      }
+    } else {
+      bad = target;
+    }
+    if (bad == good + 1) {
+      Extend(bad);
+      RunFit const proof = ProveRun(programme_, basis_, &simplex);
+      if (!proof.isFound) return good;
+      good = bad;
+      bad = count + 1;
+      if (proof.ratio <= 1.0 + simplex.Slack()) circle_ = proof.circle;
+    }
+    std::int32_t const doubled = good + (good - start);
+    target = bad <= count ? good + std::max(1, (bad - good) / 2) : std::min(count, doubled);
+  }
+  return count;
+}
+
+}  // namespace Vorn::Fewest

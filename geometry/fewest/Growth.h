@@ -1,0 +1,45 @@
+#pragma once
+
+#include <cstdint>
+#include <span>
+
+#include "geometry/fewest/Columns.h"
+#include "geometry/fewest/Limits.h"
+#include "geometry/fewest/LocalFrame.h"
+#include "geometry/fewest/RunTest.h"
+#include "geometry/fewest/Simplex.h"
+#include "vorn/Types.h"
+
+/// The longest run that one circle covers, without regard to its neighbours.
+namespace Vorn::Fewest {
+
+/// Finds longest runs; keeps its memory from one to the next.
+class FreeRun {
+ public:
+  FreeRun(std::span<WPoint const> points, Limits const& limits)
+      : points_(points), limits_(limits) {}
+
+  /// The end (one past the last point) of the longest run from a point on that one circle covers.
+  /// `expected` is a guess of its length, which only changes the time.
+  std::int32_t FindEnd(std::int32_t start, std::int32_t expected);
+
+ private:
+  void Begin(std::int32_t start, std::int32_t expected);
+  void Extend(std::int32_t end);
+  RunFit Try(std::int32_t end);
+
+  std::span<WPoint const> points_;
+  Limits limits_;
+  LocalFrame frame_;
+  Columns columns_;
+  Programme programme_;
+  Basis basis_;
+  Circle circle_;
+  std::int32_t start_ = 0;
+};
+
+/// Relative violation of a row that rounding may cause on a run of the given extent in units of its
+/// least tolerance: the inverse of a basis loses about extent / tolerance units in the last place.
+inline double SlackFor(double extentOverTolerance) { return 1e-10 + 4e-15 * extentOverTolerance; }
+
+}  // namespace Vorn::Fewest

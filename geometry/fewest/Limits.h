@@ -1,0 +1,22 @@
+#pragma once
+
+#include <limits>
+
+/// What a piece may be, besides within tolerance.
+namespace Vorn::Fewest {
+
+/// Bounds on every piece, in the unit of the points.
+struct Limits {
+  /// Least radius; 0 for none.
+  double smallestRadius = 0.0;
+  /// Greatest radius of an arc; infinite for none.
+  double largestRadius = std::numeric_limits<double>::infinity();
+  /// No arcs at all.
+  bool segmentsOnly = false;
+  /// Sine of half the greatest angle between neighbours on an arc.
+  double sineOfHalfStep = 0.5;
+  /// How far a piece may leave the path between neighbours; infinite for none.
+  double farthestBetweenPoints = std::numeric_limits<double>::infinity();
+};
+
+}  // namespace Vorn::Fewest

@@ -1,0 +1,40 @@
+#pragma once
+
+#include <cstdint>
+#include <span>
+#include <vector>
+
+#include "geometry/fewest/Circle.h"
+#include "geometry/fewest/Limits.h"
+#include "vorn/Types.h"
+
+/// The measured points as a path.
+namespace Vorn::Fewest {
+
+struct Gate;
+
+/// The points, moved near the origin, with what the search asks of them.
+struct Path {
+  /// The points.
+  std::vector<WPoint> points;
+  /// What a piece may be.
+  Limits limits;
+
+  std::int32_t Count() const { return static_cast<std::int32_t>(points.size()); }
+  WPoint const& At(std::int32_t i) const { return points[static_cast<std::size_t>(i)]; }
+};
+
+/// Distance of two points.
+double DistanceBetween(WPoint const& p, WPoint const& q);
+
+/// The gate in the middle of the gap before point `split`, square to the path.
+Gate MiddleGate(Path const& path, std::int32_t split);
+
+/// Unit vector to the left of the way from one point to another; 0 for coinciding points.
+Place LeftNormal(WPoint const& from, WPoint const& to);
+
+/// The gate across a place at which the path arrives with one left normal and leaves with another;
+/// its split and limits are left open.
+Gate BisectorGate(Place const& place, Place const& normalIn, Place const& normalOut);
+
+}  // namespace Vorn::Fewest

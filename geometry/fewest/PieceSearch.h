@@ -1,0 +1,121 @@
+#pragma once
+
+#include <cstdint>
+
+#include "geometry/fewest/Columns.h"
+#include "geometry/fewest/Gates.h"
+#include "geometry/fewest/LocalFrame.h"
+#include "geometry/fewest/Path.h"
+#include "geometry/fewest/RunTest.h"
+#include "geometry/fewest/Simplex.h"
+
+/// One piece of a chain: a circle that starts on a gate, covers a run of points and may end on
+/// another gate.
+namespace Vorn::Fewest {
+
+/// A gate with the offsets at which the piece before can end.
+struct Opening {
+  Gate gate;
+  double low = 0.0;
+  double high = 0.0;
+  /// No gate at all: the chain begins, or ends, at the end of the path.
+  bool isFree = true;
+};
+
+/// How far a piece reaches.
+struct Reach {
+  /// One past the last point covered.
+  std::int32_t end = 0;
+  /// A circle that covers them, in the coordinates of the path.
+  Circle circle;
+  /// Whether more points may be covered than are.
+  bool canGrow = false;
+};
+
+/// Offsets at which a piece can end on a gate.
+struct Interval {
+  double low = 0.0;
+  double high = 0.0;
+  bool isFound = false;
+  /// The pieces that end there.
+  Circle atLow;
+  Circle atHigh;
+};
+
+/// Searches pieces along one path; keeps its rows between searches.
+class PieceSearch {
+ public:
+  /// Tolerances are multiplied by `share`.
+  PieceSearch(Path const& path, double share) : path_(path), share_(share) {}
+
+  /// The same with another share from now on.
+  void SetShare(double share);
+
+  /// Moves the local coordinates to the points [first, last), about which the next searches go.
+  void MoveTo(std::int32_t first, std::int32_t last);
+
+  /// The farthest run that one piece covers from an opening on. `expected` is a guess of the end.
+  Reach FindReach(Opening const& from, std::int32_t expected);
+
+  /// The same where only a reach of at least that of a rival counts: a shorter one is given as one
+  /// point less than the rival's, with the circle of the rival.
+  Reach FindReachBeyond(Opening const& from, Reach const& rival);
+
+  /// The offsets at which a piece from an opening can end on a gate; `known` is a circle that
+  /// covers the points before it.
+  Interval FindInterval(Opening const& from, Gate const& to, Circle const& known);
+
+  /// The piece of the smallest largest ratio between two openings; a free opening stands for the
+  /// end of the path.
+  /// `start` is a circle to begin with; isFound when it is a piece of its ratio.
+  RunFit FindBest(Opening const& from, Opening const& to, RunFit const& start);
+
+  /// The circle of the smallest largest ratio through some points alone; its guess is their chord.
+  RunFit FitAlone(std::int32_t first, std::int32_t last);
+
+ private:
+  void Cover(std::int32_t first, std::int32_t last);
+  void BeginProgramme(Opening const& from, std::int32_t end);
+  void AddOpening(Opening const& opening);
+  void LimitCurvature(Opening const& from, std::int32_t end);
+  struct Ends {
+    Opening const* from = nullptr;
+    Opening const* to = nullptr;  ///< null while the end is open
+    std::int32_t first = 0;
+    std::int32_t end = 0;
+  };
+  struct Extreme {
+    double offset = 0.0;
+    Circle circle;
+    bool isFound = false;
+  };
+  Extreme FindExtreme(Ends const& ends, RunFit const& inner, bool isLow);
+
+  enum class Check { Holds, Added, Hopeless };
+
+  RunFit Fit(RunFit const& start, bool isTest, Ends const& ends);
+  Check AddBroken(Circle const& circle, Ends const& ends);
+  Check AddBrokenOrder(Circle const& circle, Ends const& ends);
+  Check AddBrokenStep(Circle const& circle, double gap2, Sample const& p, Place const& q);
+  bool IsFullTurn(Circle const& circle, Ends const& ends) const;
+  Check AddBrokenJoint(Circle const& circle, Opening const& opening, std::int32_t point);
+  Reach FindFirstReach(Opening const& from);
+  void Grow(Opening const& from, std::int32_t expected, Reach* reach);
+  RunFit FirstFit(Opening const& from, std::int32_t end);
+  Circle ToLocal(Circle const& circle) const;
+  Circle FromLocal(Circle const& circle) const;
+
+  Path const& path_;
+  double share_;
+  LocalFrame frame_;
+  Columns columns_;
+  std::int32_t columnsFirst_ = 0;
+  Programme programme_;
+  Basis basis_;
+  int normalisation_ = 0;
+};
+
+/// Offset at which a circle crosses a gate, in the coordinates of both; false when it does not.
+bool FindCrossing(Circle const& circle, Gate const& gate, double* offset);
+
+}  // namespace Vorn::Fewest

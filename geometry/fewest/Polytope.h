@@ -1,0 +1,54 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+
+#include "geometry/fewest/Columns.h"
+
+/// Polytopes in the space of the four coefficients, kept as a list of corners with their neighbours
+/// and cut by one half space after another (the double description of Motzkin and others 1953, for
+/// simple polytopes).
+namespace Vorn::Fewest {
+
+class Polytope {
+ public:
+  static constexpr int kMostCorners = 400;
+
+  /// The parallelepiped |row_j| <= limit_j, given the columns of the inverse of its rows.
+  Polytope(std::array<Circle, 4> const& inverse, std::array<double, 4> const& limits);
+
+  /// Where Form(c, c) is largest: at a corner or inside an edge, since the form has one negative
+  /// direction only and so no largest value inside a face of two dimensions.
+  struct Peak {
+    Circle circle;
+    double form = -1.0;
+  };
+  Peak FindPeak() const;
+
+  /// Cuts off row > limit. Answers false when there is no room for the new corners; the polytope is
+  /// then as before.
+  bool Cut(Row const& row, double limit);
+
+  /// Whether nothing is left.
+  bool IsEmpty() const { return count_ == 0; }
+  /// Number of corners.
+  int CornerCount() const { return count_; }
+
+ private:
+  struct Corner {
+    Circle at;
+    /// The four half spaces whose boundaries meet here, and the corner reached by leaving each.
+    std::array<std::int16_t, 4> planes;
+    std::array<std::int16_t, 4> neighbours;
+  };
+
+  void AddCornersOnEdges(std::array<double, kMostCorners> const& excess, int* added);
+  void LinkNewCorners(int firstNew);
+  void RemoveCut(std::array<double, kMostCorners> const& excess, int oldCount);
+
+  std::array<Corner, kMostCorners> corners_;
+  int count_ = 0;
+  std::int16_t planeCount_ = 8;
+};
+
+}  // namespace Vorn::Fewest

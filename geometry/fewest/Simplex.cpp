@@ -1,0 +1,346 @@
+// Notation: the basis holds four rows r_j with limits l_j; the solution v has r_j v = l_j, and the
+// columns of the inverse are the circles c_j with r_i c_j = [i = j]. The objective is the sum of
+// duals_j r_j. A row of two sides may take either sign, so every basis of such rows is dual
+// feasible after its signs are chosen: this is why any basis can be a start.
+
+#include "geometry/fewest/Simplex.h"
+
+#include <cmath>
+
+namespace Vorn::Fewest {
+
+namespace {
+
+/// More pivots than this are never needed but where rounding sends the search in circles.
+constexpr int kMostPivots = 80;
+
+/// After so many exchanges the inverse is computed anew.
+constexpr int kExchangesBeforeInversion = 12;
+
+/// A determinant below this share of its terms is rounding.
+constexpr double kLeastDeterminant = 1e-14;
+
+/// A pivot smaller than this share of the largest would spoil the inverse.
+constexpr double kLeastPivotShare = 1e-11;
+
+Row Negated(Row const& r) { return {-r.a, -r.bx, -r.by, -r.d}; }
+
+double& Component(Circle* c, int k) {
+  switch (k) {
+    case 0:
+      return c->a;
+    case 1:
+      return c->bx;
+    case 2:
+      return c->by;
+    default:
+      return c->d;
+  }
+}
+
+double Component(Circle const& c, int k) {
+  Circle copy = c;
+  return Component(&copy, k);
+}
+
+Circle Sum(Circle const& c, double factor, Circle const& o) {
+  return {c.a + factor * o.a, c.bx + factor * o.bx, c.by + factor * o.by, c.d + factor * o.d};
+}
+
+Row UnitRow(int k) {
+  return {k == 0 ? 1.0 : 0.0, k == 1 ? 1.0 : 0.0, k == 2 ? 1.0 : 0.0, k == 3 ? 1.0 : 0.0};
+}
+
+bool Holds(Basis const& basis, std::int32_t id) {
+  for (std::int32_t held : basis.ids) {
+    if (held == id) return true;
+  }
+  return false;
+}
+
+/// The id of a box row that the basis does not hold.
+std::int32_t FreeBox(Basis const& basis) {
+  std::int32_t id = Basis::kBox;
+  while (Holds(basis, id)) ++id;
+  return id;
+}
+
+}  // namespace
+
+bool Programme::Add(Condition const& condition) {
+  if (conditionCount == kMostConditions) return false;
+  conditions[static_cast<std::size_t>(conditionCount++)] = condition;
+  return true;
+}
+
+Row Simplex::RowOf(Programme const& programme, std::int32_t id) const {
+  if (id >= 0) return programme.columns->At(id);
+  if (id > Basis::kBox + 3) return programme.conditions[static_cast<std::size_t>(-1 - id)].row;
+  return UnitRow(id - Basis::kBox);
+}
+
+Condition::Kind Simplex::KindOf(Programme const& programme, std::int32_t id) const {
+  if (id >= 0 || id <= Basis::kBox + 3) return Condition::Kind::Slab;
+  return programme.conditions[static_cast<std::size_t>(-1 - id)].kind;
+}
+
+double Simplex::LimitOf(Programme const& programme, std::int32_t id) const {
+  if (id >= 0) return 1.0;
+  if (id <= Basis::kBox + 3) return programme.box;
+  return programme.conditions[static_cast<std::size_t>(-1 - id)].limit;
+}
+
+bool Simplex::Invert() {
+  // Cofactors from the minors of the upper and the lower two rows.
+  Row const& p = rows_[0];
+  Row const& q = rows_[1];
+  Row const& r = rows_[2];
+  Row const& s = rows_[3];
+  double const u0 = p.a * q.bx - q.a * p.bx;
+  double const u1 = p.a * q.by - q.a * p.by;
+  double const u2 = p.a * q.d - q.a * p.d;
+  double const u3 = p.bx * q.by - q.bx * p.by;
+  double const u4 = p.bx * q.d - q.bx * p.d;
+  double const u5 = p.by * q.d - q.by * p.d;
+  double const l0 = r.a * s.bx - s.a * r.bx;
+  double const l1 = r.a * s.by - s.a * r.by;
+  double const l2 = r.a * s.d - s.a * r.d;
+  double const l3 = r.bx * s.by - s.bx * r.by;
+  double const l4 = r.bx * s.d - s.bx * r.d;
+  double const l5 = r.by * s.d - s.by * r.d;
+  double const terms[6] = {u0 * l5, -u1 * l4, u2 * l3, u3 * l2, -u4 * l1, u5 * l0};
+  double determinant = 0.0;
+  double size = 0.0;
+  for (double term : terms) {
+    determinant += term;
+    size += std::fabs(term);
+  }
+  if (!(std::fabs(determinant) > kLeastDeterminant * size)) return false;
+  double const f = 1.0 / determinant;
+  inverse_[0] = {(q.bx * l5 - q.by * l4 + q.d * l3) * f, (-q.a * l5 + q.by * l2 - q.d * l1) * f,
+                 (q.a * l4 - q.bx * l2 + q.d * l0) * f, (-q.a * l3 + q.bx * l1 - q.by * l0) * f};
+  inverse_[1] = {(-p.bx * l5 + p.by * l4 - p.d * l3) * f, (p.a * l5 - p.by * l2 + p.d * l1) * f,
+                 (-p.a * l4 + p.bx * l2 - p.d * l0) * f, (p.a * l3 - p.bx * l1 + p.by * l0) * f};
+  inverse_[2] = {(s.bx * u5 - s.by * u4 + s.d * u3) * f, (-s.a * u5 + s.by * u2 - s.d * u1) * f,
+                 (s.a * u4 - s.bx * u2 + s.d * u0) * f, (-s.a * u3 + s.bx * u1 - s.by * u0) * f};
+  inverse_[3] = {(-r.bx * u5 + r.by * u4 - r.d * u3) * f, (r.a * u5 - r.by * u2 + r.d * u1) * f,
+                 (-r.a * u4 + r.bx * u2 - r.d * u0) * f, (r.a * u3 - r.bx * u1 + r.by * u0) * f};
+  return true;
+}
+
+bool Simplex::IsAccurate() const {
+  for (std::size_t j = 0; j < 4; ++j) {
+    double const residual = std::fabs(Apply(rows_[j], solution_) - limits_[j]);
+    if (!(residual <= 0.1 * slack_ * (limits_[j] > 1.0 ? limits_[j] : 1.0))) return false;
+  }
+  return true;
+}
+
+bool Simplex::Load(Programme const& programme, Basis* basis) {
+  for (std::int32_t j = 0; j < 4; ++j) {
+    std::int32_t& id = basis->ids[static_cast<std::size_t>(j)];
+    bool const isStale = id >= 0 ? id < programme.first || id >= programme.last
+                                 : id > Basis::kBox + 3 && -1 - id >= programme.conditionCount;
+    if (isStale) id = FreeBox(*basis);
+    rows_[static_cast<std::size_t>(j)] = RowOf(programme, id);
+    limits_[static_cast<std::size_t>(j)] = LimitOf(programme, id);
+  }
+  return Invert() && TakeEqualities(programme, basis);
+}
+
+bool Simplex::TakeEqualities(Programme const& programme, Basis* basis) {
+  for (int k = 0; k < programme.conditionCount; ++k) {
+    Condition const& condition = programme.conditions[static_cast<std::size_t>(k)];
+    if (condition.kind != Condition::Kind::Equality || Holds(*basis, -1 - k)) continue;
+    int best = -1;
+    double largest = 0.0;
+    for (std::size_t j = 0; j < 4; ++j) {
+      if (KindOf(programme, basis->ids[j]) == Condition::Kind::Equality) continue;
+      double const step = std::fabs(Apply(condition.row, inverse_[j]));
+      if (step > largest) {
+        largest = step;
+        best = static_cast<int>(j);
+      }
+    }
+    if (best < 0) return false;
+    auto const l = static_cast<std::size_t>(best);
+    basis->ids[l] = -1 - k;
+    rows_[l] = condition.row;
+    limits_[l] = condition.limit;
+    if (!Invert()) return false;
+  }
+  return true;
+}
+
+bool Simplex::MakeDualFeasible(Programme const& programme, Row const& objective, Basis* basis) {
+  for (int round = 0; round < 8; ++round) {
+    bool isChanged = false;
+    for (std::size_t j = 0; j < 4; ++j) {
+      duals_[j] = Apply(objective, inverse_[j]);
+      Condition::Kind const kind = KindOf(programme, basis->ids[j]);
+      if (duals_[j] >= 0.0 || kind == Condition::Kind::Equality) continue;
+      if (kind == Condition::Kind::Slab) {
+        rows_[j] = Negated(rows_[j]);
+        inverse_[j] = Scaled(inverse_[j], -1.0);
+        duals_[j] = -duals_[j];
+        continue;
+      }
+      // A half space on the wrong side makes way for the box row that keeps the basis regular.
+      int best = 0;
+      for (int k = 1; k < 4; ++k) {
+        if (std::fabs(Component(inverse_[j], k)) > std::fabs(Component(inverse_[j], best))) {
+          best = k;
+        }
+      }
+      basis->ids[j] = Basis::kBox + best;
+      rows_[j] = UnitRow(best);
+      limits_[j] = programme.box;
+      isChanged = true;
+      break;
+    }
+    if (!isChanged) return true;
+    if (!Invert()) return false;
+  }
+  return false;
+}
+
+void Simplex::Solve() {
+  solution_ = {};
+  for (std::size_t j = 0; j < 4; ++j) solution_ = Sum(solution_, limits_[j], inverse_[j]);
+}
+
+Simplex::Entry Simplex::Price(Programme const& programme) const {
+  Entry entry;
+  double worst = slack_;
+  auto const offer = [&](std::int32_t id, Row const& row, double limit, double excess) {
+    if (!(excess > worst)) return;
+    worst = excess;
+    entry = {id, row, limit, excess, true};
+  };
+  for (int k = 0; k < programme.conditionCount; ++k) {
+    Condition const& condition = programme.conditions[static_cast<std::size_t>(k)];
+    double const value = Apply(condition.row, solution_);
+    switch (condition.kind) {
+      case Condition::Kind::HalfSpace:
+        offer(-1 - k, condition.row, condition.limit, value - condition.limit);
+        break;
+      case Condition::Kind::Slab:
+        offer(-1 - k, value > 0.0 ? condition.row : Negated(condition.row), condition.limit,
+              std::fabs(value) - condition.limit);
+        break;
+      case Condition::Kind::Equality:
+        break;
+    }
+  }
+  Columns::Worst const point =
+      programme.columns->FindWorst(programme.first, programme.last, solution_);
+  if (point.index >= 0 && point.value - 1.0 > worst) {
+    Row const row = programme.columns->At(point.index);
+    double const value = Apply(row, solution_);
+    offer(point.index, value > 0.0 ? row : Negated(row), 1.0, point.value - 1.0);
+  }
+  return entry;
+}
+
+int Simplex::FindLeaving(Programme const& programme, Basis const& basis,
+                         std::array<double, 4> const& step, double* length) const {
+  double largest = 0.0;
+  for (double s : step) largest = std::fabs(s) > largest ? std::fabs(s) : largest;
+  int leaving = -1;
+  double least = 0.0;
+  for (std::size_t j = 0; j < 4; ++j) {
+    if (!(step[j] > kLeastPivotShare * largest)) continue;
+    if (KindOf(programme, basis.ids[j]) == Condition::Kind::Equality) continue;
+    double const ratio = duals_[j] / step[j];
+    if (leaving < 0 || ratio < least ||
+        (ratio == least && step[j] > step[static_cast<std::size_t>(leaving)])) {
+      leaving = static_cast<int>(j);
+      least = ratio;
+    }
+  }
+  *length = least;
+  return leaving;
+}
+
+void Simplex::Exchange(int leaving, Entry const& entry, std::array<double, 4> const& step) {
+  auto const l = static_cast<std::size_t>(leaving);
+  double const theta = duals_[l] / step[l];
+  inverse_[l] = Scaled(inverse_[l], 1.0 / step[l]);
+  for (std::size_t j = 0; j < 4; ++j) {
+    if (j == l) continue;
+    inverse_[j] = Sum(inverse_[j], -step[j], inverse_[l]);
+    duals_[j] -= theta * step[j];
+    if (duals_[j] < 0.0 && duals_[j] > -1e-300) duals_[j] = 0.0;
+  }
+  duals_[l] = theta;
+  rows_[l] = entry.row;
+  limits_[l] = entry.limit;
+}
+
+bool Simplex::InvertBasis(Programme const& programme, Basis const& basis,
+                          std::array<Circle, 4>* inverse, std::array<double, 4>* limits) {
+  Basis held = basis;
+  if (!Load(programme, &held)) return false;
+  *inverse = inverse_;
+  *limits = limits_;
+  return true;
+}
+
+Condition Simplex::FindBrokenSlab(Programme const& programme, Circle const& circle) const {
+  Condition worst;
+  double largest = -1.0;
+  for (int k = 0; k < programme.conditionCount; ++k) {
+    Condition const& condition = programme.conditions[static_cast<std::size_t>(k)];
+    if (condition.kind != Condition::Kind::Slab) continue;
+    double const value = std::fabs(Apply(condition.row, circle)) / condition.limit;
+    if (value > largest) {
+      largest = value;
+      worst = condition;
+    }
+  }
+  Columns::Worst const point =
+      programme.columns->FindWorst(programme.first, programme.last, circle);
+  if (point.value > largest) {
+    worst = {programme.columns->At(point.index), Condition::Kind::Slab, 1.0};
+  }
+  return worst;
+}
+
+Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objective, double enough,
+                                  Basis* basis) {
+  if (!Load(programme, basis)) {
+    *basis = Basis();
+    if (!Load(programme, basis)) return Status::Stalled;
+  }
+  if (!MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
+  Solve();
+  int exchanges = 0;
+  for (int pivot = 0; pivot < kMostPivots; ++pivot) {
+    if (Apply(objective, solution_) < enough) return Status::Infeasible;
+    Entry const entry = Price(programme);
+    if (!entry.isFound) {
+      if (exchanges == 0 || IsAccurate()) return Status::Optimal;
+      if (!Invert()) return Status::Stalled;
+      if (!MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
+      Solve();
+      exchanges = 0;
+      if (!Price(programme).isFound) return Status::Optimal;
+      continue;
+    }
+    std::array<double, 4> step;
+    for (std::size_t j = 0; j < 4; ++j) step[j] = Apply(entry.row, inverse_[j]);
+    double length = 0.0;
+    int const leaving = FindLeaving(programme, *basis, step, &length);
+    if (leaving < 0) return Status::Infeasible;
+    basis->ids[static_cast<std::size_t>(leaving)] = entry.id;
+    Exchange(leaving, entry, step);
+    if (++exchanges >= kExchangesBeforeInversion) {
+      if (!Invert() || !MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
+      exchanges = 0;
+    }
+    Solve();
+  }
+  return Status::Stalled;
+}
+
+}  // namespace Vorn::Fewest

@@ -1,0 +1,106 @@
+#pragma once
+
+#include <array>
+#include <cstdint>
+
+#include "geometry/fewest/Columns.h"
+
+/// Linear programmes in the four coefficients of a circle, solved by the dual simplex method with
+/// an explicit inverse of the basis (Dantzig 1963; pricing by the largest violation).
+namespace Vorn::Fewest {
+
+/// A condition besides the tolerance rows.
+struct Condition {
+  Row row;
+  /// Slab: |row| <= limit. HalfSpace: row <= limit. Equality: row = limit, always kept.
+  enum class Kind : std::int8_t { Slab, HalfSpace, Equality } kind = Kind::Slab;
+  double limit = 0.0;
+};
+
+/// The rows that a circle has to obey: those of the points [first, last) and some more.
+struct Programme {
+  static constexpr int kMostConditions = 24;
+
+  Columns const* columns = nullptr;
+  std::int32_t first = 0;
+  std::int32_t last = 0;
+  int conditionCount = 0;
+  /// Bounds every coefficient, so that the programme has an end where the points leave it without.
+  /// Local coordinates are of the order of 1, so this one holds every circle down to a radius of
+  /// 1e-6; the smaller, the better the rounding.
+  double box = 1048576.0;
+  std::array<Condition, kMostConditions> conditions;
+
+  /// Adds a condition; one too many is left out and answers false.
+  bool Add(Condition const& condition);
+};
+
+/// The four rows that hold a corner of the polytope. An id of 0 or more is the position of a point,
+/// -1 - k condition k, kBox + k the box around coefficient k.
+struct Basis {
+  static constexpr std::int32_t kBox = -1000;
+  std::array<std::int32_t, 4> ids{kBox, kBox + 1, kBox + 2, kBox + 3};
+};
+
+/// Solves one programme after another, each from the basis of the one before.
+class Simplex {
+ public:
+  enum class Status { Optimal, Infeasible, Stalled };
+
+  /// Largest relative violation of a row that counts as none.
+  explicit Simplex(double slack) : slack_(slack) {}
+
+  /// Finds the circle with the largest value of the objective.
+  ///
+  /// @param[in]     programme the rows
+  /// @param[in]     objective what is to be large
+  /// @param[in]     enough    a value below which the search stops early: the optimum is below it
+  /// @param[in,out] basis     where to start; afterwards the basis of the answer
+  /// @return Optimal; Infeasible when the rows contradict each other; Stalled when rounding keeps
+  ///         the search from an end
+  Status Maximise(Programme const& programme, Row const& objective, double enough, Basis* basis);
+
+  /// The circle found last.
+  Circle const& Solution() const { return solution_; }
+  /// Largest relative violation of a row that counts as none.
+  double Slack() const { return slack_; }
+
+  /// The columns of the inverse of the rows of a basis, and the limits of the rows; false when the
+  /// rows depend on each other.
+  bool InvertBasis(Programme const& programme, Basis const& basis, std::array<Circle, 4>* inverse,
+                   std::array<double, 4>* limits);
+  /// The slab or point row that a circle breaks most, in units of its limit.
+  Condition FindBrokenSlab(Programme const& programme, Circle const& circle) const;
+
+ private:
+  struct Entry {
+    std::int32_t id = 0;
+    Row row;
+    double limit = 0.0;
+    double excess = 0.0;
+    bool isFound = false;
+  };
+
+  bool Load(Programme const& programme, Basis* basis);
+  bool TakeEqualities(Programme const& programme, Basis* basis);
+  Row RowOf(Programme const& programme, std::int32_t id) const;
+  Condition::Kind KindOf(Programme const& programme, std::int32_t id) const;
+  double LimitOf(Programme const& programme, std::int32_t id) const;
+  bool Invert();
+  bool IsAccurate() const;
+  bool MakeDualFeasible(Programme const& programme, Row const& objective, Basis* basis);
+  void Solve();
+  Entry Price(Programme const& programme) const;
+  int FindLeaving(Programme const& programme, Basis const& basis, std::array<double, 4> const& step,
+                  double* length) const;
+  void Exchange(int leaving, Entry const& entry, std::array<double, 4> const& step);
+
+  double slack_;
+  std::array<Row, 4> rows_;
+  std::array<double, 4> limits_;
+  std::array<double, 4> duals_;
+  std::array<Circle, 4> inverse_;
+  Circle solution_;
+};
+
+}  // namespace Vorn::Fewest
