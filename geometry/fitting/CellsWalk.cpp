@@ -1,23 +1,22 @@
-// Strategy MixedCells: the longest segments are looked for first, and the points passed over
-// between two of them are covered by arcs.
+// Strategy MixedCells.
 //
-// The search begins two points behind the anchor once a segment stands, so that an arc of three
-// points at least lies between two segments. An arc that does not fit gives up its last points one
-// by one, and what it leaves is covered by the next arc; only where not even three points fit do
-// plain segments from point to point take its place.
+// The search for segments begins two points behind the anchor once a segment stands, so that an arc
+// of three points at least lies between two segments. An arc that does not fit gives up its last
+// points one by one, and what it leaves is covered by the next arc; only where not even three
+// points fit do plain segments from point to point take its place.
 
 #include <cstdint>
+#include <optional>
 #include <vector>
 
-#include "geometry/fitting/Runs.h"
 #include "geometry/fitting/Strategies.h"
-#include "vorn/GeometryUtils.h"
+#include "geometry/fitting/arc/ArcFit.h"
+#include "geometry/fitting/line/LineDeviation.h"
+#include "geometry/fitting/line/LineFit.h"
+#include "geometry/fitting/runs/Pieces.h"
+#include "geometry/fitting/runs/Runs.h"
 
-namespace Vorn {
-
-using Fitting::At;
-using Fitting::kFewestArcPoints;
-using Fitting::ToPoint;
+namespace Vorn::Fitting {
 
 namespace {
 
@@ -28,174 +27,185 @@ bool IsKnownType(GeometryUtils::ElemType type) {
   return type == GeometryUtils::ElemType::Segment || type == GeometryUtils::ElemType::Arc;
 }
 
-}  // namespace
+/// The walk from anchor to anchor.
+class CellsWalk {
+ public:
+  explicit CellsWalk(CurveTask const& task)
+      : task_(task), run_(RunOverAll(task.points)), arcFit_(AfterFailure::NoCell) {}
 
-CellsWalk::CellsWalk(std::vector<WPoint> const& points, std::vector<GeometryUtils::Elem>* contour,
-                     GeometryUtils::ProgressBase const& progress)
-    : points_(points), contour_(*contour), progress_(progress) {}
+  CurveResult Walk() {
+    while (anchor_ < LastIndex()) {
+      ErrorCode const code = Advance();
+      if (code != ErrorCode::Ok) return {code, std::nullopt};
+    }
+    return {ErrorCode::Ok, largest_.Get()};
+  }
 
-ErrorCode CellsWalk::Run(LargestDeviation* largest) {
-  while (anchor_ < LastIndex()) {
+ private:
+  /// One step of the search: covers points, or passes over more of them.
+  ErrorCode Advance() {
     bool const isLastPair = anchor_ == LastIndex() - 1;
     if (isLastPair) skipped_ = 0;
-    std::int32_t const remaining = LastIndex() + 1 - skipped_ - anchor_;
+    std::int32_t const first = anchor_ + skipped_;
+    std::int32_t const remaining = run_.count - first;
     if (remaining < kFewestArcPoints && !isLastPair) {
       CoverTail();
-      continue;
+      return ErrorCode::Ok;
     }
-    Line line;
-    ErrorCode const found = FindLine(isLastPair, &line);
+    FittedLine line;
+    ErrorCode const found = FindLine({run_.points, first, remaining}, isLastPair, &line);
     if (found != ErrorCode::Ok) return found;
-    if (line.count > 2 || isLastPair) {
-      ErrorCode const taken = TakeLine(&line);
-      if (taken != ErrorCode::Ok) return taken;
-    } else {
-      // An opening arc needs three points as well.
-      skipped_ += anchor_ == 0 && skipped_ == 0 ? kArcRoom : 1;
-    }
-  }
-  *largest = largest_;
-  return ErrorCode::Ok;
-}
-
-/// The longest segment from the first point not passed over; between the last two points one that
-/// begins where the contour ends.
-ErrorCode CellsWalk::FindLine(bool isLastPair, Line* line) {
-  if (isLastPair && (contour_.empty() || !IsKnownType(contour_.back().type))) {
-    return ErrorCode::Failed;
-  }
-  std::int32_t const first = anchor_ + skipped_;
-  return FitLine(first, LastIndex() + 1 - first, isLastPair, false, line);
-}
-
-ErrorCode CellsWalk::FitLine(std::int32_t first, std::int32_t count, bool startFixed, bool endFixed,
-                             Line* line) {
-  if (startFixed) line->start = CurrentEnd();
-  std::vector<std::int32_t> indexList;
-  ErrorCode lineCode = ErrorCode::Ok;
-  return GeometryUtils::GetFittingLine(points_, first, count, startFixed, &line->start, endFixed,
-                                       &line->end, true, &line->count, &line->deviation,
-                                       &line->deviationIndex, &indexList, &lineCode, progress_);
-}
-
-/// Covers the points passed over and appends the segment. One that would leave a single point over
-/// gives up its last one, even if only two remain.
-ErrorCode CellsWalk::TakeLine(Line* line) {
-  std::int32_t const first = anchor_ + skipped_;
-  if (first + line->count == LastIndex()) {
-    ErrorCode const shortened = FitLine(first, line->count - 1, false, false, line);
-    if (shortened != ErrorCode::Ok) return shortened;
-  }
-  ErrorCode const code = CoverGap(first, line->start);
-  if (code != ErrorCode::Ok) return code;
-  PlaceStart(line->start);
-  GeometryUtils::AddSegm(&contour_, line->end);
-  largest_.Take(line->deviation, line->deviationIndex);
-  anchor_ += line->count - 1;
-  skipped_ = kArcRoom;
-  return ErrorCode::Ok;
-}
-
-/// Covers the points from the anchor to `last`, where the next segment begins at `end`.
-ErrorCode CellsWalk::CoverGap(std::int32_t last, Point const& end) {
-  while (anchor_ < last) {
-    ErrorCode const code = last - anchor_ == 1 ? BridgeGap(end) : CoverByArc(last, end);
-    if (code != ErrorCode::Ok) return code;
-  }
-  return ErrorCode::Ok;
-}
-
-ErrorCode CellsWalk::BridgeGap(Point const& end) {
-  Line line;
-  line.end = end;
-  ErrorCode const code = FitLine(anchor_, 2, true, true, &line);
-  if (code != ErrorCode::Ok) return code;
-  GeometryUtils::AddSegm(&contour_, line.end);
-  largest_.Take(line.deviation, line.deviationIndex);
-  ++anchor_;
-  return ErrorCode::Ok;
-}
-
-ErrorCode CellsWalk::CoverByArc(std::int32_t last, Point const& end) {
-  std::int32_t const longest = last - anchor_ + 1;
-  for (std::int32_t count = longest; count >= kFewestArcPoints; --count) {
-    ErrorCode const code = FitArc(count, true, count == longest, end);
-    if (code == ErrorCode::NoFit) continue;
-    if (code != ErrorCode::OrientationMismatch) return code;
-    // Points that bend both ways: one segment stands for all of them, whatever it leaves.
-    AppendSegment(last, end);
+    if (line.count > 2 || isLastPair) return TakeLine(first, line);
+    // An opening arc needs three points as well.
+    skipped_ += first == 0 ? kArcRoom : 1;
     return ErrorCode::Ok;
   }
-  AppendSegments(last, end);
-  return ErrorCode::Ok;
-}
 
-/// Covers the points behind the anchor when too few are left to look for a segment.
-void CellsWalk::CoverTail() {
-  for (std::int32_t count = LastIndex() + 1 - anchor_; count >= kFewestArcPoints; --count) {
-    ErrorCode const code = FitArc(count, !startElementPending_, false, {});
-    if (code == ErrorCode::Ok) {
-      skipped_ = kArcRoom;
-      return;
+  /// The longest segment from the first point not passed over; between the last two points one that
+  /// begins where the contour ends.
+  ErrorCode FindLine(Run const& run, bool isLastPair, FittedLine* line) {
+    if (!isLastPair) return FitLineTo(run, {}, line);
+    if (task_.contour.empty() || !IsKnownType(task_.contour.back().type)) return ErrorCode::Failed;
+    return FitLineTo(run, {CurrentEnd(), std::nullopt}, line);
+  }
+
+  ErrorCode FitLineTo(Run const& run, Ends const& ends, FittedLine* line) {
+    std::vector<std::int32_t> offenders;
+    LineFitResult const result = FitLine({run, ends, true, task_.progress}, &offenders);
+    if (result.code == ErrorCode::Ok) *line = *result.line;
+    return result.code;
+  }
+
+  /// Covers the points passed over and appends the segment. One that would leave a single point
+  /// over gives up its last one, even if only two remain.
+  ErrorCode TakeLine(std::int32_t first, FittedLine line) {
+    if (first + line.count == LastIndex()) {
+      ErrorCode const shortened = FitLineTo({run_.points, first, line.count - 1}, {}, &line);
+      if (shortened != ErrorCode::Ok) return shortened;
     }
-    if (code != ErrorCode::NoFit) break;
+    ErrorCode const code = CoverGap(first, line.start);
+    if (code != ErrorCode::Ok) return code;
+    PlaceStart(line.start);
+    AppendLine(line);
+    skipped_ = kArcRoom;
+    return ErrorCode::Ok;
   }
-  AppendSegments(LastIndex(), ToPoint(points_.back()));
-}
 
-/// Fits an arc over the points from the anchor on and appends it. On success the anchor moves to
-/// its last point.
-ErrorCode CellsWalk::FitArc(std::int32_t count, bool startFixed, bool endFixed, Point const& end) {
-  Point arcStart = CurrentEnd();
-  Point arcEnd = end;
-  std::vector<GeometryUtils::IndexedPoint> samples;
-  std::int32_t arcCount = 0;
-  Point centre;
-  double radius = 0.0;
-  bool ccw = false;
-  double deviation = 0.0;
-  std::int32_t deviationIndex = -1;
-  ErrorCode const code = GeometryUtils::GetFittingCircleO(
-      points_, anchor_, count, startFixed, &arcStart, endFixed, &arcEnd, &samples, nullptr,
-      &arcCount, &centre, &radius, &ccw, &deviation, &deviationIndex);
-  if (code != ErrorCode::Ok) return code;
-  PlaceStart(arcStart);
-  GeometryUtils::AddArc(&contour_, arcStart, arcEnd, centre, radius, !ccw);
-  largest_.Take(deviation, deviationIndex);
-  anchor_ += arcCount - 1;
-  return ErrorCode::Ok;
-}
-
-/// From point to point, the last one ending at `end`.
-void CellsWalk::AppendSegments(std::int32_t last, Point const& end) {
-  while (anchor_ < last) {
-    std::int32_t const next = anchor_ + 1;
-    AppendSegment(next, next == last ? end : ToPoint(At(points_, next)));
+  /// Covers the points from the anchor to `last`, where the next segment begins at `end`.
+  ErrorCode CoverGap(std::int32_t last, Point const& end) {
+    while (anchor_ < last) {
+      ErrorCode const code = last - anchor_ == 1 ? BridgeGap(end) : CoverByArc(last, end);
+      if (code != ErrorCode::Ok) return code;
+    }
+    return ErrorCode::Ok;
   }
-}
 
-/// One segment from the contour's end over the points up to `last`, with the deviation that it has.
-void CellsWalk::AppendSegment(std::int32_t last, Point const& end) {
-  Point const start = CurrentEnd();
-  std::int32_t deviationIndex = -1;
-  double const deviation = GeometryUtils::GetMaxDeviationFromLine(
-      points_, anchor_, last - anchor_ + 1, start, end, &deviationIndex);
-  PlaceStart(start);
-  GeometryUtils::AddSegm(&contour_, end);
-  largest_.Take(deviation, deviationIndex);
-  anchor_ = last;
-}
+  ErrorCode BridgeGap(Point const& end) {
+    FittedLine line;
+    ErrorCode const code = FitLineTo({run_.points, anchor_, 2}, {CurrentEnd(), end}, &line);
+    if (code == ErrorCode::Ok) AppendLine(line);
+    return code;
+  }
 
-void CellsWalk::PlaceStart(Point const& start) {
-  if (!startElementPending_) return;
-  GeometryUtils::AddSegm(&contour_, start);
-  startElementPending_ = false;
-}
+  ErrorCode CoverByArc(std::int32_t last, Point const& end) {
+    std::int32_t const longest = last - anchor_ + 1;
+    for (std::int32_t count = longest; count >= kFewestArcPoints; --count) {
+      ErrorCode const code = AppendFittedArc(count, {CurrentEnd(), FixedIf(count == longest, end)});
+      if (code == ErrorCode::NoFit) continue;
+      if (code != ErrorCode::OrientationMismatch) return code;
+      // Points that bend both ways: one segment stands for all of them, whatever it leaves.
+      AppendSegment(last, end);
+      return ErrorCode::Ok;
+    }
+    AppendSegments(last, end);
+    return ErrorCode::Ok;
+  }
 
-CellsWalk::Point CellsWalk::CurrentEnd() const {
-  return startElementPending_ ? ToPoint(points_.front()) : contour_.back().end;
-}
+  /// Covers the points behind the anchor when too few are left to look for a segment.
+  void CoverTail() {
+    for (std::int32_t count = run_.count - anchor_; count >= kFewestArcPoints; --count) {
+      ErrorCode const code =
+          AppendFittedArc(count, {FixedIf(!startElementPending_, CurrentEnd()), std::nullopt});
+      if (code == ErrorCode::Ok) {
+        skipped_ = kArcRoom;
+        return;
+      }
+      if (code != ErrorCode::NoFit) break;
+    }
+    AppendSegments(LastIndex(), run_.LastPoint());
+  }
 
-std::int32_t CellsWalk::LastIndex() const { return static_cast<std::int32_t>(points_.size()) - 1; }
+  /// Fits an arc over so many points from the anchor on and appends it.
+  ErrorCode AppendFittedArc(std::int32_t count, Ends const& ends) {
+    arcCell_.samples.clear();
+    FittedArc arc;
+    ErrorCode const code = arcFit_.Fit({{run_.points, anchor_, count}, ends}, &arcCell_, &arc);
+    if (code != ErrorCode::Ok) return code;
+    PlaceStart(arc.start);
+    GeometryUtils::AddArc(&task_.contour, arc.start, arc.end, arc.circle.centre, arc.circle.radius,
+                          !arc.ccw);
+    GoOnBehind(arc);
+    return ErrorCode::Ok;
+  }
 
-}  // namespace Vorn
+  /// Segments from point to point, the last one ending at `end`.
+  void AppendSegments(std::int32_t last, Point const& end) {
+    while (anchor_ < last) {
+      std::int32_t const next = anchor_ + 1;
+      AppendSegment(next, next == last ? end : run_.PointAt(next));
+    }
+  }
+
+  /// One segment from the contour's end over the points up to `last`, with the deviation that it
+  /// has.
+  void AppendSegment(std::int32_t last, Point const& end) {
+    Point const start = CurrentEnd();
+    std::int32_t const count = last - anchor_ + 1;
+    PlaceStart(start);
+    AppendLine({{start, end, count,
+                 LargestDeviationFromLine({run_.points, anchor_, count}, {start, end})}});
+  }
+
+  void AppendLine(FittedLine const& line) {
+    GeometryUtils::AddSegm(&task_.contour, line.end);
+    GoOnBehind(line);
+  }
+
+  /// The anchor moves to the piece's last point.
+  void GoOnBehind(Piece const& piece) {
+    largest_.Take(piece.deviation);
+    anchor_ += piece.count - 1;
+  }
+
+  void PlaceStart(Point const& start) {
+    if (!startElementPending_) return;
+    GeometryUtils::AddSegm(&task_.contour, start);
+    startElementPending_ = false;
+  }
+
+  /// Where the next element begins: the last element's end, at first the first input point.
+  Point CurrentEnd() const {
+    return startElementPending_ ? run_.FirstPoint() : task_.contour.back().end;
+  }
+
+  std::int32_t LastIndex() const { return run_.count - 1; }
+
+  CurveTask const& task_;
+  Run const run_;
+  ArcFit arcFit_;
+  /// The samples and the cell of the arc fitted last; kept for its room only.
+  ArcCell arcCell_;
+
+  /// The last point that an element covers.
+  std::int32_t anchor_ = 0;
+  /// How many points after the anchor the search for segments has passed over.
+  std::int32_t skipped_ = 0;
+  bool startElementPending_ = true;
+  LargestDeviation largest_;
+};
+
+}  // namespace
+
+CurveResult FitMixedCells(CurveTask const& task) { return CellsWalk(task).Walk(); }
+
+}  // namespace Vorn::Fitting

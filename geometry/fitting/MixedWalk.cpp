@@ -1,18 +1,18 @@
-// Strategy Mixed: from the current point both fitters say how far one element can reach. The longer
-// reach wins; on equal reach the arc, unless its deviation is larger.
+// Strategy Mixed.
 
 #include <algorithm>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
-#include "geometry/fitting/Runs.h"
 #include "geometry/fitting/Strategies.h"
-#include "vorn/GeometryUtils.h"
+#include "geometry/fitting/arc/ArcSearch.h"
+#include "geometry/fitting/line/LineFit.h"
+#include "geometry/fitting/runs/Pieces.h"
+#include "geometry/fitting/runs/Runs.h"
+#include "math/Assert.h"
 
-namespace Vorn {
-
-using Fitting::kFewestArcPoints;
-using Fitting::ToPoint;
+namespace Vorn::Fitting {
 
 namespace {
 
@@ -20,83 +20,105 @@ namespace {
 /// before.
 constexpr int kLineAttempts = 3;
 
-}  // namespace
+/// The walk from point to point.
+class MixedWalk {
+ public:
+  explicit MixedWalk(CurveTask const& task) : task_(task) {}
 
-MixedWalk::MixedWalk(std::vector<WPoint> const& points, std::vector<GeometryUtils::Elem>* contour,
-                     GeometryUtils::ProgressBase const& progress)
-    : points_(points), contour_(*contour), progress_(progress), start_(ToPoint(points.front())) {}
+  /// Appends elements up to the last point, or as far as either fitter gets.
+  LargestDeviation Walk() {
+    while (Rest().count > 1 && AppendNext()) {
+    }
+    return largest_;
+  }
 
-LargestDeviation MixedWalk::Run() {
-  auto const n = static_cast<std::int32_t>(points_.size());
-  while (runStart_ + 1 < n) {
-    std::int32_t const remaining = n - runStart_;
-    end_ = ToPoint(points_.back());
+ private:
+  /// The points from the last covered one on.
+  Run Rest() const {
+    return {task_.points, first_, static_cast<std::int32_t>(task_.points.size()) - first_};
+  }
 
-    Line line;
-    Arc arc;
-    bool const hasLine = FitLine(remaining, &line);
+  /// Appends the element with the longer reach. False when there is none. Deliberate: the contour
+  /// made so far then stands, which is no error.
+  bool AppendNext() {
+    std::optional<FittedLine> const line = FindLine();
+    std::optional<FittedArc> const arc = FindArc(line);
+    if (arc && (!line || IsBetter(*arc, *line))) return Append(*arc);
+    return line && Append(*line);
+  }
+
+  /// Nothing when the line fitter reports an error. Of an attempt only the points that deviate most
+  /// go on to the next one.
+  std::optional<FittedLine> FindLine() {
+    offenders_.clear();
+    std::optional<FittedLine> line;
+    for (int attempt = 1; attempt <= kLineAttempts; ++attempt) {
+      bool const isLast = attempt == kLineAttempts;
+      LineFitResult const result =
+          FitLine({Rest(), {fixedStart_, std::nullopt}, isLast, task_.progress}, &offenders_);
+      if (result.code != ErrorCode::Ok) return std::nullopt;
+      line = result.line;
+      if (offenders_.empty()) break;
+    }
+    return line;
+  }
+
+  /// An arc that reaches no less far than the line.
+  std::optional<FittedArc> FindArc(std::optional<FittedLine> const& line) {
     // Deliberate: a line of two points that ends where the points turn back is taken unasked; an
     // arc could only run on past the turn.
-    bool const isTurn = hasLine && line.count == 2 && line.code == ErrorCode::SelfIntersection;
-    bool hasArc = false;
-    if (!isTurn) {
-      std::int32_t const minimumRun =
-          hasLine ? std::max(line.count, kFewestArcPoints) : kFewestArcPoints;
-      hasArc = FitArc(remaining, minimumRun, &arc);
-    }
-    // Deliberate: where neither fits, the contour made so far stands and is no error.
-    if (!hasLine && !hasArc) break;
-    bool const isArcBetter =
-        arc.count > line.count || (arc.count == line.count && arc.deviation <= line.deviation);
-    bool const takeArc = hasArc && (!hasLine || isArcBetter);
-    Piece const& piece = takeArc ? static_cast<Piece const&>(arc) : line;
-    if (piece.count < 2) break;
-
-    if (contour_.empty()) GeometryUtils::AddSegm(&contour_, piece.start);
-    if (takeArc) {
-      GeometryUtils::AddArc(&contour_, arc.start, arc.end, arc.centre, arc.radius, !arc.ccw);
-    } else {
-      GeometryUtils::AddSegm(&contour_, line.end);
-    }
-    Accept(piece);
+    if (line && line->count == 2 && line->hasTurnedBack) return std::nullopt;
+    std::int32_t const minCount = line ? std::max(line->count, kFewestArcPoints) : kFewestArcPoints;
+    ArcSearchResult const result = FindLongestArc(
+        {Rest(), minCount, {fixedStart_, std::nullopt}, task_.progress, AfterFailure::NoCell});
+    return result.code == ErrorCode::Ok ? result.arc : std::nullopt;
   }
-  return largest_;
-}
 
-/// False when the line fitter reports an error. What an attempt did to the end points is discarded
-/// before the next; only the index list goes on.
-bool MixedWalk::FitLine(std::int32_t remaining, Line* line) {
-  indexList_.clear();
-  for (int attempt = 1; attempt <= kLineAttempts; ++attempt) {
-    line->start = start_;
-    line->end = end_;
-    bool const isLast = attempt == kLineAttempts;
-    if (GeometryUtils::GetFittingLine(points_, runStart_, remaining, startFixed_, &line->start,
-                                      false, &line->end, isLast, &line->count, &line->deviation,
-                                      &line->deviationIndex, &indexList_, &line->code,
-                                      progress_) != ErrorCode::Ok) {
-      return false;
-    }
-    if (indexList_.empty()) break;
+  static bool IsBetter(FittedArc const& arc, FittedLine const& line) {
+    return arc.count > line.count ||
+           (arc.count == line.count && arc.deviation.value <= line.deviation.value);
   }
-  return true;
+
+  bool Append(FittedLine const& line) {
+    BeginAt(line.start);
+    GeometryUtils::AddSegm(&task_.contour, line.end);
+    GoOnBehind(line);
+    return true;
+  }
+
+  bool Append(FittedArc const& arc) {
+    BeginAt(arc.start);
+    GeometryUtils::AddArc(&task_.contour, arc.start, arc.end, arc.circle.centre, arc.circle.radius,
+                          !arc.ccw);
+    GoOnBehind(arc);
+    return true;
+  }
+
+  void BeginAt(Point const& start) {
+    if (task_.contour.empty()) GeometryUtils::AddSegm(&task_.contour, start);
+  }
+
+  /// The last point of one run is the first point of the next.
+  void GoOnBehind(Piece const& piece) {
+    largest_.Take(piece.deviation);
+    fixedStart_ = piece.end;
+    VORN_ASSERT(piece.count >= 2);
+    first_ += piece.count - 1;
+  }
+
+  CurveTask const& task_;
+  /// The last point that an element covers, at first the first point.
+  std::int32_t first_ = 0;
+  /// Where the next element begins; nothing for the first one.
+  std::optional<Point> fixedStart_;
+  std::vector<std::int32_t> offenders_;
+  LargestDeviation largest_;
+};
+
+}  // namespace
+
+CurveResult FitMixed(CurveTask const& task) {
+  return {ErrorCode::Ok, MixedWalk(task).Walk().Get()};
 }
 
-bool MixedWalk::FitArc(std::int32_t remaining, std::int32_t minimumRun, Arc* arc) {
-  arc->start = start_;
-  arc->end = end_;
-  return GeometryUtils::GetFittingCircle2(points_, runStart_, remaining, minimumRun, startFixed_,
-                                          &arc->start, false, &arc->end, nullptr, &arc->count,
-                                          &arc->centre, &arc->radius, &arc->ccw, &arc->deviation,
-                                          &arc->deviationIndex, progress_) == ErrorCode::Ok;
-}
-
-/// The last point of one run is the first point of the next.
-void MixedWalk::Accept(Piece const& piece) {
-  largest_.Take(piece.deviation, piece.deviationIndex);
-  startFixed_ = true;
-  start_ = piece.end;
-  runStart_ += piece.count - 1;
-}
-
-}  // namespace Vorn
+}  // namespace Vorn::Fitting

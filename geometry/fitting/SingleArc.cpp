@@ -1,191 +1,196 @@
-// Strategy SingleArc: one arc through all points.
+// Strategy SingleArc.
 //
 // An estimate gives a common tolerance and leaves out points that are too close together for it;
 // the arc fitter finds a circle over the rest; from there (or from the estimate, where it does not
 // reach the end) the circle is moved by weighted least squares over all points until the largest
 // deviation no longer falls.
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
+#include <optional>
 #include <vector>
 
-#include "geometry/fitting/Runs.h"
+#include "geometry/elementary/CircleThrough.h"
+#include "geometry/elementary/Sense.h"
 #include "geometry/fitting/Strategies.h"
-#include "vorn/GeometryUtils.h"
+#include "geometry/fitting/arc/ArcFit.h"
+#include "geometry/fitting/arc/ArcSearch.h"
+#include "geometry/fitting/arc/CircleEstimate.h"
+#include "geometry/fitting/arc/CircleRadius.h"
+#include "geometry/fitting/arc/CircleShift.h"
+#include "geometry/fitting/arc/ClosePoints.h"
+#include "geometry/fitting/runs/Runs.h"
+#include "geometry/intersections/Circles.h"
 
-namespace Vorn {
-
-using Fitting::At;
-using Fitting::kFewestArcPoints;
-using Fitting::ToPoint;
+namespace Vorn::Fitting {
 
 namespace {
 
+using Elementary::Circle;
+
 constexpr int kMaxRefinements = 100;
-}  // namespace
 
-SingleArcFit::SingleArcFit(std::vector<WPoint> const& points,
-                           std::vector<GeometryUtils::Elem>* contour,
-                           GeometryUtils::ProgressBase const& progress)
-    : points_(points), contour_(*contour), progress_(progress) {}
-
-ErrorCode SingleArcFit::Run(double* maxDeviation, std::int32_t* maxDeviationIndex) {
-  if (Count() < kFewestArcPoints) return ErrorCode::Failed;
-  if (Count() == kFewestArcPoints) {
-    ErrorCode const code = FitThreePoints();
-    if (code != ErrorCode::Ok) return code;
-    *maxDeviation = 0.0;
-    *maxDeviationIndex = -1;
-    return ErrorCode::Ok;
-  }
-  ErrorCode const found = FindStartingCircle();
-  if (found != ErrorCode::Ok) return found;
-  *maxDeviation = GeometryUtils::GetMaxObtainedDeviation(points_, 0, Count(), circle_.centre,
-                                                         circle_.radius, maxDeviationIndex);
-  // Deliberate: this strategy names no point.
-  *maxDeviationIndex = -1;
-
-  double kept = 0.0;
-  ErrorCode const refined = Refine(&kept, maxDeviationIndex);
-  if (refined != ErrorCode::Ok) return refined;
-  ErrorCode const written = WriteContour();
-  if (written != ErrorCode::Ok) return written;
-  *maxDeviation = kept;
-  *maxDeviationIndex = -1;
-  return ErrorCode::Ok;
-}
-
-ErrorCode SingleArcFit::FitThreePoints() {
-  WPoint const& a = points_[0];
-  WPoint const& b = points_[1];
-  WPoint const& c = points_[2];
-  Point centre;
-  double radius = 0.0;
-  bool ccw = false;
-  ErrorCode const circle =
-      GeometryUtils::GetCircle(a.x, a.y, b.x, b.y, c.x, c.y, &centre.x, &centre.y, &radius);
-  if (circle != ErrorCode::Ok) return circle;
-  ErrorCode const sense = GeometryUtils::IsCcw(ToPoint(a), ToPoint(b), ToPoint(c), &ccw);
-  if (sense != ErrorCode::Ok) return sense;
-  GeometryUtils::AddSegm(&contour_, ToPoint(a));
-  GeometryUtils::AddArc(&contour_, ToPoint(a), ToPoint(c), centre, radius, !ccw);
-  return ErrorCode::Ok;
-}
-
-/// The circle that the refinement starts from and its turning sense.
-ErrorCode SingleArcFit::FindStartingCircle() {
-  std::vector<std::int32_t> excluded;
-  Circle estimate;
-  if (!GeometryUtils::GetEstimatedDeviationForCircle(points_, &tolerance_, &excluded,
-                                                     &estimate.centre, &estimate.radius)) {
-    return ErrorCode::Failed;
-  }
-  std::vector<WPoint> const reduced = ReducedPoints(excluded);
-  auto const reducedCount = static_cast<std::int32_t>(reduced.size());
-  if (reducedCount < 2) return ErrorCode::Failed;
-
-  Point start;
-  Point end;
-  std::int32_t arcCount = 0;
-  double deviation = 0.0;
-  std::int32_t deviationIndex = -1;
-  ErrorCode const code = GeometryUtils::GetFittingCircle2(
-      reduced, 0, reducedCount, kFewestArcPoints, false, &start, false, &end, nullptr, &arcCount,
-      &circle_.centre, &circle_.radius, &ccw_, &deviation, &deviationIndex, progress_);
-  if (code != ErrorCode::Ok && code != ErrorCode::OrientationMismatch) return code;
-  if (code == ErrorCode::Ok && arcCount >= reducedCount) {
-    GeometryUtils::AddSegm(&contour_, start);
-    GeometryUtils::AddArc(&contour_, start, end, circle_.centre, circle_.radius, !ccw_);
-    return ErrorCode::Ok;
-  }
-
-  // A partial fit (three points at least) says less about the whole than the estimate does.
-  endsShort_ = code == ErrorCode::Ok;
-  shortEnd_ = end;
-  circle_ = estimate;
-  std::int32_t const coveredCount = endsShort_ ? arcCount : Count();
-  Point const firstPoint = ToPoint(points_.front());
-  Point const endPoint = ToPoint(At(points_, coveredCount - 1));
-  if (GeometryUtils::IsCcw(points_, 0, coveredCount, false, firstPoint, false, endPoint,
-                           estimate.centre, &ccw_) != ErrorCode::Ok) {
-    return ErrorCode::NoFit;
-  }
-  return ErrorCode::Ok;
-}
-
-/// The points that are not left out, each with the common tolerance.
-std::vector<WPoint> SingleArcFit::ReducedPoints(std::vector<std::int32_t> const& excluded) const {
+/// The points that are not left out, each with the common tolerance. `excluded` is ascending.
+std::vector<WPoint> ReducedPoints(std::vector<WPoint> const& points,
+                                  std::vector<std::int32_t> const& excluded, double tolerance) {
   std::vector<WPoint> reduced;
   auto nextExcluded = excluded.begin();
-  for (std::int32_t i = 0; i < Count(); ++i) {
-    if (nextExcluded != excluded.end() && *nextExcluded == i) {
+  for (std::size_t i = 0; i < points.size(); ++i) {
+    if (nextExcluded != excluded.end() && static_cast<std::size_t>(*nextExcluded) == i) {
       ++nextExcluded;
       continue;
     }
-    WPoint const& p = At(points_, i);
-    reduced.push_back({p.x, p.y, tolerance_});
+    reduced.push_back({points[i].x, points[i].y, tolerance});
   }
   return reduced;
 }
 
-/// Improves the circle until the largest deviation stops falling; a step that did not improve it is
-/// undone. Writes the deviation of the circle kept.
-ErrorCode SingleArcFit::Refine(double* deviation, std::int32_t* index) {
-  double previous = -1.0;
-  for (int iteration = 0; iteration < kMaxRefinements; ++iteration) {
-    Circle const before = circle_;
-    ErrorCode const code = ImproveCircle();
-    if (code != ErrorCode::Ok) return code;
-    double const current = GeometryUtils::GetMaxObtainedDeviation(
-        points_, 0, Count(), circle_.centre, circle_.radius, index);
-    if (previous >= 0.0 && current >= previous) {
-      circle_ = before;
-      break;
+/// An arc as the contour takes it.
+void AppendArc(Point const& start, Point const& end, Circle const& circle, bool ccw,
+               std::vector<GeometryUtils::Elem>* contour) {
+  GeometryUtils::AddSegm(contour, start);
+  GeometryUtils::AddArc(contour, start, end, circle.centre, circle.radius, !ccw);
+}
+
+/// The arc through exactly three points.
+ErrorCode JoinThreePoints(CurveTask const& task) {
+  Run const run = RunOverAll(task.points);
+  Point const first = run.PointAt(0);
+  Point const middle = run.PointAt(1);
+  Point const last = run.PointAt(2);
+  std::optional<Circle> const circle = Elementary::CircleThroughNeighbours(first, middle, last);
+  if (!circle) return ErrorCode::Failed;
+  std::optional<bool> const ccw = Elementary::IsCounterClockwise(first, middle, last);
+  if (!ccw) return ErrorCode::Failed;
+  AppendArc(first, last, *circle, *ccw, &task.contour);
+  return ErrorCode::Ok;
+}
+
+/// The fit of four points or more.
+class SingleArcFit {
+ public:
+  explicit SingleArcFit(CurveTask const& task) : task_(task), run_(RunOverAll(task.points)) {}
+
+  CurveResult Fit() {
+    ErrorCode const found = FindStartingCircle();
+    if (found != ErrorCode::Ok) return {found, std::nullopt};
+    // What a failure from here on leaves.
+    Deviation passing{LargestDistance(run_, circle_).value, -1};
+    double kept = -1.0;
+    ErrorCode code = Refine(&kept, &passing.index);
+    if (code == ErrorCode::Ok) code = WriteContour();
+    if (code != ErrorCode::Ok) return {code, passing};
+    // Deliberate: this strategy names no point.
+    return {ErrorCode::Ok, Deviation{kept, -1}};
+  }
+
+ private:
+  /// The circle that the refinement starts from and its turning sense.
+  ErrorCode FindStartingCircle() {
+    std::optional<ToleranceEstimate> const estimate = EstimateTolerance(task_.points);
+    if (!estimate) return ErrorCode::Failed;
+    std::optional<std::vector<std::int32_t>> const excluded =
+        FindClosePoints(task_.points, *estimate);
+    if (!excluded) return ErrorCode::Failed;
+    tolerance_ = estimate->tolerance;
+    std::vector<WPoint> const reduced = ReducedPoints(task_.points, *excluded, tolerance_);
+    ArcSearchResult const search =
+        FindLongestArc({RunOverAll(reduced), kFewestArcPoints, {}, task_.progress});
+    if (search.code != ErrorCode::Ok) {
+      bool const isNearlyStraight = search.code == ErrorCode::OrientationMismatch;
+      return isNearlyStraight ? StartFromEstimate(estimate->circle, run_.count) : search.code;
     }
-    previous = current;
+    FittedArc const& arc = *search.arc;
+    // A partial fit (three points at least) says less about the whole than the estimate does.
+    if (static_cast<std::size_t>(arc.count) < reduced.size()) {
+      shortEnd_ = arc.end;
+      return StartFromEstimate(estimate->circle, arc.count);
+    }
+    circle_ = arc.circle;
+    ccw_ = arc.ccw;
+    AppendArc(arc.start, arc.end, arc.circle, arc.ccw, &task_.contour);
+    return ErrorCode::Ok;
   }
-  *deviation = previous;
-  return ErrorCode::Ok;
+
+  /// Takes the estimated circle and the sense of so many points.
+  ErrorCode StartFromEstimate(Circle const& estimate, std::int32_t coveredCount) {
+    std::optional<bool> const ccw = SenseOf(run_.OfCount(coveredCount), {});
+    if (!ccw) return ErrorCode::NoFit;
+    circle_ = estimate;
+    ccw_ = *ccw;
+    return ErrorCode::Ok;
+  }
+
+  /// Improves the circle until the largest deviation stops falling; a step that did not improve it
+  /// is undone. `deviation` receives that of the circle kept, `index` the position of the point
+  /// that was farthest from the circle measured last.
+  ErrorCode Refine(double* deviation, std::int32_t* index) {
+    double previous = -1.0;
+    for (int iteration = 0; iteration < kMaxRefinements; ++iteration) {
+      Circle const before = circle_;
+      ErrorCode const code = ImproveCircle();
+      if (code != ErrorCode::Ok) return code;
+      Deviation const current = LargestDistance(run_, circle_);
+      *index = current.index;
+      if (previous >= 0.0 && current.value >= previous) {
+        circle_ = before;
+        break;
+      }
+      previous = current.value;
+    }
+    *deviation = previous;
+    return ErrorCode::Ok;
+  }
+
+  /// Shifts the centre by least squares and takes the mean radius about it.
+  ErrorCode ImproveCircle() {
+    std::vector<WPoint2> curve;
+    if (!AppendDeviationCurve(run_, circle_, &curve)) return ErrorCode::Failed;
+    std::optional<Point> const shift = FindCentreShift(curve);
+    if (!shift) return ErrorCode::Failed;
+    circle_.centre.x += shift->x;
+    circle_.centre.y += shift->y;
+    std::optional<double> const radius = FindRadius(
+        run_, circle_.centre, tolerance_, GeometryUtils::CircleRadiusFindingStrategy::MeanDistance);
+    if (!radius) return ErrorCode::NoFit;
+    circle_.radius = *radius;
+    return ErrorCode::Ok;
+  }
+
+  /// Puts the final arc in the place of whatever the contour holds. Deliberate: after a partial fit
+  /// the arc ends where that fit ended.
+  ErrorCode WriteContour() {
+    std::optional<Point> const start = Intersections::NearestOnCircle(circle_, run_.FirstPoint());
+    std::optional<Point> const end =
+        shortEnd_ ? shortEnd_ : Intersections::NearestOnCircle(circle_, run_.LastPoint());
+    if (!start || !end) return ErrorCode::Failed;
+    task_.contour.clear();
+    AppendArc(*start, *end, circle_, ccw_, &task_.contour);
+    return ErrorCode::Ok;
+  }
+
+  CurveTask const& task_;
+  Run const run_;
+  double tolerance_ = 0.0;
+  Circle circle_;
+  bool ccw_ = false;
+  /// Where a fit ended that did not cover all points; nothing when it did or there was none.
+  std::optional<Point> shortEnd_;
+};
+
+}  // namespace
+
+CurveResult FitSingleArc(CurveTask const& task) {
+  if (task.points.size() < static_cast<std::size_t>(kFewestArcPoints)) {
+    return {ErrorCode::Failed, std::nullopt};
+  }
+  if (task.points.size() > static_cast<std::size_t>(kFewestArcPoints)) {
+    return SingleArcFit(task).Fit();
+  }
+  ErrorCode const code = JoinThreePoints(task);
+  if (code != ErrorCode::Ok) return {code, std::nullopt};
+  return {ErrorCode::Ok, Deviation{0.0, -1}};
 }
 
-/// Shifts the centre by least squares and takes the mean radius about it.
-ErrorCode SingleArcFit::ImproveCircle() {
-  std::vector<WPoint2> curve;
-  if (!GeometryUtils::CalcDeviationCurve(points_, 0, Count(), circle_.centre, circle_.radius,
-                                         &curve)) {
-    return ErrorCode::Failed;
-  }
-  Point shift;
-  if (!GeometryUtils::CalcCorrectionShiftForCircle(curve, &shift)) return ErrorCode::Failed;
-  circle_.centre.x += shift.x;
-  circle_.centre.y += shift.y;
-  if (!GeometryUtils::CalcOptimalRadius(
-          points_, 0, Count(), circle_.centre.x, circle_.centre.y, tolerance_,
-          GeometryUtils::CircleRadiusFindingStrategy::MeanDistance, &circle_.radius)) {
-    return ErrorCode::NoFit;
-  }
-  return ErrorCode::Ok;
-}
-
-/// Puts the final arc in the place of whatever the contour holds. Deliberate: after a partial fit
-/// the arc ends where that fit ended.
-ErrorCode SingleArcFit::WriteContour() {
-  Point start;
-  Point end = shortEnd_;
-  if (!GeometryUtils::GetNearestPointOnCircle(circle_.centre, circle_.radius,
-                                              ToPoint(points_.front()), &start)) {
-    return ErrorCode::Failed;
-  }
-  if (!endsShort_ && !GeometryUtils::GetNearestPointOnCircle(circle_.centre, circle_.radius,
-                                                             ToPoint(points_.back()), &end)) {
-    return ErrorCode::Failed;
-  }
-  contour_.clear();
-  GeometryUtils::AddSegm(&contour_, start);
-  GeometryUtils::AddArc(&contour_, start, end, circle_.centre, circle_.radius, !ccw_);
-  return ErrorCode::Ok;
-}
-
-std::int32_t SingleArcFit::Count() const { return static_cast<std::int32_t>(points_.size()); }
-
-}  // namespace Vorn
+}  // namespace Vorn::Fitting

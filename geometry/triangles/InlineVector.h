@@ -52,8 +52,12 @@ class InlineVector {
   T const* data() const { return items_; }
 
   /// The first value.
+  T* begin() { return items_; }
+  /// As above.
   T const* begin() const { return items_; }
   /// Behind the last value.
+  T* end() { return items_ + size_; }
+  /// As above.
   T const* end() const { return items_ + size_; }
 
  private:

@@ -570,6 +570,12 @@ class VORN_EXPORT GeometryUtils {
   ///       tolerances; when its first fit covered only some of the points, the final arc ends where
   ///       that fit ended, which may be off the circle and short of the last point, and its sense
   ///       is that of as many points from the first.
+  /// @note Far from the origin: the digits that an offset takes up are lost to centres and line
+  ///       parameters, and pieces fall apart. 200 points 1 apart along (0.8, 0.6) with tolerance
+  ///       0.001 give one segment at the origin, 2 at an offset of 1e5 and 136 at one of 5e6
+  ///       (Mixed). Map and machine coordinates are like that. Take an offset off first that makes
+  ///       every difference exact, such as a whole number near the middle of the points, and add it
+  ///       to the ends and centres of the result; the program does so.
   /// @note Cost: a segment over m points takes about m overlaps of a pair cell with the running
   ///       cell; an arc over m points is fitted anew for every length, so O(m^2) triples. Running
   ///       cells are bounded at 78125 (lines) and 19531 (arcs) triangles. SingleArc compares all
@@ -581,17 +587,6 @@ class VORN_EXPORT GeometryUtils {
   /// @}
 
  private:
-  // Each holds the working state of one operation while it runs and calls the inner steps below.
-  friend class LineRun;
-  friend class ArcCellBuilder;
-  friend class ArcFit;
-  friend class ArcSearch;
-  friend class SampleThinning;
-  friend class MeanCircleRun;
-  friend class MixedWalk;
-  friend class CellsWalk;
-  friend class SingleArcFit;
-
   /// @name Inner steps: angles, distances and deviations
   /// @{
 

@@ -3,18 +3,13 @@
 #include <cstddef>
 #include <optional>
 
-#include "geometry/fitting/Runs.h"
+#include "geometry/fitting/runs/CellBudget.h"
 
-namespace Vorn {
-
-using Fitting::At;
-using Fitting::ToPoint;
+namespace Vorn::Fitting {
 
 namespace {
 
-bool IsOversized(std::size_t cellSize) {
-  return Fitting::IsOversized(cellSize, Fitting::kArcCellWeight);
-}
+bool IsOversizedArcCell(std::size_t cellSize) { return IsOversized(cellSize, kArcCellWeight); }
 
 }  // namespace
 
@@ -34,43 +29,38 @@ class ArcCellBuilder::Triples {
       return true;
     }
     for (;;) {
-      if (mirror_ == 1) ++step_;
-      mirror_ = 1 - mirror_;
+      if (isMirrored_) ++step_;
+      isMirrored_ = !isMirrored_;
       if (step_ > (size_ - 1) / 2) return false;
-      GeometryUtils::GetTriPointIndices(step_, size_, mirror_, &triple_.i0, &triple_.i1,
-                                        &triple_.i2);
+      triple_ = TripleOf(step_, size_, isMirrored_);
       if (used_.Mark(triple_)) return true;
     }
   }
 
-  Fitting::Triple const& Current() const { return triple_; }
+  Triple const& Current() const { return triple_; }
 
   /// Zero for a leading triple.
   int Step() const { return step_; }
 
  private:
   int const size_;
-  Fitting::UsedSamples used_;
+  UsedSamples used_;
   bool isLeading_;
   int step_ = 0;
-  int mirror_ = 1;
-  Fitting::Triple triple_{};
+  bool isMirrored_ = true;
+  Triple triple_;
 };
 
-ArcCellBuilder::ArcCellBuilder(Fitting::ArcRun const& run, bool ccw, AfterFailure afterFailure,
-                               std::vector<IndexedPoint>* samples, Cells::CellSequence* cell)
-    : run_(run), ccw_(ccw), afterFailure_(afterFailure), samples_(*samples), cell_(*cell) {}
-
-void ArcCellBuilder::CollectSamples() {
-  if (samples_.empty()) {
-    for (std::int32_t i = 0; i < run_.count; ++i) samples_.push_back(SampleOf(run_.first + i));
-    return;
-  }
-  samples_.front() = SampleOf(run_.first);
-  samples_.push_back(SampleOf(run_.first + run_.count - 1));
-}
+ArcCellBuilder::ArcCellBuilder(ArcRun const& arcRun, bool ccw, AfterFailure afterFailure,
+                               ArcCell* cell)
+    : arcRun_(arcRun),
+      ccw_(ccw),
+      afterFailure_(afterFailure),
+      samples_(cell->samples),
+      centres_(cell->centres) {}
 
 ErrorCode ArcCellBuilder::Build() {
+  CollectSamples();
   bool isFirstPass = true;
   bool isGuarded = true;
   for (;;) {
@@ -83,80 +73,89 @@ ErrorCode ArcCellBuilder::Build() {
   }
 }
 
-ArcCellBuilder::IndexedPoint ArcCellBuilder::SampleOf(std::int32_t index) const {
-  WPoint const& p = At(run_.points, index);
-  return {ToPoint(p), p.w, index};
+void ArcCellBuilder::CollectSamples() {
+  std::int32_t const count = arcRun_.run.count;
+  if (samples_.empty()) {
+    for (std::int32_t i = 0; i < count; ++i) samples_.push_back(SampleOf(i));
+    return;
+  }
+  samples_.front() = SampleOf(0);
+  samples_.push_back(SampleOf(count - 1));
+}
+
+GeometryUtils::IndexedPoint ArcCellBuilder::SampleOf(std::int32_t position) const {
+  Run const& run = arcRun_.run;
+  return {run.PointAt(position), run[position].w, run.first + position};
 }
 
 ErrorCode ArcCellBuilder::RunPass(bool isLed, bool isGuarded, bool* hasThinned) {
-  cell_.clear();
+  centres_.clear();
   Triples triples(samples_.size(), isLed);
   if (!triples.Next()) return ErrorCode::Ok;
-  std::vector<Triangle> tripleCell;
+  Cells::CircleCell tripleCell;
   ErrorCode code = CellOf(triples.Current(), &tripleCell);
   if (code != ErrorCode::Ok) return code;
 
   // Always one cell ahead: most tries over points that hardly bend end at a triple without a cell,
   // and there the narrowing before, the most expensive one, would be in vain.
-  std::vector<Triangle> nextCell;
+  Cells::CircleCell nextCell;
   for (bool isFirst = true;; isFirst = false) {
     int const step = triples.Step();
     bool const isLast = !triples.Next();
     nextCell.clear();
     if (!isLast) code = CellOf(triples.Current(), &nextCell);
     if (isFirst) {
-      cell_.Begin(tripleCell);
+      centres_.Begin(tripleCell);
     } else {
       bool const endsHere = code != ErrorCode::Ok && afterFailure_ == AfterFailure::NoCell;
       if (endsHere && StaysUsable(tripleCell, isGuarded)) return code;
-      cell_.NarrowBy(tripleCell);
-      if (cell_.empty()) return ErrorCode::NoFit;
+      centres_.NarrowBy(tripleCell);
+      if (centres_.empty()) return ErrorCode::NoFit;
     }
     bool const isLeading = step == 0;
-    if (!isLeading && isGuarded && IsOversized(cell_.size())) {
+    if (!isLeading && isGuarded && IsOversizedArcCell(centres_.size())) {
       *hasThinned = true;
       return Thin(step);
     }
     if (isLast || code != ErrorCode::Ok) return code;
-    tripleCell.swap(nextCell);
+    tripleCell = nextCell;
   }
 }
 
-bool ArcCellBuilder::StaysUsable(std::vector<Triangle> const& tripleCell, bool isGuarded) const {
-  std::size_t const mostTriangles = cell_.size() * tripleCell.size() * Cells::kMostParts;
-  bool const staysSmall = !isGuarded || !IsOversized(mostTriangles);
-  return staysSmall && cell_.Overlaps(tripleCell);
+bool ArcCellBuilder::StaysUsable(Cells::CircleCell const& tripleCell, bool isGuarded) const {
+  std::size_t const mostTriangles = centres_.size() * tripleCell.size() * Cells::kMostParts;
+  bool const staysSmall = !isGuarded || !IsOversizedArcCell(mostTriangles);
+  return staysSmall && centres_.Overlaps(tripleCell);
 }
 
 ErrorCode ArcCellBuilder::Thin(int steps) {
+  ThinningTask const task{arcRun_, ccw_, steps};
   std::optional<ErrorCode> code;
-  if (std::optional<Cells::RoughCentre> const rough = cell_.FindRoughCentre()) {
-    code = Fitting::ThinSamples(run_, *rough, steps, ccw_, &samples_);
+  if (std::optional<Cells::RoughCentre> const rough = centres_.FindRoughCentre()) {
+    code = ThinSamples(task, *rough, &samples_);
   }
   if (!code) {
-    GeometryUtils::Point centre;
-    if (!cell_.Center(&centre)) return ErrorCode::Failed;
-    code = Fitting::ThinSamples(run_, centre, steps, ccw_, &samples_);
+    std::optional<Point> const centre = centres_.Centre();
+    if (!centre) return ErrorCode::Failed;
+    code = ThinSamples(task, *centre, &samples_);
   }
-  if (*code == ErrorCode::Ok) cell_.clear();
+  if (*code == ErrorCode::Ok) centres_.clear();
   return *code;
 }
 
-ErrorCode ArcCellBuilder::CellOf(Fitting::Triple const& triple, std::vector<Triangle>* cell) const {
-  bool usesStart = false;
-  bool usesEnd = false;
-  double coords[6];
-  GeometryUtils::TriPointsCoordsToArray(&samples_, triple.i0, triple.i1, triple.i2, run_.startFixed,
-                                        run_.start, run_.endFixed, run_.end, &usesStart, &usesEnd,
-                                        coords);
-  return GeometryUtils::GetCircleTriangles({coords[0], coords[1], ToleranceAt(triple.i0)},
-                                           {coords[2], coords[3], ToleranceAt(triple.i1)},
-                                           {coords[4], coords[5], ToleranceAt(triple.i2)},
-                                           usesStart, usesEnd, 0, cell);
+ErrorCode ArcCellBuilder::CellOf(Triple const& triple, Cells::CircleCell* cell) const {
+  TriplePoints const points(samples_, triple, arcRun_.ends);
+  auto const withTolerance = [this](Point const& p, int position) {
+    return WPoint{p.x, p.y, ToleranceAt(position)};
+  };
+  return Cells::FindCircleCell(
+      {withTolerance(points.first, triple.i0), withTolerance(points.middle, triple.i1),
+       withTolerance(points.last, triple.i2), points.usesStart, points.usesEnd},
+      cell);
 }
 
 double ArcCellBuilder::ToleranceAt(int position) const {
   return samples_[static_cast<std::size_t>(position)].w;
 }
 
-}  // namespace Vorn
+}  // namespace Vorn::Fitting

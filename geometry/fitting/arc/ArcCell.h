@@ -1,58 +1,66 @@
+// The cell of an arc: the centres of all circles that can follow a run of points.
+
 #pragma once
 
 #include <cstdint>
 #include <vector>
 
+#include "geometry/cells/CircleCells.h"
 #include "geometry/cells/fast/CellSequence.h"
 #include "geometry/fitting/arc/SampleThinning.h"
 #include "geometry/fitting/arc/Triples.h"
-#include "vorn/GeometryUtils.h"
 
-namespace Vorn {
+namespace Vorn::Fitting {
 
-/// The cell of the centres of all circles that can follow a run, and the samples that make it up.
+/// A cell of centres and the samples that it is made of.
+struct ArcCell {
+  /// Empty before the first try from a start point; then those of the last try, which the next one
+  /// begins with.
+  Samples samples;
+  /// What the last try left.
+  Cells::CellSequence centres;
+};
+
+/// What is wanted of a try that no cell comes about for: what the cell was until then, or nothing.
+enum class AfterFailure { KeepCell, NoCell };
+
+/// Builds the cell of one run.
 ///
 /// Every triple of samples allows the centres of one circle cell; the run's cell is the overlap of
 /// the cells of all triples. The triples spread from the middle of the run outwards, each with its
 /// mirror image.
 class ArcCellBuilder {
  public:
-  using IndexedPoint = GeometryUtils::IndexedPoint;
-  using Triangle = GeometryUtils::Triangle;
+  /// For a run that exists, of three points at least, which turns counter-clockwise or not.
+  ArcCellBuilder(ArcRun const& arcRun, bool ccw, AfterFailure afterFailure, ArcCell* cell);
 
-  /// What is asked for when no cell comes about: what the cell was until then, or nothing of it.
-  enum class AfterFailure { KeepCell, NoCell };
-
-  ArcCellBuilder(Fitting::ArcRun const& run, bool ccw, AfterFailure afterFailure,
-                 std::vector<IndexedPoint>* samples, Cells::CellSequence* cell);
-
-  /// Takes up every point of the run, or, when the samples of a shorter run over the same start are
-  /// at hand, these with the new ends.
-  void CollectSamples();
-
-  /// Overlaps the cells of all triples. A cell that grows too large has its samples thinned, and
-  /// the next pass starts afresh over those left, led by the triple that spans the run. A pass
-  /// after a thinning that did not shorten the list is let grow, since thinning would go on for
-  /// ever. Ends with a pass that thinned nothing.
+  /// Collects the samples and overlaps the cells of all triples. A cell that grows too large has
+  /// its samples thinned, and the next pass starts afresh over those left, led by the triple that
+  /// spans the run. A pass after a thinning that did not shorten the list is let grow, since
+  /// thinning would go on for ever. Ends with a pass that thinned nothing. NoFit when there is no
+  /// common part, otherwise the code of the first triple that has no cell or of a thinning.
   ErrorCode Build();
 
  private:
   /// The triples of one pass, in order.
   class Triples;
 
-  IndexedPoint SampleOf(std::int32_t index) const;
+  /// Takes up every point of the run, or, when the samples of a shorter run over the same start are
+  /// at hand, these with the new ends.
+  void CollectSamples();
+  GeometryUtils::IndexedPoint SampleOf(std::int32_t position) const;
   ErrorCode RunPass(bool isLed, bool isGuarded, bool* hasThinned);
   ErrorCode Thin(int steps);
   /// Whether the cell, overlapped with that of one triple, surely is neither empty nor oversized.
-  bool StaysUsable(std::vector<Triangle> const& tripleCell, bool isGuarded) const;
-  ErrorCode CellOf(Fitting::Triple const& triple, std::vector<Triangle>* cell) const;
+  bool StaysUsable(Cells::CircleCell const& tripleCell, bool isGuarded) const;
+  ErrorCode CellOf(Triple const& triple, Cells::CircleCell* cell) const;
   double ToleranceAt(int position) const;
 
-  Fitting::ArcRun const& run_;
+  ArcRun const& arcRun_;
   bool const ccw_;
   AfterFailure const afterFailure_;
-  std::vector<IndexedPoint>& samples_;
-  Cells::CellSequence& cell_;
+  Samples& samples_;
+  Cells::CellSequence& centres_;
 };
 
-}  // namespace Vorn
+}  // namespace Vorn::Fitting

@@ -1,130 +1,107 @@
-// One arc over one run of points: the cell of admissible centres gives the centre, the points' own
-// tolerances about it give the radius, and the free ends are moved onto the circle.
-
 #include "geometry/fitting/arc/ArcFit.h"
 
-#include <algorithm>
 #include <cmath>
 #include <cstddef>
 
-#include "geometry/fitting/Runs.h"
+#include "geometry/elementary/ImplicitLine.h"
+#include "geometry/elementary/Points.h"
+#include "geometry/elementary/Sense.h"
+#include "geometry/intersections/Circles.h"
+#include "geometry/intersections/Lines.h"
 
-namespace Vorn {
+namespace Vorn::Fitting {
 
-using Fitting::At;
-using Fitting::kFewestArcPoints;
-using Fitting::ToPoint;
+namespace {
 
-ErrorCode ArcFit::Fit(Fitting::ArcRun const& run, std::vector<GeometryUtils::IndexedPoint>* samples,
-                      Cells::CellSequence* cell, Arc* arc) {
-  hasBuiltCell_ = false;
-  if (run.count < kFewestArcPoints || !Fitting::HoldsRun(run.points, run.first, run.count)) {
-    return ErrorCode::Failed;
-  }
-  Point const firstPoint = ToPoint(At(run.points, run.first));
-  Point const middlePoint = ToPoint(At(run.points, run.first + run.count / 2));
-  Point const lastPoint = ToPoint(At(run.points, run.first + run.count - 1));
-  Arc found{run.start, run.end, {}};
-  if (GeometryUtils::IsCcw(firstPoint, middlePoint, lastPoint, &found.ccw) != ErrorCode::Ok) {
-    return ErrorCode::Failed;
-  }
-  hasBuiltCell_ = true;
-  ArcCellBuilder builder(run, found.ccw, afterFailure_, samples, cell);
-  builder.CollectSamples();
-  ErrorCode const built = builder.Build();
+using Elementary::Circle;
+
+/// A fixed end as it is, a free one as the point of the circle that is nearest to the run's own end
+/// point; nothing when there is none.
+std::optional<Point> PlaceEnd(std::optional<Point> const& fixed, Circle const& circle,
+                              Point const& measured) {
+  return fixed ? fixed : Intersections::NearestOnCircle(circle, measured);
+}
+
+/// The radius through a fixed end, the start if both are fixed, or else the middle of the range.
+double ChooseRadius(Ends const& ends, Point const& centre, RadiusRange const& range) {
+  if (ends.fixedStart) return Elementary::Distance(*ends.fixedStart, centre);
+  if (ends.fixedEnd) return Elementary::Distance(*ends.fixedEnd, centre);
+  return range.Middle();
+}
+
+}  // namespace
+
+std::optional<bool> SenseOf(Run const& run, Ends const& ends) {
+  if (run.count < kFewestArcPoints || !run.Exists()) return std::nullopt;
+  return Elementary::IsCounterClockwise(ends.fixedStart.value_or(run.FirstPoint()),
+                                        run.PointAt(run.count / 2),
+                                        ends.fixedEnd.value_or(run.LastPoint()));
+}
+
+std::optional<Point> AdjustedCentre(Point const& p1, Point const& p2, Point const& centre) {
+  std::optional<Elementary::ImplicitLine> const bisector =
+      Elementary::PerpendicularBisector(p1, p2);
+  if (!bisector) return std::nullopt;
+  return Intersections::FootOn(*bisector, centre);
+}
+
+ErrorCode ArcFit::Fit(ArcRun const& arcRun, ArcCell* cell, FittedArc* arc) {
+  auto const& [run, ends] = arcRun;
+  // Fixed ends are not looked at here: they decide where the arc ends, not how the points turn.
+  std::optional<bool> const ccw = SenseOf(run, {});
+  if (!ccw) return ErrorCode::Failed;
+  ErrorCode const built = ArcCellBuilder(arcRun, *ccw, afterFailure_, cell).Build();
   if (built != ErrorCode::Ok) return built;
-
-  ErrorCode const placed = PlaceCircle(run, *cell, &found);
+  Circle circle;
+  ErrorCode const placed = PlaceCircle(arcRun, cell->centres, &circle);
   if (placed != ErrorCode::Ok) return placed;
-  auto const snap = [&found](Point const& p, Point* onArc) {
-    return GeometryUtils::GetNearestPointOnCircle(found.centre, found.radius, p, onArc);
-  };
-  if (!run.startFixed && !snap(firstPoint, &found.start)) return ErrorCode::Failed;
-  if (!run.endFixed && !snap(lastPoint, &found.end)) return ErrorCode::Failed;
-  MeasureDeviation(run, &found);
-  *arc = found;
+  std::optional<Point> const start = PlaceEnd(ends.fixedStart, circle, run.FirstPoint());
+  std::optional<Point> const end = PlaceEnd(ends.fixedEnd, circle, run.LastPoint());
+  if (!start || !end) return ErrorCode::Failed;
+  *arc = {{*start, *end, run.count, MeasureDeviation(run, circle.radius)}, circle, *ccw};
   return ErrorCode::Ok;
 }
 
-ErrorCode ArcFit::PlaceCircle(Fitting::ArcRun const& run, Cells::CellSequence const& cell,
-                              Arc* arc) {
-  if (!cell.Center(&arc->centre)) return ErrorCode::Failed;
-  if (!FindRadiusRange(run, arc->centre)) return ErrorCode::NoFit;
-  if (run.startFixed && run.endFixed) {
-    if (!GeometryUtils::AdjustCenter(run.start, run.end, arc->centre, &arc->centre)) {
-      return ErrorCode::Failed;
-    }
-    if (!FindRadiusRange(run, arc->centre)) return ErrorCode::NoFit;
+ErrorCode ArcFit::PlaceCircle(ArcRun const& arcRun, Cells::CellSequence const& centres,
+                              Circle* circle) {
+  auto const& [run, ends] = arcRun;
+  std::optional<Point> const centre = centres.Centre();
+  if (!centre) return ErrorCode::Failed;
+  circle->centre = *centre;
+  std::optional<RadiusRange> range = MeasureRadiusRange(run, circle->centre);
+  if (!range) return ErrorCode::NoFit;
+  if (ends.fixedStart && ends.fixedEnd) {
+    std::optional<Point> const adjusted =
+        AdjustedCentre(*ends.fixedStart, *ends.fixedEnd, circle->centre);
+    if (!adjusted) return ErrorCode::Failed;
+    circle->centre = *adjusted;
+    range = MeasureRadiusRange(run, circle->centre);
+    if (!range) return ErrorCode::NoFit;
   }
-  arc->radius = (minRadius_ + maxRadius_) * 0.5;
-  if (run.startFixed) {
-    arc->radius = std::sqrt(GeometryUtils::GetDist2(run.start, arc->centre));
-  } else if (run.endFixed) {
-    arc->radius = std::sqrt(GeometryUtils::GetDist2(run.end, arc->centre));
-  }
+  circle->radius = ChooseRadius(ends, circle->centre, *range);
   // A NaN is neither: then a free end fails, since it cannot be moved onto the circle.
-  bool const isOutOfRange = arc->radius < minRadius_ || arc->radius > maxRadius_;
+  bool const isOutOfRange = circle->radius < range->least || circle->radius > range->greatest;
   return isOutOfRange ? ErrorCode::NoFit : ErrorCode::Ok;
 }
 
-bool ArcFit::FindRadiusRange(Fitting::ArcRun const& run, Point const& centre) {
+std::optional<RadiusRange> ArcFit::MeasureRadiusRange(Run const& run, Point const& centre) {
   distances_.resize(static_cast<std::size_t>(run.count));
-  WPoint const* const points = run.points.data() + run.first;
+  WPoint const* const points = &run[0];
   for (std::size_t i = 0; i < distances_.size(); ++i) {
-    double const dx = points[i].x - centre.x;
-    double const dy = points[i].y - centre.y;
-    distances_[i] = std::sqrt(dy * dy + dx * dx);
+    distances_[i] = Elementary::Distance(ToPoint(points[i]), centre);
   }
-  minRadius_ = distances_[0] - points[0].w;
-  maxRadius_ = distances_[0] + points[0].w;
-  if (minRadius_ > maxRadius_) return false;
-  for (std::size_t i = 1; i < distances_.size(); ++i) {
-    minRadius_ = std::max(minRadius_, distances_[i] - points[i].w);
-    maxRadius_ = std::min(maxRadius_, distances_[i] + points[i].w);
-    if (minRadius_ > maxRadius_) return false;
-  }
-  return true;
+  return CommonRange(run.count, [&](std::int32_t i) {
+    return RadiusRange::Of(distances_[static_cast<std::size_t>(i)], points[i].w);
+  });
 }
 
-void ArcFit::MeasureDeviation(Fitting::ArcRun const& run, Arc* arc) const {
-  WPoint const* const points = run.points.data() + run.first;
-  std::size_t largestAt = 0;
-  double largest = std::fabs(arc->radius - distances_[0]) / points[0].w;
-  for (std::size_t i = 1; i < distances_.size(); ++i) {
-    double const relative = std::fabs(arc->radius - distances_[i]) / points[i].w;
-    if (relative > largest) {
-      largest = relative;
-      largestAt = i;
-    }
-  }
-  arc->deviation = largest;
-  arc->deviationIndex = run.first + static_cast<std::int32_t>(largestAt);
+Deviation ArcFit::MeasureDeviation(Run const& run, double radius) const {
+  WPoint const* const points = &run[0];
+  Deviation largest = FindLargest(run.count, [&](std::int32_t i) {
+    return std::fabs(radius - distances_[static_cast<std::size_t>(i)]) / points[i].w;
+  });
+  largest.index += run.first;
+  return largest;
 }
 
-ErrorCode GeometryUtils::GetFittingCircleO(std::vector<WPoint> const& points, std::int32_t first,
-                                           std::int32_t count, bool startFixed, Point* start,
-                                           bool endFixed, Point* end,
-                                           std::vector<IndexedPoint>* indexedPoints,
-                                           std::vector<Triangle>* cells, std::int32_t* arcCount,
-                                           Point* centre, double* radius, bool* ccw,
-                                           double* deviation, std::int32_t* deviationIndex) {
-  *deviationIndex = -1;
-  ArcFit fit(cells != nullptr ? ArcFit::AfterFailure::KeepCell : ArcFit::AfterFailure::NoCell);
-  ArcFit::Arc arc;
-  Cells::CellSequence cell;
-  ErrorCode const code = fit.Fit({points, first, count, startFixed, *start, endFixed, *end},
-                                 indexedPoints, &cell, &arc);
-  if (cells != nullptr && fit.HasBuiltCell()) *cells = cell.Expand();
-  if (code != ErrorCode::Ok) return code;
-  *start = arc.start;
-  *end = arc.end;
-  *arcCount = count;
-  *centre = arc.centre;
-  *radius = arc.radius;
-  *ccw = arc.ccw;
-  *deviation = arc.deviation;
-  *deviationIndex = arc.deviationIndex;
-  return ErrorCode::Ok;
-}
-
-}  // namespace Vorn
+}  // namespace Vorn::Fitting

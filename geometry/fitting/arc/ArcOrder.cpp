@@ -1,23 +1,30 @@
-// Whether points follow an arc in its turning direction. Angles come from atan2, so an arc may
-// cross the seam between +pi and -pi.
+#include "geometry/fitting/arc/ArcOrder.h"
 
-#include <cmath>
-
+#include "geometry/elementary/Angles.h"
 #include "math/NumericConstants.h"
-#include "vorn/GeometryUtils.h"
 
-namespace Vorn {
+namespace Vorn::Fitting {
 
 using Numeric::kTruncatedHalfPi;
 using Numeric::kTruncatedTwoPi;
 
 namespace {
 
-using Point = GeometryUtils::Point;
+/// The angles of three points about a centre.
+struct ThreeAngles {
+  ThreeAngles(Point const& centre, Point const& p1, Point const& p2, Point const& p3)
+      : a1(Elementary::AngleAbout(centre, p1)),
+        a2(Elementary::AngleAbout(centre, p2)),
+        a3(Elementary::AngleAbout(centre, p3)) {}
 
-double AngleAround(Point const& center, Point const& p) {
-  return std::atan2(p.y - center.y, p.x - center.x);
-}
+  /// Whether the second one lies between the others, in a turning direction.
+  bool AreInOrder(bool ccw) const {
+    if (ccw) return a3 > a1 ? a1 <= a2 && a2 <= a3 : a2 >= a1 || a2 <= a3;
+    return a3 <= a1 ? a3 <= a2 && a2 <= a1 : a2 <= a1 || a2 >= a3;
+  }
+
+  double a1, a2, a3;
+};
 
 /// Whether the way from one angle to the next, in the turning direction, is below a right angle.
 bool IsShortStep(bool ccw, double from, double to) {
@@ -32,24 +39,16 @@ bool IsShortStep(bool ccw, double from, double to) {
 
 }  // namespace
 
-bool GeometryUtils::IsValidArcOrder(Point const& center, bool ccw, Point const& p1, Point const& p2,
-                                    Point const& p3) {
-  double const a1 = AngleAround(center, p1);
-  double const a2 = AngleAround(center, p2);
-  double const a3 = AngleAround(center, p3);
-  if (ccw) {
-    return a3 > a1 ? a1 <= a2 && a2 <= a3 : a2 >= a1 || a2 <= a3;
-  }
-  return a3 <= a1 ? a3 <= a2 && a2 <= a1 : a2 <= a1 || a2 >= a3;
+bool IsOnArc(ArcTurn const& turn, Point const& start, Point const& p, Point const& end) {
+  return ThreeAngles(turn.centre, start, p, end).AreInOrder(turn.ccw);
 }
 
-bool GeometryUtils::IsValidArcOrder(Point const& centre, bool ccw, Point const& p1, Point const& p2,
-                                    Point const& p3, bool skipFirstGap) {
-  if (!IsValidArcOrder(centre, ccw, p1, p2, p3)) return false;
-  double const a1 = AngleAround(centre, p1);
-  double const a2 = AngleAround(centre, p2);
-  double const a3 = AngleAround(centre, p3);
-  return (skipFirstGap || IsShortStep(ccw, a1, a2)) && IsShortStep(ccw, a2, a3);
+bool ContinuesArc(ArcTurn const& turn, Point const& start, Point const& previous, Point const& next,
+                  bool skipFirstStep) {
+  ThreeAngles const angles(turn.centre, start, previous, next);
+  if (!angles.AreInOrder(turn.ccw)) return false;
+  return (skipFirstStep || IsShortStep(turn.ccw, angles.a1, angles.a2)) &&
+         IsShortStep(turn.ccw, angles.a2, angles.a3);
 }
 
-}  // namespace Vorn
+}  // namespace Vorn::Fitting

@@ -1,5 +1,5 @@
-// Extreme distances between points. The bounds that boxes give hold for the rounded distances too:
-// a difference, a square and a sum of squares never fall when their parts grow, rounded or not.
+// The bounds that boxes give hold for the rounded distances too: a difference, a square and a sum
+// of squares never fall when their parts grow, rounded or not.
 
 #include "geometry/fitting/arc/PointSpread.h"
 
@@ -7,17 +7,15 @@
 #include <cmath>
 #include <cstddef>
 
-#include "geometry/fitting/Runs.h"
+#include "geometry/elementary/Points.h"
+#include "geometry/fitting/runs/Runs.h"
 
 namespace Vorn::Fitting {
 
 namespace {
 
-/// As GetDist2.
 double Distance2(WPoint const& a, WPoint const& b) {
-  double const dx = a.x - b.x;
-  double const dy = a.y - b.y;
-  return dy * dy + dx * dx;
+  return Elementary::SquaredDistance(ToPoint(a), ToPoint(b));
 }
 
 /// How many neighbours share a box: with the cube root of n, pairs of boxes and pairs of points of
@@ -142,10 +140,10 @@ class SpreadSearch {
 PointSpread FindSpreadOfAnything(std::vector<WPoint> const& points) {
   PointSpread spread;
   spread.largest2 = spread.smallest2 = Distance2(points[0], points[1]);
-  auto const n = static_cast<std::int32_t>(points.size());
-  for (std::int32_t i = 0; i < n; ++i) {
-    for (std::int32_t j = i + 1; j < n; ++j) {
-      double const distance2 = Distance2(At(points, i), At(points, j));
+  Run const run = RunOverAll(points);
+  for (std::int32_t i = 0; i < run.count; ++i) {
+    for (std::int32_t j = i + 1; j < run.count; ++j) {
+      double const distance2 = Distance2(run[i], run[j]);
       if (distance2 > spread.largest2) {
         spread.largest2 = distance2;
         spread.i = i;

@@ -1,3 +1,5 @@
+// The extreme distances between points.
+
 #pragma once
 
 #include <cstdint>

@@ -1,100 +1,56 @@
-// How far the points of a run lie from a line, and whether they move along it in order.
+#include "geometry/fitting/line/LineDeviation.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
-#include <optional>
-#include <utility>
 
+#include "geometry/elementary/Deviations.h"
 #include "geometry/elementary/ImplicitLine.h"
-#include "geometry/fitting/Runs.h"
 #include "math/NumericConstants.h"
-#include "vorn/GeometryUtils.h"
 
-namespace Vorn {
+namespace Vorn::Fitting {
 
-double GeometryUtils::GetMaxDeviationFromLine(std::vector<WPoint> const& points, std::int32_t start,
-                                              std::int32_t count, Point const& a, Point const& b,
-                                              std::int32_t* index) {
-  *index = -1;
-  if (count < 1 || !Fitting::HoldsRun(points, start, count)) return 0.0;
-  double largest = 0.0;
-  std::int32_t largestAt = 0;
-  for (std::int32_t i = 0; i < count; ++i) {
-    WPoint const& p = Fitting::At(points, start + i);
-    double const coords[6] = {a.x, a.y, b.x, b.y, p.x, p.y};
-    double deviation = 0.0;
-    if (!GetDeviation(coords, &deviation)) return 0.0;
-    double const relative = std::fabs(deviation) / p.w;
-    if (i == 0 || relative > largest) {
-      largest = relative;
-      largestAt = i;
-    }
+namespace {
+
+constexpr Deviation kNoDeviation{0.0, -1};
+
+}  // namespace
+
+Deviation LargestDeviationFromLine(Run const& run, Elementary::Segment const& segment) {
+  if (run.count < 1 || !run.Exists()) return kNoDeviation;
+  Deviation largest;
+  for (std::int32_t i = 0; i < run.count; ++i) {
+    std::optional<double> const deviation =
+        Elementary::DeviationBySquares(segment.start, segment.end, run.PointAt(i));
+    if (!deviation) return kNoDeviation;
+    double const relative = std::fabs(*deviation) / run[i].w;
+    if (i == 0 || relative > largest.value) largest = {relative, run.first + i};
   }
-  *index = start + largestAt;
   return largest;
 }
 
-bool GeometryUtils::GetDeviationFromLineParameters(Point const& a, Point const& b,
-                                                   std::vector<WPoint> const& points,
-                                                   std::int32_t start, std::int32_t count,
-                                                   double* minDeviation, double* maxDeviation,
-                                                   std::int32_t* minIndex, std::int32_t* maxIndex) {
-  if (!Fitting::HoldsRun(points, start, count)) return false;
-  std::optional<Elementary::ImplicitLine> const line = Elementary::LineThrough(a, b);
-  if (!line) return false;
+std::optional<DeviationExtremes> FindDeviationExtremes(Run const& run,
+                                                       Elementary::Segment const& segment) {
+  if (run.count < 1 || !run.Exists()) return std::nullopt;
+  std::optional<Elementary::ImplicitLine> const line =
+      Elementary::LineThrough(segment.start, segment.end);
+  if (!line) return std::nullopt;
   // Without a norm no point has a deviation, and there are no extremes to hand out.
   double const divisor = line->SignedNorm();
-  if (Numeric::IsZeroMagnitude(divisor)) return false;
-  bool isAnyMeasured = false;
-  double smallest = 0.0;
-  double largest = 0.0;
-  std::int32_t smallestAt = -1;
-  std::int32_t largestAt = -1;
-  for (std::int32_t i = start; i < start + count; ++i) {
-    WPoint const& p = Fitting::At(points, i);
-    double const deviation = line->At({p.x, p.y}) / divisor;
-    if (!isAnyMeasured || deviation < smallest) {
-      smallest = deviation;
-      smallestAt = i;
-    }
-    if (!isAnyMeasured || deviation > largest) {
-      largest = deviation;
-      largestAt = i;
-    }
-    isAnyMeasured = true;
+  if (Numeric::IsZeroMagnitude(divisor)) return std::nullopt;
+  DeviationExtremes extremes;
+  for (std::int32_t i = 0; i < run.count; ++i) {
+    Deviation const deviation{line->At(run.PointAt(i)) / divisor, run.first + i};
+    if (i == 0 || deviation.value < extremes.least.value) extremes.least = deviation;
+    if (i == 0 || deviation.value > extremes.greatest.value) extremes.greatest = deviation;
   }
-  if (!isAnyMeasured) return false;
-  *minDeviation = smallest;
-  *maxDeviation = largest;
-  *minIndex = smallestAt;
-  *maxIndex = largestAt;
-  return true;
+  return extremes;
 }
 
-bool GeometryUtils::GetDeviationFromLineParameters(Point const& a, Point const& b,
-                                                   std::vector<WPoint> const& points,
-                                                   std::int32_t start, std::int32_t count,
-                                                   std::vector<std::int32_t>* indices) {
-  double smallest = 0.0;
-  double largest = 0.0;
-  std::int32_t lower = 0;
-  std::int32_t upper = 0;
-  if (!GetDeviationFromLineParameters(a, b, points, start, count, &smallest, &largest, &lower,
-                                      &upper)) {
-    return false;
-  }
-  if (lower > upper) std::swap(lower, upper);
+void AppendIndices(DeviationExtremes const& extremes, std::vector<std::int32_t>* indices) {
+  auto const [lower, upper] = std::minmax(extremes.least.index, extremes.greatest.index);
   indices->push_back(lower);
   if (upper != lower) indices->push_back(upper);
-  return true;
 }
 
-bool GeometryUtils::IsValidLineOrder(Point const& first, Point const& middle, Point const& last) {
-  double const toMiddle2 = GetDist2(middle, first);
-  double const toLast2 = GetDist2(last, first);
-  double const gap2 = GetDist2(last, middle);
-  if (toMiddle2 >= toLast2) return false;
-  return gap2 + toMiddle2 - toLast2 < 0.0;
-}
-
-}  // namespace Vorn
+}  // namespace Vorn::Fitting

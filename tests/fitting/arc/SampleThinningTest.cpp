@@ -29,9 +29,7 @@ Samples SamplesOf(std::vector<WPoint> const& points) {
   return samples;
 }
 
-ArcRun RunOver(std::vector<WPoint> const& points) {
-  return {points, 0, static_cast<std::int32_t>(points.size()), false, {}, false, {}};
-}
+ArcRun RunOver(std::vector<WPoint> const& points) { return {Fitting::RunOverAll(points), {}}; }
 
 std::string Transcribe(ErrorCode code, Samples const& samples) {
   Transcript transcript;
@@ -47,13 +45,15 @@ struct Thinned {
 
 Thinned ThinRoughly(std::vector<WPoint> const& points, RoughCentre const& centre, int steps) {
   Thinned thinned{{}, SamplesOf(points)};
-  thinned.code = ThinSamples(RunOver(points), centre, steps, true, &thinned.samples);
+  ArcRun const run = RunOver(points);
+  thinned.code = ThinSamples({run, true, steps}, centre, &thinned.samples);
   return thinned;
 }
 
 std::string ThinExactly(std::vector<WPoint> const& points, Point const& centre, int steps) {
   Samples samples = SamplesOf(points);
-  ErrorCode const code = ThinSamples(RunOver(points), centre, steps, true, &samples);
+  ArcRun const run = RunOver(points);
+  ErrorCode const code = ThinSamples({run, true, steps}, centre, &samples);
   return Transcribe(code, samples);
 }
 

@@ -1,10 +1,8 @@
-#include <cstdint>
-
-#include "vorn/GeometryUtils.h"
+#include "geometry/fitting/runs/Progress.h"
 
 namespace Vorn {
 
-void GeometryUtils::SetProgressState(ProgressBase const& progress, std::int32_t current) {
+void Fitting::ReportProgress(GeometryUtils::ProgressBase const& progress, std::int32_t current) {
   if (progress.state == nullptr || progress.total < 1) return;
   std::int64_t percent = progress.maxPercent;
   std::int64_t const left = static_cast<std::int64_t>(progress.total) - current;

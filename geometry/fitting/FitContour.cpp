@@ -1,0 +1,45 @@
+#include "geometry/fitting/FitContour.h"
+
+#include <algorithm>
+
+#include "geometry/elementary/Deviations.h"
+#include "geometry/fitting/runs/Runs.h"
+
+namespace Vorn::Fitting {
+
+using Strategy = GeometryUtils::FittingStrategy;
+
+namespace {
+
+bool AreNeighboursFarEnoughApart(std::vector<WPoint> const& points) {
+  auto const areTooClose = [](WPoint const& a, WPoint const& b) {
+    return !Elementary::AreFarEnoughApart(a, b);
+  };
+  return std::adjacent_find(points.begin(), points.end(), areTooClose) == points.end();
+}
+
+CurveResult JoinTwoPoints(CurveTask const& task) {
+  GeometryUtils::AddSegm(&task.contour, ToPoint(task.points.front()));
+  GeometryUtils::AddSegm(&task.contour, ToPoint(task.points.back()));
+  return {ErrorCode::Ok, Deviation{0.0, -1}};
+}
+
+}  // namespace
+
+CurveResult FitContour(CurveTask const& task, Strategy strategy) {
+  if (task.points.size() < 2) return {ErrorCode::Failed, std::nullopt};
+  // A single arc is found by least squares as well, which bears points close together.
+  if (strategy == Strategy::SingleArc) return FitSingleArc(task);
+  if (!AreNeighboursFarEnoughApart(task.points)) return {ErrorCode::PointsTooClose, std::nullopt};
+  if (task.points.size() == 2) return JoinTwoPoints(task);
+  switch (strategy) {
+    case Strategy::Mixed:
+      return FitMixed(task);
+    case Strategy::MixedCells:
+      return FitMixedCells(task);
+    default:
+      return {ErrorCode::Failed, std::nullopt};
+  }
+}
+
+}  // namespace Vorn::Fitting
