@@ -9,6 +9,7 @@
 #include <optional>
 #include <vector>
 
+#include "geometry/fitting/PieceElements.h"
 #include "geometry/fitting/Strategies.h"
 #include "geometry/fitting/arc/ArcFit.h"
 #include "geometry/fitting/line/LineDeviation.h"
@@ -22,10 +23,6 @@ namespace {
 
 /// Points passed over before the next segment is looked for: with the anchor, three for an arc.
 constexpr std::int32_t kArcRoom = 2;
-
-bool IsKnownType(GeometryUtils::ElemType type) {
-  return type == GeometryUtils::ElemType::Segment || type == GeometryUtils::ElemType::Arc;
-}
 
 /// The walk from anchor to anchor.
 class CellsWalk {
@@ -65,7 +62,7 @@ class CellsWalk {
   /// begins where the contour ends.
   ErrorCode FindLine(Run const& run, bool isLastPair, FittedLine* line) {
     if (!isLastPair) return FitLineTo(run, {}, line);
-    if (task_.contour.empty() || !IsKnownType(task_.contour.back().type)) return ErrorCode::Failed;
+    if (task_.contour.empty() || !Contours::IsKnown(task_.contour.back())) return ErrorCode::Failed;
     return FitLineTo(run, {CurrentEnd(), std::nullopt}, line);
   }
 
@@ -142,8 +139,7 @@ class CellsWalk {
     ErrorCode const code = arcFit_.Fit({{run_.points, anchor_, count}, ends}, &arcCell_, &arc);
     if (code != ErrorCode::Ok) return code;
     PlaceStart(arc.start);
-    GeometryUtils::AddArc(&task_.contour, arc.start, arc.end, arc.circle.centre, arc.circle.radius,
-                          !arc.ccw);
+    task_.contour.push_back(ElementOf(arc));
     GoOnBehind(arc);
     return ErrorCode::Ok;
   }
@@ -167,7 +163,7 @@ class CellsWalk {
   }
 
   void AppendLine(FittedLine const& line) {
-    GeometryUtils::AddSegm(&task_.contour, line.end);
+    task_.contour.push_back(Contours::SegmentTo(line.end));
     GoOnBehind(line);
   }
 
@@ -179,7 +175,7 @@ class CellsWalk {
 
   void PlaceStart(Point const& start) {
     if (!startElementPending_) return;
-    GeometryUtils::AddSegm(&task_.contour, start);
+    task_.contour.push_back(Contours::SegmentTo(start));
     startElementPending_ = false;
   }
 

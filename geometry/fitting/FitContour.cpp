@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "geometry/contours/Elements.h"
 #include "geometry/elementary/Deviations.h"
 #include "geometry/fitting/runs/Runs.h"
 
@@ -19,8 +20,8 @@ bool AreNeighboursFarEnoughApart(std::vector<WPoint> const& points) {
 }
 
 CurveResult JoinTwoPoints(CurveTask const& task) {
-  GeometryUtils::AddSegm(&task.contour, ToPoint(task.points.front()));
-  GeometryUtils::AddSegm(&task.contour, ToPoint(task.points.back()));
+  task.contour.push_back(Contours::SegmentTo(ToPoint(task.points.front())));
+  task.contour.push_back(Contours::SegmentTo(ToPoint(task.points.back())));
   return {ErrorCode::Ok, Deviation{0.0, -1}};
 }
 

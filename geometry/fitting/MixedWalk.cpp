@@ -5,6 +5,7 @@
 #include <optional>
 #include <vector>
 
+#include "geometry/fitting/PieceElements.h"
 #include "geometry/fitting/Strategies.h"
 #include "geometry/fitting/arc/ArcSearch.h"
 #include "geometry/fitting/line/LineFit.h"
@@ -81,21 +82,20 @@ class MixedWalk {
 
   bool Append(FittedLine const& line) {
     BeginAt(line.start);
-    GeometryUtils::AddSegm(&task_.contour, line.end);
+    task_.contour.push_back(Contours::SegmentTo(line.end));
     GoOnBehind(line);
     return true;
   }
 
   bool Append(FittedArc const& arc) {
     BeginAt(arc.start);
-    GeometryUtils::AddArc(&task_.contour, arc.start, arc.end, arc.circle.centre, arc.circle.radius,
-                          !arc.ccw);
+    task_.contour.push_back(ElementOf(arc));
     GoOnBehind(arc);
     return true;
   }
 
   void BeginAt(Point const& start) {
-    if (task_.contour.empty()) GeometryUtils::AddSegm(&task_.contour, start);
+    if (task_.contour.empty()) task_.contour.push_back(Contours::SegmentTo(start));
   }
 
   /// The last point of one run is the first point of the next.

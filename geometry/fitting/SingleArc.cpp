@@ -13,6 +13,7 @@
 
 #include "geometry/elementary/CircleThrough.h"
 #include "geometry/elementary/Sense.h"
+#include "geometry/fitting/PieceElements.h"
 #include "geometry/fitting/Strategies.h"
 #include "geometry/fitting/arc/ArcFit.h"
 #include "geometry/fitting/arc/ArcSearch.h"
@@ -46,11 +47,10 @@ std::vector<WPoint> ReducedPoints(std::vector<WPoint> const& points,
   return reduced;
 }
 
-/// An arc as the contour takes it.
-void AppendArc(Point const& start, Point const& end, Circle const& circle, bool ccw,
-               std::vector<GeometryUtils::Elem>* contour) {
-  GeometryUtils::AddSegm(contour, start);
-  GeometryUtils::AddArc(contour, start, end, circle.centre, circle.radius, !ccw);
+/// Appends the start of a contour and its only arc.
+void AppendArc(FittedArc const& arc, Contours::Contour* contour) {
+  contour->push_back(Contours::SegmentTo(arc.start));
+  contour->push_back(ElementOf(arc));
 }
 
 /// The arc through exactly three points.
@@ -63,7 +63,7 @@ ErrorCode JoinThreePoints(CurveTask const& task) {
   if (!circle) return ErrorCode::Failed;
   std::optional<bool> const ccw = Elementary::IsCounterClockwise(first, middle, last);
   if (!ccw) return ErrorCode::Failed;
-  AppendArc(first, last, *circle, *ccw, &task.contour);
+  AppendArc({{first, last, run.count, {}}, *circle, *ccw}, &task.contour);
   return ErrorCode::Ok;
 }
 
@@ -109,7 +109,7 @@ class SingleArcFit {
     }
     circle_ = arc.circle;
     ccw_ = arc.ccw;
-    AppendArc(arc.start, arc.end, arc.circle, arc.ccw, &task_.contour);
+    AppendArc(arc, &task_.contour);
     return ErrorCode::Ok;
   }
 
@@ -166,7 +166,7 @@ class SingleArcFit {
         shortEnd_ ? shortEnd_ : Intersections::NearestOnCircle(circle_, run_.LastPoint());
     if (!start || !end) return ErrorCode::Failed;
     task_.contour.clear();
-    AppendArc(*start, *end, circle_, ccw_, &task_.contour);
+    AppendArc({{*start, *end, run_.count, {}}, circle_, ccw_}, &task_.contour);
     return ErrorCode::Ok;
   }
 

@@ -107,17 +107,24 @@ class SpreadSearch {
     for (std::size_t g = 0; g < groups_.size(); ++g) {
       Group const& first = groups_[g];
       std::vector<Group const*> const candidates = GroupsThatReach(g);
-      for (std::size_t i = first.begin; i < first.end && !candidates.empty(); ++i) {
-        for (Group const* second : candidates) {
-          for (std::size_t j = std::max(second->begin, i + 1); j < second->end; ++j) {
-            if (Distance2(points_[i], points_[j]) != spread_.largest2) continue;
-            spread_.i = static_cast<std::int32_t>(i);
-            spread_.j = static_cast<std::int32_t>(j);
-            return;
-          }
-        }
+      for (std::size_t i = first.begin; i < first.end; ++i) {
+        if (FindFarthestFrom(i, candidates)) return;
       }
     }
+  }
+
+  /// Makes the farthest pair that of one point and the first behind it that is as far away. False
+  /// when there is none in the groups.
+  bool FindFarthestFrom(std::size_t i, std::vector<Group const*> const& groups) {
+    for (Group const* group : groups) {
+      for (std::size_t j = std::max(group->begin, i + 1); j < group->end; ++j) {
+        if (Distance2(points_[i], points_[j]) != spread_.largest2) continue;
+        spread_.i = static_cast<std::int32_t>(i);
+        spread_.j = static_cast<std::int32_t>(j);
+        return true;
+      }
+    }
+    return false;
   }
 
   /// The groups from this one on that may hold the other end of a farthest pair.
