@@ -15,6 +15,7 @@ enum class Pass { First, Later };
 /// Steps over the elements of a contour, which must stay.
 class Walk {
  public:
+  /// Over a contour that has an element.
   explicit Walk(Contour const& contour) : end_(contour.data() + contour.size()) {}
 
   /// The next element that does not end where this one ends; null when there is none before the end
