@@ -8,10 +8,10 @@
 
 #include "benchmarks/Measure.h"
 #include "benchmarks/Registration.h"
-#include "io/base/Numbers.h"
-#include "io/measure/Remeasure.h"
 #include "io/pieces/Shapes.h"
-#include "io/points/CsvReader.h"
+#include "vorn/io/Deviations.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Points.h"
 
 namespace Vorn::Benchmarks {
 namespace {

@@ -2,7 +2,7 @@
 
 #include <iosfwd>
 
-#include "cli/ExitCode.h"
+#include "cli/base/ExitCode.h"
 
 namespace Vorn::Cli {
 

@@ -44,12 +44,11 @@ endfunction()
 
 # Hidden visibility does not hide the instances of standard templates (namespace std has default
 # visibility), so the linker gets the list of what leaves the library.
-function(vorn_export_only_the_classes target)
+function(vorn_export_only target map)
   get_target_property(type ${target} TYPE)
   if(NOT CMAKE_SYSTEM_NAME STREQUAL "Linux" OR NOT type STREQUAL "SHARED_LIBRARY")
     return()
   endif()
-  set(map ${PROJECT_SOURCE_DIR}/cmake/exports.map)
   target_link_options(${target} PRIVATE LINKER:--version-script=${map})
   # The library's calls of its own exported members go straight to them, not by way of the table
   # through which a program could put its own in their place.

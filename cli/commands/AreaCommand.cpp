@@ -8,12 +8,11 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/texts/AreaText.h"
-#include "io/base/Numbers.h"
-#include "io/base/TextFile.h"
-#include "io/formats/ContourReader.h"
-#include "io/formats/Format.h"
-#include "io/measure/ContourArea.h"
-#include "io/points/CsvReader.h"
+#include "vorn/io/ContourArea.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Points.h"
 
 namespace Vorn::Cli {
 

@@ -9,12 +9,12 @@
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/texts/CheckText.h"
-#include "io/base/Numbers.h"
-#include "io/base/TextFile.h"
-#include "io/formats/ContourReader.h"
-#include "io/formats/Format.h"
-#include "io/measure/CheckReport.h"
-#include "io/points/Tolerances.h"
+#include "vorn/io/CheckReport.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Tolerances.h"
 
 namespace Vorn::Cli {
 

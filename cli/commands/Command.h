@@ -3,7 +3,7 @@
 #include <functional>
 #include <iosfwd>
 
-#include "cli/ExitCode.h"
+#include "cli/base/ExitCode.h"
 
 namespace Vorn::Cli {
 

@@ -3,7 +3,7 @@
 #include <CLI/CLI.hpp>
 #include <sstream>
 
-#include "io/base/Failure.h"
+#include "vorn/io/Failure.h"
 
 namespace Vorn::Cli {
 

@@ -6,7 +6,7 @@
 #include <string>
 #include <vector>
 
-#include "cli/Library.h"
+#include "cli/base/Library.h"
 
 namespace CLI {
 class App;

@@ -4,9 +4,10 @@
 
 #include "cli/commands/Command.h"
 #include "cli/commands/CommonOptions.h"
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
-#include "io/base/TextFile.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 

@@ -3,8 +3,8 @@
 #include <optional>
 #include <string>
 
-#include "cli/Library.h"
-#include "io/formats/Format.h"
+#include "cli/base/Library.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::Cli {
 

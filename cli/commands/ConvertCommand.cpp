@@ -8,11 +8,11 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
 #include "cli/commands/Outputs.h"
-#include "io/base/Numbers.h"
-#include "io/drawing/Drawing.h"
-#include "io/formats/ContourReader.h"
-#include "io/formats/Format.h"
-#include "io/measure/Departure.h"
+#include "vorn/io/Departure.h"
+#include "vorn/io/Drawing.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
@@ -123,8 +123,8 @@ std::string LineFor(Options const& options, ContourFile const& contour, Converte
          (IsTooFar(options, file) ? ": TOO FAR" : "") + "\n";
 }
 
-void Report(Options const& options, ContourFile const& contour, std::vector<Converted> const& files,
-            Console const& console) {
+void PrintSummary(Options const& options, ContourFile const& contour,
+                  std::vector<Converted> const& files, Console const& console) {
   for (Gap const& gap : FindGaps(contour)) {
     console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
   }
@@ -153,7 +153,7 @@ ExitCode Run(Options const& options, Console const& console) {
   outputs.Write(console);
   auto const isGCode = [](Converted const& file) { return file.format == Format::GCode; };
   WarnOfMissingFeed(options.write, std::any_of(files.begin(), files.end(), isGCode), console);
-  Report(options, contour, files, console);
+  PrintSummary(options, contour, files, console);
   bool const isTooFar = std::any_of(files.begin(), files.end(),
                                     [&](Converted const& file) { return IsTooFar(options, file); });
   return isTooFar ? ExitCode::OutsideTolerance : ExitCode::Ok;

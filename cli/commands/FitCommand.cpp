@@ -16,10 +16,11 @@
 #include "cli/commands/PointsInput.h"
 #include "cli/terminal/Progress.h"
 #include "cli/texts/FitTable.h"
-#include "io/base/Numbers.h"
-#include "io/fit/ContourFit.h"
-#include "io/fit/FitReport.h"
-#include "io/formats/Format.h"
+#include "vorn/io/FitContour.h"
+#include "vorn/io/FitReport.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
@@ -154,7 +155,7 @@ struct Options {
 };
 
 /// The contour in every format that is asked for.
-std::vector<FittedFile> FilesOf(Options const& options, Report const& report) {
+std::vector<FittedFile> FilesOf(Options const& options, FitReport const& report) {
   std::vector<FittedFile> files;
   for (Target const& target : options.Targets()) {
     files.push_back(RenderFit(report, target.file.path, target.format, options.write));
@@ -162,7 +163,7 @@ std::vector<FittedFile> FilesOf(Options const& options, Report const& report) {
   return files;
 }
 
-void PrintResults(Options const& options, Report const& report,
+void PrintResults(Options const& options, FitReport const& report,
                   std::vector<FittedFile> const& files, Console const& console) {
   FittedFile const* const worst = WorstOf(files);
   console.out << ToTable(report, options.digits,
@@ -170,7 +171,7 @@ void PrintResults(Options const& options, Report const& report,
   for (FittedFile const& file : files) console.out << "wrote       " << file.path << '\n';
 }
 
-void WriteResults(Options const& options, Report const& report,
+void WriteResults(Options const& options, FitReport const& report,
                   std::vector<FittedFile> const& files, Console const& console) {
   Outputs outputs;
   bool isOutTaken = false;
@@ -182,14 +183,14 @@ void WriteResults(Options const& options, Report const& report,
   if (!isOutTaken) PrintResults(options, report, files, console);
 }
 
-Report FitWithProgress(Options const& options, Console const& console) {
+FitReport FitWithProgress(Options const& options, Console const& console) {
   PointFile file = ReadPointsInput(options.points, console);
   ProgressBar progress(stderr, file.points.size(), options.isQuiet);
   return FitContour(std::move(file), options.Choice(), &progress);
 }
 
 /// Reads from the file alone: a standard input is not among many.
-Report FitOneOfMany(Options const& options, std::string const& path, Console const& console) {
+FitReport FitOneOfMany(Options const& options, std::string const& path, Console const& console) {
   PointsInput input = options.points;
   input.path = path;
   return FitContour(ReadPointsInput(input, console), options.Choice(), nullptr);
@@ -202,7 +203,7 @@ FitMany ManyOf(Options const& options) {
   many.formats = options.formats.empty() ? std::vector{Format::Json} : options.formats;
   many.jobs = options.jobs;
   many.showTime = !options.hideTime;
-  many.render = [&options](Report const& report, std::string const& path, Format format) {
+  many.render = [&options](FitReport const& report, std::string const& path, Format format) {
     return RenderFit(report, path, format, options.write);
   };
   return many;
@@ -217,7 +218,7 @@ ExitCode RunMany(Options const& options, Console const& console) {
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  Report report = FitWithProgress(options, console);
+  FitReport report = FitWithProgress(options, console);
   std::vector<FittedFile> const files = FilesOf(options, report);
   Verdict const verdict = VerdictOf(report, files);
   std::string const complaint = verdict == Verdict::WithinTolerance ? "" : Complaint(report, files);

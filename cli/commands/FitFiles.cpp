@@ -1,18 +1,18 @@
 #include "cli/commands/FitFiles.h"
 
-#include "io/base/Numbers.h"
-#include "io/drawing/Drawing.h"
-#include "io/fit/FitJson.h"
+#include "vorn/io/Drawing.h"
+#include "vorn/io/FitReport.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
 namespace {
 
-ContourFile ContourOf(Report const& report) {
+ContourFile ContourOf(FitReport const& report) {
   return {report.file.path, report.pieces, report.closure.isClosed, report.file.units};
 }
 
-std::string TextOf(Report const& report, Format format, WriteOptions const& options) {
+std::string TextOf(FitReport const& report, Format format, WriteOptions const& options) {
   switch (format) {
     case Format::Json:
       return ToJson(report);
@@ -32,7 +32,7 @@ std::string NameOf(FittedFile const& file) {
 }
 
 /// Why a contour within tolerance is not so in its file.
-std::string FileComplaint(Report const& report, FittedFile const& file) {
+std::string FileComplaint(FitReport const& report, FittedFile const& file) {
   std::string const name = NameOf(file) + ": ";
   if (!file.measure->unreadable.empty()) {
     return name + "cannot be read back and measured: " + file.measure->unreadable;
@@ -46,7 +46,7 @@ std::string FileComplaint(Report const& report, FittedFile const& file) {
 
 }  // namespace
 
-FittedFile RenderFit(Report const& report, std::string const& path, Format format,
+FittedFile RenderFit(FitReport const& report, std::string const& path, Format format,
                      WriteOptions const& options) {
   FittedFile file = {path, format, TextOf(report, format, options), {}};
   if (HoldsContour(format)) file.measure = MeasureText(file.text, format, report.file.points);
@@ -64,14 +64,14 @@ FittedFile const* WorstOf(std::vector<FittedFile> const& files) {
   return worst;
 }
 
-Verdict VerdictOf(Report const& report, std::vector<FittedFile> const& files) {
+Verdict VerdictOf(FitReport const& report, std::vector<FittedFile> const& files) {
   FittedFile const* const worst = WorstOf(files);
   bool const isGood = worst == nullptr || worst->measure->IsWithin();
   if (report.verdict != Verdict::WithinTolerance || isGood) return report.verdict;
   return Verdict::OutsideTolerance;
 }
 
-std::string Complaint(Report const& report, std::vector<FittedFile> const& files) {
+std::string Complaint(FitReport const& report, std::vector<FittedFile> const& files) {
   PointFile const& file = report.file;
   if (report.verdict == Verdict::StopsEarly) {
     GeometryUtils::Point const& end = report.pieces.back().end;
@@ -84,7 +84,7 @@ std::string Complaint(Report const& report, std::vector<FittedFile> const& files
          FormatShort(report.remeasured.Worst().relative) + ")";
 }
 
-std::string ReadBackText(Report const& report, FittedFile const& file) {
+std::string ReadBackText(FitReport const& report, FittedFile const& file) {
   constexpr int kDecimals = 6;
   if (!file.measure->unreadable.empty()) return "not possible for " + NameOf(file);
   return FormatFixed(file.measure->relative, kDecimals) + " of the tolerance at " +

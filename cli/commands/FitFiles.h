@@ -5,8 +5,8 @@
 #include <vector>
 
 #include "cli/commands/Command.h"
-#include "io/fit/FileMeasure.h"
-#include "io/fit/FitReport.h"
+#include "vorn/io/FileMeasure.h"
+#include "vorn/io/FitReport.h"
 
 namespace Vorn::Cli {
 
@@ -20,7 +20,7 @@ struct FittedFile {
 
 /// The text of the file, measured as it stands there.
 /// @throws as ToText does.
-FittedFile RenderFit(Report const& report, std::string const& path, Format format,
+FittedFile RenderFit(FitReport const& report, std::string const& path, Format format,
                      WriteOptions const& options);
 
 /// The file that leaves the tolerances furthest: the first that cannot be read back, else the one
@@ -28,12 +28,12 @@ FittedFile RenderFit(Report const& report, std::string const& path, Format forma
 FittedFile const* WorstOf(std::vector<FittedFile> const& files);
 
 /// The verdict about the contour and all its files.
-Verdict VerdictOf(Report const& report, std::vector<FittedFile> const& files);
+Verdict VerdictOf(FitReport const& report, std::vector<FittedFile> const& files);
 
 /// What is wrong with the contour or else with the worst of its files, for standard error.
-std::string Complaint(Report const& report, std::vector<FittedFile> const& files);
+std::string Complaint(FitReport const& report, std::vector<FittedFile> const& files);
 
 /// "0.998 of the tolerance at point 5 (line 7) in a.nc": a measure for the summary.
-std::string ReadBackText(Report const& report, FittedFile const& file);
+std::string ReadBackText(FitReport const& report, FittedFile const& file);
 
 }  // namespace Vorn::Cli

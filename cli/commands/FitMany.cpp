@@ -15,7 +15,8 @@
 #include <utility>
 
 #include "cli/commands/Outputs.h"
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
@@ -71,7 +72,7 @@ Outcome Failed(std::string const& path, ExitCode code, std::string const& messag
 
 Outcome FitFile(FitMany const& many, std::string const& path) {
   auto const begin = std::chrono::steady_clock::now();
-  Report const report = many.fit(path);
+  FitReport const report = many.fit(path);
   Outcome outcome;
   outcome.path = path;
   outcome.isFitted = true;

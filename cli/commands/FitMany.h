@@ -7,8 +7,8 @@
 
 #include "cli/commands/Command.h"
 #include "cli/commands/FitFiles.h"
-#include "io/fit/FitReport.h"
-#include "io/formats/Format.h"
+#include "vorn/io/FitReport.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::Cli {
 
@@ -19,8 +19,8 @@ struct FitMany {
   std::vector<Format> formats;
   std::optional<int> jobs;  ///< how many files at once; nothing: as many as there are processors
   bool showTime = true;
-  std::function<Report(std::string const& path)> fit;
-  std::function<FittedFile(Report const&, std::string const& path, Format)> render;
+  std::function<FitReport(std::string const& path)> fit;
+  std::function<FittedFile(FitReport const&, std::string const& path, Format)> render;
 };
 
 /// The file that the fit of `path` is written to: the name of the input with another ending.

@@ -5,8 +5,8 @@
 
 #include "cli/commands/PointsInput.h"
 #include "cli/texts/InfoText.h"
-#include "io/points/InfoReport.h"
-#include "io/points/Tolerances.h"
+#include "vorn/io/InfoReport.h"
+#include "vorn/io/Tolerances.h"
 
 namespace Vorn::Cli {
 

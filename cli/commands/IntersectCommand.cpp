@@ -6,10 +6,9 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
 #include "cli/texts/IntersectionText.h"
-#include "io/base/TextFile.h"
-#include "io/formats/ContourReader.h"
-#include "io/formats/Format.h"
-#include "io/measure/Intersections.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Intersections.h"
 
 namespace Vorn::Cli {
 

@@ -5,7 +5,7 @@
 #include <ostream>
 
 #include "cli/terminal/Interruption.h"
-#include "io/base/AtomicFile.h"
+#include "vorn/io/Files.h"
 
 namespace Vorn::Cli {
 

@@ -10,11 +10,11 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
-#include "io/base/Numbers.h"
-#include "io/drawing/Drawing.h"
-#include "io/formats/ContourReader.h"
-#include "io/formats/Format.h"
-#include "io/points/Tolerances.h"
+#include "vorn/io/Drawing.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Tolerances.h"
 
 namespace Vorn::Cli {
 

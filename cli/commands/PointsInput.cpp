@@ -1,7 +1,8 @@
 #include "cli/commands/PointsInput.h"
 
 #include "cli/commands/CommonOptions.h"
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 

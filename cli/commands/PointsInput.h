@@ -4,9 +4,9 @@
 
 #include "cli/commands/Command.h"
 #include "cli/commands/CommandLine.h"
-#include "io/points/Closure.h"
-#include "io/points/CsvReader.h"
-#include "io/points/Tolerances.h"
+#include "vorn/io/Closure.h"
+#include "vorn/io/Points.h"
+#include "vorn/io/Tolerances.h"
 
 namespace Vorn::Cli {
 

@@ -7,9 +7,10 @@
 
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
-#include "io/base/Numbers.h"
-#include "io/base/TextFile.h"
-#include "io/points/DropClose.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Thinning.h"
 
 namespace Vorn::Cli {
 

@@ -6,8 +6,8 @@
 #include <cstring>
 #include <thread>
 
-#include "cli/ExitCode.h"
-#include "io/base/StagedFiles.h"
+#include "cli/base/ExitCode.h"
+#include "vorn/io/Files.h"
 
 namespace Vorn::Cli {
 

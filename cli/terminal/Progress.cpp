@@ -6,7 +6,7 @@
 #include <cmath>
 
 #include "cli/terminal/Interruption.h"
-#include "io/base/Numbers.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 

@@ -6,7 +6,7 @@
 #include <cstdio>
 #include <string>
 
-#include "cli/Library.h"
+#include "cli/base/Library.h"
 #include "vorn/Types.h"
 
 namespace Vorn::Cli {

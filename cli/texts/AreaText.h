@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "cli/Library.h"
-#include "io/measure/ContourArea.h"
+#include "cli/base/Library.h"
+#include "vorn/io/ContourArea.h"
 
 namespace Vorn::Cli {
 

@@ -3,7 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 

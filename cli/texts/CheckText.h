@@ -4,8 +4,8 @@
 #include <string>
 #include <vector>
 
-#include "cli/Library.h"
-#include "io/measure/CheckReport.h"
+#include "cli/base/Library.h"
+#include "vorn/io/CheckReport.h"
 
 namespace Vorn::Cli {
 

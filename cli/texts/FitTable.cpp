@@ -4,7 +4,8 @@
 #include <cmath>
 #include <numbers>
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
@@ -19,7 +20,7 @@ constexpr double kLargestFixed = 1e9;
 /// columns of a readable width.
 class LengthFormat {
  public:
-  LengthFormat(Report const& report, std::optional<int> wanted) {
+  LengthFormat(FitReport const& report, std::optional<int> wanted) {
     if (wanted) {
       decimals_ = *wanted;
       return;
@@ -44,7 +45,7 @@ Row Header() {
           "centre y", "radius", "direction", "sweep",   "length", "points"};
 }
 
-Row PieceRow(Report const& report, std::size_t i, LengthFormat const& length) {
+Row PieceRow(FitReport const& report, std::size_t i, LengthFormat const& length) {
   Piece const& piece = report.pieces[i];
   Row row = {std::to_string(i + 1), piece.IsArc() ? "arc" : "line",
              length(piece.start.x), length(piece.start.y),
@@ -81,11 +82,11 @@ std::string Aligned(std::vector<Row> const& rows) {
   return text;
 }
 
-std::string WithUnits(std::string const& number, Report const& report) {
+std::string WithUnits(std::string const& number, FitReport const& report) {
   return report.file.units.empty() ? number : number + " " + report.file.units;
 }
 
-std::string ToleranceText(Report const& report) {
+std::string ToleranceText(FitReport const& report) {
   double const smallest = report.SmallestTolerance();
   double const largest = report.LargestTolerance();
   std::string text = FormatShort(smallest);
@@ -93,7 +94,7 @@ std::string ToleranceText(Report const& report) {
   return WithUnits(text, report) + " (" + report.toleranceSource + ")";
 }
 
-std::string ReportedText(Report const& report) {
+std::string ReportedText(FitReport const& report) {
   FitAnswer const& fit = report.fit;
   if (report.isFullCircle) return "nothing: a full circle is fitted by the program itself";
   if (!IsDeviationRelative(report.strategy)) {
@@ -105,7 +106,7 @@ std::string ReportedText(Report const& report) {
   return text + " at " + report.file.NameOf(static_cast<std::size_t>(fit.deviationIndex));
 }
 
-std::string RemeasuredText(Report const& report) {
+std::string RemeasuredText(FitReport const& report) {
   PointDeviation const& worst = report.remeasured.Worst();
   return FormatFixed(worst.relative, 6) + " of the tolerance at " +
          report.file.NameOf(report.remeasured.worst) + ", " +
@@ -113,7 +114,7 @@ std::string RemeasuredText(Report const& report) {
          std::to_string(worst.piece + 1);
 }
 
-std::string ClosedText(Report const& report) {
+std::string ClosedText(FitReport const& report) {
   Closure const& closure = report.closure;
   if (!closure.isClosed) return "no" + (closure.reason.empty() ? "" : " (" + closure.reason + ")");
   std::string const seam = report.file.NameOf(report.seam);
@@ -122,14 +123,14 @@ std::string ClosedText(Report const& report) {
   return text + "GAP of " + WithUnits(FormatShort(report.Gap()), report) + " at " + seam;
 }
 
-std::string CompressionText(Report const& report) {
+std::string CompressionText(FitReport const& report) {
   auto const points = static_cast<double>(report.file.points.size());
   auto const pieces = static_cast<double>(report.pieces.size());
   return FormatFixed(points / pieces, 1) + " points a piece, " +
          FormatFixed(100.0 * pieces / points, 1) + " % of the points";
 }
 
-std::string Summary(Report const& report, std::string const& readBack) {
+std::string Summary(FitReport const& report, std::string const& readBack) {
   return "points      " + std::to_string(report.file.points.size()) + "\n" + "tolerance   " +
          ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) + "\n" +
          "closed      " + ClosedText(report) + "\n" + "pieces      " +
@@ -144,7 +145,8 @@ std::string Summary(Report const& report, std::string const& readBack) {
 
 }  // namespace
 
-std::string ToTable(Report const& report, std::optional<int> digits, std::string const& readBack) {
+std::string ToTable(FitReport const& report, std::optional<int> digits,
+                    std::string const& readBack) {
   LengthFormat const length(report, digits);
   std::vector<Row> rows = {Header()};
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {

@@ -3,8 +3,8 @@
 #include <optional>
 #include <string>
 
-#include "cli/Library.h"
-#include "io/fit/FitReport.h"
+#include "cli/base/Library.h"
+#include "vorn/io/FitReport.h"
 
 namespace Vorn::Cli {
 
@@ -13,7 +13,7 @@ namespace Vorn::Cli {
 /// @param digits after the point of coordinates and lengths; nothing: a hundredth of the smallest
 ///        tolerance, as far as columns stay readable
 /// @param readBack what was found when the files were read back; empty: nothing to say
-std::string ToTable(Report const& report, std::optional<int> digits = {},
+std::string ToTable(FitReport const& report, std::optional<int> digits = {},
                     std::string const& readBack = "");
 
 }  // namespace Vorn::Cli

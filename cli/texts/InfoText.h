@@ -2,8 +2,8 @@
 
 #include <string>
 
-#include "cli/Library.h"
-#include "io/points/InfoReport.h"
+#include "cli/base/Library.h"
+#include "vorn/io/InfoReport.h"
 
 namespace Vorn::Cli {
 

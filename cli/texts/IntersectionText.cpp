@@ -2,7 +2,8 @@
 
 #include <algorithm>
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 

@@ -3,8 +3,8 @@
 #include <string>
 #include <vector>
 
-#include "cli/Library.h"
-#include "io/measure/Intersections.h"
+#include "cli/base/Library.h"
+#include "vorn/io/Intersections.h"
 
 namespace Vorn::Cli {
 

@@ -1,5 +1,3 @@
-#include "io/base/AtomicFile.h"
-
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
@@ -10,8 +8,9 @@
 #include <cstring>
 #include <filesystem>
 
-#include "io/base/Failure.h"
 #include "io/base/StagedFiles.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Files.h"
 
 namespace Vorn::IO {
 

@@ -3,7 +3,8 @@
 #include <algorithm>
 #include <string>
 
-#include "io/base/Numbers.h"
+#include "io/base/Words.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

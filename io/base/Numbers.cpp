@@ -1,4 +1,4 @@
-#include "io/base/Numbers.h"
+#include "vorn/io/Numbers.h"
 
 #include <fast_float/fast_float.h>
 
@@ -6,6 +6,9 @@
 #include <array>
 #include <charconv>
 #include <cstdio>
+
+#include "io/base/Words.h"
+#include "vorn/io/Messages.h"
 
 namespace Vorn::IO {
 

@@ -4,6 +4,8 @@
 
 #include <set>
 
+#include "vorn/io/Files.h"
+
 namespace Vorn::IO {
 
 namespace {

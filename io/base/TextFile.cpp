@@ -1,12 +1,11 @@
-#include "io/base/TextFile.h"
-
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <istream>
 
-#include "io/base/Failure.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Files.h"
 
 namespace Vorn::IO {
 

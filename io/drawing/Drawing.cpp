@@ -1,14 +1,14 @@
-#include "io/drawing/Drawing.h"
+#include "vorn/io/Drawing.h"
 
 #include <algorithm>
 #include <filesystem>
 #include <utility>
 
-#include "io/base/Numbers.h"
-#include "io/base/TextFile.h"
-#include "io/formats/Format.h"
-#include "io/pieces/ContourFile.h"
-#include "io/points/CsvReader.h"
+#include "vorn/io/ContourFile.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Points.h"
 
 namespace Vorn::IO {
 
@@ -53,7 +53,7 @@ std::size_t Drawing::Worst() const {
   return static_cast<std::size_t>(largest - deviations.begin());
 }
 
-Drawing DrawingOf(Report const& report) {
+Drawing DrawingOf(FitReport const& report) {
   Drawing drawing;
   drawing.title = std::filesystem::path(report.file.path).filename().string();
   drawing.units = report.file.units;

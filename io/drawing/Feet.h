@@ -2,7 +2,7 @@
 
 #include <vector>
 
-#include "io/drawing/Drawing.h"
+#include "vorn/io/Drawing.h"
 
 namespace Vorn::IO {
 

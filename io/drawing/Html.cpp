@@ -4,12 +4,12 @@
 #include <string_view>
 
 #include "HtmlParts.h"
-#include "io/base/Numbers.h"
 #include "io/drawing/Band.h"
-#include "io/drawing/Drawing.h"
 #include "io/drawing/Feet.h"
 #include "io/drawing/Layout.h"
 #include "io/drawing/SvgElements.h"
+#include "vorn/io/Drawing.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

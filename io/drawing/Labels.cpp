@@ -3,10 +3,10 @@
 #include <algorithm>
 #include <cmath>
 
-#include "io/base/Numbers.h"
 #include "io/drawing/Feet.h"
 #include "io/drawing/Style.h"
 #include "io/drawing/SvgElements.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO::Svg {
 

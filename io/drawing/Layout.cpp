@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO::Svg {
 

@@ -3,7 +3,7 @@
 #include <string>
 #include <vector>
 
-#include "io/drawing/Drawing.h"
+#include "vorn/io/Drawing.h"
 
 /// Where things go on the page: pixels, scales and ticks. Everything is laid out in pixels before
 /// it is written, so strokes and letters look the same whatever the size of the contour.

@@ -1,9 +1,9 @@
 #include "io/drawing/Legend.h"
 
-#include "io/base/Numbers.h"
 #include "io/drawing/Style.h"
 #include "io/drawing/SvgContour.h"
 #include "io/drawing/SvgElements.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO::Svg {
 

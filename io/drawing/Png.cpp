@@ -5,8 +5,8 @@
 #include <cmath>
 #include <memory>
 
-#include "io/base/Failure.h"
-#include "io/drawing/Drawing.h"
+#include "vorn/io/Drawing.h"
+#include "vorn/io/Failure.h"
 
 namespace Vorn::IO {
 

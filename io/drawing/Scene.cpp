@@ -2,7 +2,7 @@
 
 #include <utility>
 
-#include "io/fit/FitReport.h"
+#include "vorn/io/FitReport.h"
 
 namespace Vorn::IO::Svg {
 

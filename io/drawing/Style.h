@@ -2,7 +2,7 @@
 
 #include <string>
 
-#include "io/pieces/Pieces.h"
+#include "vorn/io/Pieces.h"
 
 /// What the parts of the drawing have in common. The colours of the pieces, the band and the worst
 /// point are told apart with any kind of colour vision; shapes and dashes tell the same again.

@@ -1,10 +1,11 @@
-#include "io/base/Numbers.h"
 #include "io/drawing/Legend.h"
 #include "io/drawing/Scene.h"
 #include "io/drawing/Style.h"
 #include "io/drawing/SvgContour.h"
 #include "io/drawing/SvgDeviation.h"
 #include "io/drawing/SvgElements.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -5,12 +5,12 @@
 #include <map>
 #include <numbers>
 
-#include "io/base/Numbers.h"
 #include "io/drawing/Band.h"
 #include "io/drawing/Decimation.h"
 #include "io/drawing/Labels.h"
 #include "io/drawing/Style.h"
 #include "io/drawing/SvgElements.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO::Svg {
 

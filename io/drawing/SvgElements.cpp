@@ -2,8 +2,8 @@
 
 #include <cmath>
 
-#include "io/base/Numbers.h"
 #include "io/drawing/Decimation.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO::Svg {
 

@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <limits>
 
-#include "io/measure/Remeasure.h"
+#include "vorn/io/Deviations.h"
 
 namespace Vorn::IO {
 

@@ -5,9 +5,9 @@
 #include <optional>
 
 #include "io/fit/Assignment.h"
-#include "io/fit/FitReport.h"
-#include "io/measure/Remeasure.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Deviations.h"
+#include "vorn/io/FitReport.h"
 
 namespace Vorn::IO {
 

@@ -2,8 +2,8 @@
 
 #include <vector>
 
-#include "io/pieces/Pieces.h"
 #include "vorn/Types.h"
+#include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
 

@@ -1,14 +1,14 @@
-#include "io/fit/ContourFit.h"
-
 #include <chrono>
 #include <cstdint>
 #include <limits>
 #include <utility>
 
-#include "io/base/Failure.h"
 #include "io/fit/Fit.h"
 #include "io/fit/FullCircle.h"
-#include "io/points/Spacing.h"
+#include "io/fit/MakeReport.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/FitContour.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 
@@ -32,8 +32,8 @@ void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
   }
 }
 
-Report FitOpen(PointFile file, std::string toleranceSource, Closure const& closure,
-               FitChoice const& choice, ExecutionState* progress) {
+FitReport FitOpen(PointFile file, std::string toleranceSource, Closure const& closure,
+                  FitChoice const& choice, ExecutionState* progress) {
   if (choice.start) {
     throw Failure(FailureKind::BadArgument,
                   file.path + ": --start is for closed contours, and this one is " + "open (" +
@@ -46,7 +46,7 @@ Report FitOpen(PointFile file, std::string toleranceSource, Closure const& closu
     }
   }
   RefuseFailedFit(file, answer);
-  Report report =
+  FitReport report =
       MakeReport(std::move(file), std::move(toleranceSource), choice.strategy, std::move(answer));
   report.closure = closure;
   return report;
@@ -88,8 +88,8 @@ double SecondsSince(std::chrono::steady_clock::time_point begin) {
   return std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count();
 }
 
-Report FitFrom(std::size_t seam, PointFile file, std::string toleranceSource,
-               Closure const& closure, FitChoice const& choice, ExecutionState* progress) {
+FitReport FitFrom(std::size_t seam, PointFile file, std::string toleranceSource,
+                  Closure const& closure, FitChoice const& choice, ExecutionState* progress) {
   Circuit const circuit = MakeCircuit(file.points, closure, seam);
   RefuseClosePair(file, choice, circuit);
   auto const begin = std::chrono::steady_clock::now();
@@ -120,30 +120,30 @@ class Half final : public ExecutionState {
 };
 
 /// The last point of the first piece: a place where two pieces meet.
-std::optional<std::size_t> JointOf(Report const& report) {
+std::optional<std::size_t> JointOf(FitReport const& report) {
   if (report.isFullCircle || !report.ranges || report.ranges->front().count < 2) return {};
   std::size_t const count = report.file.points.size() - (report.closure.repeatsFirst ? 1 : 0);
   return (report.seam + report.ranges->front().count - 1) % count;
 }
 
-bool IsBetter(Report const& a, Report const& b) {
+bool IsBetter(FitReport const& a, FitReport const& b) {
   return a.verdict == Verdict::WithinTolerance && a.Gap() <= b.Gap() &&
          a.pieces.size() < b.pieces.size();
 }
 
 /// A contour without a corner. Cut open at its first point it would in most cases have a piece too
 /// many, so it is fitted again from a joint that the first attempt found.
-Report FitSmooth(PointFile const& file, std::string const& toleranceSource, Closure const& closure,
-                 FitChoice const& choice, ExecutionState* progress) {
+FitReport FitSmooth(PointFile const& file, std::string const& toleranceSource,
+                    Closure const& closure, FitChoice const& choice, ExecutionState* progress) {
   Half firstHalf(progress, 0);
   Half secondHalf(progress, kFullProgress / 2);
-  Report first = FitFrom(0, file, toleranceSource, closure, choice, &firstHalf);
+  FitReport first = FitFrom(0, file, toleranceSource, closure, choice, &firstHalf);
   std::optional<std::size_t> const joint = JointOf(first);
   if (!joint) return first;
   try {
-    Report second = FitFrom(*joint, file, toleranceSource, closure, choice, &secondHalf);
+    FitReport second = FitFrom(*joint, file, toleranceSource, closure, choice, &secondHalf);
     double const seconds = first.fit.seconds + second.fit.seconds;
-    Report& best = IsBetter(second, first) ? second : first;
+    FitReport& best = IsBetter(second, first) ? second : first;
     best.fit.seconds = seconds;
     return std::move(best);
   } catch (Failure const&) {
@@ -151,8 +151,8 @@ Report FitSmooth(PointFile const& file, std::string const& toleranceSource, Clos
   }
 }
 
-Report FitClosed(PointFile file, std::string toleranceSource, Closure const& closure,
-                 FitChoice const& choice, ExecutionState* progress) {
+FitReport FitClosed(PointFile file, std::string toleranceSource, Closure const& closure,
+                    FitChoice const& choice, ExecutionState* progress) {
   std::optional<std::size_t> const seam = SeamOf(file, closure, choice);
   if (!seam) return FitSmooth(file, toleranceSource, closure, choice, progress);
   return FitFrom(*seam, std::move(file), std::move(toleranceSource), closure, choice, progress);
@@ -167,7 +167,7 @@ void RequirePoints(PointFile const& file, Closure const& closure) {
 
 }  // namespace
 
-Report FitContour(PointFile file, FitChoice const& choice, ExecutionState* progress) {
+FitReport FitContour(PointFile file, FitChoice const& choice, ExecutionState* progress) {
   Closure const closure = FindClosure(file.points, choice.closed);
   if (closure.isClosed) RequirePoints(file, closure);
   std::string source = AssignTolerances(choice.tolerance, &file, closure.isClosed);

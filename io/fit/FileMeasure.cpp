@@ -1,10 +1,10 @@
-#include "io/fit/FileMeasure.h"
+#include "vorn/io/FileMeasure.h"
 
 #include <algorithm>
 
-#include "io/base/Failure.h"
-#include "io/formats/ContourReader.h"
-#include "io/measure/Remeasure.h"
+#include "vorn/io/Deviations.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 

@@ -1,8 +1,8 @@
-#include "io/fit/FitJson.h"
-
 #include <nlohmann/json.hpp>
 
 #include "io/formats/JsonPieces.h"
+#include "vorn/io/FitReport.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 
@@ -10,7 +10,7 @@ namespace {
 
 using Json = nlohmann::ordered_json;
 
-Json InputJson(Report const& report) {
+Json InputJson(FitReport const& report) {
   Json units = nullptr;
   if (!report.file.units.empty()) units = report.file.units;
   return {
@@ -32,7 +32,7 @@ Json RangeJson(std::optional<std::vector<PointRange>> const& ranges, std::size_t
   return {{"first", first}, {"count", range.count}};
 }
 
-Json ReportedJson(Report const& report) {
+Json ReportedJson(FitReport const& report) {
   bool const hasIndex = report.fit.deviationIndex >= 0;
   Json index = nullptr;
   if (hasIndex) index = report.fit.deviationIndex;
@@ -43,7 +43,7 @@ Json ReportedJson(Report const& report) {
   };
 }
 
-Json RemeasuredJson(Report const& report) {
+Json RemeasuredJson(FitReport const& report) {
   PointDeviation const& worst = report.remeasured.Worst();
   return {
       {"value", worst.relative},          {"kind", "relative"},
@@ -52,7 +52,7 @@ Json RemeasuredJson(Report const& report) {
   };
 }
 
-Json ClosureJson(Report const& report) {
+Json ClosureJson(FitReport const& report) {
   bool const isClosed = report.closure.isClosed;
   Json seam = nullptr;
   if (isClosed) seam = report.seam;
@@ -73,7 +73,7 @@ char const* VerdictName(Verdict verdict) {
 
 }  // namespace
 
-std::string ToJson(Report const& report) {
+std::string ToJson(FitReport const& report) {
   Json elements = Json::array();
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {
     elements.push_back(PieceJson(report.pieces[i], i + 1, RangeJson(report.ranges, i)));

@@ -1,9 +1,10 @@
-#include "io/fit/FitReport.h"
-
 #include <algorithm>
 #include <utility>
 
+#include "io/fit/Assignment.h"
 #include "io/fit/Closing.h"
+#include "io/fit/Fit.h"
+#include "io/fit/MakeReport.h"
 
 namespace Vorn::IO {
 
@@ -14,7 +15,7 @@ bool ByTolerance(WPoint const& a, WPoint const& b) { return a.w < b.w; }
 /// Written so that a deviation that is not a number is outside.
 bool IsWithin(double relative) { return relative <= kLargestRelative; }
 
-Verdict Judge(Report const& report, bool reachesLastPoint) {
+Verdict Judge(FitReport const& report, bool reachesLastPoint) {
   if (!reachesLastPoint) return Verdict::StopsEarly;
   bool const reportsRelative = !report.isFullCircle && IsDeviationRelative(report.strategy);
   bool const within = (!reportsRelative || IsWithin(report.fit.deviation)) &&
@@ -37,26 +38,26 @@ std::optional<std::vector<PointRange>> RangesInFile(Circuit const& circuit,
 
 }  // namespace
 
-std::size_t Report::ArcCount() const {
+std::size_t FitReport::ArcCount() const {
   return static_cast<std::size_t>(std::count_if(pieces.begin(), pieces.end(),
                                                 [](Piece const& piece) { return piece.IsArc(); }));
 }
 
-std::size_t Report::LineCount() const { return pieces.size() - ArcCount(); }
+std::size_t FitReport::LineCount() const { return pieces.size() - ArcCount(); }
 
-double Report::SmallestTolerance() const {
+double FitReport::SmallestTolerance() const {
   return std::min_element(file.points.begin(), file.points.end(), ByTolerance)->w;
 }
 
-double Report::LargestTolerance() const {
+double FitReport::LargestTolerance() const {
   return std::max_element(file.points.begin(), file.points.end(), ByTolerance)->w;
 }
 
-double Report::Gap() const { return GapOf(pieces); }
+double FitReport::Gap() const { return GapOf(pieces); }
 
-Report MakeReport(PointFile file, std::string toleranceSource,
-                  GeometryUtils::FittingStrategy strategy, FitAnswer fit) {
-  Report report;
+FitReport MakeReport(PointFile file, std::string toleranceSource,
+                     GeometryUtils::FittingStrategy strategy, FitAnswer fit) {
+  FitReport report;
   report.file = std::move(file);
   report.toleranceSource = std::move(toleranceSource);
   report.strategy = strategy;
@@ -68,11 +69,11 @@ Report MakeReport(PointFile file, std::string toleranceSource,
   return report;
 }
 
-Report MakeClosedReport(PointFile file, std::string toleranceSource,
-                        GeometryUtils::FittingStrategy strategy, FitAnswer fit,
-                        Closure const& closure, Circuit const& circuit,
-                        std::optional<std::vector<Piece>> circle) {
-  Report report;
+FitReport MakeClosedReport(PointFile file, std::string toleranceSource,
+                           GeometryUtils::FittingStrategy strategy, FitAnswer fit,
+                           Closure const& closure, Circuit const& circuit,
+                           std::optional<std::vector<Piece>> circle) {
+  FitReport report;
   report.file = std::move(file);
   report.toleranceSource = std::move(toleranceSource);
   report.strategy = strategy;

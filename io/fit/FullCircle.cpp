@@ -4,9 +4,9 @@
 #include <cmath>
 #include <numbers>
 
-#include "io/fit/FitReport.h"
-#include "io/measure/Remeasure.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Deviations.h"
+#include "vorn/io/FitReport.h"
 
 namespace Vorn::IO {
 

@@ -3,8 +3,8 @@
 #include <optional>
 #include <vector>
 
-#include "io/pieces/Pieces.h"
 #include "vorn/Types.h"
+#include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
 

@@ -1,14 +1,12 @@
-#include "io/formats/ContourReader.h"
-
-#include "io/base/Failure.h"
-#include "io/base/TextFile.h"
 #include "io/formats/CsvPieces.h"
 #include "io/formats/Dxf.h"
-#include "io/formats/Format.h"
 #include "io/formats/GCode.h"
 #include "io/formats/JsonPieces.h"
 #include "io/formats/Text.h"
 #include "io/formats/Wkt.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 

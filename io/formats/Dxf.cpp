@@ -3,10 +3,10 @@
 #include <cmath>
 #include <numbers>
 
-#include "io/base/Numbers.h"
 #include "io/formats/DxfEntities.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

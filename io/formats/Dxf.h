@@ -3,7 +3,7 @@
 #include <string>
 #include <string_view>
 
-#include "io/pieces/ContourFile.h"
+#include "vorn/io/ContourFile.h"
 
 namespace Vorn::IO {
 

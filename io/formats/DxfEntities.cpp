@@ -3,8 +3,10 @@
 #include <cmath>
 #include <optional>
 
-#include "io/base/Numbers.h"
+#include "io/base/Words.h"
 #include "io/formats/Text.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO::Dxf {
 

@@ -4,10 +4,10 @@
 #include <numbers>
 #include <set>
 
-#include "io/base/Numbers.h"
 #include "io/formats/Dxf.h"
 #include "io/formats/DxfEntities.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -1,16 +1,17 @@
-#include "io/formats/Format.h"
-
 #include <array>
 #include <filesystem>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
+#include "io/base/Words.h"
 #include "io/formats/CsvPieces.h"
 #include "io/formats/Dxf.h"
 #include "io/formats/GCode.h"
 #include "io/formats/JsonPieces.h"
 #include "io/formats/Text.h"
 #include "io/formats/Wkt.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

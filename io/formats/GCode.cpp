@@ -3,12 +3,13 @@
 #include <algorithm>
 #include <cmath>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
 #include "io/formats/LengthUnits.h"
 #include "io/formats/NamedFields.h"
 #include "io/formats/ToolPath.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

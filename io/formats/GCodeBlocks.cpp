@@ -2,9 +2,11 @@
 
 #include <algorithm>
 
-#include "io/base/Numbers.h"
+#include "io/base/Words.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -6,12 +6,14 @@
 #include <optional>
 #include <vector>
 
-#include "io/base/Numbers.h"
+#include "io/base/Words.h"
 #include "io/formats/GCode.h"
 #include "io/formats/GCodeBlocks.h"
 #include "io/formats/LengthUnits.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -3,11 +3,13 @@
 #include <algorithm>
 #include <numbers>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
-#include "io/fit/FitJson.h"
+#include "io/base/Words.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

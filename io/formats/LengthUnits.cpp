@@ -1,6 +1,7 @@
 #include "io/formats/LengthUnits.h"
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -4,8 +4,9 @@
 #include <array>
 #include <ctime>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -6,9 +6,10 @@
 #include <cmath>
 #include <optional>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -2,9 +2,10 @@
 
 #include <cmath>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
 #include "io/formats/LengthUnits.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -1,9 +1,10 @@
 #include "io/formats/Wkt.h"
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

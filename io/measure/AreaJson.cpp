@@ -1,7 +1,7 @@
 #include <cmath>
 #include <nlohmann/json.hpp>
 
-#include "io/measure/ContourArea.h"
+#include "vorn/io/ContourArea.h"
 
 namespace Vorn::IO {
 

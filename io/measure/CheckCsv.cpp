@@ -1,5 +1,5 @@
-#include "io/base/Numbers.h"
-#include "io/measure/CheckReport.h"
+#include "vorn/io/CheckReport.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -2,7 +2,7 @@
 #include <cmath>
 #include <nlohmann/json.hpp>
 
-#include "io/measure/CheckReport.h"
+#include "vorn/io/CheckReport.h"
 
 namespace Vorn::IO {
 

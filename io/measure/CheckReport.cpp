@@ -1,10 +1,10 @@
-#include "io/measure/CheckReport.h"
+#include "vorn/io/CheckReport.h"
 
 #include <algorithm>
 #include <numeric>
 #include <utility>
 
-#include "io/measure/ContourArea.h"
+#include "vorn/io/ContourArea.h"
 
 namespace Vorn::IO {
 

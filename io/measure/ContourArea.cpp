@@ -5,12 +5,12 @@
 // circles (a rise of 0.00005 over a chord of 100 costs five digits), and it refuses contours that
 // cross themselves. Tests compare the two where the library's is good.
 
-#include "io/measure/ContourArea.h"
+#include "vorn/io/ContourArea.h"
 
 #include <algorithm>
 #include <cmath>
 
-#include "io/measure/Intersections.h"
+#include "vorn/io/Intersections.h"
 
 namespace Vorn::IO {
 

@@ -1,8 +1,8 @@
-#include "io/measure/Departure.h"
+#include "vorn/io/Departure.h"
 
 #include <algorithm>
 
-#include "io/measure/Remeasure.h"
+#include "vorn/io/Deviations.h"
 
 namespace Vorn::IO {
 

@@ -1,7 +1,7 @@
 #include <nlohmann/json.hpp>
 
-#include "io/base/Numbers.h"
-#include "io/measure/Intersections.h"
+#include "vorn/io/Intersections.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

@@ -1,13 +1,14 @@
-#include "io/measure/Intersections.h"
+#include "vorn/io/Intersections.h"
 
 #include <algorithm>
 #include <array>
 #include <cmath>
 #include <numbers>
 
-#include "io/base/Numbers.h"
 #include "io/measure/PieceMeetings.h"
 #include "io/pieces/BoxIndex.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

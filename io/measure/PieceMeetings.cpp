@@ -4,8 +4,8 @@
 #include <cmath>
 #include <numbers>
 
-#include "io/measure/Remeasure.h"
 #include "vorn/GeometryUtils.h"
+#include "vorn/io/Deviations.h"
 
 namespace Vorn::IO {
 

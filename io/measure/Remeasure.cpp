@@ -1,11 +1,10 @@
 // The second opinion on a fit. It shares no formula with the library: distances are taken to the
 // pieces as drawn, clipped at their ends, and not to the endless lines and full circles that a
 // fit works with.
-#include "io/measure/Remeasure.h"
-
 #include <cmath>
 
 #include "io/pieces/PieceIndex.h"
+#include "vorn/io/Deviations.h"
 
 namespace Vorn::IO {
 

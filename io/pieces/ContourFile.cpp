@@ -1,10 +1,10 @@
-#include "io/pieces/ContourFile.h"
+#include "vorn/io/ContourFile.h"
 
 #include <algorithm>
 #include <cmath>
 
-#include "io/base/Numbers.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

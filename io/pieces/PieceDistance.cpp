@@ -1,8 +1,8 @@
-#include "io/pieces/PieceDistance.h"
-
 #include <algorithm>
 #include <cmath>
 #include <numbers>
+
+#include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
 

@@ -6,7 +6,7 @@
 #include <numbers>
 #include <utility>
 
-#include "io/pieces/PieceDistance.h"
+#include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
 

@@ -3,7 +3,7 @@
 #include <cstddef>
 #include <vector>
 
-#include "io/pieces/Pieces.h"
+#include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
 

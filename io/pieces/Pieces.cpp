@@ -1,9 +1,9 @@
-#include "io/pieces/Pieces.h"
+#include "vorn/io/Pieces.h"
 
 #include <cmath>
 #include <numbers>
 
-#include "io/base/Failure.h"
+#include "vorn/io/Failure.h"
 
 namespace Vorn::IO {
 

@@ -5,7 +5,7 @@
 #include <limits>
 #include <numbers>
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

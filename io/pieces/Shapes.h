@@ -4,12 +4,10 @@
 #include <string>
 #include <vector>
 
-#include "io/pieces/Pieces.h"
+#include "vorn/io/Pieces.h"
 
 /// Making pieces from what files tell, and getting pieces ready for what files can hold.
 namespace Vorn::IO {
-
-using XY = GeometryUtils::Point;
 
 /// Above this, squares of coordinates leave the range of doubles and nothing can be measured.
 inline constexpr double kLargestCoordinate = 1e150;
@@ -21,16 +19,7 @@ inline constexpr double kWidestArc = 5.497787143782138;  // 315 degrees
 /// Whether the number can be a coordinate or a radius.
 bool IsUsable(double value);
 
-double Distance(XY const& a, XY const& b);
-
 bool AreEqual(XY const& a, XY const& b);
-
-Piece MakeLine(XY const& start, XY const& end);
-
-/// The arc with these data; angles, sweep and length follow. Ends in the same direction from the
-/// centre mean no sweep.
-Piece MakeArc(XY const& start, XY const& end, XY const& center, double radius,
-              bool counterClockwise);
 
 /// The arc from `start` to `end` whose bulge is the tangent of a quarter of its sweep, positive
 /// counter-clockwise. A line where that is nearer to the arc than its rounded circle would be.
@@ -38,12 +27,6 @@ Piece MakeBulge(XY const& start, XY const& end, double bulge);
 
 /// The tangent of a quarter of the sweep, positive counter-clockwise; 0 for lines.
 double BulgeOf(Piece const& piece);
-
-/// The whole circle as two halves, from `start` back to it.
-std::vector<Piece> MakeCircle(XY const& start, XY const& center, double radius,
-                              bool counterClockwise);
-
-Piece Reversed(Piece const& piece);
 
 /// The two halves of the arc.
 std::vector<Piece> Halves(Piece const& arc);
@@ -57,12 +40,5 @@ std::vector<std::vector<Piece>> ConnectedRuns(std::vector<Piece> const& pieces, 
 /// What is wrong with the arc, as far as a reader can tell: "the start is 0.3 off the circle".
 /// Files with three good digits pass.
 std::optional<std::string> FaultOf(Piece const& arc);
-
-/// The box around the pieces, what arcs bulge out included. Needs at least one piece.
-struct Extent {
-  XY low;
-  XY high;
-};
-Extent ExtentOf(std::vector<Piece> const& pieces);
 
 }  // namespace Vorn::IO

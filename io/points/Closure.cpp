@@ -1,10 +1,10 @@
-#include "io/points/Closure.h"
+#include "vorn/io/Closure.h"
 
 #include <algorithm>
 #include <cmath>
 #include <numbers>
 
-#include "io/points/Spacing.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 

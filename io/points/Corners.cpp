@@ -1,10 +1,10 @@
-#include "io/points/Corners.h"
+#include "vorn/io/Corners.h"
 
 #include <algorithm>
 #include <cmath>
 #include <numbers>
 
-#include "io/points/Spacing.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 

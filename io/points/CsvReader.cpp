@@ -1,16 +1,17 @@
-#include "io/points/CsvReader.h"
-
 #include <algorithm>
 #include <cmath>
 #include <istream>
 #include <iterator>
 #include <utility>
 
-#include "io/base/Failure.h"
 #include "io/base/Fields.h"
-#include "io/base/Numbers.h"
-#include "io/base/TextFile.h"
 #include "io/base/TextLines.h"
+#include "io/base/Words.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Points.h"
 
 namespace Vorn::IO {
 

@@ -1,7 +1,6 @@
-#include "io/points/DropClose.h"
-
 #include "io/base/TextLines.h"
-#include "io/points/Spacing.h"
+#include "vorn/io/Spacing.h"
+#include "vorn/io/Thinning.h"
 
 namespace Vorn::IO {
 

@@ -1,6 +1,6 @@
 #include <nlohmann/json.hpp>
 
-#include "io/points/InfoReport.h"
+#include "vorn/io/InfoReport.h"
 
 namespace Vorn::IO {
 

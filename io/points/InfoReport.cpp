@@ -1,4 +1,4 @@
-#include "io/points/InfoReport.h"
+#include "vorn/io/InfoReport.h"
 
 #include <algorithm>
 #include <utility>

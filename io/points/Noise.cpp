@@ -16,7 +16,7 @@
 #include <array>
 #include <cmath>
 
-#include "io/points/Spacing.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 

@@ -1,11 +1,11 @@
-#include "io/points/PathFacts.h"
+#include "vorn/io/PathFacts.h"
 
 #include <algorithm>
 #include <cmath>
 #include <numeric>
 #include <tuple>
 
-#include "io/points/Spacing.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 

@@ -1,10 +1,10 @@
-#include "io/points/PointsInfo.h"
+#include "vorn/io/PointsInfo.h"
 
 #include <algorithm>
 
-#include "io/base/Numbers.h"
 #include "io/points/Noise.h"
-#include "io/points/Spacing.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 

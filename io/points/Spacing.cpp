@@ -1,10 +1,11 @@
-#include "io/points/Spacing.h"
+#include "vorn/io/Spacing.h"
 
 #include <algorithm>
 #include <cmath>
 #include <limits>
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 

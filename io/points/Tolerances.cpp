@@ -1,10 +1,11 @@
-#include "io/points/Tolerances.h"
+#include "vorn/io/Tolerances.h"
 
 #include <algorithm>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
-#include "io/points/Spacing.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 

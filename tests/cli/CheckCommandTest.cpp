@@ -7,7 +7,7 @@
 #include <sstream>
 
 #include "cli/RunInProcess.h"
-#include "io/base/TextFile.h"
+#include "vorn/io/Files.h"
 
 namespace Vorn::Cli {
 namespace {

@@ -5,10 +5,9 @@
 
 #include "cli/RunInProcess.h"
 #include "io/FormatContours.h"
-#include "io/formats/ContourReader.h"
 #include "io/formats/CsvPieces.h"
-#include "io/formats/Format.h"
 #include "io/formats/JsonPieces.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::Cli {
 namespace {

@@ -3,8 +3,8 @@
 #include <nlohmann/json.hpp>
 
 #include "cli/RunInProcess.h"
-#include "io/points/Spacing.h"
 #include "support/SharedData.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::Cli {
 namespace {

@@ -7,7 +7,7 @@
 #include <sstream>
 
 #include "cli/RunInProcess.h"
-#include "io/drawing/Drawing.h"
+#include "vorn/io/Drawing.h"
 
 namespace Vorn::Cli {
 namespace {

@@ -12,10 +12,10 @@
 
 #include "cli/RunInProcess.h"
 #include "io/Picture.h"
-#include "io/base/TextFile.h"
 #include "io/drawing/Style.h"
-#include "io/formats/ContourReader.h"
 #include "support/SharedData.h"
+#include "vorn/io/Files.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::Cli {
 namespace {

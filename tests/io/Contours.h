@@ -3,7 +3,7 @@
 #include <cmath>
 #include <vector>
 
-#include "io/fit/FitReport.h"
+#include "io/fit/MakeReport.h"
 #include "vorn/GeometryUtils.h"
 
 /// Contours made by hand, for tests of what the program does with them.
@@ -47,7 +47,7 @@ inline PointFile FileWith(std::vector<WPoint> points) {
 }
 
 /// Points of LineAndArc, the second 0.01 off it and the fourth 0.015, with a tolerance of 0.02.
-inline Report LineAndArcReport() {
+inline FitReport LineAndArcReport() {
   double const w = 0.02;
   double const r = std::sqrt(0.5);
   FitAnswer fit;

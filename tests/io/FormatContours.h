@@ -9,12 +9,12 @@
 #include <string>
 #include <vector>
 
-#include "io/base/Failure.h"
 #include "io/formats/GCode.h"
-#include "io/measure/Remeasure.h"
-#include "io/pieces/ContourFile.h"
 #include "io/pieces/Shapes.h"
 #include "support/RandomGeometry.h"
+#include "vorn/io/ContourFile.h"
+#include "vorn/io/Deviations.h"
+#include "vorn/io/Failure.h"
 
 /// Contours and measurements for the tests of the file formats.
 namespace Vorn::IO::FormatContours {

@@ -9,9 +9,9 @@
 #include <functional>
 #include <thread>
 
-#include "cli/ExitCode.h"
+#include "cli/base/ExitCode.h"
 #include "cli/terminal/Interruption.h"
-#include "io/base/AtomicFile.h"
+#include "vorn/io/Files.h"
 
 namespace Vorn::Cli {
 namespace {

@@ -4,7 +4,7 @@
 
 #include "cli/texts/FitTable.h"
 #include "io/Contours.h"
-#include "io/fit/ContourFit.h"
+#include "vorn/io/FitContour.h"
 
 namespace Vorn::Cli {
 namespace {
@@ -33,7 +33,7 @@ TEST(Table, ShowsPiecesAndSummary) {
 }
 
 TEST(Table, SaysThatTheSingleArcReportsALength) {
-  Report report = Contours::LineAndArcReport();
+  FitReport report = Contours::LineAndArcReport();
   report.strategy = GeometryUtils::FittingStrategy::SingleArc;
   report.fit.deviation = 0.0625;
   EXPECT_NE(ToTable(report).find("reported    0.0625 as a length (this strategy reports no "
@@ -42,7 +42,7 @@ TEST(Table, SaysThatTheSingleArcReportsALength) {
 }
 
 /// A square of side 4 with a point at every unit, from the middle of one on.
-Report FitSquare(ClosedChoice closed) {
+FitReport FitSquare(ClosedChoice closed) {
   std::vector<WPoint> points;
   for (int i = 0; i < 16; ++i) {
     int const k = (i + 2) % 16;

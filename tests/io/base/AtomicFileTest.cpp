@@ -5,8 +5,8 @@
 #include <fstream>
 #include <sstream>
 
-#include "io/base/AtomicFile.h"
-#include "io/base/Failure.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Files.h"
 
 namespace Vorn::IO {
 namespace {

@@ -5,7 +5,8 @@
 #include <limits>
 #include <random>
 
-#include "io/base/Numbers.h"
+#include "vorn/io/Messages.h"
+#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 namespace {

@@ -14,6 +14,7 @@
 #include "io/drawing/Style.h"
 #include "io/drawing/SvgContour.h"
 #include "io/drawing/SvgElements.h"
+#include "vorn/io/Failure.h"
 
 namespace Vorn::IO::Svg {
 namespace {

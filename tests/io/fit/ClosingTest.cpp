@@ -5,8 +5,8 @@
 
 #include "io/fit/Closing.h"
 #include "io/fit/FullCircle.h"
-#include "io/measure/Remeasure.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Deviations.h"
 
 namespace Vorn::IO {
 namespace {

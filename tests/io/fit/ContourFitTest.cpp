@@ -6,9 +6,10 @@
 
 #include "io/Contours.h"
 #include "io/fit/Closing.h"
-#include "io/fit/ContourFit.h"
-#include "io/fit/FitJson.h"
 #include "support/SharedData.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/FitContour.h"
+#include "vorn/io/FitReport.h"
 
 namespace Vorn::IO {
 namespace {
@@ -37,7 +38,7 @@ FitChoice PerPoint(double cap) {
   return choice;
 }
 
-Report FitRectangle(FitChoice const& choice) {
+FitReport FitRectangle(FitChoice const& choice) {
   return FitContour(Contours::FileWith(Rectangle()), choice, nullptr);
 }
 
@@ -49,7 +50,7 @@ FitChoice FromCorner(double tolerance) {
 }
 
 TEST(FitContour, ClosedRectangleHasFourSidesThatMeetExactly) {
-  Report const report = FitRectangle(FromCorner(0.01));
+  FitReport const report = FitRectangle(FromCorner(0.01));
   EXPECT_TRUE(report.closure.isClosed);
   EXPECT_EQ(report.pieces.size(), 4u);
   EXPECT_EQ(report.LineCount(), 4u);
@@ -62,7 +63,7 @@ TEST(FitContour, SeamIsTheFirstOfTheSharpestCornersOrTheOneGiven) {
   EXPECT_EQ(FitRectangle(Same(0.01)).seam, 18u) << "(30, 0)";
   FitChoice choice = Same(0.01);
   choice.start = 0;
-  Report const report = FitRectangle(choice);
+  FitReport const report = FitRectangle(choice);
   EXPECT_EQ(report.seam, 0u);
   EXPECT_EQ(report.pieces.size(), 5u) << "one side is cut in two";
   EXPECT_EQ(report.Gap(), 0.0);
@@ -81,11 +82,11 @@ TEST(FitContour, SmoothContourIsCutOpenAtAJoint) {
     choice.start = start;
     return FitContour(Cam(), choice, nullptr);
   };
-  Report const found = fit({});
-  Report const fromFirst = fit(0);
+  FitReport const found = fit({});
+  FitReport const fromFirst = fit(0);
   EXPECT_NE(found.seam, 0u);
   EXPECT_LT(found.pieces.size(), fromFirst.pieces.size());
-  for (Report const* report : {&found, &fromFirst}) {
+  for (FitReport const* report : {&found, &fromFirst}) {
     EXPECT_EQ(report->verdict, Verdict::WithinTolerance);
     EXPECT_EQ(report->Gap(), 0.0);
   }
@@ -111,7 +112,7 @@ TEST(FitContour, ProgressOfTwoAttemptsIsOneBar) {
 }
 
 TEST(FitContour, RangesCountPointsAsTheFileDoes) {
-  Report const report = FitRectangle(FromCorner(0.01));
+  FitReport const report = FitRectangle(FromCorner(0.01));
   ASSERT_TRUE(report.ranges.has_value());
   std::vector<PointRange> const& ranges = *report.ranges;
   ASSERT_EQ(ranges.size(), 4u);
@@ -130,7 +131,7 @@ TEST(FitContour, RangesCountPointsAsTheFileDoes) {
 TEST(FitContour, DeviationsNameThePointOfTheFile) {
   std::vector<WPoint> points = Rectangle();
   points[5].y = 0.12;  // (17, 0), further than the tolerance off its side
-  Report const report = FitContour(Contours::FileWith(points), FromCorner(0.1), nullptr);
+  FitReport const report = FitContour(Contours::FileWith(points), FromCorner(0.1), nullptr);
   ASSERT_EQ(report.verdict, Verdict::WithinTolerance);
   EXPECT_NEAR(static_cast<double>(report.remeasured.worst), 5.0, 1.0);
   EXPECT_NEAR(static_cast<double>(report.fit.deviationIndex), 5.0, 1.0);
@@ -139,7 +140,7 @@ TEST(FitContour, DeviationsNameThePointOfTheFile) {
 TEST(FitContour, SaidToBeOpenIsFittedAsBefore) {
   FitChoice choice = Same(0.01);
   choice.closed = ClosedChoice::No;
-  Report const report = FitRectangle(choice);
+  FitReport const report = FitRectangle(choice);
   EXPECT_FALSE(report.closure.isClosed);
   EXPECT_EQ(report.pieces.size(), 5u);
   EXPECT_NEAR(report.Gap(), 1.0, 0.01);
@@ -167,7 +168,7 @@ TEST(FitContour, CloseClosingPairIsNamedAsTheFileCountsIt) {
 TEST(FitContour, TolerancePerPointFollowsTheSpacingAcrossTheSeam) {
   std::vector<WPoint> points = Rectangle();
   points.push_back({11.9, 0.0, 0.0});
-  Report const report = FitContour(Contours::FileWith(points), PerPoint(0.2), nullptr);
+  FitReport const report = FitContour(Contours::FileWith(points), PerPoint(0.2), nullptr);
   EXPECT_NEAR(report.file.points.front().w, 0.03, 1e-12);
   EXPECT_NEAR(report.file.points.back().w, 0.03, 1e-12);
   EXPECT_EQ(report.Gap(), 0.0);
@@ -200,13 +201,13 @@ TEST(FitContour, ClosedNeedsThreePoints) {
                                             std::vector<WPoint>{{0, 0, 0}, {1, 0, 0}, {0, 0, 0}}}) {
     EXPECT_THROW(FitContour(Contours::FileWith(points), choice, nullptr), Failure);
   }
-  Report const report =
+  FitReport const report =
       FitContour(Contours::FileWith({{0, 0, 0}, {4, 0, 0}, {0, 3, 0}}), choice, nullptr);
   EXPECT_EQ(report.Gap(), 0.0);
 }
 
 TEST(FitContour, ReportsTellOfTheSeamAndTheGap) {
-  Report const closed = FitRectangle(FromCorner(0.01));
+  FitReport const closed = FitRectangle(FromCorner(0.01));
   auto const json = nlohmann::json::parse(ToJson(closed));
   EXPECT_EQ(json.at("closed"), true);
   EXPECT_EQ(json.at("gap"), 0.0);
@@ -214,7 +215,7 @@ TEST(FitContour, ReportsTellOfTheSeamAndTheGap) {
 
   FitChoice choice = Same(0.01);
   choice.closed = ClosedChoice::No;
-  Report const open = FitRectangle(choice);
+  FitReport const open = FitRectangle(choice);
   auto const openJson = nlohmann::json::parse(ToJson(open));
   EXPECT_EQ(openJson.at("closed"), false);
   EXPECT_NEAR(openJson.at("gap").get<double>(), 1.0, 0.01);
@@ -233,7 +234,7 @@ TEST(FitContour, FullCircleIsTwoArcsWithEveryStrategy) {
         GeometryUtils::FittingStrategy::SingleArc}) {
     FitChoice choice = Same(0.01);
     choice.strategy = strategy;
-    Report const report = FitContour(Contours::FileWith(points), choice, nullptr);
+    FitReport const report = FitContour(Contours::FileWith(points), choice, nullptr);
     EXPECT_EQ(report.verdict, Verdict::WithinTolerance);
     EXPECT_EQ(report.ArcCount(), 2u);
     EXPECT_EQ(report.pieces.size(), 2u);
@@ -265,7 +266,7 @@ TEST(FitContour, MeasuredContoursStayWithinToleranceAndCloseExactly) {
         Measured{"circle_r3", Same(0.001), true}, Measured{"circle_r3", Same(0.0001), true}}) {
     SCOPED_TRACE(measured.name);
     std::vector<WPoint> const points = Testing::ReadPoints(*folder + "/" + measured.name + ".csv");
-    Report const report = FitContour(Contours::FileWith(points), measured.choice, nullptr);
+    FitReport const report = FitContour(Contours::FileWith(points), measured.choice, nullptr);
     EXPECT_EQ(report.verdict, Verdict::WithinTolerance);
     EXPECT_EQ(report.closure.isClosed, measured.isClosed);
     if (measured.isClosed) {
@@ -295,7 +296,7 @@ TEST(FitContour, KnownCircleIsFound) {
   auto const folder = Testing::SharedDataFolder();
   if (!folder) GTEST_SKIP() << "VORN_DATA_DIR is not set";
   std::vector<WPoint> const points = Testing::ReadPoints(*folder + "/circle_r3.csv");
-  Report const report = FitContour(Contours::FileWith(points), Same(0.001), nullptr);
+  FitReport const report = FitContour(Contours::FileWith(points), Same(0.001), nullptr);
   ASSERT_EQ(report.pieces.size(), 2u);
   for (Piece const& arc : report.pieces) {
     EXPECT_NEAR(arc.center.x, 0.0, 6e-5);

@@ -6,15 +6,14 @@
 #include <nlohmann/json.hpp>
 
 #include "io/Contours.h"
-#include "io/fit/FitJson.h"
-#include "io/fit/FitReport.h"
+#include "io/fit/MakeReport.h"
 
 namespace Vorn::IO {
 namespace {
 
 using Strategy = GeometryUtils::FittingStrategy;
 
-Report StraightReport(double offset, double reported, Strategy strategy, double lastX = 2.0) {
+FitReport StraightReport(double offset, double reported, Strategy strategy, double lastX = 2.0) {
   FitAnswer fit;
   fit.code = ErrorCode::Ok;
   fit.contour = {Contours::Segment(0, 0), Contours::Segment(lastX, 0)};
@@ -50,7 +49,7 @@ TEST(Verdict, ContourThatStopsEarlyIsNoFit) {
 }
 
 TEST(Json, HoldsEveryFieldWithItsExactBits) {
-  Report const report = Contours::LineAndArcReport();
+  FitReport const report = Contours::LineAndArcReport();
   auto const json = nlohmann::json::parse(ToJson(report));
   EXPECT_EQ(json.at("schemaVersion"), 1);
   EXPECT_EQ(json.at("input").at("file"), "part.csv");
@@ -89,7 +88,7 @@ TEST(Json, HoldsEveryFieldWithItsExactBits) {
 }
 
 TEST(Json, WritesNullForWhatIsNotKnown) {
-  Report report = Contours::LineAndArcReport();
+  FitReport report = Contours::LineAndArcReport();
   report.fit.deviation = std::numeric_limits<double>::quiet_NaN();
   report.fit.deviationIndex = -1;
   report.ranges.reset();
@@ -100,7 +99,7 @@ TEST(Json, WritesNullForWhatIsNotKnown) {
 }
 
 TEST(Json, FileNameThatIsNotUtf8StillGivesADocument) {
-  Report report = Contours::LineAndArcReport();
+  FitReport report = Contours::LineAndArcReport();
   report.file.path = "caf\xE9.csv";
   auto const json = nlohmann::json::parse(ToJson(report));
   EXPECT_EQ(json.at("input").at("file"), "caf\xEF\xBF\xBD.csv");

@@ -1,13 +1,12 @@
 #include <gtest/gtest.h>
 
 #include "io/FormatContours.h"
-#include "io/formats/ContourReader.h"
 #include "io/formats/CsvPieces.h"
 #include "io/formats/Dxf.h"
-#include "io/formats/Format.h"
 #include "io/formats/GCode.h"
 #include "io/formats/JsonPieces.h"
 #include "io/formats/Wkt.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 namespace {

@@ -6,14 +6,13 @@
 
 #include "io/FormatContours.h"
 #include "io/fit/Fit.h"
-#include "io/formats/ContourReader.h"
 #include "io/formats/CsvPieces.h"
 #include "io/formats/Dxf.h"
-#include "io/formats/Format.h"
 #include "io/formats/GCode.h"
 #include "io/formats/JsonPieces.h"
 #include "io/formats/Wkt.h"
 #include "support/SharedData.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 namespace {

@@ -2,8 +2,8 @@
 
 #include "io/Contours.h"
 #include "io/FormatContours.h"
-#include "io/fit/FitJson.h"
 #include "io/formats/JsonPieces.h"
+#include "vorn/io/FitReport.h"
 
 namespace Vorn::IO {
 namespace {
@@ -37,7 +37,7 @@ TEST(ToJson, HoldsTheLayoutOfAFitLessTheFit) {
 }
 
 TEST(ParseJsonPieces, ReadsTheDocumentOfAFit) {
-  Report const report = Contours::LineAndArcReport();
+  FitReport const report = Contours::LineAndArcReport();
   ContourFile const contour = ParseJsonPieces(ToJson(report), "p.json");
   ASSERT_EQ(contour.pieces.size(), report.pieces.size());
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {

@@ -4,8 +4,8 @@
 #include <numbers>
 
 #include "io/FormatContours.h"
-#include "io/measure/ContourArea.h"
 #include "support/RandomGeometry.h"
+#include "vorn/io/ContourArea.h"
 
 namespace Vorn::IO {
 namespace {

@@ -4,9 +4,9 @@
 #include <cmath>
 #include <numbers>
 
-#include "io/measure/Intersections.h"
-#include "io/measure/Remeasure.h"
 #include "support/RandomGeometry.h"
+#include "vorn/io/Deviations.h"
+#include "vorn/io/Intersections.h"
 
 namespace Vorn::IO {
 namespace {

@@ -5,9 +5,9 @@
 #include <random>
 
 #include "io/Contours.h"
-#include "io/base/Failure.h"
 #include "io/fit/Assignment.h"
-#include "io/measure/Remeasure.h"
+#include "vorn/io/Deviations.h"
+#include "vorn/io/Failure.h"
 
 namespace Vorn::IO {
 namespace {
@@ -124,7 +124,7 @@ TEST(Remeasure, TellsTheSidesOfArcs) {
 }
 
 TEST(AssignPoints, DealsPointsOutInOrder) {
-  Report const report = Contours::LineAndArcReport();
+  FitReport const report = Contours::LineAndArcReport();
   ASSERT_TRUE(report.ranges.has_value());
   ASSERT_EQ(report.ranges->size(), 2u);
   EXPECT_EQ((*report.ranges)[0].first, 0u);

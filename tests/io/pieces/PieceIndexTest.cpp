@@ -5,9 +5,9 @@
 #include <numbers>
 #include <random>
 
-#include "io/measure/Remeasure.h"
 #include "io/pieces/PieceIndex.h"
 #include "io/pieces/Shapes.h"
+#include "vorn/io/Deviations.h"
 
 namespace Vorn::IO {
 namespace {

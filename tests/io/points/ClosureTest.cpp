@@ -4,8 +4,8 @@
 #include <numbers>
 #include <random>
 
-#include "io/points/Closure.h"
 #include "support/SharedData.h"
+#include "vorn/io/Closure.h"
 
 namespace Vorn::IO {
 namespace {

@@ -5,7 +5,7 @@
 #include <numbers>
 #include <random>
 
-#include "io/points/Corners.h"
+#include "vorn/io/Corners.h"
 
 namespace Vorn::IO {
 namespace {

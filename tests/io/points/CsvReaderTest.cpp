@@ -6,9 +6,9 @@
 #include <random>
 #include <sstream>
 
-#include "io/base/Failure.h"
-#include "io/base/Numbers.h"
-#include "io/points/CsvReader.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Points.h"
 
 namespace Vorn::IO {
 namespace {

@@ -2,9 +2,9 @@
 
 #include <random>
 
-#include "io/points/DropClose.h"
-#include "io/points/Spacing.h"
 #include "vorn/GeometryUtils.h"
+#include "vorn/io/Spacing.h"
+#include "vorn/io/Thinning.h"
 
 namespace Vorn::IO {
 namespace {

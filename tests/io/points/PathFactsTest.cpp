@@ -2,7 +2,7 @@
 
 #include <cmath>
 
-#include "io/points/PathFacts.h"
+#include "vorn/io/PathFacts.h"
 
 namespace Vorn::IO {
 namespace {

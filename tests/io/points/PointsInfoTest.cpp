@@ -3,9 +3,9 @@
 #include <cmath>
 #include <random>
 
-#include "io/points/PointsInfo.h"
-#include "io/points/Spacing.h"
 #include "vorn/GeometryUtils.h"
+#include "vorn/io/PointsInfo.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 namespace {

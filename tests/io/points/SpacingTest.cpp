@@ -3,7 +3,7 @@
 #include <cmath>
 #include <random>
 
-#include "io/points/Spacing.h"
+#include "vorn/io/Spacing.h"
 
 namespace Vorn::IO {
 namespace {

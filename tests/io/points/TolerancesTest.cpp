@@ -1,8 +1,8 @@
 #include <gtest/gtest.h>
 
-#include "io/base/Failure.h"
-#include "io/points/Spacing.h"
-#include "io/points/Tolerances.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Spacing.h"
+#include "vorn/io/Tolerances.h"
 
 namespace Vorn::IO {
 namespace {

@@ -1,0 +1,42 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <vector>
+
+#include "vorn/io/Export.h"
+#include "vorn/io/Pieces.h"
+
+namespace Vorn::IO {
+
+/// A contour as files hold it.
+struct ContourFile {
+  std::string path;           ///< for messages; "-" is standard input
+  std::vector<Piece> pieces;  ///< in the order of travel; neighbours need not meet
+  bool isClosed = false;      ///< the last piece leads back to the start of the first
+  std::string units;          ///< "mm", "inch" and so on; empty when nobody says
+};
+
+/// Two pieces that follow each other in a contour but do not meet.
+struct Gap {
+  std::size_t before = 0;  ///< index of the earlier piece; the other one is the next
+  std::size_t after = 0;   ///< 0 for the seam of a closed contour
+  double size = 0.0;
+};
+
+/// The places where neighbours are further apart than rounding explains (see JointTolerance): in
+/// the order of the contour, that of the seam last.
+VORN_IO_EXPORT std::vector<Gap> FindGaps(ContourFile const& contour);
+
+/// How far apart two ends may lie that are meant to be one point: 1e-9 of the largest coordinate
+/// or radius. Contours of the fit meet to some last digits; files with nine digits still pass.
+VORN_IO_EXPORT double JointTolerance(std::vector<Piece> const& pieces);
+
+/// Whether the last piece leads back to the start of the first, up to JointTolerance: what a file
+/// without a flag of its own says about being closed.
+VORN_IO_EXPORT bool ReturnsToStart(std::vector<Piece> const& pieces);
+
+/// "pieces 3 and 4 do not meet: the gap is 0.01"; pieces counted from 1 as the tables do.
+VORN_IO_EXPORT std::string Describe(Gap const& gap);
+
+}  // namespace Vorn::IO

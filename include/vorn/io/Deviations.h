@@ -1,0 +1,37 @@
+#pragma once
+
+#include <cstddef>
+#include <vector>
+
+#include "vorn/Types.h"
+#include "vorn/io/Export.h"
+#include "vorn/io/Pieces.h"
+
+namespace Vorn::IO {
+
+/// Where one measured point lies against the contour.
+struct PointDeviation {
+  double distance = 0.0;  ///< to the nearest place of any piece, its ends included
+  double relative = 0.0;  ///< distance divided by the point's tolerance
+  bool isLeft = false;    ///< to the left of the contour's sense of travel
+  std::size_t piece = 0;  ///< the piece with that place; the first of several
+};
+
+/// A relative deviation counts as within tolerance up to here. A piece may touch the tolerance of
+/// a point exactly, and re-measuring it by other formulas then ends some bits above 1.
+inline constexpr double kLargestRelative = 1.0 + 1e-9;
+
+/// What is found when it measures every point, without a word from the fit.
+struct Remeasured {
+  std::vector<PointDeviation> points;
+  std::size_t worst = 0;  ///< index of the largest relative deviation; the first of several
+
+  PointDeviation const& Worst() const { return points[worst]; }
+};
+
+/// Measures every point against every piece, as far as the answer is concerned: see PieceIndex.
+/// Needs at least one of each.
+VORN_IO_EXPORT Remeasured Remeasure(std::vector<WPoint> const& points,
+                                    std::vector<Piece> const& pieces);
+
+}  // namespace Vorn::IO

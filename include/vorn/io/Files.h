@@ -1,0 +1,60 @@
+#pragma once
+
+#include <iosfwd>
+#include <mutex>
+#include <string>
+#include <string_view>
+
+#include "vorn/io/Export.h"
+
+namespace Vorn::IO {
+
+/// The path that stands for standard input.
+inline constexpr char const* kStandardInput = "-";
+
+/// How a file that is read is called in messages: its path, or "standard input".
+VORN_IO_EXPORT std::string InputName(std::string const& path);
+
+/// The whole contents of a file, read in one go; those of `in` for the path `-`.
+/// @throws Failure (FailureKind::File) naming the file when it cannot be read or is a directory.
+VORN_IO_EXPORT std::string ReadTextFile(std::string const& path, std::istream& in);
+
+/// A file that appears whole or not at all: written under another name in the same folder, forced
+/// to the disk, and only then given its real name. Until Commit() an existing file stays as it
+/// was; dropped before, it leaves nothing behind.
+///
+/// Stage all files of a run first and commit them together: what commonly fails (no folder, no
+/// permission, a full disk) fails while staging, with none of the files changed.
+class VORN_IO_EXPORT AtomicFile {
+ public:
+  /// @throws Failure (FailureKind::File) naming the file when it cannot be written.
+  AtomicFile(std::string const& path, std::string_view contents);
+  AtomicFile(AtomicFile const&) = delete;
+  AtomicFile& operator=(AtomicFile const&) = delete;
+  ~AtomicFile();
+
+  /// @throws Failure (FailureKind::File) naming the file.
+  void Commit();
+
+ private:
+  int MakeTemporary();
+  void RemoveTemporary();
+  void Write(int descriptor, std::string_view contents) const;
+
+  std::string path_;       ///< as the user wrote it, for messages
+  std::string target_;     ///< behind symbolic links
+  std::string temporary_;  ///< empty when there is none
+};
+
+/// Finds out before a long computation that a file could not be written afterwards.
+/// @throws Failure (FailureKind::File) naming the file.
+VORN_IO_EXPORT void RequireWritable(std::string const& path);
+
+/// While the lock is held no other thread makes, renames or removes a staged file. A thread may
+/// hold it more than once.
+VORN_IO_EXPORT std::unique_lock<std::recursive_mutex> LockStagedFiles();
+
+/// Removes the files of all that are staged; to be called just before the process ends.
+VORN_IO_EXPORT void RemoveTemporaries();
+
+}  // namespace Vorn::IO

@@ -1,0 +1,64 @@
+#pragma once
+
+#include <iosfwd>
+#include <optional>
+#include <string>
+#include <string_view>
+
+#include "vorn/io/ContourFile.h"
+#include "vorn/io/Export.h"
+#include "vorn/io/GCodeOptions.h"
+
+namespace Vorn::IO {
+
+/// What a file is written as. The first five hold a contour and are read again.
+enum class Format { Json, Csv, Dxf, GCode, Wkt, Svg, Html, Png };
+
+/// By the ending of the name, in any case; nothing when it is none of ours.
+VORN_IO_EXPORT std::optional<Format> FormatOf(std::string const& path);
+
+/// By the name used for options: json, csv, dxf, gcode (or nc), wkt, svg, html, png.
+VORN_IO_EXPORT std::optional<Format> FormatNamed(std::string_view name);
+
+/// As FormatNamed takes it.
+VORN_IO_EXPORT std::string NameOf(Format format);
+
+/// By the first words of a text that holds a contour.
+VORN_IO_EXPORT std::optional<Format> FormatOfContent(std::string_view text);
+
+/// Whether a contour can be read from and written to the format: all but the drawings.
+VORN_IO_EXPORT bool HoldsContour(Format format);
+
+/// The version of the JSON documents that hold a contour; it grows when a field changes its meaning
+/// or goes away.
+inline constexpr int kJsonSchemaVersion = 1;
+
+/// What the user can choose about the files.
+struct WriteOptions {
+  bool dxfEntities = false;  ///< LINE and ARC in place of one POLYLINE
+  GCodeOptions gcode;
+};
+
+/// The contour as the text of a file.
+/// @throws Failure (FailureKind::Internal) for a drawing, or (FailureKind::BadArgument) when the
+/// format cannot
+///         say what the contour needs.
+VORN_IO_EXPORT std::string ToText(ContourFile const& contour, Format format,
+                                  WriteOptions const& options);
+
+/// Reads a contour from JSON, CSV, DXF, G-code or WKT; "-" is `in`. Without `format` the
+/// ending of the name tells, and for other names the content.
+///
+/// Gaps stay as they are: nothing is joined that the file does not join.
+///
+/// @throws Failure (FailureKind::File) naming file, line and offending text, or
+/// (FailureKind::BadArgument)
+///         when the format is told and cannot be read as a contour.
+VORN_IO_EXPORT ContourFile ReadContour(std::string const& path, std::istream& in,
+                                       std::optional<Format> format = {});
+
+/// The same for text already in memory; `path` serves the messages.
+VORN_IO_EXPORT ContourFile ParseContour(std::string_view text, std::string const& path,
+                                        std::optional<Format> format = {});
+
+}  // namespace Vorn::IO

@@ -1,0 +1,82 @@
+#pragma once
+
+#include <cstddef>
+#include <iosfwd>
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "vorn/Types.h"
+#include "vorn/io/Export.h"
+
+namespace Vorn::IO {
+
+/// How messages call the standard input.
+inline constexpr char const* kStandardInputName = "standard input";
+
+/// Where the reader takes each point's tolerance from.
+struct ToleranceColumn {
+  enum class Use {
+    Ignore,     ///< every `w` stays 0
+    IfPresent,  ///< column `w`, or the third one of a file without a header
+    Required,   ///< the column called `name`, or with that number; without one the file is refused
+  };
+  Use use = Use::Ignore;
+  std::string name = "w";
+};
+
+/// Which columns hold the points, each as a name from the header or a number counted from 1. Empty
+/// ones are for the reader to find.
+struct ColumnChoice {
+  std::string x;
+  std::string y;
+  std::string w;
+
+  bool IsGiven() const { return !x.empty(); }
+};
+
+/// Reads `x,y` or `x,y,w`. Nothing when there are not two or three names, all different.
+VORN_IO_EXPORT std::optional<ColumnChoice> ParseColumnChoice(std::string_view text);
+
+/// The contents of one file of measured points.
+struct VORN_IO_EXPORT PointFile {
+  std::string path;                   ///< as it stands in messages
+  std::vector<WPoint> points;         ///< `w` is 0 unless hasTolerances
+  std::vector<std::size_t> lines;     ///< line of each point, counted from 1
+  bool hasTolerances = false;         ///< a column gave every point's `w`
+  std::string toleranceColumn = "w";  ///< which one that was, as it was asked for
+  std::optional<double> tolerance;    ///< of a comment `# tolerance T`
+  std::string units;                  ///< of a comment `# units mm`; may be empty
+
+  /// "point 4 (line 6)", points counted from 0 as the library does.
+  std::string NameOf(std::size_t index) const;
+};
+
+/// Reads points written as `x,y` or `x,y,w`, one a line.
+///
+/// Fields are separated by a semicolon, a tab, a comma or blanks, by what the first line with
+/// data holds; see FindSeparator. Fields may stand in double quotes. Numbers have a decimal point
+/// or, where the separator is no comma, a decimal comma: one of the two throughout a file.
+///
+/// A first line without any number is a header; columns called x and y are found by it, else the
+/// first two columns are taken. Without a header there must be two or three columns, unless the
+/// choice names columns by their numbers. Empty lines and comments are skipped: what follows a `#`,
+/// and what follows a `//` at the beginning of a line or behind a blank. Line ends may be of any
+/// system; a UTF-8 byte order mark is allowed.
+///
+/// @throws Failure (FailureKind::File) naming file, line, column and offending text when a number
+/// is
+///         not one or not finite, a tolerance is not positive, the columns do not fit, the file is
+///         not text, or fewer than two points are there.
+/// @throws Failure (FailureKind::BadArgument) when both arguments name a column for the tolerance.
+VORN_IO_EXPORT PointFile ReadPoints(std::string const& path, std::istream& in,
+                                    ToleranceColumn const& tolerance,
+                                    ColumnChoice const& columns = {});
+
+/// The same for text already in memory; `path` serves the messages.
+VORN_IO_EXPORT PointFile ParsePoints(std::string_view text, std::string const& path,
+                                     ToleranceColumn const& tolerance,
+                                     ColumnChoice const& columns = {});
+
+}  // namespace Vorn::IO

@@ -1,0 +1,49 @@
+#pragma once
+
+#include <cstddef>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "vorn/io/Closure.h"
+#include "vorn/io/Corners.h"
+#include "vorn/io/Export.h"
+#include "vorn/io/PathFacts.h"
+#include "vorn/io/Spacing.h"
+
+namespace Vorn::IO {
+
+/// Every pair of neighbours that is too close for its tolerances, in the order of the points. Of a
+/// closed contour that does not repeat its first point, the last and the first are neighbours.
+VORN_IO_EXPORT std::vector<ClosePair> FindClosePairs(std::vector<WPoint> const& points,
+                                                     Closure const& closure);
+
+/// A tolerance that suits the points, and why.
+struct Suggestion {
+  enum class Way { Same, PerPoint, None };
+  Way way = Way::None;
+  double tolerance = 0.0;  ///< for all points, or the cap for each
+  std::string reason;
+};
+
+/// All that can be said about measured points without a fit.
+struct PointsInfo {
+  PointsBox box;
+  SpacingFacts spacing;
+  std::vector<Duplicate> duplicates;
+  Closure closure;
+  std::optional<double> largestTolerance;  ///< see LargestSingleTolerance
+  std::vector<Corner> corners;
+  std::optional<double> noise;  ///< see EstimateNoise
+  Suggestion suggestion;
+};
+
+/// Looks at the points alone, not at their tolerances.
+VORN_IO_EXPORT PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed);
+
+/// Five times the noise, or what the shape asks for where that is more: a ten-thousandth of the
+/// size, of a flat profile at most a hundredth of its height. For all points where the spacing
+/// rule allows it or not much less, else by the spacing of each.
+VORN_IO_EXPORT Suggestion SuggestTolerance(PointsInfo const& info);
+
+}  // namespace Vorn::IO

@@ -1,0 +1,22 @@
+#pragma once
+
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "vorn/io/FitReport.h"
+
+namespace Vorn::IO {
+
+/// Measures the contour of a fit that answered Ok with at least one piece, and judges it.
+FitReport MakeReport(PointFile file, std::string toleranceSource,
+                     GeometryUtils::FittingStrategy strategy, FitAnswer fit);
+
+/// The same for a closed contour: closes the pieces exactly if it can. Without pieces in `fit` the
+/// contour is the full circle `circle`.
+FitReport MakeClosedReport(PointFile file, std::string toleranceSource,
+                           GeometryUtils::FittingStrategy strategy, FitAnswer fit,
+                           Closure const& closure, Circuit const& circuit,
+                           std::optional<std::vector<Piece>> circle);
+
+}  // namespace Vorn::IO
