@@ -1,9 +1,12 @@
-# Debian packages, one per component: the shared library, the development files, the program.
+# Debian packages, one per component: the two shared libraries, the development files of each, the
+# program.
 if(NOT BUILD_SHARED_LIBS)
   message(FATAL_ERROR "The Debian packages hold the shared library: set BUILD_SHARED_LIBS to ON")
 endif()
 set(library_package libgeometryutils${PROJECT_VERSION_MAJOR})
 set(development_package libgeometryutils-dev)
+set(io_library_package libgeometryutils-io${PROJECT_VERSION_MAJOR})
+set(io_development_package libgeometryutils-io-dev)
 set(tools_package geometryutils-tools)
 set(debian_dir ${PROJECT_SOURCE_DIR}/cmake/debian)
 set(debian_revision 1)
@@ -32,11 +35,8 @@ compress(${debian_dir}/changelog ${compressed}/changelog.Debian.gz)
 compress(${PROJECT_SOURCE_DIR}/CHANGELOG.md ${compressed}/changelog.gz)
 compress(${PROJECT_SOURCE_DIR}/docs/man/contour.1 ${compressed}/contour.1.gz)
 
-foreach(component IN ITEMS library development tools)
-  set(install_component ${component})
-  if(component STREQUAL "library")
-    set(install_component runtime)
-  endif()
+foreach(component IN ITEMS library development io_library io_development tools)
+  string(REPLACE library runtime install_component ${component})
   install(
     FILES ${debian_dir}/copyright ${compressed}/changelog.Debian.gz ${compressed}/changelog.gz
     DESTINATION ${CMAKE_INSTALL_DATAROOTDIR}/doc/${${component}_package}
@@ -49,7 +49,7 @@ install(
 
 set(CPACK_GENERATOR DEB)
 set(CPACK_DEB_COMPONENT_INSTALL ON)
-set(CPACK_COMPONENTS_ALL runtime development tools)
+set(CPACK_COMPONENTS_ALL runtime development io_runtime io_development tools)
 set(CPACK_PACKAGING_INSTALL_PREFIX /usr)
 set(CPACK_STRIP_FILES ON)
 set(CPACK_INSTALL_DEFAULT_DIRECTORY_PERMISSIONS
@@ -64,7 +64,7 @@ set(CPACK_DEBIAN_PACKAGE_RELEASE ${debian_revision})
 set(CPACK_DEBIAN_PACKAGE_PRIORITY optional)
 set(CPACK_DEBIAN_PACKAGE_CONTROL_STRICT_PERMISSION ON)
 set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS ON)
-set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${PROJECT_BINARY_DIR})
+set(CPACK_DEBIAN_PACKAGE_SHLIBDEPS_PRIVATE_DIRS ${PROJECT_BINARY_DIR} ${PROJECT_BINARY_DIR}/io)
 
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_NAME ${library_package})
 set(CPACK_DEBIAN_RUNTIME_PACKAGE_SECTION libs)
@@ -94,9 +94,37 @@ self-intersections and intersections of lines, circles and arcs.
 This package holds the headers, the CMake package and the pkg-config
 file.")
 
+set(CPACK_DEBIAN_IO_RUNTIME_PACKAGE_NAME ${io_library_package})
+set(CPACK_DEBIAN_IO_RUNTIME_PACKAGE_SECTION libs)
+set(CPACK_DEBIAN_IO_RUNTIME_PACKAGE_CONTROL_EXTRA ${debian_dir}/triggers)
+set(CPACK_DEBIAN_IO_RUNTIME_PACKAGE_DEPENDS "${library_package} (>= ${debian_version})")
+set(CPACK_COMPONENT_IO_RUNTIME_DESCRIPTION
+    "files, measures and drawings of contours, shared library
+Reads measured points, fits contours of straight segments and circular
+arcs to them, reads and writes contours as JSON, CSV, DXF, G-code and
+WKT, measures deviations, areas and intersections, and draws SVG, PNG
+and HTML.
+.
+This package holds the shared library.")
+
+set(CPACK_DEBIAN_IO_DEVELOPMENT_PACKAGE_NAME ${io_development_package})
+set(CPACK_DEBIAN_IO_DEVELOPMENT_PACKAGE_SECTION libdevel)
+set(CPACK_DEBIAN_IO_DEVELOPMENT_PACKAGE_SHLIBDEPS OFF)
+set(CPACK_DEBIAN_IO_DEVELOPMENT_PACKAGE_DEPENDS
+    "${io_library_package} (= ${debian_version}), ${development_package} (= ${debian_version})")
+set(CPACK_COMPONENT_IO_DEVELOPMENT_DESCRIPTION
+    "files, measures and drawings of contours, development files
+Reads measured points, fits contours of straight segments and circular
+arcs to them, reads and writes contours as JSON, CSV, DXF, G-code and
+WKT, measures deviations, areas and intersections, and draws SVG, PNG
+and HTML.
+.
+This package holds the headers, the part of the CMake package and the
+pkg-config file.")
+
 set(CPACK_DEBIAN_TOOLS_PACKAGE_NAME ${tools_package})
 set(CPACK_DEBIAN_TOOLS_PACKAGE_SECTION science)
-set(CPACK_DEBIAN_TOOLS_PACKAGE_DEPENDS "${library_package} (>= ${debian_version})")
+set(CPACK_DEBIAN_TOOLS_PACKAGE_DEPENDS "${io_library_package} (>= ${debian_version})")
 set(CPACK_DEBIAN_TOOLS_PACKAGE_RECOMMENDS fonts-dejavu-core)
 set(CPACK_COMPONENT_TOOLS_DESCRIPTION
     "fit lines and arcs to measured contour points

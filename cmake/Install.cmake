@@ -15,7 +15,8 @@ install(
   DESTINATION ${CMAKE_INSTALL_INCLUDEDIR}
   COMPONENT development
   FILES_MATCHING
-  PATTERN "*.h")
+  PATTERN "*.h"
+  PATTERN "vorn/io" EXCLUDE)
 
 set(package_dir ${CMAKE_INSTALL_LIBDIR}/cmake/GeometryUtils)
 install(
@@ -52,6 +53,10 @@ install(
   FILES ${PROJECT_BINARY_DIR}/GeometryUtils.pc
   DESTINATION ${pkgconfig_dir}
   COMPONENT development)
+
+if(TARGET GeometryUtilsIO)
+  include(InstallIO)
+endif()
 
 if(VORN_DEBIAN_PACKAGES)
   include(DebianPackages)

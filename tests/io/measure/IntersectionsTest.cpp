@@ -4,6 +4,7 @@
 #include <cmath>
 #include <numbers>
 
+#include "io/pieces/Shapes.h"
 #include "support/RandomGeometry.h"
 #include "vorn/io/Deviations.h"
 #include "vorn/io/Intersections.h"
