@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "io/formats/GCode.h"
 #include "vorn/io/Deviations.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Formats.h"
