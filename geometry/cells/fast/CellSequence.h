@@ -72,13 +72,6 @@ class CellSequence {
   /// As CentreOf.
   std::optional<Point> Centre() const;
 
-  /// Centre for callers that hold its point already.
-  bool Center(Point* centre) const {
-    std::optional<Point> const found = Centre();
-    if (found) *centre = *found;
-    return found.has_value();
-  }
-
   /// The centre without its exact rounding, which takes no sum over the copies. Nothing for a cell
   /// without a proper triangle, or with one of extreme size.
   std::optional<RoughCentre> FindRoughCentre() const;

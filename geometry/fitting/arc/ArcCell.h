@@ -48,12 +48,18 @@ class ArcCellBuilder {
   /// Takes up every point of the run, or, when the samples of a shorter run over the same start are
   /// at hand, these with the new ends.
   void CollectSamples();
+  /// The sample of the point at a position within the run.
   GeometryUtils::IndexedPoint SampleOf(std::int32_t position) const;
+  /// Overlaps the cells of all triples afresh, led or not by the triple that spans the run. When it
+  /// is guarded and the cell grows too large, the samples are thinned and the pass ends.
   ErrorCode RunPass(bool isLed, bool isGuarded, bool* hasThinned);
+  /// Thins the samples and empties the cell, whose triples of so many steps have been taken.
   ErrorCode Thin(int steps);
   /// Whether the cell, overlapped with that of one triple, surely is neither empty nor oversized.
   bool StaysUsable(Cells::CircleCell const& tripleCell, bool isGuarded) const;
+  /// The circle cell of one triple.
   ErrorCode CellOf(Triple const& triple, Cells::CircleCell* cell) const;
+  /// The tolerance of the sample at a position.
   double ToleranceAt(int position) const;
 
   ArcRun const& arcRun_;

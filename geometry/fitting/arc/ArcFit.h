@@ -24,6 +24,7 @@ std::optional<Point> AdjustedCentre(Point const& p1, Point const& p2, Point cons
 /// Fits arcs to runs. Kept over many fits, it keeps its room for the distances.
 class ArcFit {
  public:
+  /// What is asked for after failures goes for all fits.
   explicit ArcFit(AfterFailure afterFailure) : afterFailure_(afterFailure) {}
 
   /// Fits an arc to a run. `cell` is left alone when the run has no sense; otherwise it holds the

@@ -8,6 +8,7 @@
 #include "geometry/fitting/arc/SampleThinning.h"
 #include "geometry/fitting/runs/LineOrder.h"
 #include "geometry/fitting/runs/Progress.h"
+#include "math/Assert.h"
 
 namespace Vorn::Fitting {
 
@@ -111,6 +112,7 @@ class ArcSearch {
       arc_ = saved_->arc;
       cell_.centres = std::move(saved_->cell.centres);
     }
+    VORN_ASSERT(code != ErrorCode::Ok || arc_);
     if (code == ErrorCode::Ok) ReportProgress(task_.progress, task_.run.first + arc_->count);
     return {code, arc_, std::move(cell_.centres)};
   }

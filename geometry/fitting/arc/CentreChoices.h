@@ -47,15 +47,20 @@ inline double AngleBetween(double direction, double other) {
 /// A centre that is known up to an error, and by how much what is measured from it may change.
 class UncertainCentre {
  public:
+  /// For a centre that is off by no more than its error.
   explicit UncertainCentre(Cells::RoughCentre const& centre)
       : at_(centre.at), error_(centre.error) {}
 
+  /// Where it is thought to be.
   Point const& At() const { return at_; }
 
   /// Whether the centre is the true one: then every choice is the true one.
   bool IsExact() const { return error_ == 0.0; }
 
+  /// The squared distance of a point from where it is thought to be.
   double SquaredDistanceTo(Point const& p) const { return Elementary::SquaredDistance(p, at_); }
+
+  /// The polar angle of a point as seen from there.
   double DirectionTo(Point const& p) const { return Elementary::AngleAbout(at_, p); }
 
   /// By how much two squared distances up to the largest one may change against each other with a

@@ -9,6 +9,7 @@
 
 #include "geometry/elementary/Points.h"
 #include "geometry/fitting/runs/Runs.h"
+#include "math/Assert.h"
 
 namespace Vorn::Fitting {
 
@@ -167,6 +168,7 @@ bool IsFinite(WPoint const& p) { return std::isfinite(p.x) && std::isfinite(p.y)
 }  // namespace
 
 PointSpread FindSpread(std::vector<WPoint> const& points) {
+  VORN_ASSERT(points.size() >= 2);
   bool const areFinite = std::all_of(points.begin(), points.end(), IsFinite);
   return areFinite ? SpreadSearch(points).Find() : FindSpreadOfAnything(points);
 }

@@ -6,6 +6,7 @@
 #include <cstdint>
 #include <optional>
 
+#include "math/Assert.h"
 #include "vorn/Types.h"
 
 namespace Vorn::Fitting {
@@ -26,6 +27,7 @@ struct RadiusRange {
     return {distance - tolerance, distance + tolerance};
   }
 
+  /// Whether there is no radius in it. False when a limit is not a number.
   bool IsEmpty() const { return least > greatest; }
 
   /// Keeps what is in another range as well. A limit of the other that is not a number changes
@@ -35,6 +37,7 @@ struct RadiusRange {
     greatest = std::min(greatest, other.greatest);
   }
 
+  /// The radius half way between the limits.
   double Middle() const { return (least + greatest) * 0.5; }
 };
 
@@ -42,6 +45,7 @@ struct RadiusRange {
 /// when that is empty. O(count).
 template <typename RangeAt>
 std::optional<RadiusRange> CommonRange(std::int32_t count, RangeAt const& rangeAt) {
+  VORN_ASSERT(count >= 1);
   RadiusRange common = rangeAt(0);
   for (std::int32_t i = 1; i < count && !common.IsEmpty(); ++i) common.NarrowBy(rangeAt(i));
   if (common.IsEmpty()) return std::nullopt;

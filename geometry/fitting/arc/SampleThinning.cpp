@@ -10,6 +10,7 @@
 #include "geometry/fitting/arc/ArcOrder.h"
 #include "geometry/fitting/arc/CentreChoices.h"
 #include "geometry/intersections/Circles.h"
+#include "math/Assert.h"
 
 namespace Vorn::Fitting {
 
@@ -46,6 +47,7 @@ class SampleThinning {
   /// The samples whose distance from the centre is smallest and largest. When they are one and the
   /// same, two that cut the list in thirds.
   void FindNearestAndFarthest() {
+    VORN_ASSERT(HasEnoughSamples());
     auto const firstEntry = std::next(entered_.begin());
     auto const lastEntry = std::prev(entered_.end());
     Choice<SampleMap::const_iterator> nearest;

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "geometry/fitting/runs/Runs.h"
+#include "math/Assert.h"
 
 namespace Vorn::Fitting {
 
@@ -54,6 +55,7 @@ struct TriplePoints {
   bool usesEnd;
 
  private:
+  /// The point of the sample at a position.
   static Point const& At(Samples const& samples, int position) {
     return samples[static_cast<std::size_t>(position)].pt;
   }
@@ -73,6 +75,7 @@ class UsedSamples {
 
   /// Marks the triple's samples, which must exist. False when all three had been marked before.
   bool Mark(Triple const& triple) {
+    VORN_ASSERT(Holds(triple));
     bool const isNew0 = MarkOne(triple.i0);
     bool const isNew1 = MarkOne(triple.i1);
     bool const isNew2 = MarkOne(triple.i2);
@@ -80,10 +83,12 @@ class UsedSamples {
   }
 
  private:
+  /// Whether there is such a position.
   bool Exists(int position) const {
     return position >= 0 && static_cast<std::size_t>(position) < used_.size();
   }
 
+  /// Marks one sample. False when it had been marked before.
   bool MarkOne(int position) {
     auto const at = static_cast<std::size_t>(position);
     bool const isNew = !used_[at];

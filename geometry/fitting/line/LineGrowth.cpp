@@ -8,6 +8,7 @@
 #include "geometry/fitting/runs/CellBudget.h"
 #include "geometry/fitting/runs/LineOrder.h"
 #include "geometry/fitting/runs/Progress.h"
+#include "math/Assert.h"
 
 namespace Vorn::Fitting {
 
@@ -32,7 +33,6 @@ LineGrowth::End LineGrowth::Grow(std::int32_t limit) {
   return End::AtLimit;
 }
 
-/// Brings the next point into the cell; AtLimit when it fits.
 LineGrowth::End LineGrowth::TakeNext() {
   Run const& run = task_.run;
   WPoint const& previous = run[taken_ - 1];
@@ -54,7 +54,6 @@ LineGrowth::End LineGrowth::TakeNext() {
   return End::Early;
 }
 
-/// The cell after one point more.
 void LineGrowth::BeginStretch(CellSequence&& cell) {
   std::size_t const depth = cell.Depth();
   stretches_.push_back({taken_ + 1, depth, std::move(cell)});
@@ -62,6 +61,7 @@ void LineGrowth::BeginStretch(CellSequence&& cell) {
 }
 
 void LineGrowth::GrowAgain(std::int32_t limit) {
+  VORN_ASSERT(limit <= taken_);
   while (HasCell() && stretches_.back().begin > limit) stretches_.pop_back();
   if (!HasCell()) {
     Grow(limit);
@@ -75,8 +75,6 @@ void LineGrowth::GrowAgain(std::int32_t limit) {
   }
 }
 
-/// Replaces an oversized cell by that of a short chain that ends with the next point. AtLimit when
-/// the cell was rebuilt.
 LineGrowth::End LineGrowth::RebuildCell(WPoint const& next) {
   std::optional<std::vector<std::int32_t>> const chain = FindChain(next);
   if (!chain) return End::Failed;
@@ -99,8 +97,6 @@ LineGrowth::End LineGrowth::RebuildCell(WPoint const& next) {
   return End::AtLimit;
 }
 
-/// The indices of a chain behind the first point: the points that deviate most from the chord to
-/// the next point, those that deviated most in earlier attempts, and the next point itself.
 std::optional<std::vector<std::int32_t>> LineGrowth::FindChain(WPoint const& next) const {
   Run const& run = task_.run;
   std::optional<DeviationExtremes> const extremes = FindDeviationExtremes(
@@ -118,7 +114,6 @@ std::optional<std::vector<std::int32_t>> LineGrowth::FindChain(WPoint const& nex
   return chain;
 }
 
-/// The line cell of two points, in the run's form.
 bool LineGrowth::FindPairCell(WPoint const& from, WPoint const& to) {
   return Cells::FindLineCell(from, to, &form_, &pairCell_) == ErrorCode::Ok;
 }

@@ -32,9 +32,9 @@ class LineGrowth {
   /// Takes points from the first one on until so many are taken or the next one does not fit.
   End Grow(std::int32_t limit);
 
-  /// Makes the run what growing anew up to a limit below the points taken would make it. That would
-  /// take the same points into the same cells, so the run only goes back to what it was. What it
-  /// would report as progress is reported.
+  /// Makes the run what growing anew up to a limit would make it, which must not be above the
+  /// points taken: the fast form of Grow. Growing anew would take the same points into the same
+  /// cells, so the run only goes back to what it was. What it would report as progress is reported.
   void GrowAgain(std::int32_t limit);
 
   /// The points taken, 1 at least once it has grown.
@@ -57,19 +57,34 @@ class LineGrowth {
     std::size_t firstDepth;
     CellSequence cell;
 
+    /// Goes back to so many points taken, `begin` at least.
     void ReturnTo(std::int32_t taken) {
       cell.ReturnTo(firstDepth + static_cast<std::size_t>(taken - begin));
     }
   };
 
+  /// The cell of the points taken; there must be one.
   CellSequence& Cell() { return stretches_.back().cell; }
+
+  /// Whether two points at least have been taken, so that there is a cell.
   bool HasCell() const { return !stretches_.empty(); }
 
+  /// Brings the next point into the cell. AtLimit when it fits.
   End TakeNext();
-  End NarrowByPair(WPoint const& next);
+
+  /// Makes this the cell after one point more.
   void BeginStretch(CellSequence&& cell);
+
+  /// Replaces an oversized cell by that of a short chain that ends with the next point. AtLimit
+  /// when the cell was rebuilt.
   End RebuildCell(WPoint const& next);
+
+  /// The indices of a chain behind the first point: the points that deviate most from the chord to
+  /// the next point, those that deviated most in earlier attempts, and the next point itself.
+  /// Nothing when the deviations cannot be computed.
   std::optional<std::vector<std::int32_t>> FindChain(WPoint const& next) const;
+
+  /// The line cell of two points, in the run's form. False when there is none.
   bool FindPairCell(WPoint const& from, WPoint const& to);
 
   LineTask const& task_;
