@@ -11,12 +11,9 @@
 #include "geometry/cells/Bounds.h"
 #include "geometry/cells/fast/CellLevel.h"
 #include "geometry/cells/fast/SequenceCentre.h"
-#include "geometry/triangles/Overlap.h"
 #include "geometry/triangles/Triangle.h"
 
 namespace Vorn::Cells {
-
-using Triangles::kMostParts;
 
 /// A cell that is narrowed again and again, held without its copies.
 ///

@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "geometry/fitting/runs/CellBudget.h"
+#include "geometry/triangles/Overlap.h"
 
 namespace Vorn::Fitting {
 
@@ -123,7 +124,7 @@ ErrorCode ArcCellBuilder::RunPass(bool isLed, bool isGuarded, bool* hasThinned) 
 }
 
 bool ArcCellBuilder::StaysUsable(Cells::CircleCell const& tripleCell, bool isGuarded) const {
-  std::size_t const mostTriangles = centres_.size() * tripleCell.size() * Cells::kMostParts;
+  std::size_t const mostTriangles = centres_.size() * tripleCell.size() * Triangles::kMostParts;
   bool const staysSmall = !isGuarded || !IsOversizedArcCell(mostTriangles);
   return staysSmall && centres_.Overlaps(tripleCell);
 }

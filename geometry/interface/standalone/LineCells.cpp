@@ -52,6 +52,17 @@ std::optional<TangentPoints> TangentPointsOfEqualCircles(Point const& p1, Point 
   return TangentPoints{first, second, mirrored(first), mirrored(second)};
 }
 
+/// The corners of a line cell in the form that the caller's flags hold; Failed, flags unchanged,
+/// without tangent points.
+ErrorCode FindCorners(std::optional<TangentPoints> const& tangentPoints, bool* formFixed,
+                      bool* xOfY, Cells::LineCellCorners* corners) {
+  if (!tangentPoints) return ErrorCode::Failed;
+  Cells::LineForm form = Cells::ReadForm(formFixed, xOfY);
+  ErrorCode const code = Cells::FindCorners(*tangentPoints, &form, corners);
+  Cells::WriteForm(form, formFixed, xOfY);
+  return code;
+}
+
 }  // namespace
 
 bool GeometryUtils::GetPermissibleRect(double x1, double y1, double x2, double y2, double r,
@@ -64,12 +75,8 @@ bool GeometryUtils::GetPermissibleRect(double x1, double y1, double x2, double y
 
 ErrorCode GeometryUtils::GetLinePolygon(WPoint a, WPoint b, bool* formFixed, bool* xOfY,
                                         Point2D<double>* const polygon) {
-  std::optional<TangentPoints> const tangentPoints = Cells::FindTangentPoints(a, b);
-  if (!tangentPoints) return ErrorCode::Failed;
-  Cells::LineForm form = Cells::ReadForm(formFixed, xOfY);
   Cells::LineCellCorners corners;
-  ErrorCode const code = Cells::FindCorners(*tangentPoints, &form, &corners);
-  Cells::WriteForm(form, formFixed, xOfY);
+  ErrorCode const code = FindCorners(Cells::FindTangentPoints(a, b), formFixed, xOfY, &corners);
   if (code != ErrorCode::Ok) return code;
   for (std::size_t i = 0; i < corners.size(); ++i) polygon[i] = {corners[i].x, corners[i].y};
   return ErrorCode::Ok;
@@ -78,13 +85,9 @@ ErrorCode GeometryUtils::GetLinePolygon(WPoint a, WPoint b, bool* formFixed, boo
 ErrorCode GeometryUtils::GetLineTriangles(double x1, double y1, double x2, double y2, double r,
                                           bool* formFixed, bool* xOfY,
                                           std::vector<Triangle>* cell) {
-  std::optional<TangentPoints> const tangentPoints =
-      TangentPointsOfEqualCircles({x1, y1}, {x2, y2}, r);
-  if (!tangentPoints) return ErrorCode::Failed;
-  Cells::LineForm form = Cells::ReadForm(formFixed, xOfY);
   Cells::LineCellCorners corners;
-  ErrorCode const code = Cells::FindCorners(*tangentPoints, &form, &corners);
-  Cells::WriteForm(form, formFixed, xOfY);
+  ErrorCode const code =
+      FindCorners(TangentPointsOfEqualCircles({x1, y1}, {x2, y2}, r), formFixed, xOfY, &corners);
   if (code != ErrorCode::Ok) return code;
   Cells::LineCell const found = Cells::Divide(corners);
   cell->assign(found.begin(), found.end());
