@@ -51,10 +51,14 @@ Fewest::Limits LimitsOf(Options const& options, double scale) {
           std::sin(0.5 * options.largestStep), options.farthestBetweenPoints * scale};
 }
 
+WPoint const& Tightest(std::vector<WPoint> const& points) {
+  return *std::min_element(points.begin(), points.end(),
+                           [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
+}
+
 /// The point of least tolerance lies within the tolerance of every other: one place stands for all.
 bool DoCoincide(std::vector<WPoint> const& points) {
-  WPoint const& tightest = *std::min_element(
-      points.begin(), points.end(), [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
+  WPoint const& tightest = Tightest(points);
   return std::all_of(points.begin(), points.end(),
                      [&](WPoint const& p) { return Fewest::DistanceBetween(p, tightest) <= p.w; });
 }
@@ -134,6 +138,7 @@ ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& op
   Path path;
   path.points = shift.Apply(points);
   path.limits = LimitsOf(options, shift.scale);
+  path.leastTolerance = Tightest(points).w * shift.scale;
 
   Fewest::Cover const cover = Fewest::CoverGreedily(
       path.points, path.limits, [&](std::int32_t done) { progress.Tell(0, 20, done); });

@@ -28,6 +28,11 @@ void FreeRun::Begin(std::int32_t start, std::int32_t expected) {
   frame_.originX = first.front().x;
   frame_.originY = first.front().y;
   frame_.scale = ScaleOf(ExtentOf(first.first(static_cast<std::size_t>(probe - start))));
+  double least = points_[static_cast<std::size_t>(start)].w;
+  for (WPoint const& p : first.first(static_cast<std::size_t>(probe - start))) {
+    least = std::min(least, p.w);
+  }
+  slack_ = SlackFor(1.0 / (frame_.scale * least));
   columns_.Clear();
   basis_ = Basis();
   programme_ = Programme();
@@ -50,7 +55,7 @@ void FreeRun::Extend(std::int32_t end) {
 
 RunFit FreeRun::Try(std::int32_t end) {
   Extend(end);
-  Simplex simplex(SlackFor(0.0));
+  Simplex simplex(slack_);
   Basis basis = basis_;
   RunFit const fit = FitRun(programme_, {circle_, 0.0, false}, true, &simplex, &basis);
   if (fit.isFound && fit.ratio <= 1.0 + simplex.Slack()) {
@@ -70,7 +75,7 @@ std::int32_t FreeRun::FindEnd(std::int32_t start, std::int32_t expected) {
   std::int32_t good = start + 2;
   std::int32_t bad = count + 1;
   std::int32_t target = std::min(count, std::max(good + 2, start + expected));
-  Simplex simplex(SlackFor(0.0));
+  Simplex simplex(slack_);
   while (good < count) {
     RunFit const fit = Try(target);
     if (fit.isFound && fit.ratio <= 1.0 + simplex.Slack()) {

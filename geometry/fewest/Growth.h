@@ -36,6 +36,7 @@ class FreeRun {
   Basis basis_;
   Circle circle_;
   std::int32_t start_ = 0;
+  double slack_ = 0.0;
 };
 
 /// Relative violation of a row that rounding may cause on a run of the given extent in units of its

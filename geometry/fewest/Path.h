@@ -19,6 +19,8 @@ struct Path {
   std::vector<WPoint> points;
   /// What a piece may be.
   Limits limits;
+  /// The least of the tolerances.
+  double leastTolerance = 1.0;
 
   std::int32_t Count() const { return static_cast<std::int32_t>(points.size()); }
   WPoint const& At(std::int32_t i) const { return points[static_cast<std::size_t>(i)]; }

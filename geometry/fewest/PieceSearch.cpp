@@ -131,6 +131,7 @@ void PieceSearch::MoveTo(std::int32_t first, std::int32_t last) {
   frame_.scale = ScaleOf(ExtentOf(
       std::span(path_.points)
           .subspan(static_cast<std::size_t>(first), static_cast<std::size_t>(last - first))));
+  slack_ = SlackFor(1.0 / (frame_.scale * path_.leastTolerance));
 }
 
 void PieceSearch::Cover(std::int32_t first, std::int32_t last) {
@@ -317,7 +318,7 @@ PieceSearch::Check PieceSearch::AddBroken(Circle const& circle, Ends const& ends
 }
 
 RunFit PieceSearch::Fit(RunFit const& start, bool isTest, Ends const& ends) {
-  Simplex simplex(1e-10);
+  Simplex simplex(slack_);
   RunFit at = start;
   RunFit fit;
   while (true) {
@@ -440,7 +441,7 @@ PieceSearch::Extreme PieceSearch::FindExtreme(Ends const& ends, RunFit const& in
     programme_.conditions[static_cast<std::size_t>(normalisation_)].row = FormRow(at.circle);
     // A larger value of f beside the crossing moves the crossing down the gate.
     Row const row = ValueRow(PlaceOn(gate, extreme.offset));
-    Simplex simplex(1e-10);
+    Simplex simplex(slack_);
     Simplex::Status const status =
         simplex.Maximise(programme_, isLow ? row : Negated(row), -1e300, &basis_);
     if (status != Simplex::Status::Optimal) break;
@@ -481,7 +482,7 @@ RunFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
   programme_.first = first - columnsFirst_;
   programme_.last = last - columnsFirst_;
   programme_.conditionCount = 0;
-  Simplex simplex(1e-10);
+  Simplex simplex(slack_);
   Basis basis;
   RunFit fit = FitRun(programme_,
                       {LineThrough(PlaceOf(frame_.ToLocal(path_.At(first))),

@@ -107,6 +107,7 @@ class PieceSearch {
 
   Path const& path_;
   double share_;
+  double slack_ = 0.0;
   LocalFrame frame_;
   Columns columns_;
   std::int32_t columnsFirst_ = 0;
