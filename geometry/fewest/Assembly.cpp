@@ -153,6 +153,13 @@ void DrawBack(Path const& path, ChainPiece const& piece, Point* start, Point* en
   *end = drawn(*end, path.At(piece.end - 1), -1.0);
 }
 
+/// An end of the chain: its fixed place, or beside the outermost points.
+Point EndOf(Path const& path, Opening const& opening, ChainPiece const& piece, std::int32_t step) {
+  if (opening.isFree) return FreeEnd(path, piece, step);
+  Place const place = PlaceOn(opening.gate, opening.low);
+  return {place.x, place.y};
+}
+
 /// A turn from which on the ends of a piece may meet.
 constexpr double kNearFullTurn = 6.0;
 
@@ -174,9 +181,10 @@ double TurnOf(Path const& path, ChainPiece const& piece) {
 std::vector<BuiltPiece> BuildPieces(Path const& path, Chain const& chain) {
   std::vector<BuiltPiece> pieces;
   if (chain.pieces.empty()) return pieces;
-  Point start = FreeEnd(path, chain.pieces.front(), 1);
-  Point finish = FreeEnd(path, chain.pieces.back(), -1);
-  if (TurnOf(path, chain.pieces.front()) > kNearFullTurn && chain.pieces.size() == 1) {
+  Point start = EndOf(path, path.start, chain.pieces.front(), 1);
+  Point finish = EndOf(path, path.finish, chain.pieces.back(), -1);
+  if (path.start.isFree && chain.pieces.size() == 1 &&
+      TurnOf(path, chain.pieces.front()) > kNearFullTurn) {
     DrawBack(path, chain.pieces.front(), &start, &finish);
   }
   for (std::size_t k = 0; k < chain.pieces.size(); ++k) {

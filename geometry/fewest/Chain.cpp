@@ -92,7 +92,7 @@ class BackwardPass {
  private:
   bool Place(std::size_t k) {
     Link const& link = links_[k];
-    Opening end;
+    Opening end = path_.finish;
     if (k + 1 < links_.size()) {
       end = {chain_.gates[k], chain_.offsets[k], chain_.offsets[k], false};
     }
@@ -143,6 +143,7 @@ class ChainSearch {
 
   Chain Run() {
     levels_.push_back({State()});
+    levels_.back().front().opening = path_.start;
     std::int32_t expected = std::min(path_.Count(), 8);
     std::int32_t before = 0;
     while (true) {
@@ -160,9 +161,15 @@ class ChainSearch {
       }
       farthest = rival.end;
       tell_(farthest);
-      if (farthest == path_.Count()) return Backwards();
+      if (farthest == path_.Count()) {
+        std::int32_t const last = FindLast();
+        if (last >= 0) return Backwards(last);
+        // No piece ends where a closed path has to; one more closes it.
+        farthest = path_.Count() - 1;
+      }
       Level next = MakeStates(level, before, farthest);
-      if (next.empty() || farthest <= before) return {};
+      if (next.empty() || (farthest <= before && path_.finish.isFree)) return {};
+      if (levels_.size() > path_.points.size() + 2) return {};
       expected = farthest + std::max(4, farthest - before);
       before = farthest;
       levels_.push_back(std::move(next));
@@ -283,21 +290,25 @@ class ChainSearch {
     }
   }
 
-  Chain Backwards() {
+  /// The state of the last level whose piece to the finish deviates least; -1 if there is none.
+  std::int32_t FindLast() {
     Level const& last = levels_.back();
     double least = 0.0;
     std::int32_t at = -1;
     search_.MoveTo(FirstOf(last.front().opening), path_.Count());
     for (std::size_t i = 0; i < last.size(); ++i) {
       if (last[i].reach.end < path_.Count()) continue;
-      RunFit const fit =
-          search_.FindBest(last[i].opening, Opening(), {last[i].reach.circle, 1.0, true});
-      if (fit.isFound && (at < 0 || fit.ratio < least)) {
+      RunFit const fit = search_.FindBest(last[i].opening, path_.finish,
+                                          {last[i].reach.circle, 1.0, path_.finish.isFree});
+      if (fit.isFound && fit.ratio <= kWholeTolerance && (at < 0 || fit.ratio < least)) {
         least = fit.ratio;
         at = static_cast<std::int32_t>(i);
       }
     }
-    if (at < 0) return {};
+    return at;
+  }
+
+  Chain Backwards(std::int32_t at) {
     std::vector<Link> links(levels_.size());
     for (std::size_t k = levels_.size(); k-- > 0;) {
       State const& state = levels_[k][static_cast<std::size_t>(at)];
@@ -323,6 +334,7 @@ Chain FollowGates(Path const& path, double share, Chain const& known) {
   PieceSearch search(path, share);
   std::vector<Link> links;
   Link link;
+  link.opening = path.start;
   for (std::size_t k = 0; k < known.pieces.size(); ++k) {
     link.guess = known.pieces[k].circle;
     links.push_back(link);

@@ -12,6 +12,7 @@
 #include "geometry/fewest/Chain.h"
 #include "geometry/fewest/LocalFrame.h"
 #include "geometry/fewest/Progress.h"
+#include "geometry/fewest/Seam.h"
 #include "geometry/fewest/promises/Promises.h"
 #include "vorn/FewestPieces.h"
 
@@ -27,6 +28,9 @@ using Result = FewestPieces::Result;
 /// The search works within this share of the tolerances, so that its rounding and its second order
 /// terms stay within the true ones.
 constexpr double kSearchShare = 1.0 - 1e-6;
+
+/// Joints of the open chain at which a closed one is tried to begin.
+constexpr std::size_t kMostSeams = 4;
 
 bool IsMeasured(WPoint const& p) {
   return std::isfinite(p.x) && std::isfinite(p.y) && std::isfinite(p.w) && p.w > 0.0;
@@ -101,17 +105,52 @@ class Fitter {
       Chain const chain = Fewest::FindChain(
           path_, share * kSearchShare, [&](std::int32_t done) { progress_.Tell(20, 80, done); });
       if (chain.pieces.empty()) continue;
-      if (options_.centre && Keeps(Fewest::Centre(path_, chain), answer, report)) return true;
-      if (Keeps(chain, answer, report)) return true;
+      if (options_.closed) {
+        if (Close(chain, share * kSearchShare, answer, report)) return true;
+        continue;
+      }
+      if (KeepsCentred(path_, 0, chain, answer, report)) return true;
     }
     return false;
   }
 
  private:
-  bool Keeps(Chain const& chain, Answer* answer, Promises::Report* report) const {
-    *answer = Restore(shift_, chain, Fewest::BuildPieces(path_, chain));
+  /// The shortest of the chains that begin and end at one of the joints of an open one.
+  bool Close(Chain const& open, double share, Answer* answer, Promises::Report* report) {
+    bool isFound = false;
+    for (Fewest::CutPath const& cut : Fewest::CutAtJoints(path_, open, kMostSeams)) {
+      Chain const chain = Fewest::FindChain(cut.path, share, [&](std::int32_t done) {
+        progress_.Tell(20, 80, done);
+      });
+      if (chain.pieces.empty()) continue;
+      if (isFound && chain.pieces.size() >= answer->ranges.size()) continue;
+      Answer closed;
+      Promises::Report closedReport;
+      if (!KeepsCentred(cut.path, cut.rotation, chain, &closed, &closedReport)) continue;
+      *answer = std::move(closed);
+      *report = std::move(closedReport);
+      isFound = true;
+      // No closed chain has fewer than the open one less the piece that the end of the input cuts.
+      if (answer->ranges.size() + 1 <= open.pieces.size()) return true;
+    }
+    return isFound;
+  }
+
+  bool KeepsCentred(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
+                    Promises::Report* report) const {
+    if (options_.centre && Keeps(path, rotation, Fewest::Centre(path, chain), answer, report)) {
+      return true;
+    }
+    return Keeps(path, rotation, chain, answer, report);
+  }
+
+  bool Keeps(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
+             Promises::Report* report) const {
+    *answer = Restore(shift_, chain, Fewest::BuildPieces(path, chain));
+    std::int32_t const count = path.Count();
     std::vector<Promises::PieceRange> ranges;
-    for (FewestPieces::Range const& range : answer->ranges) {
+    for (FewestPieces::Range& range : answer->ranges) {
+      range = {(range.first + rotation) % count, (range.last + rotation) % count};
       ranges.push_back({range.first, range.last});
     }
     *report = Promises::Measure({points_, answer->contour, ranges, options_.closed,

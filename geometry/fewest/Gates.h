@@ -38,4 +38,13 @@ inline Place PlaceOn(Gate const& gate, double offset) {
   return {gate.origin.x + offset * gate.across.x, gate.origin.y + offset * gate.across.y};
 }
 
+/// A gate with the offsets at which the piece before can end.
+struct Opening {
+  Gate gate;
+  double low = 0.0;
+  double high = 0.0;
+  /// No gate at all: the chain begins, or ends, at the end of the path.
+  bool isFree = true;
+};
+
 }  // namespace Vorn::Fewest

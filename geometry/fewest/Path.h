@@ -5,13 +5,12 @@
 #include <vector>
 
 #include "geometry/fewest/Circle.h"
+#include "geometry/fewest/Gates.h"
 #include "geometry/fewest/Limits.h"
 #include "vorn/Types.h"
 
 /// The measured points as a path.
 namespace Vorn::Fewest {
-
-struct Gate;
 
 /// The points, moved near the origin, with what the search asks of them.
 struct Path {
@@ -21,6 +20,10 @@ struct Path {
   Limits limits;
   /// The least of the tolerances.
   double leastTolerance = 1.0;
+  /// Where the chain begins and ends: free at the ends of an open path, one fixed place on a gate
+  /// of a closed one.
+  Opening start;
+  Opening finish;
 
   std::int32_t Count() const { return static_cast<std::int32_t>(points.size()); }
   WPoint const& At(std::int32_t i) const { return points[static_cast<std::size_t>(i)]; }

@@ -13,15 +13,6 @@
 /// another gate.
 namespace Vorn::Fewest {
 
-/// A gate with the offsets at which the piece before can end.
-struct Opening {
-  Gate gate;
-  double low = 0.0;
-  double high = 0.0;
-  /// No gate at all: the chain begins, or ends, at the end of the path.
-  bool isFree = true;
-};
-
 /// How far a piece reaches.
 struct Reach {
   /// One past the last point covered.
