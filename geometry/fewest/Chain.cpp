@@ -133,6 +133,9 @@ class BackwardPass {
 
 constexpr std::size_t kMostSources = 2;
 
+/// Points behind a gate whose circle tells whether there is a corner.
+constexpr std::int32_t kPointsBehind = 16;
+
 /// In gaps wider than this many times the sum of the tolerances the joint may lie at either point.
 constexpr double kWideGap = 8.0;
 
@@ -180,8 +183,16 @@ class ChainSearch {
   Level MakeStates(Level const& level, std::int32_t before, std::int32_t farthest) {
     Level next;
     std::int32_t const half = std::max(before + 1, farthest - (farthest - before) / 2 - 1);
-    for (std::int32_t back = 0; farthest - back >= half; back = back < 4 ? back + 1 : back * 2) {
+    std::int32_t const stride = StrideFrom(path_, half - 1);
+    std::int32_t const quarter = std::max(1, stride / 4);
+    std::int32_t back = 0;
+    while (farthest - back >= half) {
       AddGates(level, farthest - back, &next);
+      if (back < stride) {
+        back = std::min(back + quarter, stride);
+      } else {
+        back = back < 4 * stride ? back + stride : 2 * back;
+      }
     }
     return next;
   }
@@ -191,7 +202,9 @@ class ChainSearch {
     Gate corner;
     bool const isCorner = MakeCornerGate(level, split, &corner);
     if (isCorner) AddState(level, corner, next);
-    if (!isCorner) AddState(level, MiddleGate(path_, split), next);
+    State const* from = BestFor(level, split);
+    if (from == nullptr) return;
+    if (!isCorner) AddState(level, MiddleGate(path_, split, from->reach.circle), next);
     WPoint const& last = path_.At(split - 1);
     WPoint const& first = path_.At(split);
     bool const isWide = DistanceBetween(last, first) > kWideGap * (last.w + first.w);
@@ -218,14 +231,15 @@ class ChainSearch {
     State const* from = BestFor(level, split);
     if (from == nullptr) return false;
     RunFit behind;
-    for (std::int32_t length = 16; length >= 2; length /= 2) {
+    for (std::int32_t length = kPointsBehind * StrideFrom(path_, split);;) {
       std::int32_t const end = std::min(split + length, path_.Count());
-      if (end - split < 2) continue;
+      if (end - split < 2) break;
       behind = search_.FitAlone(split, end);
       if (behind.isFound && behind.ratio <= 1.0) break;
+      length = (end - split) / 2;
     }
     if (!behind.isFound || behind.ratio > 1.0) return false;
-    Gate const middle = MiddleGate(path_, split);
+    Gate const middle = MiddleGate(path_, split, from->reach.circle);
     Place const in = GradientAt(from->reach.circle, middle.origin);
     Place const out = GradientAt(behind.circle, middle.origin);
     if (!(std::fabs(Cross(in, out)) > 0.2)) return false;

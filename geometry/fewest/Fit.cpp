@@ -118,10 +118,10 @@ class Fitter {
   /// The shortest of the chains that begin and end at one of the joints of an open one.
   bool Close(Chain const& open, double share, Answer* answer, Promises::Report* report) {
     bool isFound = false;
-    for (Fewest::CutPath const& cut : Fewest::CutAtJoints(path_, open, kMostSeams)) {
-      Chain const chain = Fewest::FindChain(cut.path, share, [&](std::int32_t done) {
-        progress_.Tell(20, 80, done);
-      });
+    auto cuts = Fewest::CutAtJoints(path_, open, kMostSeams);
+    for (Fewest::CutPath& cut : cuts) {
+      Chain const chain =
+          Fewest::CloseChain(&cut, share, [&](std::int32_t done) { progress_.Tell(20, 80, done); });
       if (chain.pieces.empty()) continue;
       if (isFound && chain.pieces.size() >= answer->ranges.size()) continue;
       Answer closed;
@@ -191,7 +191,9 @@ ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& op
   result->ranges = std::move(answer.ranges);
   result->largestDeviation = report.largestRatio;
   result->largestDeviationIndex = static_cast<std::int32_t>(report.largestIndex);
-  result->fewestPossible = static_cast<std::int32_t>(cover.starts.size());
+  // A closed cover of m runs, cut where the input ends, is an open one of m + 1 at most.
+  auto const open = static_cast<std::int32_t>(cover.starts.size());
+  result->fewestPossible = options.closed ? std::max(1, open - 1) : open;
   result->isFewest = static_cast<std::int32_t>(result->ranges.size()) == result->fewestPossible;
   return ErrorCode::Ok;
 }

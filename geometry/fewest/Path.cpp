@@ -18,6 +18,9 @@ Place Direction(WPoint const& p, WPoint const& q) {
 
 Place LeftOf(Place const& direction) { return {-direction.y, direction.x}; }
 
+/// Points farther apart than this many times the sum of their tolerances lie in order.
+constexpr double kClearlyAhead = 1.5;
+
 }  // namespace
 
 double DistanceBetween(WPoint const& p, WPoint const& q) {
@@ -26,17 +29,33 @@ double DistanceBetween(WPoint const& p, WPoint const& q) {
   return std::sqrt(dx * dx + dy * dy);
 }
 
-Gate MiddleGate(Path const& path, std::int32_t split) {
-  WPoint const& before = path.At(split - 1);
-  WPoint const& behind = path.At(split);
-  Place direction = Direction(before, behind);
-  if (direction.x == 0.0 && direction.y == 0.0) direction = {1.0, 0.0};
-  double const room = 0.5 * DistanceBetween(before, behind) + 2.0 * std::max(before.w, behind.w);
-  return {split,
-          {0.5 * (before.x + behind.x), 0.5 * (before.y + behind.y)},
-          LeftOf(direction),
-          -room,
-          room};
+std::int32_t StrideFrom(Path const& path, std::int32_t point) {
+  WPoint const& from = path.At(point);
+  std::int32_t const count = path.Count();
+  std::int32_t i = point + 1;
+  while (i < count &&
+         DistanceBetween(from, path.At(i)) <= kClearlyAhead * (from.w + path.At(i).w)) {
+    ++i;
+  }
+  return i - point;
+}
+
+Gate MiddleGate(Path const& path, std::int32_t split, Circle const& before) {
+  WPoint const& last = path.At(split - 1);
+  WPoint const& first = path.At(split);
+  Gate gate;
+  gate.split = split;
+  gate.origin = {0.5 * (last.x + first.x), 0.5 * (last.y + first.y)};
+  double const gap = DistanceBetween(last, first);
+  gate.greatest = 0.5 * gap + 2.0 * std::max(last.w, first.w);
+  gate.least = -gate.greatest;
+  if (gap > kClearlyAhead * (last.w + first.w)) {
+    gate.across = LeftNormal(last, first);
+  } else {
+    Place const normal = GradientAt(before, gate.origin);
+    gate.across = BisectorGate(gate.origin, normal, normal).across;
+  }
+  return gate;
 }
 
 Gate BisectorGate(Place const& place, Place const& normalIn, Place const& normalOut) {

@@ -32,8 +32,14 @@ struct Path {
 /// Distance of two points.
 double DistanceBetween(WPoint const& p, WPoint const& q);
 
-/// The gate in the middle of the gap before point `split`, square to the path.
-Gate MiddleGate(Path const& path, std::int32_t split);
+/// How many points there are from one to the first that lies clearly ahead of it: 1 where points
+/// lie farther apart than their tolerances, more in denser scans, whose neighbours say nothing
+/// about direction or order. Every "few points" of the search counts in these strides.
+std::int32_t StrideFrom(Path const& path, std::int32_t point);
+
+/// The gate in the middle of the gap before point `split`, square to the path, which is that of
+/// `before`, the piece before it, where the points are too dense to tell.
+Gate MiddleGate(Path const& path, std::int32_t split, Circle const& before);
 
 /// Unit vector to the left of the way from one point to another; 0 for coinciding points.
 Place LeftNormal(WPoint const& from, WPoint const& to);

@@ -235,14 +235,17 @@ PieceSearch::Check PieceSearch::AddBrokenStep(Circle const& circle, double gap2,
 bool PieceSearch::IsFullTurn(Circle const& circle, Ends const& ends) const {
   double turn = 0.0;
   Place before;
-  for (std::int32_t i = ends.first; i < ends.end; ++i) {
-    Sample const p = frame_.ToLocal(path_.At(i));
-    Place const radial = GradientAt(circle, PlaceOf(p));
+  auto const add = [&](Place const& p, bool isFirst) {
+    Place const radial = GradientAt(circle, p);
     double const cross = before.x * radial.y - before.y * radial.x;
-    double const dot = before.x * radial.x + before.y * radial.y;
-    if (i > ends.first) turn += std::atan2(cross, dot);
+    if (!isFirst) turn += std::atan2(cross, before.x * radial.x + before.y * radial.y);
     before = radial;
+  };
+  if (!ends.from->isFree) add(frame_.ToLocal(ends.from->gate.origin), true);
+  for (std::int32_t i = ends.first; i < ends.end; ++i) {
+    add(PlaceOf(frame_.ToLocal(path_.At(i))), ends.from->isFree && i == ends.first);
   }
+  if (ends.to != nullptr && !ends.to->isFree) add(frame_.ToLocal(ends.to->gate.origin), false);
   // Both ends of an open path may be drawn back within the tolerances of its ends.
   bool const isWhole = ends.from->isFree && ends.end == path_.Count();
   double const w = share_ * std::min(path_.At(ends.first).w, path_.At(ends.end - 1).w);
@@ -302,14 +305,16 @@ PieceSearch::Check PieceSearch::AddBroken(Circle const& circle, Ends const& ends
   Check const order = AddBrokenOrder(circle, ends);
   if (order != Check::Holds || ends.first >= ends.end) return order;
   if (!ends.from->isFree) {
-    std::int32_t const last = std::min(ends.end, ends.first + kPointsNearJoint);
+    std::int32_t const last =
+        std::min(ends.end, ends.first + kPointsNearJoint * StrideFrom(path_, ends.first));
     for (std::int32_t i = ends.first; i < last; ++i) {
       Check const start = AddBrokenJoint(circle, *ends.from, i);
       if (start != Check::Holds) return start;
     }
   }
   if (ends.to == nullptr || ends.to->isFree) return Check::Holds;
-  std::int32_t const last = std::max(ends.first, ends.end - kPointsNearJoint);
+  std::int32_t const stride = StrideFrom(path_, std::max(ends.first, ends.end - kPointsNearJoint));
+  std::int32_t const last = std::max(ends.first, ends.end - kPointsNearJoint * stride);
   for (std::int32_t i = ends.end; i-- > last;) {
     Check const end = AddBrokenJoint(circle, *ends.to, i);
     if (end != Check::Holds) return end;
@@ -343,9 +348,10 @@ RunFit PieceSearch::FirstFit(Opening const& from, std::int32_t end) {
   Place const start = from.isFree
                           ? PlaceOf(frame_.ToLocal(path_.At(first)))
                           : frame_.ToLocal(PlaceOn(from.gate, 0.5 * (from.low + from.high)));
+  std::int32_t const stride = StrideFrom(path_, first);
   RunFit best;
   for (std::int32_t ahead = 1; ahead <= 8; ahead *= 2) {
-    std::int32_t const target = std::min(first + ahead, end) - (from.isFree ? 0 : 1);
+    std::int32_t const target = std::min(first + ahead * stride, end) - (from.isFree ? 0 : 1);
     if (target >= end) break;
     programme_.conditionCount = conditions;
     basis_ = Basis();
@@ -360,9 +366,10 @@ RunFit PieceSearch::FirstFit(Opening const& from, std::int32_t end) {
 
 Reach PieceSearch::FindFirstReach(Opening const& from) {
   std::int32_t const first = from.isFree ? 0 : from.gate.split;
-  std::int32_t const longest = std::min(first + kShortRun, path_.Count());
+  std::int32_t const stride = StrideFrom(path_, first);
+  std::int32_t const longest = std::min(first + kShortRun * stride, path_.Count());
   // Short runs have several local optima: they are begun anew from several chords.
-  for (std::int32_t end = longest; end > first; --end) {
+  for (std::int32_t end = longest; end > first; end = std::min(end - 1, end - stride / 4)) {
     RunFit const fit = FirstFit(from, end);
     if (fit.isFound && fit.ratio <= 1.0) return {end, fit.circle, end == longest};
   }
@@ -378,7 +385,9 @@ Reach PieceSearch::FindReach(Opening const& from, std::int32_t expected) {
 
 Reach PieceSearch::FindReachBeyond(Opening const& from, Reach const& rival) {
   std::int32_t const first = from.isFree ? 0 : from.gate.split;
-  if (rival.end - first < kShortestForRival) return FindReach(from, rival.end);
+  if (rival.end - first < kShortestForRival * StrideFrom(path_, first)) {
+    return FindReach(from, rival.end);
+  }
   BeginProgramme(from, rival.end);
   Ends const ends{&from, nullptr, first, rival.end};
   RunFit const fit = Fit({ToLocal(rival.circle), 0.0, false}, true, ends);

@@ -1,5 +1,6 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 #include <limits>
 #include <stdexcept>
@@ -119,6 +120,66 @@ TEST(FewestPieces, ScalingByAPowerOfTwoScalesTheBits) {
     EXPECT_EQ(one.contour[i].end.x * 1024.0, other.contour[i].end.x);
     EXPECT_EQ(one.contour[i].radius * 1024.0, other.contour[i].radius);
   }
+}
+
+FewestPieces::Result FitClosed(std::vector<WPoint> const& points) {
+  FewestPieces::Options options;
+  options.closed = true;
+  FewestPieces::Result result;
+  EXPECT_EQ(FewestPieces::Fit(points, options, &result, nullptr, 100), ErrorCode::Ok);
+  return result;
+}
+
+/// The outline of a square of side 10, beginning in the middle of a side.
+std::vector<WPoint> Square() {
+  std::vector<WPoint> points;
+  for (int i = 0; i < 40; ++i) {
+    double const s = 0.5 + 5.0 + i;
+    double const along = std::fmod(s, 10.0);
+    int const side = static_cast<int>(s / 10.0) % 4;
+    if (side == 0) points.push_back({along, 0.0, 0.01});
+    if (side == 1) points.push_back({10.0, along, 0.01});
+    if (side == 2) points.push_back({10.0 - along, 10.0, 0.01});
+    if (side == 3) points.push_back({0.0, 10.0 - along, 0.01});
+  }
+  return points;
+}
+
+TEST(FewestPieces, AClosedSquareHasFourSidesWhereverTheInputBegins) {
+  std::vector<WPoint> points = Square();
+  for (int turn = 0; turn < 40; turn += 7) {
+    FewestPieces::Result const result = FitClosed(points);
+    ASSERT_EQ(result.ranges.size(), 4u) << "beginning " << turn;
+    EXPECT_EQ(result.contour.front().end.x, result.contour.back().end.x);
+    EXPECT_EQ(result.contour.front().end.y, result.contour.back().end.y);
+    EXPECT_LE(result.fewestPossible, 4);
+    std::rotate(points.begin(), points.begin() + 7, points.end());
+  }
+}
+
+TEST(FewestPieces, AClosedCircleComesAsTwoArcs) {
+  FewestPieces::Result const result =
+      FitClosed(MakeArcPoints({3.0, 4.0}, 10.0, 0.3, 2.0 * std::acos(-1.0), 61, 0.01));
+  ASSERT_EQ(result.ranges.size(), 2u);
+  for (std::size_t k = 1; k < 3; ++k) {
+    EXPECT_EQ(result.contour[k].type, GeometryUtils::ElemType::Arc);
+    EXPECT_NEAR(result.contour[k].radius, 10.0, 0.01);
+  }
+}
+
+TEST(FewestPieces, AScanDenserThanItsToleranceKeepsItsPieces) {
+  Testing::RandomGeometry random(21);
+  std::vector<WPoint> points;
+  for (int i = 0; i < 4000; ++i) {
+    double const s = 0.001 * i;
+    double const x = s < 2.0 ? s : 2.0 + (s - 2.0) * std::cos(1.0);
+    double const y = s < 2.0 ? 0.0 : (s - 2.0) * std::sin(1.0);
+    points.push_back({x + random.Uniform(-0.005, 0.005), y + random.Uniform(-0.005, 0.005), 0.01});
+  }
+  FewestPieces::Result result;
+  ASSERT_EQ(FitPlain(points, &result), ErrorCode::Ok);
+  EXPECT_EQ(result.ranges.size(), 2u);
+  EXPECT_EQ(result.fewestPossible, 2);
 }
 
 class Listener : public ExecutionState {
