@@ -19,8 +19,8 @@ using CrossingPoint = GeometryUtils::CrossingPoint;
 /// How many points stay on a side of the first triangle.
 inline constexpr std::size_t kKeptOnSide = 2;
 
-/// How many points are found on a side: the ends of the stretches shared with three others.
-inline constexpr std::size_t kMostOnSide = 3 * 2;
+/// How many points are found on a side: two ends of the stretches shared with three others.
+inline constexpr std::size_t kMostOnSide = 6;
 
 /// Crossing points, with room for two sides done and one that is being searched.
 using CrossingPoints = InlineVector<CrossingPoint, 2 * kKeptOnSide + kMostOnSide>;

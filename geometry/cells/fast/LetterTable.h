@@ -17,8 +17,8 @@ namespace Vorn::Cells {
 inline bool AreIdentical(Triangle const& a, Triangle const& b) {
   // Bits are meant, and a triangle is six doubles without padding.
   static_assert(sizeof(Triangle) == 6 * sizeof(double));
-  return std::memcmp(&a, &b, sizeof(Triangle)) ==
-         0;  // NOLINT(bugprone-suspicious-memory-comparison)
+  // NOLINTNEXTLINE(bugprone-suspicious-memory-comparison)
+  return std::memcmp(&a, &b, sizeof(Triangle)) == 0;
 }
 
 /// Finds letters by triangle. The triangles themselves stand in a vector that the caller keeps,
