@@ -1,22 +1,18 @@
 #pragma once
 
 #include <cstddef>
-#include <cstdint>
 #include <limits>
 #include <vector>
 
+#include "vorn/FewestPieces.h"
 #include "vorn/GeometryUtils.h"
 
 /// What a contour of fewest pieces promises about the points that it covers, measured on the
 /// finished contour with nothing taken over from the search.
 namespace Vorn::Promises {
 
-/// The points that one piece covers, both ends included. On a closed contour a range with
-/// last < first runs over the last point to the first one.
-struct PieceRange {
-  std::int32_t first = 0;
-  std::int32_t last = 0;
-};
+/// The points that one piece covers.
+using PieceRange = FewestPieces::Range;
 
 /// A contour of one or more pieces and the points that it stands for. Only refers to them.
 struct Chain {

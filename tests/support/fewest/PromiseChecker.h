@@ -342,11 +342,11 @@ class Run {
     }
   }
 
-  /// Does an edge of one strand meet an edge of the other near x? Edges count that have an end
-  /// within reach: four tolerances or, where points are few, the next point on either side.
+  /// Does an edge of one strand meet an edge of the other near x? From x on, edges count for as
+  /// long as the strand stays within four tolerances of the other piece.
   bool PathCrossesNear(std::size_t a, std::size_t b, Vec x) const {
-    auto const first = EdgesNear(a, x);
-    auto const second = EdgesNear(b, x);
+    auto const first = EdgesNear(a, b, x);
+    auto const second = EdgesNear(b, a, x);
     for (std::size_t const i : first) {
       for (std::size_t const j : second) {
         if (i + 1 < j && DoEdgesMeet(i, j) && LeavesBetween(i, j, x)) return true;
@@ -356,21 +356,20 @@ class Run {
     return false;
   }
 
-  Real Reach(std::size_t i) const { return 4 * std::max(ToleranceAt(i), ToleranceAt(i + 1)); }
-
-  std::vector<std::size_t> EdgesNear(std::size_t k, Vec x) const {
-    std::vector<std::size_t> edges;
+  /// The edges of piece k from the one that passes x on, in both directions.
+  std::vector<std::size_t> EdgesNear(std::size_t k, std::size_t other, Vec x) const {
     auto const [first, last] = spans_[k];
     std::size_t const begin = first == 0 ? 0 : first - 1;
     std::size_t const end = chain_.isClosed ? last + 1 : std::min(last + 1, Count() - 1);
     Real const place = pieces_[k].Along(x);
-    for (std::size_t i = begin; i < end; ++i) {
-      Real const from = pieces_[k].Along(PointAt(i));
-      Real const to = pieces_[k].Along(PointAt(i + 1));
-      bool const isAround = std::min(from, to) <= place && place <= std::max(from, to);
-      bool const isNear = std::min(Norm(PointAt(i) - x), Norm(PointAt(i + 1) - x)) <= Reach(i);
-      if (isAround || isNear) edges.push_back(i);
-    }
+    std::size_t middle = begin;
+    while (middle + 1 < end && pieces_[k].Along(PointAt(middle + 1)) < place) ++middle;
+    auto const isBeside = [&](std::size_t i) {
+      return pieces_[other].Distance(PointAt(i)) <= 4 * ToleranceAt(i);
+    };
+    std::vector<std::size_t> edges{middle};
+    for (std::size_t i = middle; i > begin && isBeside(i); --i) edges.push_back(i - 1);
+    for (std::size_t i = middle + 1; i < end && isBeside(i); ++i) edges.push_back(i);
     return edges;
   }
 
@@ -393,7 +392,7 @@ class Run {
   /// A knot of noise is no crossing: the path has to leave the place before it comes back.
   bool LeavesBetween(std::size_t i, std::size_t j, Vec x) const {
     for (std::size_t k = i + 1; k <= j; ++k) {
-      if (Norm(PointAt(k) - x) > 4 * ToleranceAt(k)) return true;
+      if (Norm(PointAt(k) - x) > 2 * ToleranceAt(k)) return true;
     }
     return false;
   }

@@ -1,0 +1,134 @@
+#include <cmath>
+#include <cstdint>
+#include <vector>
+
+#include "gtest/gtest.h"
+#include "support/fewest/FewestCalls.h"
+#include "support/fewest/Motions.h"
+#include "support/fewest/Scans.h"
+
+// Scans made to be hard. Whatever the answer, no promise is broken; where the least number is known
+// it is found.
+
+namespace Vorn::Testing {
+namespace {
+
+/// Ok and every promise kept, or NoFit.
+FewestResult FitIfPossible(Scan const& scan, FewestOptions const& options = {}) {
+  FewestResult result;
+  ErrorCode const code = FewestPieces::Fit(scan, options, &result, nullptr, 100);
+  EXPECT_TRUE(code == ErrorCode::Ok || code == ErrorCode::NoFit);
+  if (code == ErrorCode::Ok) ExpectPromisesKept(scan, options, result);
+  return result;
+}
+
+TEST(FewestPiecesHostile, ZigzagsJustWithinTheToleranceAreOneSegment) {
+  for (double const share : {0.5, 0.9, 0.99, 0.9999}) {
+    SCOPED_TRACE(testing::Message() << "share " << share);
+    FewestResult const result = FitKept(MakeZigzag(101, 1.0, 0.01, share));
+    EXPECT_EQ(result.fewestPossible, 1);
+    EXPECT_EQ(PieceCount(result), 1);
+  }
+}
+
+TEST(FewestPiecesHostile, ZigzagsBeyondTheToleranceTakeTwoPointsEach) {
+  // Any circle leaves one of four points in turn above and below a line 1.1 w away; three are
+  // always covered.
+  FewestResult const result = FitKept(MakeZigzag(99, 1.0, 0.01, 1.1));
+  EXPECT_EQ(result.fewestPossible, 33);
+}
+
+TEST(FewestPiecesHostile, SpiralsOfManyTurnsAreFollowed) {
+  for (double const w : {0.01, 0.1, 0.3}) {
+    SCOPED_TRACE(testing::Message() << "w " << w);
+    FewestResult const result = FitKept(MakeSpiral(6.0, 1.0, 800, w));
+    EXPECT_GE(PieceCount(result), result.fewestPossible);
+  }
+}
+
+TEST(FewestPiecesHostile, AnOutlierFarAwayTakesAPieceOrTwoMore) {
+  for (double const distance : {10.0, 1e3, 1e6}) {
+    SCOPED_TRACE(testing::Message() << "distance " << distance);
+    FewestResult const result = FitKept(MakeOutlier(101, 0.1, distance));
+    EXPECT_LE(result.fewestPossible, 3);
+    EXPECT_LE(PieceCount(result), 5);
+  }
+}
+
+TEST(FewestPiecesHostile, CoordinatesOfAMillionMillionLoseOnlyTheirOwnDigits) {
+  // Doubles are 1.2e-4 apart there, a hundredth of the tolerance.
+  Scan const scan = Shifted(MakeNoisyProfile(1, ProfileStyle::Mixed, 1, 500, 0.45), 1e12, -1e12);
+  FewestResult const result = FitKept(scan);
+  EXPECT_EQ(PieceCount(result), 16);
+  EXPECT_EQ(result.fewestPossible, 16);
+}
+
+TEST(FewestPiecesHostile, CoordinatesOfAMillionLoseNothing) {
+  Scan const scan = Magnified(MakeNoisyProfile(1, ProfileStyle::Mixed, 1, 500, 0.45), 0.0625);
+  FewestResult const result = FitKept(Shifted(scan, 1e6, 1e6));
+  EXPECT_EQ(PieceCount(result), 16);
+}
+
+TEST(FewestPiecesHostile, ScribblesBreakNoPromise) {
+  RandomGeometry random(6402);
+  for (int round = 0; round < 60; ++round) {
+    SCOPED_TRACE(testing::Message() << "seed 6402, round " << round);
+    Scan scan;
+    double const w = std::exp2(random.Uniform(-8.0, 1.0));
+    for (int i = random.Integer(2, 60); i > 0; --i) {
+      auto const p = random.PointIn(-5.0, 5.0);
+      scan.push_back({p.x, p.y, w * random.Uniform(0.5, 1.0)});
+    }
+    FitIfPossible(scan);
+    FitIfPossible(scan, Closed());
+  }
+}
+
+TEST(FewestPiecesHostile, PointsOnASmallGridBreakNoPromise) {
+  RandomGeometry random(6403);
+  for (int round = 0; round < 100; ++round) {
+    SCOPED_TRACE(testing::Message() << "seed 6403, round " << round);
+    Scan scan;
+    for (int i = random.Integer(2, 30); i > 0; --i) {
+      auto const p = random.GridPoint(3);
+      scan.push_back({p.x, p.y, 0.25 * random.Integer(1, 3)});
+    }
+    FitIfPossible(scan);
+    FitIfPossible(scan, Closed());
+  }
+}
+
+TEST(FewestPiecesHostile, AnyDoublesGiveAnAnswer) {
+  RandomGeometry random(6404);
+  for (int round = 0; round < 300; ++round) {
+    SCOPED_TRACE(testing::Message() << "seed 6404, round " << round);
+    Scan scan;
+    for (int i = random.Integer(2, 12); i > 0; --i) {
+      scan.push_back({random.AnyDouble(), random.AnyDouble(), std::fabs(random.AnyDouble())});
+    }
+    FewestResult result;
+    ErrorCode const code = FewestPieces::Fit(scan, {}, &result, nullptr, 100);
+    EXPECT_TRUE(code == ErrorCode::Ok || code == ErrorCode::NoFit || code == ErrorCode::Failed);
+  }
+}
+
+TEST(FewestPiecesHostile, OutAndBackOnOneLineIsFollowed) {
+  Scan scan = MakeZigzag(41, 0.5, 0.1, 0.4);
+  Scan const back = Reversed(scan);
+  scan.insert(scan.end(), back.begin() + 1, back.end());
+  FewestResult const result = FitKept(scan);
+  EXPECT_EQ(PieceCount(result), 2);
+}
+
+TEST(FewestPiecesHostile, AFigureEightIsFollowed) {
+  RandomGeometry random(6405);
+  double const turn = 2.0 * 3.141592653589793;
+  Scan const scan = SampleWithNormalNoise(
+      &random, {{0.95 * turn * 10.0, 0.1}, {0.95 * turn * 10.0, -0.1}}, 500, 0.05, 0.45);
+  FewestResult const result = FitKept(scan);
+  EXPECT_EQ(result.fewestPossible, 2);
+  EXPECT_EQ(PieceCount(result), 2);
+}
+
+}  // namespace
+}  // namespace Vorn::Testing

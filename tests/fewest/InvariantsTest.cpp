@@ -1,0 +1,132 @@
+#include <algorithm>
+#include <cmath>
+#include <cstdint>
+#include <vector>
+
+#include "gtest/gtest.h"
+#include "support/fewest/FewestCalls.h"
+#include "support/fewest/Motions.h"
+#include "support/fewest/Scans.h"
+
+// What must not change the number of pieces and the bound, on scans whose true number is known.
+
+namespace Vorn::Testing {
+namespace {
+
+constexpr ProfileStyle kStyles[] = {ProfileStyle::Smooth, ProfileStyle::Corners,
+                                    ProfileStyle::Mixed};
+
+/// Profiles of every style, with noise of half the tolerance.
+std::vector<Scan> Profiles(std::int32_t count) {
+  std::vector<Scan> scans;
+  for (ProfileStyle const style : kStyles)
+    scans.push_back(MakeNoisyProfile(2, style, 1, count, 0.5));
+  return scans;
+}
+
+void ExpectSixteen(Scan const& scan, FewestOptions const& options = {}) {
+  FewestResult const result = FitKept(scan, options);
+  EXPECT_EQ(PieceCount(result), 16);
+  EXPECT_EQ(result.fewestPossible, 16);
+}
+
+TEST(FewestPiecesInvariants, NoisyProfilesHaveTheirTrueNumber) {
+  for (ProfileStyle const style : kStyles) {
+    for (std::uint64_t seed = 1; seed <= 5; ++seed) {
+      for (double const noise : {0.45, 0.7}) {
+        SCOPED_TRACE(testing::Message() << "style " << static_cast<int>(style) << ", seed " << seed
+                                        << ", noise " << noise);
+        ExpectSixteen(MakeNoisyProfile(seed, style, 1, 500, noise));
+      }
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, ReversingThePointsKeepsTheNumber) {
+  for (Scan const& scan : Profiles(600)) ExpectSixteen(Reversed(scan));
+}
+
+TEST(FewestPiecesInvariants, TurningKeepsTheNumber) {
+  for (Scan const& scan : Profiles(600)) {
+    for (double const angle :
+         {0.1, 0.5235987755982988, 0.7853981633974483, 1.0, 2.0, 3.0, 4.0, 5.5}) {
+      SCOPED_TRACE(testing::Message() << "turned by " << angle);
+      ExpectSixteen(Rotated(scan, angle));
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, QuarterTurnsAndMirrorsKeepTheNumber) {
+  for (Scan const& scan : Profiles(600)) {
+    Scan turned = scan;
+    for (int quarter = 0; quarter < 4; ++quarter) {
+      turned = TurnedByAQuarter(turned);
+      ExpectSixteen(turned);
+      ExpectSixteen(Mirrored(turned));
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, MovingByAHundredMillionTolerancesKeepsTheNumber) {
+  for (Scan const& scan : Profiles(600)) {
+    for (double const tolerances : {1e2, 1e5, 1e8}) {
+      SCOPED_TRACE(testing::Message() << "moved by " << tolerances);
+      double const shift = 0.02 * tolerances;
+      ExpectSixteen(Shifted(scan, shift, -0.7 * shift));
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, RepeatedPointsChangeNothing) {
+  RandomGeometry random(6301);
+  for (Scan const& scan : Profiles(500)) {
+    Scan repeated;
+    for (WPoint const& p : scan) {
+      repeated.push_back(p);
+      while (random.Integer(0, 2) == 0) repeated.push_back(p);
+    }
+    ExpectSixteen(repeated);
+  }
+}
+
+TEST(FewestPiecesInvariants, APointRemovedNeverRaisesTheBound) {
+  RandomGeometry random(6302);
+  for (Scan scan : Profiles(250)) {
+    FewestResult last = FitKept(scan);
+    for (int round = 0; round < 40; ++round) {
+      SCOPED_TRACE(testing::Message() << "seed 6302, round " << round);
+      auto const at = random.Integer(0, static_cast<std::int32_t>(scan.size()) - 1);
+      scan.erase(scan.begin() + at);
+      FewestResult const result = FitKept(scan);
+      EXPECT_LE(result.fewestPossible, last.fewestPossible);
+      last = result;
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, LooserTolerancesNeverGiveMorePieces) {
+  for (Scan const& scan : Profiles(300)) {
+    FewestResult last = FitKept(WithTolerances(scan, 0.3));
+    for (int step = 1; step < 20; ++step) {
+      double const factor = 0.3 * std::pow(1.3, step);
+      SCOPED_TRACE(testing::Message() << "tolerances times " << factor);
+      FewestResult const result = FitKept(WithTolerances(scan, factor));
+      EXPECT_LE(PieceCount(result), PieceCount(last));
+      EXPECT_LE(result.fewestPossible, last.fewestPossible);
+      last = result;
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, DenseScansHaveTheirTrueNumber) {
+  for (std::uint64_t seed = 1; seed <= 3; ++seed) {
+    SCOPED_TRACE(testing::Message() << "seed " << seed);
+    FewestResult const bracket = FitKept(MakeDenseBracket(seed, 0.001, 0.1));
+    EXPECT_EQ(PieceCount(bracket), 4);
+    EXPECT_EQ(bracket.fewestPossible, 4);
+    ExpectSixteen(MakeDenseProfile(seed, ProfileStyle::Mixed, 40.0, 0.002));
+  }
+}
+
+}  // namespace
+}  // namespace Vorn::Testing
