@@ -89,10 +89,10 @@ void GeometryUtils::TriPointsCoordsToArray(std::vector<IndexedPoint> const* samp
       {Fitting::FixedIf(firstFixed, first), Fitting::FixedIf(lastFixed, last)});
   *usedFirst = points.usesStart;
   *usedLast = points.usesEnd;
-  Point const inOrder[3] = {points.first, points.middle, points.last};
-  for (int i = 0; i < 3; ++i) {
-    coords[2 * i] = inOrder[i].x;
-    coords[2 * i + 1] = inOrder[i].y;
+  double* next = coords;
+  for (Point const& p : {points.first, points.middle, points.last}) {
+    *next++ = p.x;
+    *next++ = p.y;
   }
 }
 

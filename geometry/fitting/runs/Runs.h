@@ -32,7 +32,7 @@ struct Run {
 
   /// The measured point at a position within the run, 0 for the first.
   WPoint const& operator[](std::int32_t position) const {
-    return points[static_cast<std::size_t>(first + position)];
+    return points[static_cast<std::size_t>(first) + static_cast<std::size_t>(position)];
   }
 
   /// The same without its tolerance.
