@@ -33,6 +33,7 @@ Option AddChoice(Command& command, std::string const& name, Value* value,
                  std::vector<std::pair<std::string, Value>> const& choices,
                  std::string const& help) {
   std::vector<std::string> words;
+  words.reserve(choices.size());
   for (auto const& choice : choices) words.push_back(choice.first);
   return AddWord(
       command, name, words,

@@ -145,7 +145,7 @@ class Listing {
     std::string text = "\n" + Counted(many_.paths.size(), "file");
     std::string separator = ": ";
     for (auto const& [verdict, count] : counts_) {
-      text += separator + std::to_string(count) + " " + verdict;
+      text.append(separator).append(std::to_string(count)).append(" ").append(verdict);
       separator = ", ";
     }
     text += "; " + Counted(points_, "point") + ", " + Counted(pieces_, "piece");
@@ -230,8 +230,10 @@ void RefuseCollisions(FitMany const& many) {
       }
       auto const [other, isNew] = outputs.emplace(whole, path);
       if (!isNew) {
-        throw Failure(FailureKind::BadArgument, "the fits of " + other->second + " and " + path +
-                                                    " would both be written to " + output);
+        std::string message = "the fits of ";
+        message.append(other->second).append(" and ").append(path);
+        throw Failure(FailureKind::BadArgument,
+                      message.append(" would both be written to ").append(output));
       }
     }
   }

@@ -104,6 +104,7 @@ std::string Message(PointFile const& file, std::vector<std::size_t> const& dropp
 
 std::vector<std::size_t> LinesOf(PointFile const& file, std::vector<std::size_t> const& points) {
   std::vector<std::size_t> lines;
+  lines.reserve(points.size());
   for (std::size_t const i : points) lines.push_back(file.lines[i]);
   return lines;
 }

@@ -17,7 +17,7 @@ namespace {
 int terminalLine = -1;
 
 [[noreturn]] void Leave() {
-  auto const lock = HoldOffInterruption();
+  [[maybe_unused]] auto const lock = HoldOffInterruption();
   RemoveTemporaries();
   if (terminalLine >= 0) {
     // There is nothing left to do about a terminal that is gone.

@@ -33,11 +33,12 @@ std::string Duration(double seconds) {
 std::string DescribePace(std::size_t points, std::int32_t percent, double seconds) {
   constexpr double kTooShort = 0.2;
   constexpr int kDigits = 2;
+  constexpr int kWhole = 15;  // the rounded rate is written whole, without a power of ten
   if (percent <= 0 || seconds < kTooShort) return "";
   double const part = static_cast<double>(percent) / ProgressBar::kFull;
   double const rate = part * static_cast<double>(points) / seconds;
   double const scale = std::pow(10.0, std::max(0.0, std::floor(std::log10(rate)) - (kDigits - 1)));
-  std::string const speed = FormatShort(std::round(rate / scale) * scale, 15) + " points/s";
+  std::string speed = FormatShort(std::round(rate / scale) * scale, kWhole) + " points/s";
   if (percent >= ProgressBar::kFull) return speed;
   return speed + ", " + Duration(seconds * (1.0 - part) / part) + " left";
 }

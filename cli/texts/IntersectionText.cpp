@@ -51,7 +51,7 @@ std::string Aligned(std::vector<Row> const& rows) {
 
 std::string ToText(std::vector<Intersection> const& found, ContourFile const& a,
                    ContourFile const* b) {
-  std::string const text = Heading(found, a, b);
+  std::string text = Heading(found, a, b);
   if (found.empty()) return text;
   std::vector<Row> rows = {
       {"no", "kind", "x", "y", "to x", "to y", "piece of A", "at", "piece of B", "at"}};

@@ -67,7 +67,9 @@ VORN_IO_EXPORT std::string ToSvg(Drawing const& drawing);
 
 /// The same page as pixels.
 struct PngSize {
-  double dpi = 150.0;
+  static constexpr double kUsualDpi = 150.0;
+
+  double dpi = kUsualDpi;
   std::optional<int> width;  ///< in pixels; overrides `dpi`
 };
 
