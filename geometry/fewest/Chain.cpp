@@ -1,7 +1,8 @@
 #include "geometry/fewest/Chain.h"
 
 #include <algorithm>
-#include <cmath>
+
+#include "geometry/fewest/Corner.h"
 
 namespace Vorn::Fewest {
 
@@ -17,26 +18,6 @@ struct State {
 };
 
 using Level = std::vector<State>;
-
-double Cross(Place const& a, Place const& b) { return a.x * b.y - a.y * b.x; }
-
-/// The crossing of two circles that is nearest to a place, by Newton's method.
-bool FindMeeting(Circle const& one, Circle const& other, Place start, Place* meeting) {
-  for (int i = 0; i < 20; ++i) {
-    double const f = ValueAt(one, start);
-    double const g = ValueAt(other, start);
-    Place const df = GradientAt(one, start);
-    Place const dg = GradientAt(other, start);
-    double const determinant = Cross(df, dg);
-    if (!(std::fabs(determinant) > 1e-3)) return false;
-    double const dx = (f * dg.y - g * df.y) / determinant;
-    double const dy = (df.x * g - dg.x * f) / determinant;
-    start = {start.x - dx, start.y - dy};
-    if (dx * dx + dy * dy == 0.0) break;
-  }
-  *meeting = start;
-  return true;
-}
 
 std::int32_t FirstOf(Opening const& opening) { return opening.isFree ? 0 : opening.gate.split; }
 
@@ -239,23 +220,7 @@ class ChainSearch {
       length = (end - split) / 2;
     }
     if (!behind.isFound || behind.ratio > 1.0) return false;
-    Gate const middle = MiddleGate(path_, split, from->reach.circle);
-    Place const in = GradientAt(from->reach.circle, middle.origin);
-    Place const out = GradientAt(behind.circle, middle.origin);
-    if (!(std::fabs(Cross(in, out)) > 0.2)) return false;
-    Place meeting;
-    if (!FindMeeting(from->reach.circle, behind.circle, middle.origin, &meeting)) return false;
-    double const dx = meeting.x - middle.origin.x;
-    double const dy = meeting.y - middle.origin.y;
-    double const room = 2.0 * middle.greatest;
-    if (!(dx * dx + dy * dy < room * room)) return false;
-    Place const first = GradientAt(from->reach.circle, meeting);
-    Place const second = GradientAt(behind.circle, meeting);
-    *gate = BisectorGate(meeting, first, second);
-    gate->split = split;
-    gate->least = -room;
-    gate->greatest = room;
-    return true;
+    return CornerGate(path_, split, from->reach.circle, behind.circle, gate);
   }
 
   static State const* BestFor(Level const& level, std::int32_t split) {

@@ -29,6 +29,12 @@ using Result = FewestPieces::Result;
 /// terms stay within the true ones.
 constexpr double kSearchShare = 1.0 - 1e-6;
 
+/// Searches with smaller tolerances where promises fail.
+constexpr int kMostRepairs = 4;
+
+/// At least so many points on either side of a broken promise get a smaller tolerance.
+constexpr std::int32_t kLeastReach = 4;
+
 /// Joints of the open chain at which a closed one is tried to begin.
 constexpr std::size_t kMostSeams = 4;
 
@@ -95,40 +101,89 @@ Answer Restore(Fewest::Shift const& shift, Chain const& chain,
 class Fitter {
  public:
   Fitter(std::vector<WPoint> const& points, Options const& options, Fewest::Shift const& shift,
-         Path const& path, Fewest::Progress* progress)
-      : points_(points), options_(options), shift_(shift), path_(path), progress_(*progress) {}
+         Path path, Fewest::Progress* progress)
+      : points_(points),
+        options_(options),
+        shift_(shift),
+        path_(std::move(path)),
+        progress_(*progress) {}
 
   /// The first contour found that keeps every promise; false when there is none.
   bool Run(Answer* answer, Promises::Report* report) {
-    // Where a promise fails at the full tolerances, smaller ones leave room for it.
-    for (double const share : {1.0, 0.9, 0.7, 0.5, 0.3}) {
-      Chain const chain = Fewest::FindChain(
-          path_, share * kSearchShare, [&](std::int32_t done) { progress_.Tell(20, 80, done); });
-      if (chain.pieces.empty()) continue;
-      if (options_.closed) {
-        if (Close(chain, share * kSearchShare, answer, report)) return true;
-        continue;
-      }
-      if (KeepsCentred(path_, 0, chain, answer, report)) return true;
+    for (int round = 0; round < kMostRepairs; ++round) {
+      if (Search(1.0, answer, report)) return true;
+      if (answer->ranges.empty()) break;
+      Tighten(*answer, *report);
+    }
+    path_.points = shift_.Apply(points_);
+    // What does not yield near the place may yield when all pieces change.
+    for (double const share : {0.9, 0.7, 0.5, 0.3}) {
+      if (Search(share, answer, report)) return true;
     }
     return false;
   }
 
  private:
+  /// Finds and measures one contour; `answer` is without ranges when there was none to measure.
+  bool Search(double share, Answer* answer, Promises::Report* report) {
+    *answer = {};
+    Chain const chain =
+        Fewest::FindChain(path_, share * kSearchShare, [&](std::int32_t done) { Tell(done); });
+    if (chain.pieces.empty()) return false;
+    if (options_.closed) return Close(chain, share * kSearchShare, answer, report);
+    return KeepsCentred(path_, 0, chain, answer, report);
+  }
+
+  void Tell(std::int32_t done) { progress_.Tell(20, 80, done); }
+
+  /// Halves the tolerances of the search about the places where promises fail, which leaves room
+  /// for them and costs a piece there.
+  void Tighten(Answer const& answer, Promises::Report const& report) {
+    for (Promises::Violation const& violation : report.violations) {
+      TightenNear(answer.ranges[violation.piece], violation.at);
+      if (violation.otherPiece != Promises::kNone) {
+        TightenNear(answer.ranges[violation.otherPiece], violation.at);
+      }
+    }
+    path_.leastTolerance *= 0.5;
+  }
+
+  void TightenNear(FewestPieces::Range const& range, GeometryUtils::Point const& at) {
+    std::int32_t const count = path_.Count();
+    std::int32_t const length = (range.last - range.first + count) % count + 1;
+    std::int32_t nearest = 0;
+    double least = std::numeric_limits<double>::infinity();
+    for (std::int32_t k = 0; k < length; ++k) {
+      WPoint const& p = points_[static_cast<std::size_t>((range.first + k) % count)];
+      double const distance = Fewest::DistanceBetween(p, {at.x, at.y, 0.0});
+      if (distance < least) {
+        least = distance;
+        nearest = k;
+      }
+    }
+    std::int32_t const reach = std::max(kLeastReach, length / 8);
+    for (std::int32_t k = nearest - reach; k <= nearest + reach; ++k) {
+      std::int32_t const i = range.first + k;
+      if (!options_.closed && (i < 0 || i >= count)) continue;
+      path_.points[static_cast<std::size_t>((i % count + count) % count)].w *= 0.5;
+    }
+  }
+
   /// The shortest of the chains that begin and end at one of the joints of an open one.
   bool Close(Chain const& open, double share, Answer* answer, Promises::Report* report) {
     bool isFound = false;
     auto cuts = Fewest::CutAtJoints(path_, open, kMostSeams);
     for (Fewest::CutPath& cut : cuts) {
-      Chain const chain =
-          Fewest::CloseChain(&cut, share, [&](std::int32_t done) { progress_.Tell(20, 80, done); });
+      Chain const chain = Fewest::CloseChain(&cut, share, [&](std::int32_t done) { Tell(done); });
       if (chain.pieces.empty()) continue;
       if (isFound && chain.pieces.size() >= answer->ranges.size()) continue;
       Answer closed;
       Promises::Report closedReport;
-      if (!KeepsCentred(cut.path, cut.rotation, chain, &closed, &closedReport)) continue;
+      bool const isKept = KeepsCentred(cut.path, cut.rotation, chain, &closed, &closedReport);
+      if (isFound && !isKept) continue;
       *answer = std::move(closed);
       *report = std::move(closedReport);
+      if (!isKept) continue;
       isFound = true;
       // No closed chain has fewer than the open one less the piece that the end of the input cuts.
       if (answer->ranges.size() + 1 <= open.pieces.size()) return true;
@@ -161,7 +216,7 @@ class Fitter {
   std::vector<WPoint> const& points_;
   Options const& options_;
   Fewest::Shift const& shift_;
-  Path const& path_;
+  Path path_;
   Fewest::Progress& progress_;
 };
 
@@ -183,7 +238,7 @@ ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& op
       path.points, path.limits, [&](std::int32_t done) { progress.Tell(0, 20, done); });
   Answer answer;
   Promises::Report report;
-  if (!Fitter(points, options, shift, path, &progress).Run(&answer, &report)) {
+  if (!Fitter(points, options, shift, std::move(path), &progress).Run(&answer, &report)) {
     return ErrorCode::NoFit;
   }
   progress.Finish();

@@ -128,10 +128,10 @@ bool Simplex::Invert() {
   return true;
 }
 
-bool Simplex::IsAccurate() const {
+bool Simplex::IsAccurate(double slack) const {
   for (std::size_t j = 0; j < 4; ++j) {
     double const residual = std::fabs(Apply(rows_[j], solution_) - limits_[j]);
-    if (!(residual <= 0.1 * slack_ * (limits_[j] > 1.0 ? limits_[j] : 1.0))) return false;
+    if (!(residual <= 0.1 * slack * (limits_[j] > 1.0 ? limits_[j] : 1.0))) return false;
   }
   return true;
 }
@@ -209,9 +209,9 @@ void Simplex::Solve() {
   for (std::size_t j = 0; j < 4; ++j) solution_ = Sum(solution_, limits_[j], inverse_[j]);
 }
 
-Simplex::Entry Simplex::Price(Programme const& programme) const {
+Simplex::Entry Simplex::Price(Programme const& programme, double slack) const {
   Entry entry;
-  double worst = slack_;
+  double worst = slack;
   auto const offer = [&](std::int32_t id, Row const& row, double limit, double excess) {
     if (!(excess > worst)) return;
     worst = excess;
@@ -316,15 +316,18 @@ Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objecti
   Solve();
   int exchanges = 0;
   for (int pivot = 0; pivot < kMostPivots; ++pivot) {
-    if (Apply(objective, solution_) < enough) return Status::Infeasible;
-    Entry const entry = Price(programme);
+    // Rounding grows with the size of the circle, which the form of an objective measures.
+    double const value = Apply(objective, solution_);
+    if (value < enough) return Status::Infeasible;
+    double const slack = value > 1.0 ? slack_ * value : slack_;
+    Entry const entry = Price(programme, slack);
     if (!entry.isFound) {
-      if (exchanges == 0 || IsAccurate()) return Status::Optimal;
+      if (exchanges == 0 || IsAccurate(slack)) return Status::Optimal;
       if (!Invert()) return Status::Stalled;
       if (!MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
       Solve();
       exchanges = 0;
-      if (!Price(programme).isFound) return Status::Optimal;
+      if (!Price(programme, slack).isFound) return Status::Optimal;
       continue;
     }
     std::array<double, 4> step;

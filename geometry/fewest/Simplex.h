@@ -87,10 +87,10 @@ class Simplex {
   Condition::Kind KindOf(Programme const& programme, std::int32_t id) const;
   double LimitOf(Programme const& programme, std::int32_t id) const;
   bool Invert();
-  bool IsAccurate() const;
+  bool IsAccurate(double slack) const;
   bool MakeDualFeasible(Programme const& programme, Row const& objective, Basis* basis);
   void Solve();
-  Entry Price(Programme const& programme) const;
+  Entry Price(Programme const& programme, double slack) const;
   int FindLeaving(Programme const& programme, Basis const& basis, std::array<double, 4> const& step,
                   double* length) const;
   void Exchange(int leaving, Entry const& entry, std::array<double, 4> const& step);

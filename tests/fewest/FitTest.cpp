@@ -122,6 +122,21 @@ TEST(FewestPieces, ScalingByAPowerOfTwoScalesTheBits) {
   }
 }
 
+TEST(FewestPieces, CentringBringsBackTheLinesAndLowersTheDeviation) {
+  FewestPieces::Options options;
+  options.centre = false;
+  FewestPieces::Result plain;
+  FewestPieces::Result centred;
+  ASSERT_EQ(FewestPieces::Fit(LineArcLine(), options, &plain, nullptr, 100), ErrorCode::Ok);
+  ASSERT_EQ(FitPlain(LineArcLine(), &centred), ErrorCode::Ok);
+  ASSERT_EQ(centred.ranges.size(), 3u);
+  EXPECT_EQ(centred.contour[1].type, GeometryUtils::ElemType::Segment);
+  EXPECT_EQ(centred.contour[2].type, GeometryUtils::ElemType::Arc);
+  EXPECT_EQ(centred.contour[3].type, GeometryUtils::ElemType::Segment);
+  EXPECT_NEAR(centred.contour[2].radius, 8.0, 0.2);
+  EXPECT_LT(centred.largestDeviation, plain.largestDeviation);
+}
+
 FewestPieces::Result FitClosed(std::vector<WPoint> const& points) {
   FewestPieces::Options options;
   options.closed = true;
