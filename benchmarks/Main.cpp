@@ -54,6 +54,7 @@ void RegisterAll(Scale scale) {
   RegisterSelfIntersectionOfOthers(scale);
 #endif
   RegisterFitting(scale);
+  RegisterFewest(scale);
 #if defined(VORN_BENCHMARK_PROGRAM)
   RegisterProgram(scale);
 #endif

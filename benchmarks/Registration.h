@@ -6,6 +6,7 @@
 namespace Vorn::Benchmarks {
 
 void RegisterFitting(Scale scale);
+void RegisterFewest(Scale scale);
 void RegisterSelfIntersection(Scale scale);
 void RegisterArea(Scale scale);
 void RegisterIntersections();

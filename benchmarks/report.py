@@ -181,6 +181,42 @@ def fitting_tables(cases):
     return text
 
 
+def fewest_rows(cases):
+    for case in cases.values():
+        effort = case.function.removeprefix("BM_FewestPieces_")
+        if effort == case.function:
+            continue
+        row = [case.profile.replace("_", " "), f"{case.size:,}", effort.lower()]
+        if case.error:
+            yield row + [f"*left out: {left_out(case)}*"] + [""] * 8
+            continue
+        true_pieces = case.get("true_pieces")
+        arcs = int(case.get("arcs"))
+        mixed = cases.get(f"BM_CreateFittingCurve_Mixed/{case.profile}/{case.size}")
+        has_mixed = mixed is not None and mixed.per_item is not None
+        yield row + [
+            time_text(case.per_item),
+            CODES.get(int(case.get("code")), str(int(case.get("code")))),
+            f"{int(case.get('bound')):,}",
+            f"{int(case.get('pieces')):,}",
+            "" if true_pieces is None else f"{int(true_pieces):,}",
+            f"{int(case.get('pieces')) - arcs:,} + {arcs:,}",
+            f"{case.get('largest_relative_deviation'):.3g}",
+            memory_text(case.get("peak_bytes_per_point")),
+            f"{int(mixed.get('pieces')):,} in {time_text(mixed.per_item)}" if has_mixed else "",
+        ]
+
+
+def fewest_table(cases):
+    rows = list(fewest_rows(cases))
+    if not rows:
+        return ""
+    header = ["profile", "N", "effort", "time per point", "answer", "bound", "pieces",
+              "true pieces", "lines + arcs", "largest deviation", "peak memory per point",
+              "strategy `Mixed`"]
+    return "### The fewest pieces\n\n" + table(header, rows) + "\n"
+
+
 def outline_rows(cases, sizes):
     for outline in OUTLINES + tuple(f"{name}_arcs" for name in OUTLINES):
         for size in sizes:
@@ -271,6 +307,7 @@ def write_table(results, cases, build, path):
     text += table(["", ""], machine_rows(results, build)) + "\n"
     text += "## Fitting\n\n![Time of a fit against the number of points](fitting.svg)\n\n"
     text += fitting_tables(cases)
+    text += fewest_table(cases)
     text += "## Self-intersection, time per element\n\n"
     text += "![Time of the test against the number of elements](self_intersection.svg)\n\n"
     text += table(["outline", "N"] + [title for _, title in CHECKS], outline_rows(cases, sizes))
