@@ -112,8 +112,6 @@ class BackwardPass {
   Chain chain_;
 };
 
-constexpr std::size_t kMostSources = 2;
-
 /// Points behind a gate whose circle tells whether there is a corner.
 constexpr std::int32_t kPointsBehind = 16;
 
@@ -265,7 +263,7 @@ class ChainSearch {
         }
       }
       if (isNew) next->push_back(state);
-      if (next->size() - begin >= kMostSources) break;
+      if (next->size() - begin >= path_.limits.mostSources) break;
     }
   }
 

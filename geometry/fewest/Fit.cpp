@@ -29,6 +29,12 @@ using Result = FewestPieces::Result;
 /// terms stay within the true ones.
 constexpr double kSearchShare = 1.0 - 1e-6;
 
+/// From how many states a gate takes offsets, for each effort.
+constexpr std::size_t kSources[] = {2, 4, 64};
+
+/// By how much rounding may change a radius, relative to it.
+constexpr double kRadiusRounding = 1e-9;
+
 /// Searches with smaller tolerances where promises fail.
 constexpr int kMostRepairs = 4;
 
@@ -120,18 +126,31 @@ class Fitter {
     for (double const share : {0.9, 0.7, 0.5, 0.3}) {
       if (Search(share, answer, report)) return true;
     }
-    return false;
+    // Segments keep to the path between the points and have no radius.
+    path_.limits.segmentsOnly = true;
+    return Search(1.0, answer, report);
   }
 
  private:
   /// Finds and measures one contour; `answer` is without ranges when there was none to measure.
   bool Search(double share, Answer* answer, Promises::Report* report) {
     *answer = {};
-    Chain const chain =
-        Fewest::FindChain(path_, share * kSearchShare, [&](std::int32_t done) { Tell(done); });
+    path_.limits.mostSources = kSources[0];
+    Chain chain = FindOpen(share);
+    // A wider look starts from other gates, so it may also end with more pieces.
+    for (std::int32_t effort = 1; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
+      path_.limits.mostSources = kSources[effort];
+      Chain wider = FindOpen(share);
+      bool const isBetter = chain.pieces.empty() || wider.pieces.size() < chain.pieces.size();
+      if (isBetter && !wider.pieces.empty()) chain = std::move(wider);
+    }
     if (chain.pieces.empty()) return false;
     if (options_.closed) return Close(chain, share * kSearchShare, answer, report);
     return KeepsCentred(path_, 0, chain, answer, report);
+  }
+
+  Chain FindOpen(double share) {
+    return Fewest::FindChain(path_, share * kSearchShare, [&](std::int32_t done) { Tell(done); });
   }
 
   void Tell(std::int32_t done) { progress_.Tell(20, 80, done); }
@@ -191,6 +210,14 @@ class Fitter {
     return isFound;
   }
 
+  bool AreRadiiAllowed(std::vector<GeometryUtils::Elem> const& contour) const {
+    return std::all_of(contour.begin(), contour.end(), [&](GeometryUtils::Elem const& elem) {
+      return elem.type == GeometryUtils::ElemType::Segment ||
+             (elem.radius >= options_.smallestRadius * (1.0 - kRadiusRounding) &&
+              elem.radius <= options_.largestRadius * (1.0 + kRadiusRounding));
+    });
+  }
+
   bool KeepsCentred(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
                     Promises::Report* report) const {
     if (options_.centre && Keeps(path, rotation, Fewest::Centre(path, chain), answer, report)) {
@@ -210,7 +237,7 @@ class Fitter {
     }
     *report = Promises::Measure({points_, answer->contour, ranges, options_.closed,
                                  options_.largestStep, options_.farthestBetweenPoints});
-    return report->violations.empty();
+    return report->violations.empty() && AreRadiiAllowed(answer->contour);
   }
 
   std::vector<WPoint> const& points_;

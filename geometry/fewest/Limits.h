@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <limits>
 
 /// What a piece may be, besides within tolerance.
@@ -17,6 +18,8 @@ struct Limits {
   double sineOfHalfStep = 0.5;
   /// How far a piece may leave the path between neighbours; infinite for none.
   double farthestBetweenPoints = std::numeric_limits<double>::infinity();
+  /// From how many states of the level before a gate takes offsets; more look wider.
+  std::size_t mostSources = 2;
 };
 
 }  // namespace Vorn::Fewest

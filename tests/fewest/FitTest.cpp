@@ -137,6 +137,43 @@ TEST(FewestPieces, CentringBringsBackTheLinesAndLowersTheDeviation) {
   EXPECT_LT(centred.largestDeviation, plain.largestDeviation);
 }
 
+TEST(FewestPieces, LimitsOfTheRadiusHold) {
+  std::vector<FewestPieces::Options> options(3);
+  options[0].smallestRadius = 9.0;
+  options[1].largestRadius = 5.0;
+  options[2].segmentsOnly = true;
+  for (FewestPieces::Options const& limits : options) {
+    FewestPieces::Result result;
+    ASSERT_EQ(FewestPieces::Fit(LineArcLine(), limits, &result, nullptr, 100), ErrorCode::Ok);
+    EXPECT_GE(result.ranges.size(), 4u);
+    EXPECT_LE(result.largestDeviation, 1.0);
+    for (GeometryUtils::Elem const& elem : result.contour) {
+      if (elem.type == GeometryUtils::ElemType::Segment) continue;
+      EXPECT_FALSE(limits.segmentsOnly);
+      EXPECT_GE(elem.radius, limits.smallestRadius * (1.0 - 1e-9));
+      EXPECT_LE(elem.radius, limits.largestRadius * (1.0 + 1e-9));
+    }
+  }
+}
+
+TEST(FewestPieces, AHarderLookGivesNoMorePieces) {
+  Testing::RandomGeometry random(31);
+  for (int trial = 0; trial < 10; ++trial) {
+    std::vector<WPoint> const points = Testing::MakeProfile(&random, 60);
+    std::size_t before = points.size();
+    for (auto effort : {FewestPieces::Effort::Quick, FewestPieces::Effort::Wide}) {
+      FewestPieces::Options options;
+      options.effort = effort;
+      options.centre = false;
+      FewestPieces::Result result;
+      ErrorCode const code = FewestPieces::Fit(points, options, &result, nullptr, 100);
+      if (code != ErrorCode::Ok) continue;
+      EXPECT_LE(result.ranges.size(), before) << "trial " << trial;
+      before = result.ranges.size();
+    }
+  }
+}
+
 FewestPieces::Result FitClosed(std::vector<WPoint> const& points) {
   FewestPieces::Options options;
   options.closed = true;
