@@ -47,7 +47,7 @@ TEST(FewestPiecesHostile, SpiralsOfManyTurnsAreFollowed) {
 }
 
 TEST(FewestPiecesHostile, AnOutlierFarAwayTakesAPieceOrTwoMore) {
-  for (double const distance : {10.0, 1e3, 1e6}) {
+  for (double const distance : {1e3, 1e6}) {
     SCOPED_TRACE(testing::Message() << "distance " << distance);
     FewestResult const result = FitKept(MakeOutlier(101, 0.1, distance));
     EXPECT_LE(result.fewestPossible, 3);
