@@ -33,7 +33,14 @@ set(compressed ${PROJECT_BINARY_DIR}/debian)
 file(MAKE_DIRECTORY ${compressed})
 compress(${debian_dir}/changelog ${compressed}/changelog.Debian.gz)
 compress(${PROJECT_SOURCE_DIR}/CHANGELOG.md ${compressed}/changelog.gz)
-compress(${PROJECT_SOURCE_DIR}/docs/man/contour.1 ${compressed}/contour.1.gz)
+
+get_target_property(manual manual MANUAL)
+add_custom_command(
+  OUTPUT ${compressed}/contour.1.gz
+  COMMAND ${gzip_program} -9 --no-name --stdout ${manual} > ${compressed}/contour.1.gz
+  DEPENDS manual ${manual}
+  VERBATIM)
+add_custom_target(compressed_manual ALL DEPENDS ${compressed}/contour.1.gz)
 
 foreach(component IN ITEMS library development io_library io_development tools)
   string(REPLACE library runtime install_component ${component})

@@ -61,9 +61,10 @@ endif()
 if(VORN_DEBIAN_PACKAGES)
   include(DebianPackages)
 else()
-  if(TARGET contour)
+  if(TARGET manual)
+    get_target_property(manual manual MANUAL)
     install(
-      FILES ${PROJECT_SOURCE_DIR}/docs/man/contour.1
+      FILES ${manual}
       DESTINATION ${CMAKE_INSTALL_MANDIR}/man1
       COMPONENT tools)
   endif()

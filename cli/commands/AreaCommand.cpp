@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourInput.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/texts/AreaText.h"
 #include "vorn/io/ContourArea.h"
@@ -70,7 +71,7 @@ ContourFile ReadClosed(Options const& options, std::string const& path, Console 
     return PolygonThrough(
         ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns));
   }
-  ContourFile contour = ReadContour(path, console.in, options.from);
+  ContourFile contour = ReadContourInput(path, options.from, console);
   if (options.doClose) return Closed(std::move(contour));
   if (!IsClosed(contour)) {
     double const gap = Distance(contour.pieces.back().end, contour.pieces.front().start);

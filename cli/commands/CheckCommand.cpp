@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourInput.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/texts/CheckText.h"
@@ -90,7 +91,7 @@ std::string TextFor(Options const& options, CheckReport const& report) {
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
   PointFile file = ReadPointsInput(options.points, console);
-  ContourFile contour = ReadContour(options.contour, console.in, options.from);
+  ContourFile contour = ReadContourInput(options.contour, options.from, console);
   std::string source;
   if (IsToleranceStated(options.points.tolerance, file)) {
     bool const isClosed = FindClosure(file.points, options.closed).isClosed;

@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourInput.h"
 #include "cli/commands/ContourOutput.h"
 #include "cli/commands/Outputs.h"
 #include "vorn/io/Departure.h"
@@ -125,9 +126,7 @@ std::string LineFor(Options const& options, ContourFile const& contour, Converte
 
 void PrintSummary(Options const& options, ContourFile const& contour,
                   std::vector<Converted> const& files, Console const& console) {
-  for (Gap const& gap : FindGaps(contour)) {
-    console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
-  }
+  ReportGaps(contour, console);
   for (Converted const& file : files) {
     if (!IsTooFar(options, file)) continue;
     console.err << "contour: " << (file.path == "-" ? "the standard output" : file.path)
@@ -142,7 +141,7 @@ void PrintSummary(Options const& options, ContourFile const& contour,
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile contour = ReadContour(options.input, console.in, options.from);
+  ContourFile contour = ReadContourInput(options.input, options.from, console);
   if (!options.units.empty()) contour.units = options.units;
   Outputs outputs;
   std::vector<Converted> files;

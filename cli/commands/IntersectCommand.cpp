@@ -4,6 +4,7 @@
 #include <ostream>
 
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourInput.h"
 #include "cli/commands/Outputs.h"
 #include "cli/texts/IntersectionText.h"
 #include "vorn/io/Files.h"
@@ -66,9 +67,9 @@ struct Options {
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile const a = ReadContour(options.a, console.in, options.from);
+  ContourFile const a = ReadContourInput(options.a, options.from, console);
   std::optional<ContourFile> other;
-  if (!options.b.empty()) other = ReadContour(options.b, console.in, options.from);
+  if (!options.b.empty()) other = ReadContourInput(options.b, options.from, console);
   ContourFile const* const b = other ? &*other : nullptr;
   std::vector<Intersection> const found =
       b == nullptr ? SelfIntersectionsOf(a) : IntersectionsOf(a, *b);

@@ -8,6 +8,7 @@
 #include <utility>
 
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourInput.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
 #include "vorn/io/Drawing.h"
@@ -123,10 +124,8 @@ std::string NameOfFile(std::string const& path) {
 }
 
 ContourFile ReadDrawnContour(std::string const& path, Console const& console) {
-  ContourFile contour = ReadContour(path, console.in);
-  for (Gap const& gap : FindGaps(contour)) {
-    console.err << "contour: " << contour.path << ": " << Describe(gap) << '\n';
-  }
+  ContourFile contour = ReadContourInput(path, {}, console);
+  ReportGaps(contour, console);
   return contour;
 }
 

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "cli/texts/Columns.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -11,14 +12,8 @@ namespace Vorn::Cli {
 namespace {
 
 constexpr int kDigits = 10;
-constexpr std::size_t kNameWidth = 12;
 
 std::string Number(double value) { return FormatShort(value, kDigits); }
-
-std::string Fact(std::string name, std::string const& text) {
-  name.resize(kNameWidth, ' ');
-  return name + text + "\n";
-}
 
 std::string PointText(XY const& point) {
   return "(" + Number(point.x) + ", " + Number(point.y) + ")";

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "cli/texts/Columns.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -12,15 +13,7 @@ namespace {
 
 /// Gaps and places where the contour meets itself are listed up to here.
 constexpr std::size_t kMostPlaces = 10;
-constexpr std::size_t kNameWidth = 12;
 constexpr int kRelativeDecimals = 6;
-
-using Row = std::vector<std::string>;
-
-std::string Fact(std::string name, std::string const& text) {
-  name.resize(kNameWidth, ' ');
-  return name + text + "\n";
-}
 
 std::string PlaceOf(CheckReport const& report, std::size_t point) {
   PointDeviation const& deviation = report.deviations[point];
@@ -134,23 +127,6 @@ Row PointRow(CheckReport const& report, std::size_t point) {
     row.push_back(FormatFixed(deviation.relative, kRelativeDecimals));
   }
   return row;
-}
-
-std::string Aligned(std::vector<Row> const& rows) {
-  std::vector<std::size_t> widths(rows.front().size());
-  for (Row const& row : rows) {
-    for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
-  }
-  std::string text;
-  for (Row const& row : rows) {
-    for (std::size_t i = 0; i < row.size(); ++i) {
-      if (i > 0) text += "  ";
-      text.append(widths[i] - row[i].size(), ' ');
-      text += row[i];
-    }
-    text += "\n";
-  }
-  return text;
 }
 
 }  // namespace

@@ -4,14 +4,13 @@
 #include <cmath>
 #include <numbers>
 
+#include "cli/texts/Columns.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
 namespace {
-
-using Row = std::vector<std::string>;
 
 constexpr int kMostDecimals = 9;
 constexpr double kLargestFixed = 1e9;
@@ -60,26 +59,6 @@ Row PieceRow(FitReport const& report, std::size_t i, LengthFormat const& length)
   row.push_back(length(piece.length));
   row.push_back(report.ranges ? std::to_string((*report.ranges)[i].count) : "-");
   return row;
-}
-
-/// Columns as wide as their widest entry; words to the left, numbers to the right.
-std::string Aligned(std::vector<Row> const& rows) {
-  std::vector<std::size_t> widths(rows.front().size());
-  for (Row const& row : rows) {
-    for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
-  }
-  std::string text;
-  for (Row const& row : rows) {
-    std::string line;
-    for (std::size_t i = 0; i < row.size(); ++i) {
-      std::string const padding(widths[i] - row[i].size(), ' ');
-      bool const isWord = rows.front()[i] == "kind" || rows.front()[i] == "direction";
-      line += (i > 0 ? "  " : "") + (isWord ? row[i] + padding : padding + row[i]);
-    }
-    line.erase(line.find_last_not_of(' ') + 1);
-    text += line + "\n";
-  }
-  return text;
 }
 
 std::string WithUnits(std::string const& number, FitReport const& report) {
@@ -153,8 +132,8 @@ std::string ToTable(FitReport const& report, std::optional<int> digits,
     rows.push_back(PieceRow(report, i, length));
   }
   std::string const units = report.file.units.empty() ? "" : ", lengths in " + report.file.units;
-  return report.file.path + units + ", sweeps in degrees\n\n" + Aligned(rows) + "\n" +
-         Summary(report, readBack);
+  return report.file.path + units + ", sweeps in degrees\n\n" +
+         Aligned(rows, {"kind", "direction"}) + "\n" + Summary(report, readBack);
 }
 
 }  // namespace Vorn::Cli

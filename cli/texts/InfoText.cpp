@@ -2,6 +2,7 @@
 
 #include <algorithm>
 
+#include "cli/texts/Columns.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -10,15 +11,11 @@ namespace Vorn::Cli {
 namespace {
 
 constexpr std::size_t kMostListed = 10;
-constexpr std::size_t kNameWidth = 12;
 
 /// Lines of a name and a text; lines without a name go on with the one above.
 class FactList {
  public:
-  void Add(std::string name, std::string const& text) {
-    name.resize(kNameWidth, ' ');
-    text_ += name + text + "\n";
-  }
+  void Add(std::string const& name, std::string const& text) { text_ += Fact(name, text); }
 
   void GoOn(std::string const& text) { Add("", text); }
 

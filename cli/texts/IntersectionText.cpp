@@ -2,14 +2,13 @@
 
 #include <algorithm>
 
+#include "cli/texts/Columns.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
 namespace {
-
-using Row = std::vector<std::string>;
 
 constexpr int kDigits = 10;
 
@@ -28,23 +27,6 @@ std::string Heading(std::vector<Intersection> const& found, ContourFile const& a
   std::string const who = b == nullptr ? a.path + " with itself" : a.path + " with " + b->path;
   if (found.empty()) return who + ": no intersections\n";
   return who + ": " + Describe(Tally(found)) + "\n";
-}
-
-std::string Aligned(std::vector<Row> const& rows) {
-  std::vector<std::size_t> widths(rows.front().size());
-  for (Row const& row : rows) {
-    for (std::size_t i = 0; i < row.size(); ++i) widths[i] = std::max(widths[i], row[i].size());
-  }
-  std::string text;
-  for (Row const& row : rows) {
-    for (std::size_t i = 0; i < row.size(); ++i) {
-      text += i == 0 ? "" : "  ";
-      text.append(widths[i] - row[i].size(), ' ');
-      text += row[i];
-    }
-    text += "\n";
-  }
-  return text;
 }
 
 }  // namespace

@@ -19,7 +19,7 @@ namespace {
 namespace fs = std::filesystem;
 
 [[noreturn]] void Refuse(std::string const& path, std::string const& reason) {
-  throw Failure(FailureKind::File, path + ": cannot be written: " + reason);
+  throw Failure(FailureKind::File, {path}, "cannot be written: " + reason);
 }
 
 /// Behind symbolic links: the new contents go where a plain write would have put them.

@@ -17,7 +17,7 @@ constexpr std::size_t kFirstBlock = 64 * 1024;
 constexpr std::size_t kLargestText = std::size_t{4} << 30;
 
 [[noreturn]] void Refuse(std::string const& path, std::string const& message) {
-  throw Failure(FailureKind::File, InputName(path) + ": " + message);
+  throw Failure(FailureKind::File, {InputName(path)}, message);
 }
 
 /// One byte more than the file holds, so that its end is seen without another block.

@@ -82,7 +82,8 @@ Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece> pieces) {
   if (drawing.points.empty() || !drawing.HasContour()) return drawing;
   drawing.deviations = Remeasure(drawing.points, drawing.pieces).points;
   if (drawing.HasTolerances()) {
-    bool const isWithin = drawing.deviations[drawing.Worst()].relative <= kLargestRelative;
+    bool const isWithin =
+        IsWithinTolerance(drawing.deviations[drawing.Worst()], drawing.points[drawing.Worst()]);
     drawing.verdict = isWithin ? Verdict::WithinTolerance : Verdict::OutsideTolerance;
   }
   return drawing;

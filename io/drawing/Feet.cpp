@@ -2,13 +2,12 @@
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
+
+#include "io/pieces/Turning.h"
 
 namespace Vorn::IO {
 
 namespace {
-
-using std::numbers::pi;
 
 Foot FootOnLine(Piece const& line, double x, double y) {
   double const alongX = line.end.x - line.start.x;
@@ -23,10 +22,7 @@ Foot FootOnLine(Piece const& line, double x, double y) {
 Foot FootOnArc(Piece const& arc, double x, double y) {
   double const fromX = x - arc.center.x;
   double const fromY = y - arc.center.y;
-  double const polar = std::atan2(fromY, fromX);
-  double turn =
-      std::fmod(arc.counterClockwise ? polar - arc.startAngle : arc.startAngle - polar, 2.0 * pi);
-  if (turn < 0.0) turn += 2.0 * pi;
+  double const turn = TurnTo(arc, x, y);
   double const distance = std::hypot(fromX, fromY);
   if (turn <= arc.sweep && distance > 0.0) {
     double const reach = arc.radius / distance;

@@ -5,6 +5,7 @@
 
 #include "io/fit/Fit.h"
 #include "io/fit/FullCircle.h"
+#include "io/fit/LocalFrame.h"
 #include "io/fit/MakeReport.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/FitContour.h"
@@ -19,25 +20,25 @@ constexpr std::size_t kLeastClosedPoints = 3;
 [[noreturn]] void RefuseTooClose(PointFile const& file, FitChoice const& choice,
                                  std::vector<WPoint> const& fitted, ClosePair const& pair) {
   throw Failure(
-      FailureKind::PointsTooClose,
+      FailureKind::PointsTooClose, {file.path},
       DescribeClosePair(file, pair, LargestSingleTolerance(fitted), OptionsFor(choice.tolerance)));
 }
 
 void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
   if (answer.code != ErrorCode::Ok) {
-    throw Failure(FailureKind::NoFit, file.path + ": no fit (code " + Describe(answer.code) + ")");
+    throw Failure(FailureKind::NoFit, {file.path}, "no fit (code " + Describe(answer.code) + ")");
   }
   if (answer.contour.size() < 2) {
-    throw Failure(FailureKind::NoFit, file.path + ": no fit (the contour has no pieces)");
+    throw Failure(FailureKind::NoFit, {file.path}, "no fit (the contour has no pieces)");
   }
 }
 
 FitReport FitOpen(PointFile file, std::string toleranceSource, Closure const& closure,
                   FitChoice const& choice, ExecutionState* progress) {
   if (choice.start) {
-    throw Failure(FailureKind::BadArgument,
-                  file.path + ": --start is for closed contours, and this one is " + "open (" +
-                      closure.reason + "); --closed yes closes it");
+    throw Failure(FailureKind::BadArgument, {file.path},
+                  "--start is for closed contours, and this one is open (" + closure.reason +
+                      "); --closed yes closes it");
   }
   FitAnswer answer = Fit(file.points, choice.strategy, progress);
   if (answer.code == ErrorCode::PointsTooClose) {
@@ -56,10 +57,10 @@ std::optional<std::size_t> SeamOf(PointFile const& file, Closure const& closure,
                                   FitChoice const& choice) {
   if (!choice.start) return SharpestCorner(file.points, closure);
   if (*choice.start >= file.points.size()) {
-    throw Failure(FailureKind::BadArgument, file.path + ": --start " +
-                                                std::to_string(*choice.start) +
-                                                ": the points are counted from 0 to " +
-                                                std::to_string(file.points.size() - 1));
+    throw Failure(FailureKind::BadArgument, {file.path},
+                  "--start " + std::to_string(*choice.start) +
+                      ": the points are counted from 0 to " +
+                      std::to_string(file.points.size() - 1));
   }
   return *choice.start;
 }
@@ -160,19 +161,28 @@ FitReport FitClosed(PointFile file, std::string toleranceSource, Closure const& 
 
 void RequirePoints(PointFile const& file, Closure const& closure) {
   if (file.points.size() < kLeastClosedPoints + (closure.repeatsFirst ? 1 : 0)) {
-    throw Failure(FailureKind::BadArgument,
-                  file.path + ": a closed contour needs three different points");
+    throw Failure(FailureKind::BadArgument, {file.path},
+                  "a closed contour needs three different points");
   }
 }
 
-}  // namespace
-
-FitReport FitContour(PointFile file, FitChoice const& choice, ExecutionState* progress) {
+/// The points lie in a local frame already.
+FitReport FitLocally(PointFile file, FitChoice const& choice, ExecutionState* progress) {
   Closure const closure = FindClosure(file.points, choice.closed);
   if (closure.isClosed) RequirePoints(file, closure);
   std::string source = AssignTolerances(choice.tolerance, &file, closure.isClosed);
   return (closure.isClosed ? FitClosed : FitOpen)(std::move(file), std::move(source), closure,
                                                   choice, progress);
+}
+
+}  // namespace
+
+FitReport FitContour(PointFile file, FitChoice const& choice, ExecutionState* progress) {
+  XY const origin = LocalOrigin(file.points);
+  file.points = TakenOff(std::move(file.points), origin);
+  FitReport report = FitLocally(std::move(file), choice, progress);
+  PutBack(origin, &report);
+  return report;
 }
 
 }  // namespace Vorn::IO

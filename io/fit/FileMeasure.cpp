@@ -34,8 +34,6 @@ std::optional<std::string> GCodeWith(int decimals, ContourFile const& contour,
 
 }  // namespace
 
-bool FileMeasure::IsWithin() const { return unreadable.empty() && relative <= kLargestRelative; }
-
 FileMeasure MeasureText(std::string_view text, Format format, std::vector<WPoint> const& points) {
   FileMeasure measure;
   try {
@@ -43,6 +41,7 @@ FileMeasure MeasureText(std::string_view text, Format format, std::vector<WPoint
     Remeasured const remeasured = Remeasure(points, contour.pieces);
     measure.relative = remeasured.Worst().relative;
     measure.point = remeasured.worst;
+    measure.isWithin = AreWithinTolerance(remeasured, points);
   } catch (Failure const& failure) {
     measure.unreadable = failure.what();
   }
@@ -53,7 +52,7 @@ std::string ToTextFor(std::vector<WPoint> const& points, ContourFile const& cont
                       WriteOptions options) {
   if (format != Format::GCode) return ToText(contour, format, options);
   options.gcode.tolerance = SmallestTolerance(points);
-  bool const isWithin = Remeasure(points, contour.pieces).Worst().relative <= kLargestRelative;
+  bool const isWithin = AreWithinTolerance(Remeasure(points, contour.pieces), points);
   int const first = GCodeDecimals(contour.units, options.gcode.tolerance);
   if (!options.gcode.decimals && isWithin) {
     int const last = std::min(first + kMostExtraDecimals, kMostGCodeDecimals);

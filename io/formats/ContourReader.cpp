@@ -15,7 +15,7 @@ namespace {
 void RefuseBinary(std::string_view text, std::string const& path) {
   std::size_t const zero = text.find('\0');
   if (zero != std::string_view::npos) {
-    throw Failure(FailureKind::File, path + ":" + PlaceOf(text, zero) + ": is binary, not text");
+    throw Failure(FailureKind::File, PlaceIn(text, zero, path), "is binary, not text");
   }
 }
 
@@ -42,8 +42,8 @@ ContourFile ParseAs(Format format, std::string_view text, std::string const& pat
     case Format::Wkt:
       return ParseWkt(text, path);
     default:
-      throw Failure(FailureKind::BadArgument,
-                    path + ": a contour cannot be read from " + NameOf(format));
+      throw Failure(FailureKind::BadArgument, {path},
+                    "a contour cannot be read from " + NameOf(format));
   }
 }
 
@@ -56,6 +56,8 @@ ContourFile ParseContour(std::string_view text, std::string const& path,
   ContourFile contour = ParseAs(format ? *format : RecognisedFormat(text, path), text, path);
   contour.path = path;
   if (contour.pieces.empty()) RefuseFile(path, "holds no contour: there are no pieces");
+  contour.leftOut = RemovePiecesWithoutLength(&contour.pieces);
+  if (contour.pieces.empty()) RefuseFile(path, "holds no contour: no piece has a length");
   return contour;
 }
 

@@ -98,13 +98,14 @@ Stretch CircleOf(Entity const& entity) {
 Stretch PolylineOf(Entity const& entity, std::vector<Vertex> vertices, bool isClosed) {
   if (vertices.size() < 2) entity.Refuse("has fewer than two vertices");
   Stretch stretch;
-  if (isClosed) vertices.push_back(vertices.front());
+  // A closed polyline may repeat its first vertex at its end.
+  if (isClosed && !AreEqual(vertices.front().at, vertices.back().at)) {
+    vertices.push_back(vertices.front());
+  }
   for (std::size_t i = 1; i < vertices.size(); ++i) {
     Vertex const& from = vertices[i - 1];
-    if (AreEqual(from.at, vertices[i].at)) continue;
     stretch.pieces.push_back(MakeBulge(from.at, vertices[i].at, from.bulge));
   }
-  if (stretch.pieces.empty()) entity.Refuse("has no length");
   return stretch;
 }
 

@@ -106,7 +106,9 @@ bool HoldsContour(Format format) {
   return format != Format::Svg && format != Format::Html && format != Format::Png;
 }
 
-std::string ToText(ContourFile const& contour, Format format, WriteOptions const& options) {
+namespace {
+
+std::string Written(ContourFile const& contour, Format format, WriteOptions const& options) {
   switch (format) {
     case Format::Json:
       return ToJson(contour);
@@ -119,8 +121,20 @@ std::string ToText(ContourFile const& contour, Format format, WriteOptions const
     case Format::Wkt:
       return ToWkt(contour);
     default:
-      throw Failure(FailureKind::Internal, NameOf(format) + " holds no contour");
+      throw Failure(FailureKind::BadArgument, NameOf(format) + " holds no contour");
   }
+}
+
+}  // namespace
+
+std::string ToText(ContourFile const& contour, Format format, WriteOptions const& options) {
+  ContourFile written = contour;
+  RemovePiecesWithoutLength(&written.pieces);
+  if (written.pieces.empty()) {
+    throw Failure(FailureKind::BadArgument, {contour.path},
+                  "there is nothing to write: no piece has a length");
+  }
+  return Written(written, format, options);
 }
 
 }  // namespace Vorn::IO

@@ -36,9 +36,9 @@ void WriteUnits(ContourFile const& contour, ToolPath* tool) {
   } else if (contour.units.empty()) {
     tool->Line("(units not known: neither G20 nor G21)");
   } else {
-    throw Failure(FailureKind::BadArgument,
-                  contour.path + ": G-code is in mm or inch, and the contour is in " +
-                      Quoted(contour.units) + "; see --units");
+    throw Failure(FailureKind::BadArgument, {contour.path},
+                  "G-code is in mm or inch, and the contour is in " + Quoted(contour.units) +
+                      "; see --units");
   }
 }
 
@@ -94,8 +94,8 @@ int GCodeDecimals(std::string const& units, std::optional<double> tolerance) {
 
 std::string ToGCode(ContourFile const& contour, GCodeOptions const& options) {
   if (options.plane == Plane::G18 && options.safeHeight) {
-    throw Failure(FailureKind::BadArgument,
-                  contour.path + ": heights are for the plane of X and Y, not for X and Z");
+    throw Failure(FailureKind::BadArgument, {contour.path},
+                  "heights are for the plane of X and Y, not for X and Z");
   }
   std::vector<NamedField> const fields = FieldsOf(contour, options);
   ToolPath tool(contour, options);
@@ -104,8 +104,8 @@ std::string ToGCode(ContourFile const& contour, GCodeOptions const& options) {
   tool.Line(options.plane == Plane::G18 ? "G18 G90 G91.1" : "G17 G90 G91.1");
   CutPieces(contour, options, &tool);
   if (!tool.HasCut()) {
-    throw Failure(FailureKind::BadArgument,
-                  contour.path + ": is smaller than the last digit of the G-code");
+    throw Failure(FailureKind::BadArgument, {contour.path},
+                  "is smaller than the last digit of the G-code");
   }
   tool.Retract();
   WriteText(FilledIn(options.footer, fields), &tool);

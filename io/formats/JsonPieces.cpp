@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <numbers>
+#include <optional>
 
 #include "io/base/Words.h"
 #include "io/formats/Text.h"
@@ -23,20 +24,58 @@ constexpr double kLargestSweep = 2.0 * std::numbers::pi * (1.0 + 1e-6);
 
 OrderedJson PointJson(XY const& point) { return {{"x", point.x}, {"y", point.y}}; }
 
+/// The documents read here are five levels deep.
+constexpr std::size_t kDeepest = 64;
+
+/// Where brackets are nested deeper than that; nothing in good documents.
+std::optional<std::size_t> FindTooDeep(std::string_view text) {
+  std::size_t depth = 0;
+  bool isInString = false;
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    char const c = text[i];
+    if (c == '"') isInString = !isInString;
+    if (isInString && c == '\\') ++i;
+    if (isInString) continue;
+    if (c == '[' || c == '{') ++depth;
+    if ((c == ']' || c == '}') && depth > 0) --depth;
+    if (depth > kDeepest) return i;
+  }
+  return {};
+}
+
+std::string ComplaintAt(std::string_view text, std::size_t offset) {
+  if (offset >= Trimmed(text).size()) return "is not JSON to the end: the text stops early";
+  std::size_t const lineEnd = text.find('\n', offset);
+  return "is not JSON from here on: " + Quoted(text.substr(offset, lineEnd - offset));
+}
+
 json Parsed(std::string_view text, std::string const& path) {
+  if (std::optional<std::size_t> const deep = FindTooDeep(text)) {
+    throw Failure(FailureKind::File, PlaceIn(text, *deep, path),
+                  "is nested deeper than " + std::to_string(kDeepest) + " brackets");
+  }
   try {
     return json::parse(text);
   } catch (json::parse_error const& error) {
     std::size_t const offset = std::min(error.byte > 0 ? error.byte - 1 : 0, text.size());
-    bool const isCut = offset >= Trimmed(text).size();
-    throw Failure(FailureKind::File,
-                  path + ":" + PlaceOf(text, offset) + ": is not JSON " +
-                      (isCut ? "to the end: the text stops early"
-                             : "from here on: " +
-                                   Quoted(text.substr(offset, text.find('\n', offset) - offset))));
+    throw Failure(FailureKind::File, PlaceIn(text, offset, path), ComplaintAt(text, offset));
   } catch (json::exception const&) {
-    throw Failure(FailureKind::File, path + ": a number is too large for a double");
+    RefuseFile(path, "a number is too large for a double");
   }
+}
+
+/// The beginning of the value as JSON, a little longer than a message quotes.
+std::string BeginningOf(json const& value) {
+  constexpr std::size_t kEnough = 64;
+  if (!value.is_structured()) return value.dump(-1, ' ', false, json::error_handler_t::replace);
+  std::string text(1, value.is_array() ? '[' : '{');
+  for (auto const& item : value.items()) {
+    if (text.size() > kEnough) return text;
+    if (text.size() > 1) text += ',';
+    if (value.is_object()) text += '"' + item.key() + "\":";
+    text += BeginningOf(item.value());
+  }
+  return text + (value.is_array() ? ']' : '}');
 }
 
 /// One value of the document, with the way to it for messages: `elements[2].end.x`.
@@ -92,9 +131,7 @@ class Field {
 
   XY At() const { return {(*this)["x"].Number(), (*this)["y"].Number()}; }
 
-  std::string Text() const {
-    return Quoted(value_.dump(-1, ' ', false, json::error_handler_t::replace));
-  }
+  std::string Text() const { return Quoted(BeginningOf(value_)); }
 
  private:
   json const& value_;

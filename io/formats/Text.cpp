@@ -34,11 +34,11 @@ bool Lines::Next(std::string_view* line) {
 }
 
 void RefuseFile(std::string const& path, std::string const& message) {
-  throw Failure(FailureKind::File, path + ": " + message);
+  throw Failure(FailureKind::File, {path}, message);
 }
 
 void RefuseLine(std::string const& path, std::size_t line, std::string const& message) {
-  throw Failure(FailureKind::File, path + ":" + std::to_string(line) + ": " + message);
+  throw Failure(FailureKind::File, {path, line}, message);
 }
 
 double RequireNumber(std::string_view text, std::string const& what, std::string const& path,
@@ -67,13 +67,13 @@ std::string OneLine(std::string text) {
   return text;
 }
 
-std::string PlaceOf(std::string_view text, std::size_t offset) {
+Place PlaceIn(std::string_view text, std::size_t offset, std::string const& path) {
   std::string_view const before = text.substr(0, offset);
-  auto const line = std::count(before.begin(), before.end(), '\n') + 1;
+  auto const line = static_cast<std::size_t>(std::count(before.begin(), before.end(), '\n')) + 1;
   std::size_t const lineEnd = before.rfind('\n');
   std::size_t const column =
       lineEnd == std::string_view::npos ? before.size() + 1 : before.size() - lineEnd;
-  return std::to_string(line) + ":" + std::to_string(column);
+  return {path, line, column};
 }
 
 }  // namespace Vorn::IO

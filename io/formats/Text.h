@@ -5,6 +5,7 @@
 #include <string_view>
 
 #include "io/base/TextLines.h"
+#include "vorn/io/Failure.h"
 
 /// What the readers of contour files have in common.
 namespace Vorn::IO {
@@ -43,7 +44,7 @@ std::string FormatPlain(double value);
 /// With blanks in place of line breaks, so that a comment stays one.
 std::string OneLine(std::string text);
 
-/// Line and column of a place in the text, both counted from 1: "3:17".
-std::string PlaceOf(std::string_view text, std::size_t offset);
+/// Line and column of a place in the text of a file.
+Place PlaceIn(std::string_view text, std::size_t offset, std::string const& path);
 
 }  // namespace Vorn::IO

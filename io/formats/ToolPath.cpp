@@ -63,7 +63,7 @@ void ToolPath::Cut(Piece const& piece, std::size_t number) {
 }
 
 void ToolPath::Refuse(std::string const& message) const {
-  throw Failure(FailureKind::BadArgument, path_ + ": " + message);
+  throw Failure(FailureKind::BadArgument, {path_}, message);
 }
 
 std::string ToolPath::Written(double value) const { return FormatFixed(value, decimals_); }

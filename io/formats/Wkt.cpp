@@ -91,7 +91,7 @@ class Reader {
             ? "the text stops early"
             : Quoted(rest.substr(0, std::max<std::size_t>(1, rest.find_first_of(" ,()\t\r\n")))) +
                   " " + complaint;
-    throw Failure(FailureKind::File, path_ + ":" + PlaceOf(text_, at_) + ": " + what);
+    throw Failure(FailureKind::File, PlaceIn(text_, at_, path_), what);
   }
 
   bool TakeSign(char sign) {
@@ -251,7 +251,7 @@ class Reader {
   }
 
   [[noreturn]] void RefuseList(std::string const& message) {
-    throw Failure(FailureKind::File, path_ + ":" + PlaceOf(text_, at_) + ": " + message);
+    throw Failure(FailureKind::File, PlaceIn(text_, at_, path_), message);
   }
 
   std::string_view text_;

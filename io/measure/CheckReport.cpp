@@ -25,11 +25,11 @@ std::size_t IndexOfFurthest(std::vector<PointDeviation> const& deviations) {
       deviations.begin());
 }
 
-/// Written so that a deviation that is not a number is outside.
-std::vector<std::size_t> IndicesOutside(std::vector<PointDeviation> const& deviations) {
+std::vector<std::size_t> IndicesOutside(std::vector<PointDeviation> const& deviations,
+                                        std::vector<WPoint> const& points) {
   std::vector<std::size_t> outside;
   for (std::size_t i = 0; i < deviations.size(); ++i) {
-    if (!(deviations[i].relative <= kLargestRelative)) outside.push_back(i);
+    if (!IsWithinTolerance(deviations[i], points[i])) outside.push_back(i);
   }
   return outside;
 }
@@ -61,7 +61,8 @@ CheckReport MakeCheckReport(PointFile file, std::string toleranceSource, Contour
   report.deviations = std::move(remeasured.points);
   report.worst = remeasured.worst;
   report.furthest = IndexOfFurthest(report.deviations);
-  if (report.HasTolerances()) report.outside = IndicesOutside(report.deviations);
+  if (report.HasTolerances())
+    report.outside = IndicesOutside(report.deviations, report.file.points);
   report.gaps = FindGaps(report.contour);
   report.meetings = SelfIntersectionsOf(report.contour);
   if (report.contour.isClosed && Tally(report.meetings).crossings == 0) {

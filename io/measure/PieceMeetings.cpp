@@ -4,6 +4,7 @@
 #include <cmath>
 #include <numbers>
 
+#include "io/pieces/Turning.h"
 #include "vorn/GeometryUtils.h"
 #include "vorn/io/Deviations.h"
 
@@ -22,13 +23,6 @@ XY Minus(XY const& a, XY const& b) { return {a.x - b.x, a.y - b.y}; }
 double Cross(XY const& a, XY const& b) { return a.x * b.y - a.y * b.x; }
 
 double Dot(XY const& a, XY const& b) { return a.x * b.x + a.y * b.y; }
-
-/// Radians from the start of the arc in its sense of travel, 0 to a full turn.
-double TurnTo(Piece const& arc, XY const& point) {
-  double const polar = std::atan2(point.y - arc.center.y, point.x - arc.center.x);
-  double const raw = arc.counterClockwise ? polar - arc.startAngle : arc.startAngle - polar;
-  return raw - kFullTurn * std::floor(raw / kFullTurn);
-}
 
 bool IsOn(Piece const& piece, XY const& point, double tolerance) {
   return DistanceTo(piece, point.x, point.y) <= tolerance;
@@ -178,7 +172,7 @@ std::vector<Meeting> MeetingsOf(Piece const& a, Piece const& b, double tolerance
 
 double PositionOn(Piece const& piece, XY const& point) {
   if (piece.IsArc()) {
-    double const turn = TurnTo(piece, point);
+    double const turn = TurnTo(piece, point.x, point.y);
     // Beyond the end: the nearer end, which for a point on the arc is off by rounding only.
     if (turn > piece.sweep) {
       return turn - piece.sweep < kFullTurn - turn ? piece.length : 0.0;

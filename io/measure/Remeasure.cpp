@@ -1,7 +1,9 @@
 // The second opinion on a fit. It shares no formula with the library: distances are taken to the
 // pieces as drawn, clipped at their ends, and not to the endless lines and full circles that a
 // fit works with.
+#include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "io/pieces/PieceIndex.h"
 #include "vorn/io/Deviations.h"
@@ -37,6 +39,19 @@ Remeasured Remeasure(std::vector<WPoint> const& points, std::vector<Piece> const
     }
   }
   return result;
+}
+
+bool IsWithinTolerance(PointDeviation const& deviation, WPoint const& point) {
+  // Both ends and the centre of a piece are rounded by at most half a last place each, in x and in
+  // y; four whole ones are beyond what can come together.
+  constexpr double kLastPlaces = 4.0 * std::numeric_limits<double>::epsilon();
+  double const rounding = kLastPlaces * std::max(std::fabs(point.x), std::fabs(point.y));
+  return deviation.distance <= kLargestRelative * point.w + rounding;
+}
+
+bool AreWithinTolerance(Remeasured const& measured, std::vector<WPoint> const& points) {
+  return std::equal(measured.points.begin(), measured.points.end(), points.begin(), points.end(),
+                    IsWithinTolerance);
 }
 
 }  // namespace Vorn::IO

@@ -1,17 +1,18 @@
 #include "io/pieces/BoxIndex.h"
 
 #include <algorithm>
-#include <limits>
 
 namespace Vorn::IO {
 
 namespace {
 
-constexpr double kFar = std::numeric_limits<double>::infinity();
-
 Extent Joined(Extent const& a, Extent const& b) {
   return {{std::min(a.low.x, b.low.x), std::min(a.low.y, b.low.y)},
           {std::max(a.high.x, b.high.x), std::max(a.high.y, b.high.y)}};
+}
+
+Extent Widened(Extent const& box, double margin) {
+  return {{box.low.x - margin, box.low.y - margin}, {box.high.x + margin, box.high.y + margin}};
 }
 
 bool DoMeet(Extent const& a, Extent const& b) {
@@ -20,27 +21,19 @@ bool DoMeet(Extent const& a, Extent const& b) {
 
 }  // namespace
 
-BoxIndex::BoxIndex(std::vector<Piece> const& pieces, double margin) {
-  while (firstLeaf_ < pieces.size()) firstLeaf_ *= 2;
-  boxes_.resize(2 * firstLeaf_, Extent{{kFar, kFar}, {-kFar, -kFar}});
-  for (std::size_t i = 0; i < pieces.size(); ++i) {
-    Extent const box = ExtentOf({pieces[i]});
-    boxes_[firstLeaf_ + i] = {{box.low.x - margin, box.low.y - margin},
-                              {box.high.x + margin, box.high.y + margin}};
-  }
-  for (std::size_t node = firstLeaf_ - 1; node > 0; --node) {
-    boxes_[node] = Joined(boxes_[2 * node], boxes_[2 * node + 1]);
-  }
-}
+BoxIndex::BoxIndex(std::vector<Piece> const& pieces, double margin)
+    : tree_(
+          pieces.size(), [&](std::size_t i) { return Widened(ExtentOf({pieces[i]}), margin); },
+          Joined) {}
 
 void BoxIndex::Visit(Extent const& box, std::function<void(std::size_t)> const& visit) const {
-  Search(1, box, visit);
+  Search(ArrayTree<Extent>::kRoot, box, visit);
 }
 
 void BoxIndex::Search(std::size_t node, Extent const& box,
                       std::function<void(std::size_t)> const& visit) const {
-  if (!DoMeet(boxes_[node], box)) return;
-  if (node >= firstLeaf_) return visit(node - firstLeaf_);
+  if (!tree_.Has(node) || !DoMeet(tree_[node], box)) return;
+  if (tree_.IsLeaf(node)) return visit(tree_.ItemOf(node));
   Search(2 * node, box, visit);
   Search(2 * node + 1, box, visit);
 }

@@ -4,7 +4,8 @@
 #include <functional>
 #include <vector>
 
-#include "io/pieces/Shapes.h"
+#include "io/pieces/ArrayTree.h"
+#include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
 
@@ -22,10 +23,7 @@ class BoxIndex {
   void Search(std::size_t node, Extent const& box,
               std::function<void(std::size_t)> const& visit) const;
 
-  /// A binary tree in an array: the children of node n are 2 n and 2 n + 1, the leaves are the
-  /// pieces in order, from firstLeaf_ on.
-  std::vector<Extent> boxes_;
-  std::size_t firstLeaf_ = 1;
+  ArrayTree<Extent> tree_;
 };
 
 }  // namespace Vorn::IO

@@ -8,6 +8,13 @@
 
 namespace Vorn::IO {
 
+std::size_t RemovePiecesWithoutLength(std::vector<Piece>* pieces) {
+  auto const isPoint = [](Piece const& piece) {
+    return AreEqual(piece.start, piece.end) && (!piece.IsArc() || piece.sweep == 0.0);
+  };
+  return std::erase_if(*pieces, isPoint);
+}
+
 double JointTolerance(std::vector<Piece> const& pieces) {
   double coordinate = 0.0;
   double radius = 0.0;

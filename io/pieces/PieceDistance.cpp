@@ -1,14 +1,12 @@
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 
+#include "io/pieces/Turning.h"
 #include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
 
 namespace {
-
-using std::numbers::pi;
 
 double DistanceToLine(Piece const& line, double x, double y) {
   double const alongX = line.end.x - line.start.x;
@@ -19,14 +17,6 @@ double DistanceToLine(Piece const& line, double x, double y) {
   if (!(length2 > 0.0)) return std::hypot(fromX, fromY);
   double const part = std::clamp((fromX * alongX + fromY * alongY) / length2, 0.0, 1.0);
   return std::hypot(fromX - part * alongX, fromY - part * alongY);
-}
-
-/// Radians turned from the start of the arc to the direction of (x, y), in [0, 2 pi).
-double TurnTo(Piece const& arc, double x, double y) {
-  double const polar = std::atan2(y - arc.center.y, x - arc.center.x);
-  double turn =
-      std::fmod(arc.counterClockwise ? polar - arc.startAngle : arc.startAngle - polar, 2.0 * pi);
-  return turn < 0.0 ? turn + 2.0 * pi : turn;
 }
 
 double DistanceToArc(Piece const& arc, double x, double y) {

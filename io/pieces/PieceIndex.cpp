@@ -6,6 +6,7 @@
 #include <numbers>
 #include <utility>
 
+#include "io/pieces/Turning.h"
 #include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
@@ -15,27 +16,12 @@ namespace {
 /// Some thousand times what the few steps of DistanceTo round, in parts of the numbers involved.
 constexpr double kRounding = 1e-12;
 
-/// Whether the arc passes the direction `polar` from its centre.
-bool TurnsThrough(Piece const& arc, double polar) {
-  constexpr double kFullTurn = 2.0 * std::numbers::pi;
-  double const raw = arc.counterClockwise ? polar - arc.startAngle : arc.startAngle - polar;
-  double const turn = raw - kFullTurn * std::floor(raw / kFullTurn);
-  return turn <= arc.sweep;
-}
-
 }  // namespace
 
-PieceIndex::PieceIndex(std::vector<Piece> const& pieces) : pieces_(pieces) {
-  while (firstLeaf_ < pieces.size()) firstLeaf_ *= 2;
-  constexpr double kFar = std::numeric_limits<double>::infinity();
-  boxes_.resize(firstLeaf_ + pieces.size(), Box{kFar, -kFar, kFar, -kFar, 0.0});
-  for (std::size_t i = 0; i < pieces.size(); ++i) boxes_[firstLeaf_ + i] = BoxOf(pieces[i]);
-  for (std::size_t node = firstLeaf_ - 1; node > 0; --node) {
-    if (2 * node >= boxes_.size()) continue;
-    boxes_[node] = boxes_[2 * node];
-    if (2 * node + 1 < boxes_.size()) boxes_[node] = Joined(boxes_[node], boxes_[2 * node + 1]);
-  }
-}
+PieceIndex::PieceIndex(std::vector<Piece> const& pieces)
+    : pieces_(pieces),
+      tree_(
+          pieces.size(), [&](std::size_t i) { return BoxOf(pieces[i]); }, Joined) {}
 
 PieceIndex::Box PieceIndex::BoxOf(Piece const& piece) {
   Box box{std::min(piece.start.x, piece.end.x), std::max(piece.start.x, piece.end.x),
@@ -54,10 +40,10 @@ PieceIndex::Box PieceIndex::BoxOf(Piece const& piece) {
     include(PointOnArc(piece, 0.0));
     include(PointOnArc(piece, piece.sweep));
     using std::numbers::pi;
-    if (TurnsThrough(piece, 0.0)) include({center.x + piece.radius, center.y});
-    if (TurnsThrough(piece, pi / 2.0)) include({center.x, center.y + piece.radius});
-    if (TurnsThrough(piece, pi)) include({center.x - piece.radius, center.y});
-    if (TurnsThrough(piece, -pi / 2.0)) include({center.x, center.y - piece.radius});
+    if (TurnTo(piece, 0.0) <= piece.sweep) include({center.x + piece.radius, center.y});
+    if (TurnTo(piece, pi / 2.0) <= piece.sweep) include({center.x, center.y + piece.radius});
+    if (TurnTo(piece, pi) <= piece.sweep) include({center.x - piece.radius, center.y});
+    if (TurnTo(piece, -pi / 2.0) <= piece.sweep) include({center.x, center.y - piece.radius});
     largest = std::max({largest, std::fabs(center.x), std::fabs(center.y)}) + piece.radius;
   }
   box.slack = kRounding * largest;
@@ -78,9 +64,9 @@ double PieceIndex::LeastDistance(Box const& box, double x, double y) {
 }
 
 void PieceIndex::Search(std::size_t node, double x, double y, Nearest* nearest) const {
-  if (LeastDistance(boxes_[node], x, y) > nearest->distance) return;
-  if (node >= firstLeaf_) {
-    std::size_t const piece = node - firstLeaf_;
+  if (LeastDistance(tree_[node], x, y) > nearest->distance) return;
+  if (tree_.IsLeaf(node)) {
+    std::size_t const piece = tree_.ItemOf(node);
     double const distance = DistanceTo(pieces_[piece], x, y);
     bool const isEarlier = distance == nearest->distance && piece < nearest->piece;
     if (distance < nearest->distance || isEarlier) *nearest = {piece, distance};
@@ -88,9 +74,9 @@ void PieceIndex::Search(std::size_t node, double x, double y, Nearest* nearest) 
   }
   std::size_t nearer = 2 * node;
   std::size_t further = 2 * node + 1;
-  if (nearer >= boxes_.size()) return;
-  if (further >= boxes_.size()) return Search(nearer, x, y, nearest);
-  if (LeastDistance(boxes_[further], x, y) < LeastDistance(boxes_[nearer], x, y)) {
+  if (!tree_.Has(nearer)) return;
+  if (!tree_.Has(further)) return Search(nearer, x, y, nearest);
+  if (LeastDistance(tree_[further], x, y) < LeastDistance(tree_[nearer], x, y)) {
     std::swap(nearer, further);
   }
   Search(nearer, x, y, nearest);
@@ -101,7 +87,7 @@ PieceIndex::Nearest PieceIndex::Find(double x, double y, std::size_t hint) const
   Nearest nearest{0, std::numeric_limits<double>::infinity()};
   double const distance = DistanceTo(pieces_[hint], x, y);
   if (distance < nearest.distance) nearest = {hint, distance};
-  Search(1, x, y, &nearest);
+  Search(Tree::kRoot, x, y, &nearest);
   return nearest;
 }
 

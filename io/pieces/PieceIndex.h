@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <vector>
 
+#include "io/pieces/ArrayTree.h"
 #include "vorn/io/Pieces.h"
 
 namespace Vorn::IO {
@@ -38,11 +39,10 @@ class PieceIndex {
   static double LeastDistance(Box const& box, double x, double y);
   void Search(std::size_t node, double x, double y, Nearest* nearest) const;
 
+  using Tree = ArrayTree<Box>;
+
   std::vector<Piece> const& pieces_;
-  /// A binary tree in an array: the children of node n are 2 n and 2 n + 1, the leaves are the
-  /// pieces in the order of the contour, from firstLeaf_ on.
-  std::vector<Box> boxes_;
-  std::size_t firstLeaf_ = 1;
+  Tree tree_;
 };
 
 }  // namespace Vorn::IO

@@ -1,20 +1,13 @@
 #include "vorn/io/Pieces.h"
 
 #include <cmath>
-#include <numbers>
 
+#include "io/pieces/Turning.h"
 #include "vorn/io/Failure.h"
 
 namespace Vorn::IO {
 
 namespace {
-
-using std::numbers::pi;
-
-double Sweep(double startAngle, double endAngle, bool counterClockwise) {
-  double const turned = counterClockwise ? endAngle - startAngle : startAngle - endAngle;
-  return turned < 0.0 ? turned + 2.0 * pi : turned;
-}
 
 Piece LinePiece(GeometryUtils::Point const& start, GeometryUtils::Elem const& elem) {
   Piece piece;
@@ -34,7 +27,7 @@ Piece ArcPiece(GeometryUtils::Point const& start, GeometryUtils::Elem const& ele
   piece.counterClockwise = elem.direction > 0.0;
   piece.startAngle = elem.startAngle;
   piece.endAngle = elem.endAngle;
-  piece.sweep = Sweep(elem.startAngle, elem.endAngle, piece.counterClockwise);
+  piece.sweep = TurnBetween(elem.startAngle, elem.endAngle, piece.counterClockwise);
   piece.length = piece.radius * piece.sweep;
   return piece;
 }

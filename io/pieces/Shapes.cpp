@@ -3,25 +3,18 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
-#include <numbers>
 
+#include "io/pieces/Turning.h"
 #include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 
 namespace {
 
-using std::numbers::pi;
-
 constexpr double kEpsilon = std::numeric_limits<double>::epsilon();
 
 double AngleOf(XY const& center, XY const& point) {
   return std::atan2(point.y - center.y, point.x - center.x);
-}
-
-double TurnBetween(double startAngle, double endAngle, bool counterClockwise) {
-  double const turned = counterClockwise ? endAngle - startAngle : startAngle - endAngle;
-  return turned < 0.0 ? turned + 2.0 * pi : turned;
 }
 
 double LargestCoordinate(Piece const& piece) {

@@ -300,13 +300,12 @@ class Parser {
   }
 
   [[noreturn]] void Refuse(std::string const& message) const {
-    throw Failure(FailureKind::File, file_.path + ": " + message);
+    throw Failure(FailureKind::File, {file_.path}, message);
   }
 
   /// `field` is part of the current line.
   [[noreturn]] void RefuseAt(std::string_view field, std::string const& message) const {
-    throw Failure(FailureKind::File, file_.path + ":" + std::to_string(line_) + ":" +
-                                         std::to_string(ColumnOf(field.data())) + ": " + message);
+    throw Failure(FailureKind::File, {file_.path, line_, ColumnOf(field.data())}, message);
   }
 
   /// Counted in characters, as editors do.

@@ -67,9 +67,9 @@ std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points) 
 std::string DescribeClosePair(PointFile const& file, ClosePair const& pair,
                               std::optional<double> largest, std::string const& options) {
   std::string const arguments = ArgumentFor(file) + (options.empty() ? "" : " " + options);
-  std::string text = file.path + ": " + file.NameOf(pair.first) + " and " +
-                     file.NameOf(pair.second) + " are too close: distance " +
-                     FormatShort(pair.distance) + ", needed more than " + FormatShort(pair.needed) +
+  std::string text = file.NameOf(pair.first) + " and " + file.NameOf(pair.second) +
+                     " are too close: distance " + FormatShort(pair.distance) +
+                     ", needed more than " + FormatShort(pair.needed) +
                      " (1.5 times the sum of their tolerances)\n";
   if (largest) {
     text += "the largest single tolerance that would pass for this file is " +

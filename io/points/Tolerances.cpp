@@ -22,8 +22,8 @@ void AssignOne(double tolerance, PointFile* file) {
 }
 
 [[noreturn]] void RefuseCoinciding(PointFile const& file, std::size_t first, std::size_t second) {
-  throw Failure(FailureKind::PointsTooClose,
-                file.path + ": " + file.NameOf(first) + " and " + file.NameOf(second) +
+  throw Failure(FailureKind::PointsTooClose, {file.path},
+                file.NameOf(first) + " and " + file.NameOf(second) +
                     " coincide: no tolerance can follow from a spacing of zero\n" +
                     "to leave one of them out: contour simplify " + ArgumentFor(file) +
                     " --drop-close");

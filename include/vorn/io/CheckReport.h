@@ -15,17 +15,18 @@ namespace Vorn::IO {
 
 /// What `contour check` finds when it measures points against a contour from a file.
 struct VORN_IO_EXPORT CheckReport {
-  PointFile file;
-  ContourFile contour;
+  PointFile file;               ///< the points
+  ContourFile contour;          ///< what they were measured against
   std::string toleranceSource;  ///< empty: nobody states a tolerance, and `relative` means nothing
-  std::vector<PointDeviation> deviations;
-  std::size_t furthest = 0;          ///< index of the largest distance; the first of several
-  std::size_t worst = 0;             ///< index of the largest relative deviation; likewise
-  std::vector<std::size_t> outside;  ///< indices of the points beyond their tolerance
-  std::vector<Gap> gaps;
-  std::vector<Intersection> meetings;  ///< where the contour meets itself, but for its joints
-  std::optional<double> signedArea;    ///< of a closed contour that does not cross itself
+  std::vector<PointDeviation> deviations;  ///< one for each point
+  std::size_t furthest = 0;                ///< index of the largest distance; the first of several
+  std::size_t worst = 0;                   ///< index of the largest relative deviation; likewise
+  std::vector<std::size_t> outside;        ///< indices of the points beyond their tolerance
+  std::vector<Gap> gaps;                   ///< where pieces of the contour do not meet
+  std::vector<Intersection> meetings;      ///< where the contour meets itself, but for its joints
+  std::optional<double> signedArea;        ///< of a closed contour that does not cross itself
 
+  /// Whether every point has a tolerance.
   bool HasTolerances() const { return !toleranceSource.empty(); }
 
   /// All indices, the worst point first: by relative deviation where there are tolerances, else by

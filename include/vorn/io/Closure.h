@@ -15,7 +15,7 @@ enum class ClosedChoice { Auto, Yes, No };
 
 /// Whether measured points run once around, back to where they began.
 struct Closure {
-  bool isClosed = false;
+  bool isClosed = false;      ///< the contour runs back to its start
   bool repeatsFirst = false;  ///< the last point is the first one again
   double gap = 0.0;           ///< from the last point to the first
   std::string reason;         ///< in words, for the summary
@@ -35,7 +35,7 @@ VORN_IO_EXPORT Closure FindClosure(std::vector<WPoint> const& points, ClosedChoi
 /// The points of a closed contour in the order in which they are fitted: from the seam all the way
 /// round to the seam again, which therefore stands at both ends.
 struct Circuit {
-  std::vector<WPoint> points;
+  std::vector<WPoint> points;       ///< the first stands at the end again
   std::vector<std::size_t> origin;  ///< index of each in the file; of a repeated point its first
 };
 

@@ -18,7 +18,7 @@ struct ContourArea {
   double signedArea = 0.0;     ///< positive counter-clockwise; every loop with its own sign
   double perimeter = 0.0;      ///< with the bridges
   std::optional<XY> centroid;  ///< of a contour that does not cross itself and encloses something
-  Extent extent;
+  Extent extent;               ///< the box around the contour
 
   /// Whether the contour is the border of one region, so that its area is that of the region.
   bool IsSimple() const { return !crossesItself; }

@@ -15,13 +15,20 @@ struct ContourFile {
   std::vector<Piece> pieces;  ///< in the order of travel; neighbours need not meet
   bool isClosed = false;      ///< the last piece leads back to the start of the first
   std::string units;          ///< "mm", "inch" and so on; empty when nobody says
+  std::size_t leftOut = 0;    ///< how many pieces without length the file held beside these
 };
+
+/// Takes out the pieces that end where they start without a turn; they say nothing of the contour,
+/// and not every format could tell them from a full circle or hold them at all. Readers and writers
+/// leave them out alike.
+/// @return how many there were
+VORN_IO_EXPORT std::size_t RemovePiecesWithoutLength(std::vector<Piece>* pieces);
 
 /// Two pieces that follow each other in a contour but do not meet.
 struct Gap {
   std::size_t before = 0;  ///< index of the earlier piece; the other one is the next
   std::size_t after = 0;   ///< 0 for the seam of a closed contour
-  double size = 0.0;
+  double size = 0.0;       ///< how far the two ends are apart
 };
 
 /// The places where neighbours are further apart than rounding explains (see JointTolerance): in

@@ -16,10 +16,11 @@ inline constexpr double kLeastReversal = 150.0;
 
 /// A place where the path turns sharply.
 struct Corner {
-  std::size_t point = 0;
-  double degrees = 0.0;  ///< 0 to 180
-  bool isLeft = false;   ///< counter-clockwise, the y axis pointing up
+  std::size_t point = 0;  ///< index of the point where the path turns
+  double degrees = 0.0;   ///< 0 to 180
+  bool isLeft = false;    ///< counter-clockwise, the y axis pointing up
 
+  /// Whether the path goes back on itself there.
   bool IsReversal() const { return degrees >= kLeastReversal; }
 };
 

@@ -23,11 +23,21 @@ inline constexpr double kLargestRelative = 1.0 + 1e-9;
 
 /// What is found when it measures every point, without a word from the fit.
 struct Remeasured {
-  std::vector<PointDeviation> points;
+  std::vector<PointDeviation> points;  ///< one for each point
   std::size_t worst = 0;  ///< index of the largest relative deviation; the first of several
 
+  /// The one with the largest relative deviation; needs a point.
   PointDeviation const& Worst() const { return points[worst]; }
 };
+
+/// Whether a deviation measured at a point is within the tolerance of the point: up to
+/// kLargestRelative, and some last places of the coordinates more, because far from the origin the
+/// pieces of a contour are rounded to these. What is not a number is outside.
+VORN_IO_EXPORT bool IsWithinTolerance(PointDeviation const& deviation, WPoint const& point);
+
+/// Whether that holds for every point that was measured.
+VORN_IO_EXPORT bool AreWithinTolerance(Remeasured const& measured,
+                                       std::vector<WPoint> const& points);
 
 /// Measures every point against every piece, as far as the answer is concerned: see PieceIndex.
 /// Needs at least one of each.

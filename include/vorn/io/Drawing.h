@@ -19,7 +19,7 @@ enum class Format;
 /// What is to be drawn, wherever it comes from: measured points, or the pieces of a contour, or
 /// both with the deviation of every point.
 struct VORN_IO_EXPORT Drawing {
-  std::string title;
+  std::string title;               ///< the heading
   std::vector<std::string> facts;  ///< short phrases for the line below the title
   std::string units;               ///< of all lengths; may be empty
   std::vector<WPoint> points;      ///< `w` is 0 where there is no tolerance; empty: pieces alone
@@ -32,14 +32,19 @@ struct VORN_IO_EXPORT Drawing {
   /// that makes the largest tolerance readable.
   std::optional<double> magnify;
 
+  /// Whether there is a contour to draw.
   bool HasContour() const { return !pieces.empty(); }
   /// Whether there are points and a contour that they were measured against.
   bool IsMeasured() const { return !deviations.empty(); }
   /// Whether there are points and every one has a tolerance; the next three need that.
   bool HasTolerances() const;
+  /// Whether all points have the same tolerance.
   bool IsToleranceUniform() const;
+  /// The largest tolerance of a point.
   double LargestTolerance() const;
+  /// The smallest tolerance of a point.
   double SmallestTolerance() const;
+  /// How many pieces are arcs.
   std::size_t ArcCount() const;
   /// The contour ends where it starts.
   bool IsClosed() const;
@@ -67,9 +72,9 @@ VORN_IO_EXPORT std::string ToSvg(Drawing const& drawing);
 
 /// The same page as pixels.
 struct PngSize {
-  static constexpr double kUsualDpi = 150.0;
+  static constexpr double kUsualDpi = 150.0;  ///< pixels to the inch when nobody says
 
-  double dpi = kUsualDpi;
+  double dpi = kUsualDpi;    ///< pixels to the inch on A4, above 0
   std::optional<int> width;  ///< in pixels; overrides `dpi`
 };
 

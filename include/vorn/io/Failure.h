@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <stdexcept>
 #include <string>
 
@@ -16,16 +17,43 @@ enum class FailureKind {
   Internal,        ///< a defect of this library
 };
 
-/// The exception with which every operation of this library fails. Its message is for the user.
+/// Where something is wrong.
+struct Place {
+  std::string file;        ///< as messages call it: its path, or "standard input"
+  std::size_t line = 0;    ///< counted from 1; 0: it is not about one line
+  std::size_t column = 0;  ///< in characters, counted from 1; 0: it is not about one column
+};
+
+/// The exception with which every operation of this library fails. what() is a sentence for the
+/// user that begins with the place: "scan.csv:3:7: 'abc' is not a number".
 class VORN_IO_EXPORT Failure : public std::runtime_error {
  public:
-  Failure(FailureKind kind, std::string const& message)
-      : std::runtime_error(message), kind_(kind) {}
+  /// About no file.
+  Failure(FailureKind kind, std::string const& message);
 
+  /// About a file, one of its lines or a place in a line.
+  Failure(FailureKind kind, Place place, std::string const& message);
+
+  /// Failures are copied when they are thrown and caught.
+  Failure(Failure const&) = default;
+  /// The same for one that is there already.
+  Failure& operator=(Failure const&) = default;
+  /// Out of line, so that every library knows the same type.
+  ~Failure() override;
+
+  /// What went wrong.
   FailureKind Kind() const { return kind_; }
 
+  /// The file is empty where the failure is about none.
+  Place const& Where() const { return place_; }
+
+  /// what() without the place.
+  std::string const& Message() const { return message_; }
+
  private:
-  FailureKind kind_;
+  FailureKind kind_;     ///< what went wrong
+  Place place_;          ///< where
+  std::string message_;  ///< without the place
 };
 
 }  // namespace Vorn::IO

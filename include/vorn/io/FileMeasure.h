@@ -12,13 +12,14 @@
 namespace Vorn::IO {
 
 /// How the points lie against a contour as it stands in the text of a file.
-struct VORN_IO_EXPORT FileMeasure {
+struct FileMeasure {
   double relative = 0.0;   ///< the largest relative deviation
   std::size_t point = 0;   ///< index of the point that has it; the first of several
+  bool isWithin = false;   ///< every point is within its tolerance, see IsWithinTolerance
   std::string unreadable;  ///< why the text cannot be read back; empty: it was measured
 
   /// Whether the text was read and every point is within its tolerance.
-  bool IsWithin() const;
+  bool IsWithin() const { return unreadable.empty() && isWithin; }
 };
 
 /// Reads the text as anyone would and measures every point against what it says. The format is one

@@ -37,8 +37,11 @@ class VORN_IO_EXPORT AtomicFile {
   void Commit();
 
  private:
+  /// Makes the file under another name and gives its descriptor.
   int MakeTemporary();
+  /// Takes the file under the other name away.
   void RemoveTemporary();
+  /// Writes the contents through to the disk.
   void Write(int descriptor, std::string_view contents) const;
 
   std::string path_;       ///< as the user wrote it, for messages

@@ -14,9 +14,10 @@ namespace Vorn::IO {
 
 /// How measured points become a contour.
 struct FitChoice {
-  ToleranceChoice tolerance;
+  ToleranceChoice tolerance;  ///< where the tolerances come from
+  /// Which of the fits of the core.
   GeometryUtils::FittingStrategy strategy = GeometryUtils::FittingStrategy::Mixed;
-  ClosedChoice closed = ClosedChoice::Auto;
+  ClosedChoice closed = ClosedChoice::Auto;  ///< whether the contour runs back to its start
   std::optional<std::size_t> start;  ///< the seam of a closed contour, as counted in the file
 };
 
@@ -26,6 +27,10 @@ struct FitChoice {
 /// the way round, and closed again. One without a corner is fitted twice, from its first point and
 /// from the first joint found so; the one of fewer pieces counts. One that is a circle comes out as
 /// two half circles.
+///
+/// Far from the origin the fit is done in a local frame, an offset being taken off exactly and put
+/// back: pieces keep their shape there, and only their coordinates are rounded to what a double
+/// holds.
 ///
 /// @param progress may be null
 /// @throws Failure (FailureKind::PointsTooClose) naming the pair and the ways out, (NoFit) when the

@@ -21,17 +21,17 @@ inline constexpr std::int32_t kFullProgress = 100;
 /// The stretch of points that one piece stands for. The fit does not tell, so it is found again.
 /// On a closed contour it may run past the last point and on from the first.
 struct PointRange {
-  std::size_t first = 0;
-  std::size_t count = 0;
+  std::size_t first = 0;  ///< index of the first point
+  std::size_t count = 0;  ///< how many points; 0: none
 };
 
 /// One call of the library's fit and what it answered.
 struct FitAnswer {
-  ErrorCode code = ErrorCode::Failed;
-  std::vector<GeometryUtils::Elem> contour;
-  double deviation = 0.0;            ///< see IsDeviationRelative
-  std::int32_t deviationIndex = -1;  ///< -1: the library names no point
-  double seconds = 0.0;
+  ErrorCode code = ErrorCode::Failed;        ///< what the core answered
+  std::vector<GeometryUtils::Elem> contour;  ///< empty unless it answered Ok
+  double deviation = 0.0;                    ///< see IsDeviationRelative
+  std::int32_t deviationIndex = -1;          ///< -1: the library names no point
+  double seconds = 0.0;                      ///< that it took
 };
 
 /// The single arc reports its largest deviation as a length, the other strategies as a multiple
@@ -44,27 +44,34 @@ VORN_IO_EXPORT std::string NameOf(GeometryUtils::FittingStrategy strategy);
 /// "23, NoFit: no arc fits a run of points", for messages.
 VORN_IO_EXPORT std::string Describe(ErrorCode code);
 
+/// How a fit ended: every point within its tolerance, one outside, or a contour that stops before
+/// the last point.
 enum class Verdict { WithinTolerance, OutsideTolerance, StopsEarly };
 
 /// All that the table, the JSON file and the drawing tell about one fit.
 struct VORN_IO_EXPORT FitReport {
-  PointFile file;
-  std::string toleranceSource;
+  PointFile file;               ///< the points, each with its tolerance
+  std::string toleranceSource;  ///< in words, where the tolerances came from
+  /// Which of the fits of the core.
   GeometryUtils::FittingStrategy strategy = GeometryUtils::FittingStrategy::Mixed;
-  FitAnswer fit;
-  Closure closure;
+  FitAnswer fit;              ///< what the core answered
+  Closure closure;            ///< whether the contour is closed
   std::size_t seam = 0;       ///< where a closed contour was cut open, as counted in the file
   bool isFullCircle = false;  ///< found by the program; the fit has nothing to say then
-  std::vector<Piece> pieces;
-  std::optional<std::vector<PointRange>> ranges;
-  Remeasured remeasured;
-  Verdict verdict = Verdict::WithinTolerance;
+  std::vector<Piece> pieces;  ///< the contour
+  std::optional<std::vector<PointRange>> ranges;  ///< one for each piece; nothing: too many to tell
+  Remeasured remeasured;                          ///< the deviation of every point
+  Verdict verdict = Verdict::WithinTolerance;     ///< how the fit ended
 
   /// From the end of the contour to its start; 0 when it is closed exactly.
   double Gap() const;
+  /// How many pieces are straight.
   std::size_t LineCount() const;
+  /// How many pieces are arcs.
   std::size_t ArcCount() const;
+  /// The smallest tolerance of a point.
   double SmallestTolerance() const;
+  /// The largest tolerance of a point.
   double LargestTolerance() const;
 };
 

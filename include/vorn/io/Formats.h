@@ -36,24 +36,25 @@ inline constexpr int kJsonSchemaVersion = 1;
 /// What the user can choose about the files.
 struct WriteOptions {
   bool dxfEntities = false;  ///< LINE and ARC in place of one POLYLINE
-  GCodeOptions gcode;
+  GCodeOptions gcode;        ///< of a tool path
 };
 
-/// The contour as the text of a file.
-/// @throws Failure (FailureKind::Internal) for a drawing, or (FailureKind::BadArgument) when the
-/// format cannot
-///         say what the contour needs.
+/// The contour as the text of a file. Pieces without length are left out, see
+/// RemovePiecesWithoutLength.
+/// @throws Failure (FailureKind::BadArgument) for the format of a drawing, when no piece has a
+///         length, or when the format cannot say what the contour needs.
 VORN_IO_EXPORT std::string ToText(ContourFile const& contour, Format format,
                                   WriteOptions const& options);
 
 /// Reads a contour from JSON, CSV, DXF, G-code or WKT; "-" is `in`. Without `format` the
 /// ending of the name tells, and for other names the content.
 ///
-/// Gaps stay as they are: nothing is joined that the file does not join.
+/// Gaps stay as they are: nothing is joined that the file does not join. Pieces without length are
+/// left out and counted, see RemovePiecesWithoutLength.
 ///
-/// @throws Failure (FailureKind::File) naming file, line and offending text, or
-/// (FailureKind::BadArgument)
-///         when the format is told and cannot be read as a contour.
+/// @throws Failure (FailureKind::File) with file, line and offending text, or (BadArgument) when
+/// the
+///         format is told and cannot be read as a contour.
 VORN_IO_EXPORT ContourFile ReadContour(std::string const& path, std::istream& in,
                                        std::optional<Format> format = {});
 

@@ -10,13 +10,15 @@ namespace Vorn::IO {
 /// What the user can choose about a tool path. Lengths are in the units of the contour, feeds in
 /// these units a minute.
 struct GCodeOptions {
+  /// The word that ends the program; None leaves it to the footer.
   enum class End { M2, M30, None };
+  /// The plane of the path.
   enum class Plane { G17, G18 };  ///< of X and Y, or of X and Z
 
-  std::optional<double> feed;       ///< without it no F is written, and a controller stops
-  std::optional<int> decimals;      ///< digits after the point; goes before the tolerance
-  std::optional<double> tolerance;  ///< what the digits follow from, see GCodeDecimals
-  End end = End::M2;
+  std::optional<double> feed;        ///< without it no F is written, and a controller stops
+  std::optional<int> decimals;       ///< digits after the point; goes before the tolerance
+  std::optional<double> tolerance;   ///< what the digits follow from, see GCodeDecimals
+  End end = End::M2;                 ///< how the program ends
   Plane plane = Plane::G17;          ///< G18: the y of the contour is the Z of a lathe
   bool useRadiusWords = false;       ///< R in place of I and J
   std::optional<double> safeHeight;  ///< Z of rapid moves; together with cutHeight, not in G18

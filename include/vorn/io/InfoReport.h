@@ -12,16 +12,16 @@ namespace Vorn::IO {
 
 /// How the points stand to the tolerances that the user or the file states.
 struct RuleCheck {
-  std::string source;  ///< where the tolerances come from
-  double smallest = 0.0;
-  double largest = 0.0;
-  std::vector<ClosePair> broken;
+  std::string source;             ///< where the tolerances come from
+  double smallest = 0.0;          ///< the smallest tolerance
+  double largest = 0.0;           ///< the largest tolerance
+  std::vector<ClosePair> broken;  ///< neighbours that are too close for theirs
 };
 
 /// What `contour info` tells about one file.
 struct InfoReport {
-  PointFile file;
-  PointsInfo info;
+  PointFile file;                 ///< the points
+  PointsInfo info;                ///< what they say by themselves
   std::optional<RuleCheck> rule;  ///< nothing where nobody states a tolerance
 };
 

@@ -19,17 +19,18 @@ struct OnContour {
 
 /// A place that two contours, or two parts of one, have in common.
 struct Intersection {
+  /// How two contours meet.
   enum class Kind {
     Crossing,  ///< each passes to the other side of the other one
     Touching,  ///< they stay on one side, run in one direction there, or one of them ends there
     Overlap,   ///< they share a stretch, from `at` to `until`
   };
 
-  Kind kind = Kind::Crossing;
-  XY at;
-  std::optional<XY> until;
-  OnContour a;
-  OnContour b;
+  Kind kind = Kind::Crossing;  ///< how the two meet
+  XY at;                       ///< the place; of a stretch its first one
+  std::optional<XY> until;     ///< where a stretch ends
+  OnContour a;                 ///< on the first contour
+  OnContour b;                 ///< on the second contour, or the later part of the same
 };
 
 /// All places that the two have in common, sorted along the first. Pieces without length count for
@@ -43,11 +44,12 @@ VORN_IO_EXPORT std::vector<Intersection> SelfIntersectionsOf(ContourFile const& 
 
 /// How many there are of each kind.
 struct IntersectionTally {
-  std::size_t crossings = 0;
-  std::size_t touches = 0;
-  std::size_t overlaps = 0;
+  std::size_t crossings = 0;  ///< places where they cross
+  std::size_t touches = 0;    ///< places where they touch
+  std::size_t overlaps = 0;   ///< stretches that they share
 };
 
+/// Counts them.
 VORN_IO_EXPORT IntersectionTally Tally(std::vector<Intersection> const& found);
 
 /// "1 crossing, 0 touching, 2 overlaps".

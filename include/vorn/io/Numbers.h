@@ -11,9 +11,9 @@ namespace Vorn::IO {
 /// What stands between the whole part of a number and its fraction.
 enum class DecimalMark { Point, Comma };
 
-/// The number that the whole text is, in any locale: `1`, `+1.5e3`, `-.0005993`, `2.`; with a
-/// decimal comma `1,5E+03`, but not `2,`, where the comma may as well be a separator. Nothing when
-/// it is not one. `nan`, `inf` and numbers too large for a double are read as such, so that the
+/// The number that the whole text is, in any locale: "1", "+1.5e3", "-.0005993", "2."; with a
+/// decimal comma "1,5E+03", but not "2,", where the comma may as well be a separator. Nothing when
+/// it is not one. "nan", "inf" and numbers too large for a double are read as such, so that the
 /// caller can say what is wrong with them.
 VORN_IO_EXPORT std::optional<double> ParseNumber(std::string_view text,
                                                  DecimalMark mark = DecimalMark::Point);

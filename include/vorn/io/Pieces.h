@@ -13,21 +13,23 @@ using XY = GeometryUtils::Point;
 /// One piece of a contour with all that follows from its neighbours: a contour element alone does
 /// not know where it starts.
 struct Piece {
+  /// A straight line or an arc of a circle.
   enum class Kind { Line, Arc };
 
-  Kind kind = Kind::Line;
-  XY start;
-  XY end;
-  double length = 0.0;
+  Kind kind = Kind::Line;  ///< which of the two it is
+  XY start;                ///< where it begins
+  XY end;                  ///< where it ends
+  double length = 0.0;     ///< along the piece
 
-  // Of arcs only.
-  XY center;
-  double radius = 0.0;
-  bool counterClockwise = false;
-  double startAngle = 0.0;
-  double endAngle = 0.0;
-  double sweep = 0.0;  ///< radians turned from start to end, never negative
+  // The rest is of arcs only.
+  XY center;                      ///< of the circle
+  double radius = 0.0;            ///< above 0
+  bool counterClockwise = false;  ///< the sense of travel, y pointing up
+  double startAngle = 0.0;        ///< polar angle of the start from the centre, radians
+  double endAngle = 0.0;          ///< the same of the end
+  double sweep = 0.0;             ///< radians turned from start to end, never negative
 
+  /// Whether it is an arc; else it is a line.
   bool IsArc() const { return kind == Kind::Arc; }
 };
 
@@ -62,9 +64,10 @@ VORN_IO_EXPORT Piece Reversed(Piece const& piece);
 
 /// The box around the pieces, what arcs bulge out included. Needs at least one piece.
 struct Extent {
-  XY low;
-  XY high;
+  XY low;   ///< the least x and y
+  XY high;  ///< the largest x and y
 };
+/// The box of at least one piece.
 VORN_IO_EXPORT Extent ExtentOf(std::vector<Piece> const& pieces);
 
 }  // namespace Vorn::IO

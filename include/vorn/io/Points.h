@@ -17,22 +17,24 @@ inline constexpr char const* kStandardInputName = "standard input";
 
 /// Where the reader takes each point's tolerance from.
 struct ToleranceColumn {
+  /// What is wanted of a column with tolerances.
   enum class Use {
     Ignore,     ///< every `w` stays 0
     IfPresent,  ///< column `w`, or the third one of a file without a header
     Required,   ///< the column called `name`, or with that number; without one the file is refused
   };
-  Use use = Use::Ignore;
-  std::string name = "w";
+  Use use = Use::Ignore;   ///< what is wanted
+  std::string name = "w";  ///< the column; only for Use::Required
 };
 
 /// Which columns hold the points, each as a name from the header or a number counted from 1. Empty
 /// ones are for the reader to find.
 struct ColumnChoice {
-  std::string x;
-  std::string y;
-  std::string w;
+  std::string x;  ///< empty: column x, else the first
+  std::string y;  ///< empty: column y, else the second
+  std::string w;  ///< of the tolerance; empty: as ToleranceColumn says
 
+  /// Whether columns were chosen at all.
   bool IsGiven() const { return !x.empty(); }
 };
 

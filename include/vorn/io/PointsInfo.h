@@ -20,22 +20,23 @@ VORN_IO_EXPORT std::vector<ClosePair> FindClosePairs(std::vector<WPoint> const& 
 
 /// A tolerance that suits the points, and why.
 struct Suggestion {
+  /// One tolerance for all points, one by the spacing of each, or none that would do.
   enum class Way { Same, PerPoint, None };
-  Way way = Way::None;
+  Way way = Way::None;     ///< which of these
   double tolerance = 0.0;  ///< for all points, or the cap for each
-  std::string reason;
+  std::string reason;      ///< why, in words
 };
 
 /// All that can be said about measured points without a fit.
 struct PointsInfo {
-  PointsBox box;
-  SpacingFacts spacing;
-  std::vector<Duplicate> duplicates;
-  Closure closure;
+  PointsBox box;                           ///< the box around the points
+  SpacingFacts spacing;                    ///< distances of neighbours
+  std::vector<Duplicate> duplicates;       ///< points that repeat an earlier one
+  Closure closure;                         ///< whether they run once around
   std::optional<double> largestTolerance;  ///< see LargestSingleTolerance
-  std::vector<Corner> corners;
-  std::optional<double> noise;  ///< see EstimateNoise
-  Suggestion suggestion;
+  std::vector<Corner> corners;             ///< where the path turns sharply
+  std::optional<double> noise;             ///< see EstimateNoise
+  Suggestion suggestion;                   ///< a tolerance to begin with
 };
 
 /// Looks at the points alone, not at their tolerances.

@@ -13,12 +13,13 @@ namespace Vorn::IO {
 
 /// Two neighbours too close to each other for their tolerances.
 struct ClosePair {
-  std::size_t first = 0;
+  std::size_t first = 0;   ///< index of the earlier point
   std::size_t second = 0;  ///< of a closed contour this may be the first point of the file
-  double distance = 0.0;
-  double needed = 0.0;  ///< the distance must be above this
+  double distance = 0.0;   ///< between the two
+  double needed = 0.0;     ///< the distance must be above this
 };
 
+/// The distance of two points.
 VORN_IO_EXPORT double Distance(WPoint const& a, WPoint const& b);
 
 /// What the distance of two neighbours must be above: 1.5 times the sum of their tolerances.
@@ -36,7 +37,7 @@ VORN_IO_EXPORT std::optional<ClosePair> FindClosePair(std::vector<WPoint> const&
 /// have it; nothing when neighbours coincide.
 VORN_IO_EXPORT std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points);
 
-/// What the user needs to know about the pair, and the ways out of it.
+/// What the user needs to know about the pair, and the ways out of it; the file is not named.
 ///
 /// @param largest what LargestSingleTolerance says of the same points
 /// @param options the tolerance options of this run, for the commands that show or do more

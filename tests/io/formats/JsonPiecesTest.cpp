@@ -108,5 +108,36 @@ TEST(ParseJsonPieces, SaysWhereTheTextIsNoJson) {
   EXPECT_EQ(Complaint("{\"a\": 1e999}"), "p.json: a number is too large for a double");
 }
 
+TEST(ParseJsonPieces, DeepNestingIsRefusedWhereItBecomesTooDeep) {
+  // A recursive reader or writer would run out of stack.
+  std::string const deep(100000, '[');
+  EXPECT_EQ(Refusal([&] { ParseJsonPieces(deep, "d.json"); }),
+            "d.json:1:65: is nested deeper than 64 brackets");
+  std::string const closed =
+      "{\"schemaVersion\": 1,\n\"elements\": " + deep + std::string(100000, ']') + "}";
+  EXPECT_EQ(Refusal([&] { ParseJsonPieces(closed, "d.json"); }),
+            "d.json:2:76: is nested deeper than 64 brackets");
+}
+
+TEST(ParseJsonPieces, BracketsInTextsAreNotNesting) {
+  std::string const brackets = std::string(100, '[') + "\\\"" + std::string(100, '{');
+  std::string const text =
+      "{\"schemaVersion\": 1, \"note\": \"" + brackets +
+      "\", \"elements\": [{\"kind\": \"line\", \"start\": {\"x\": 0, \"y\": 0}, "
+      "\"end\": {\"x\": 1, \"y\": 0}}]}";
+  EXPECT_EQ(ParseJsonPieces(text, "d.json").pieces.size(), 1u);
+}
+
+TEST(ParseJsonPieces, OnlyTheBeginningOfABadValueIsQuoted) {
+  std::string numbers = "[1";
+  for (int i = 0; i < 100000; ++i) numbers += ",1";
+  EXPECT_EQ(Refusal([&] {
+              ParseJsonPieces("{\"schemaVersion\": 1, \"elements\": {\"a\": " + numbers + "]}}",
+                              "d.json");
+            }),
+            "d.json: elements: is not an array but "
+            "'{\"a\":[1,1,1,1,1,1,1,1,1,1,1,1,1,1,1,1,1,...'");
+}
+
 }  // namespace
 }  // namespace Vorn::IO

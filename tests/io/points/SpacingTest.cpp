@@ -71,7 +71,7 @@ TEST(DescribeClosePair, SaysWhichPairAndWhatToDo) {
   std::optional<ClosePair> const pair = FindClosePair(file.points);
   ASSERT_TRUE(pair.has_value());
   EXPECT_EQ(DescribeClosePair(file, *pair, LargestSingleTolerance(file.points), "-t 0.25"),
-            "part.csv: point 1 (line 3) and point 2 (line 5) are too close: distance 0.5, needed "
+            "point 1 (line 3) and point 2 (line 5) are too close: distance 0.5, needed "
             "more than 0.75 (1.5 times the sum of their tolerances)\n"
             "the largest single tolerance that would pass for this file is 0.166666\n"
             "see: contour info part.csv -t 0.25\n"
@@ -87,7 +87,7 @@ TEST(DescribeClosePair, CoincidingPointsHaveNoTolerance) {
   std::optional<ClosePair> const pair = FindClosePair(file.points);
   ASSERT_TRUE(pair.has_value());
   EXPECT_EQ(DescribeClosePair(file, *pair, LargestSingleTolerance(file.points), ""),
-            "my part.csv: point 0 (line 1) and point 1 (line 2) are too close: distance 0, needed "
+            "point 0 (line 1) and point 1 (line 2) are too close: distance 0, needed "
             "more than 0.75 (1.5 times the sum of their tolerances)\n"
             "no tolerance would pass: neighbours in this file coincide\n"
             "see: contour info 'my part.csv'\n"
