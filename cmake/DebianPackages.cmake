@@ -39,8 +39,12 @@ add_custom_command(
   OUTPUT ${compressed}/contour.1.gz
   COMMAND ${gzip_program} -9 --no-name --stdout ${manual} > ${compressed}/contour.1.gz
   DEPENDS manual ${manual}
+  COMMENT "Compressing the manual page"
   VERBATIM)
-add_custom_target(compressed_manual ALL DEPENDS ${compressed}/contour.1.gz)
+add_custom_target(
+  compressed_manual ALL
+  DEPENDS ${compressed}/contour.1.gz
+  COMMENT "Compressed manual page")
 
 foreach(component IN ITEMS library development io_library io_development tools)
   string(REPLACE library runtime install_component ${component})
