@@ -1,6 +1,7 @@
 #include "cli/Program.h"
 
 #include <exception>
+#include <new>
 #include <ostream>
 
 #include "cli/commands/AreaCommand.h"
@@ -13,6 +14,7 @@
 #include "cli/commands/IntersectCommand.h"
 #include "cli/commands/PlotCommand.h"
 #include "cli/commands/SimplifyCommand.h"
+#include "cli/terminal/PrintableStream.h"
 
 namespace Vorn::Cli {
 
@@ -55,12 +57,16 @@ ExitCode Dispatch(int argc, char const* const* argv, Console const& console) {
 }  // namespace
 
 ExitCode RunProgram(int argc, char const* const* argv, std::istream& in, std::ostream& out,
-                    std::ostream& err) {
+                    std::ostream& terminal) {
+  PrintableStream err(terminal);
   try {
     return Dispatch(argc, argv, {in, out, err});
   } catch (Failure const& failure) {
     err << "contour: " << failure.what() << '\n';
     return ExitCodeOf(failure.Kind());
+  } catch (std::bad_alloc const&) {
+    err << "contour: the memory does not suffice\n";
+    return ExitCode::Internal;
   } catch (std::exception const& error) {
     err << "contour: internal error: " << error.what() << '\n';
     return ExitCode::Internal;

@@ -23,6 +23,7 @@ ExitCode ExitCodeOf(Verdict verdict) {
     case Verdict::WithinTolerance:
       return ExitCode::Ok;
     case Verdict::OutsideTolerance:
+    case Verdict::NotClosed:
       return ExitCode::OutsideTolerance;
     case Verdict::StopsEarly:
       return ExitCode::NoFit;

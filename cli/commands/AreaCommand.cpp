@@ -12,6 +12,7 @@
 #include "vorn/io/ContourArea.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 #include "vorn/io/Points.h"
 
@@ -26,6 +27,10 @@ constexpr char const* kFooter =
 Contours are read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
 by the content. With --points the files hold measured points instead, and the contour is the
 polygon through them, closed from the last point to the first.
+
+A file may hold several outlines: its pieces are chained by their ends, in any order and sense,
+where these are no further apart than 1e-6 of the size of the drawing. Each outline is measured;
+one that lies in another is a hole, and the area of all has the holes taken off.
 
 The area is that of lines and true arcs. Where neighbouring pieces do not meet, a straight line
 bridges the gap, and the gap is listed. Where a contour crosses or touches itself, the area is the
@@ -50,6 +55,7 @@ struct Options {
   bool arePoints = false;
   ColumnChoice columns;
   std::string units;
+  std::optional<int> outline;
   bool doClose = false;
   bool asJson = false;
 };
@@ -66,36 +72,49 @@ ContourFile PolygonThrough(PointFile const& file) {
   return Closed(std::move(contour));
 }
 
-ContourFile ReadClosed(Options const& options, std::string const& path, Console const& console) {
+void RefuseOpen(ContourFile const& contour) {
+  double const gap = Distance(contour.pieces.back().end, contour.pieces.front().start);
+  throw Failure(FailureKind::BadArgument,
+                contour.path + ": the contour is open, its ends are " + FormatShort(gap) +
+                    " apart; --close measures it with a line between them");
+}
+
+std::vector<ContourFile> ReadClosed(Options const& options, std::string const& path,
+                                    Console const& console) {
   if (options.arePoints) {
-    return PolygonThrough(
-        ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns));
+    return {PolygonThrough(
+        ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns))};
   }
-  ContourFile contour = ReadContourInput(path, options.from, console);
-  if (options.doClose) return Closed(std::move(contour));
-  if (!IsClosed(contour)) {
-    double const gap = Distance(contour.pieces.back().end, contour.pieces.front().start);
-    throw Failure(FailureKind::BadArgument,
-                  contour.path + ": the contour is open, its ends are " + FormatShort(gap) +
-                      " apart; --close measures it with a line between them");
+  std::vector<ContourFile> outlines = ReadOutlines({path, options.from, options.outline}, console);
+  for (ContourFile& outline : outlines) {
+    if (options.doClose) {
+      outline = Closed(std::move(outline));
+    } else if (!IsClosed(outline)) {
+      RefuseOpen(outline);
+    }
   }
-  return contour;
+  return outlines;
+}
+
+void Print(std::vector<ContourArea> const& areas, bool isFirst, Console const& console) {
+  for (ContourArea const& area : areas) {
+    console.out << (isFirst && &area == &areas.front() ? "" : "\n") << ToText(area);
+  }
+  if (areas.size() > 1) console.out << "\n" << NetText(areas);
 }
 
 ExitCode Run(Options const& options, Console const& console) {
-  std::vector<ContourArea> areas;
+  std::vector<ContourArea> all;
   for (std::string const& path : options.paths) {
-    ContourFile contour = ReadClosed(options, path, console);
-    if (!options.units.empty()) contour.units = options.units;
-    areas.push_back(MeasureArea(std::move(contour)));
+    std::vector<ContourFile> outlines = ReadClosed(options, path, console);
+    for (ContourFile& outline : outlines) {
+      if (!options.units.empty()) outline.units = Printable(options.units);
+    }
+    std::vector<ContourArea> const areas = MeasureOutlines(std::move(outlines));
+    if (!options.asJson) Print(areas, all.empty(), console);
+    all.insert(all.end(), areas.begin(), areas.end());
   }
-  if (options.asJson) {
-    console.out << ToJson(areas);
-    return ExitCode::Ok;
-  }
-  for (ContourArea const& area : areas) {
-    console.out << (&area == &areas.front() ? "" : "\n") << ToText(area);
-  }
+  if (options.asJson) console.out << ToJson(all);
   return ExitCode::Ok;
 }
 
@@ -114,6 +133,7 @@ void AddOptions(Command& command, Options* options) {
   AddColumns(command, &options->columns).Need(points);
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
+  AddOutline(command, &options->outline);
   command.AddFlag("--close", &options->doClose,
                   "Close an open contour with a line from its end to its start");
   command.AddFlag("--json", &options->asJson, "Write the measures as JSON, with every digit");

@@ -32,7 +32,7 @@ constexpr char const* kFooter =
     R"(
 The contour is read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
 by the content. Every point is measured against every piece as drawn, clipped at its ends. A
-relative deviation counts as within tolerance up to 1 + 1e-9, for rounding. Without any tolerance
+relative deviation counts as within tolerance up to 1 + 1e-6, for rounding. Without any tolerance
 deviations are lengths, and none is judged.
 
 Deviations to the left of the contour's sense of travel are positive in the tables. Points are
@@ -59,6 +59,7 @@ struct Options {
   ClosedChoice closed = ClosedChoice::Auto;
   std::string contour;
   std::optional<Format> from;
+  std::optional<int> outline;
   std::string table;
   std::string json;
   bool all = false;
@@ -91,7 +92,7 @@ std::string TextFor(Options const& options, CheckReport const& report) {
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
   PointFile file = ReadPointsInput(options.points, console);
-  ContourFile contour = ReadContourInput(options.contour, options.from, console);
+  ContourFile contour = ReadContourInput({options.contour, options.from, options.outline}, console);
   std::string source;
   if (IsToleranceStated(options.points.tolerance, file)) {
     bool const isClosed = FindClosure(file.points, options.closed).isClosed;
@@ -120,6 +121,7 @@ void AddOptions(Command& command, Options* options) {
       command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contour as this");
+  AddOutline(command, &options->outline);
   command.AddText("--table", &options->table, "FILE",
                   "Write every point's deviation to this CSV file; - is the standard output, which "
                   "then holds nothing else");

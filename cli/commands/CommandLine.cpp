@@ -1,9 +1,12 @@
 #include "cli/commands/CommandLine.h"
 
 #include <CLI/CLI.hpp>
+#include <algorithm>
 #include <sstream>
 
+#include "cli/commands/NearestWord.h"
 #include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
 
 namespace Vorn::Cli {
 
@@ -14,6 +17,18 @@ namespace {
   for (CLI::App const* command : program.get_subcommands()) name += command->get_name() + " ";
   throw Failure(FailureKind::BadArgument,
                 complaint + "\nRun '" + program.get_name() + " " + name + "--help' for the usage.");
+}
+
+/// CLI11 itself says only that a command is missing.
+void RefuseUnknownCommand(CLI::App const& program, int argc, char const* const* argv) {
+  if (argc < 2 || argv[1][0] == '-') return;
+  std::string const word = argv[1];
+  std::vector<std::string> names;
+  for (CLI::App const* command : program.get_subcommands({})) names.push_back(command->get_name());
+  if (std::find(names.begin(), names.end(), word) != names.end()) return;
+  auto const nearest = NearestWord(word, names);
+  RefuseUsage(program, "there is no command " + Quoted(word) +
+                           (nearest ? "; did you mean " + Quoted(*nearest) + "?" : ""));
 }
 
 }  // namespace
@@ -82,6 +97,7 @@ Command CommandLine::AddCommand(std::string const& name, std::string const& text
 }
 
 std::optional<std::string> CommandLine::Parse(int argc, char const* const* argv) {
+  RefuseUnknownCommand(*program_, argc, argv);
   try {
     program_->parse(argc, argv);
   } catch (CLI::ParseError const& error) {

@@ -2,18 +2,50 @@
 
 #include <ostream>
 
+#include "cli/commands/CommonOptions.h"
+#include "vorn/io/Failure.h"
 #include "vorn/io/Messages.h"
+#include "vorn/io/Outlines.h"
 
 namespace Vorn::Cli {
 
-ContourFile ReadContourInput(std::string const& path, std::optional<Format> from,
-                             Console const& console) {
-  ContourFile contour = ReadContour(path, console.in, from);
+namespace {
+
+ContourFile Chosen(std::vector<ContourFile> const& outlines, int number) {
+  auto const index = static_cast<std::size_t>(number) - 1;
+  if (index < outlines.size()) return outlines[index];
+  throw Failure(FailureKind::BadArgument, outlines.front().path + ": there is no outline " +
+                                              std::to_string(number) + ", the file has " +
+                                              Counted(outlines.size(), "outline"));
+}
+
+/// Says on the standard error what was left out.
+ContourFile Read(ContourInput const& input, Console const& console) {
+  ContourFile contour = ReadContour(input.path, console.in, input.from);
   if (contour.leftOut > 0) {
     console.err << "contour: " << contour.path << ": left out " << Counted(contour.leftOut, "piece")
                 << " without length\n";
   }
   return contour;
+}
+
+}  // namespace
+
+void AddOutline(Command& command, std::optional<int>* outline) {
+  constexpr int kMost = 1000000;
+  AddWholeNumber(command, "--outline", outline, 1, kMost, "N",
+                 "Take only this one of the outlines in a file, counted from 1");
+}
+
+std::vector<ContourFile> ReadOutlines(ContourInput const& input, Console const& console) {
+  std::vector<ContourFile> outlines = OutlinesOf(Read(input, console));
+  if (input.outline) return {Chosen(outlines, *input.outline)};
+  return outlines;
+}
+
+ContourFile ReadContourInput(ContourInput const& input, Console const& console) {
+  ContourFile const contour = Read(input, console);
+  return input.outline ? Chosen(OutlinesOf(contour), *input.outline) : Chained(contour);
 }
 
 void ReportGaps(ContourFile const& contour, Console const& console) {

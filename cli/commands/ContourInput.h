@@ -2,17 +2,32 @@
 
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "cli/commands/Command.h"
+#include "cli/commands/CommandLine.h"
+#include "vorn/io/ContourFile.h"
 #include "vorn/io/Formats.h"
 
 namespace Vorn::Cli {
 
-/// Reads the contour that a command works on and says on the standard error what was left out.
-/// @param from the format when the user names it
-/// @throws Failure as ReadContour does.
-ContourFile ReadContourInput(std::string const& path, std::optional<Format> from,
-                             Console const& console);
+/// A contour that a command reads.
+struct ContourInput {
+  std::string path;
+  std::optional<Format> from;
+  std::optional<int> outline;  ///< counted from 1; nothing: all there are
+};
+
+/// Adds --outline.
+void AddOutline(Command& command, std::optional<int>* outline);
+
+/// The outlines in the file, each chained from its pieces (see OutlinesOf), or the one asked for.
+/// @throws Failure as ReadContour does, or (FailureKind::BadArgument) when there are not so many.
+std::vector<ContourFile> ReadOutlines(ContourInput const& input, Console const& console);
+
+/// The same as one contour with gaps between the outlines. One whose pieces are chained in the file
+/// as far as they can be stays as it is.
+ContourFile ReadContourInput(ContourInput const& input, Console const& console);
 
 /// Says on the standard error where pieces do not meet.
 void ReportGaps(ContourFile const& contour, Console const& console);

@@ -40,7 +40,8 @@ What a format keeps:
 Drawings show the pieces, their joints and their order; they cannot be read back. With measured
 points 'contour plot' draws the deviations as well.
 DXF, G-code and WKT hold arcs of more than 315 degrees as two halves. Where pieces do not meet, the
-gap is kept and reported.
+gap is kept and reported. Pieces that meet are chained, whatever their order in the file (see
+'contour area --help').
 
 Every file that holds the contour is read back. Where it leaves the contour by more than the last
 digits of doubles, the line that names it says how far, and with --tolerance whether that is too
@@ -69,6 +70,7 @@ struct Options {
   std::optional<Format> to;
   std::string units;
   std::optional<double> tolerance;
+  std::optional<int> outline;
   WriteOptions write;
 
   std::vector<NamedFile> Written() const {
@@ -117,7 +119,7 @@ bool IsTooFar(Options const& options, Converted const& file) {
 }
 
 std::string LineFor(Options const& options, ContourFile const& contour, Converted const& file) {
-  std::string const text = "wrote       " + file.path;
+  std::string const text = "wrote       " + Printable(file.path);
   if (!file.departure || *file.departure <= JointTolerance(contour.pieces)) return text + "\n";
   std::string const units = contour.units.empty() ? "" : " " + contour.units;
   return text + ", up to " + FormatShort(*file.departure, 2) + units + " from the contour" +
@@ -141,8 +143,8 @@ void PrintSummary(Options const& options, ContourFile const& contour,
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile contour = ReadContourInput(options.input, options.from, console);
-  if (!options.units.empty()) contour.units = options.units;
+  ContourFile contour = ReadContourInput({options.input, options.from, options.outline}, console);
+  if (!options.units.empty()) contour.units = Printable(options.units);
   Outputs outputs;
   std::vector<Converted> files;
   for (std::string const& path : options.outputs) {
@@ -169,18 +171,17 @@ void AddOptions(Command& command, Options* options) {
   command
       .AddText("CONTOUR", &options->input, "FILE", "File with the contour; - is the standard input")
       .Require();
-  command
-      .AddRepeatable(
-          "-o,--output", &options->outputs, "FILE",
-          "Write the contour to this file; may be given several times; - is the standard "
-          "output")
-      .Require();
+  command.AddRepeatable(
+      "-o,--output", &options->outputs, "FILE",
+      "Write the contour to this file; may be given several times; - is the standard "
+      "output, which --to without -o means as well");
   AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt"}, &options->from,
             "Read the input as this");
   AddFormat(command, "--to", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png", "html"},
             &options->to, "Write the outputs as this");
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
+  AddOutline(command, &options->outline);
   AddPositiveNumber(command, "-t,--tolerance", &options->tolerance, "T",
                     "How far a file may leave the contour; G-code gets the digits for it");
   AddWriteOptions(command, &options->write);
@@ -194,6 +195,10 @@ void AddConvertCommand(CommandLine& program, Action* action) {
   auto const options = std::make_shared<Options>();
   AddOptions(command, options.get());
   command.OnParsed([options, action] {
+    if (options->outputs.empty() && options->to) options->outputs = {"-"};
+    if (options->outputs.empty()) {
+      throw Failure(FailureKind::BadArgument, "--output is required, or --to");
+    }
     RefuseSharedFiles({{"CONTOUR", options->input}}, options->Written());
     for (std::string const& path : options->outputs) FormatFor(*options, path);
     options->write.gcode.tolerance = options->tolerance;

@@ -45,13 +45,14 @@ body that is open at one end and a contour with its seam in a very sharp corner 
 so do a closed contour and one that is open by a single step: then say --closed yes or no. The
 contour is cut open at --start or else where it turns most (without a corner: where two pieces
 meet) and fitted all the way round. Both ends are moved to one common point where that keeps
-every point within its tolerance; otherwise the gap is reported. A full circle comes out as two
-half circles.
+every point within its tolerance; otherwise a short line joins them, and where no line within the
+tolerance can, the gap is reported and the exit code is 1. A full circle comes out as two half
+circles.
 
 Deviations are multiples of the tolerance of the point: up to 1 is within tolerance. They are
-printed as the fit reports them, and as measured again by the program over every point. Up to
-1 + 1e-9 counts as within, for the rounding of the second measurement. Points are counted from
-0. The strategy arc reports its deviation as a length, and no point.
+printed as the fit reports them, and as measured again by the program over every point; the larger
+counts. Up to 1 + 1e-6 counts as within, for the rounding of the measurement. Points are counted
+from 0. The strategy arc reports its deviation as a length, and no point.
 
 Outputs: the ending of a file tells its format: .json (the contour with deviations and all),
 .csv, .dxf, .nc or .gcode, .wkt (the contour; see 'contour convert --help' for what each keeps),
@@ -68,7 +69,8 @@ of all files, in the order 70, 3, 2, 4, 5, 1, 0.
 
 Exit codes:
   0   every point is within its tolerance
-  1   the contour, or a file of it, leaves the tolerance of a point (table and files are written)
+  1   the contour, or a file of it, leaves the tolerance of a point, or a closed contour has a gap
+      (table and files are written)
   2   wrong usage
   3   a file cannot be read or written, or a line of the points file is wrong
   4   two neighbouring points are too close for their tolerances
@@ -168,7 +170,8 @@ void PrintResults(Options const& options, FitReport const& report,
   FittedFile const* const worst = WorstOf(files);
   console.out << ToTable(report, options.digits,
                          worst == nullptr ? "" : ReadBackText(report, *worst));
-  for (FittedFile const& file : files) console.out << "wrote       " << file.path << '\n';
+  for (FittedFile const& file : files)
+    console.out << "wrote       " << Printable(file.path) << '\n';
 }
 
 void WriteResults(Options const& options, FitReport const& report,
@@ -327,6 +330,11 @@ void AddFitCommand(CommandLine& program, Action* action) {
   AddOptions(command, options.get());
   command.OnParsed([options, action] {
     options->points.path = options->paths.front();
+    bool const namesNoFile =
+        options->outputs.empty() && options->json.empty() && options->svg.empty();
+    if (namesNoFile && !options->AreMany() && options->formats.size() == 1) {
+      options->outputs = {"-"};
+    }
     RefuseWrongUse(*options);
     *action = [options](Console const& console) {
       return options->AreMany() ? RunMany(*options, console) : Run(*options, console);

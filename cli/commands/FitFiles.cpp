@@ -1,7 +1,9 @@
 #include "cli/commands/FitFiles.h"
 
+#include "cli/texts/Relative.h"
 #include "vorn/io/Drawing.h"
 #include "vorn/io/FitReport.h"
+#include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
@@ -28,7 +30,7 @@ std::string TextOf(FitReport const& report, Format format, WriteOptions const& o
 }
 
 std::string NameOf(FittedFile const& file) {
-  return file.path == "-" ? "the standard output" : file.path;
+  return file.path == "-" ? "the standard output" : Printable(file.path);
 }
 
 /// Why a contour within tolerance is not so in its file.
@@ -78,16 +80,20 @@ std::string Complaint(FitReport const& report, std::vector<FittedFile> const& fi
     return file.path + ": no fit beyond (" + FormatShort(end.x) + ", " + FormatShort(end.y) +
            "): the contour stops before the last point, " + file.NameOf(file.points.size() - 1);
   }
+  if (report.verdict == Verdict::NotClosed) {
+    return file.path + ": the ends of the closed contour are " + FormatShort(report.Gap()) +
+           " apart at " + file.NameOf(report.seam) +
+           ", and nothing within the tolerance joins them";
+  }
   if (report.verdict == Verdict::WithinTolerance) return FileComplaint(report, *WorstOf(files));
   return file.path + ": the contour leaves the tolerance of " +
-         file.NameOf(report.remeasured.worst) + " (relative deviation " +
-         FormatShort(report.remeasured.Worst().relative) + ")";
+         file.NameOf(report.LargestDeviation().point) + " (relative deviation " +
+         FormatShort(report.LargestDeviation().relative) + ")";
 }
 
 std::string ReadBackText(FitReport const& report, FittedFile const& file) {
-  constexpr int kDecimals = 6;
   if (!file.measure->unreadable.empty()) return "not possible for " + NameOf(file);
-  return FormatFixed(file.measure->relative, kDecimals) + " of the tolerance at " +
+  return RelativeText(file.measure->relative) + " of the tolerance at " +
          report.file.NameOf(file.measure->point) + " in " + NameOf(file);
 }
 

@@ -15,6 +15,7 @@
 #include <utility>
 
 #include "cli/commands/Outputs.h"
+#include "cli/texts/Relative.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -25,7 +26,6 @@ namespace {
 namespace fs = std::filesystem;
 
 constexpr char const* kStandardStream = "-";
-constexpr int kDeviationDecimals = 6;
 constexpr int kTimeDecimals = 3;
 
 /// How one file ended.
@@ -78,7 +78,7 @@ Outcome FitFile(FitMany const& many, std::string const& path) {
   outcome.isFitted = true;
   outcome.points = report.file.points.size();
   outcome.pieces = report.pieces.size();
-  outcome.deviation = report.remeasured.Worst().relative;
+  outcome.deviation = report.LargestDeviation().relative;
   if (!many.outFolder.empty()) {
     for (Format const format : many.formats) {
       outcome.files.push_back(many.render(report, OutputOf(many, path, format), format));
@@ -124,8 +124,7 @@ class Listing {
     if (outcome.isFitted) {
       Print(outcome.path,
             {std::to_string(outcome.points), std::to_string(outcome.pieces),
-             FormatFixed(outcome.deviation, kDeviationDecimals),
-             FormatFixed(outcome.seconds, kTimeDecimals)},
+             RelativeText(outcome.deviation), FormatFixed(outcome.seconds, kTimeDecimals)},
             outcome.verdict);
       points_ += outcome.points;
       pieces_ += outcome.pieces;
@@ -150,8 +149,8 @@ class Listing {
     }
     text += "; " + Counted(points_, "point") + ", " + Counted(pieces_, "piece");
     if (!largest_.empty()) {
-      text += "; largest deviation " + FormatFixed(deviation_, kDeviationDecimals) +
-              " of the tolerance in " + largest_;
+      text += "; largest deviation " + RelativeText(deviation_) + " of the tolerance in " +
+              Printable(largest_);
     }
     if (many_.showTime) {
       std::chrono::duration<double> const taken = std::chrono::steady_clock::now() - begin_;
@@ -173,7 +172,8 @@ class Listing {
       constexpr std::size_t kWidth = 9;
       line += "  " + std::string(kWidth - std::min(kWidth, numbers[i].size()), ' ') + numbers[i];
     }
-    console_.out << line << "  " << result << std::endl;  // at once, for who is waiting
+    console_.out << Printable(line) << "  " << Printable(result)
+                 << std::endl;  // at once, for who is waiting
   }
 
   FitMany const& many_;

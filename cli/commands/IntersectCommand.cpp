@@ -49,6 +49,7 @@ struct Options {
   std::string a;
   std::string b;  ///< empty: the first with itself
   std::optional<Format> from;
+  std::optional<int> outline;  ///< of the first file
   std::string output;
   bool asJson = false;
   bool failIfAny = false;
@@ -67,9 +68,9 @@ struct Options {
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile const a = ReadContourInput(options.a, options.from, console);
+  ContourFile const a = ReadContourInput({options.a, options.from, options.outline}, console);
   std::optional<ContourFile> other;
-  if (!options.b.empty()) other = ReadContourInput(options.b, options.from, console);
+  if (!options.b.empty()) other = ReadContourInput({options.b, options.from, {}}, console);
   ContourFile const* const b = other ? &*other : nullptr;
   std::vector<Intersection> const found =
       b == nullptr ? SelfIntersectionsOf(a) : IntersectionsOf(a, *b);
@@ -91,6 +92,7 @@ void AddOptions(Command& command, Options* options) {
       command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contours as this");
+  AddOutline(command, &options->outline);
   command.AddText("-o,--output", &options->output, "FILE",
                   "Write the points to this CSV file; - is the standard output");
   command.AddFlag("--json", &options->asJson, "Write the points as JSON, with every digit");

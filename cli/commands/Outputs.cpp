@@ -29,9 +29,18 @@ bool AreSameFile(std::string const& a, std::string const& b) {
 }
 
 /// All of them or, when interrupted, none.
-void Commit(std::vector<std::unique_ptr<AtomicFile>> const& files) {
+void CommitFiles(std::vector<std::unique_ptr<AtomicFile>> const& files) {
   auto const lock = HoldOffInterruption();
-  for (auto const& file : files) file->Commit();
+  for (auto const& file : files) {
+    if (!file->IsStream()) file->Commit();
+  }
+}
+
+void Commit(std::vector<std::unique_ptr<AtomicFile>> const& files) {
+  CommitFiles(files);
+  for (auto const& file : files) {
+    if (file->IsStream()) file->Commit();
+  }
 }
 
 }  // namespace

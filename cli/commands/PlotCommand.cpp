@@ -61,6 +61,7 @@ struct Options {
   std::string contour;
   std::vector<std::string> outputs;
   std::optional<Format> to;
+  std::optional<int> outline;
   std::optional<double> magnify;
   std::optional<double> dpi;
   std::optional<int> width;
@@ -123,16 +124,16 @@ std::string NameOfFile(std::string const& path) {
   return path == "-" ? "standard input" : std::filesystem::path(path).filename().string();
 }
 
-ContourFile ReadDrawnContour(std::string const& path, Console const& console) {
-  ContourFile contour = ReadContourInput(path, {}, console);
+ContourFile ReadDrawnContour(Options const& options, Console const& console) {
+  ContourFile contour = ReadContourInput({options.contour, {}, options.outline}, console);
   ReportGaps(contour, console);
   return contour;
 }
 
 Drawing ReadDrawing(Options const& options, Console const& console) {
   if (options.points.path.empty()) {
-    ContourFile contour = ReadDrawnContour(options.contour, console);
-    if (!options.points.units.empty()) contour.units = options.points.units;
+    ContourFile contour = ReadDrawnContour(options, console);
+    if (!options.points.units.empty()) contour.units = Printable(options.points.units);
     return DrawingOf(contour);
   }
   PointFile file = ReadPointsInput(options.points, console);
@@ -141,7 +142,7 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
     AssignTolerances(options.points.tolerance, &file, isClosed);
   }
   ContourFile contour;
-  if (!options.contour.empty()) contour = ReadDrawnContour(options.contour, console);
+  if (!options.contour.empty()) contour = ReadDrawnContour(options, console);
   Drawing drawing = MakeDrawing(std::move(file.points), std::move(contour.pieces));
   drawing.units = file.units.empty() ? contour.units : file.units;
   drawing.title = NameOfFile(options.points.path);
@@ -188,7 +189,8 @@ ExitCode Run(Options const& options, Console const& console) {
       std::find(options.outputs.begin(), options.outputs.end(), "-") != options.outputs.end();
   if (isOutTaken) return ExitCode::Ok;
   console.out << Summary(drawing);
-  for (std::string const& path : options.outputs) console.out << "wrote       " << path << '\n';
+  for (std::string const& path : options.outputs)
+    console.out << "wrote       " << Printable(path) << '\n';
   return ExitCode::Ok;
 }
 
@@ -213,16 +215,15 @@ void AddOptions(Command& command, Options* options) {
   AddPointsInput(command, &options->points);
   command.AddText("CONTOUR", &options->contour, "FILE",
                   "File with a contour; - is the standard input");
-  command
-      .AddRepeatable(
-          "-o,--output", &options->outputs, "FILE",
-          "Write the drawing to this file; may be given several times; - is the standard "
-          "output")
-      .Require();
+  command.AddRepeatable(
+      "-o,--output", &options->outputs, "FILE",
+      "Write the drawing to this file; may be given several times; - is the standard "
+      "output, which --to without -o means as well");
   AddWord(
       command, "--to", {"svg", "png", "html"},
       [options](std::string const& word) { options->to = FormatNamed(word); },
       "Write the outputs as this");
+  AddOutline(command, &options->outline);
   AddMagnify(command, &options->magnify);
   Option const dpi = AddPositiveNumber(command, "--dpi", &options->dpi, "N",
                                        "PNG: pixels to the inch on A4; 150 if not said");
@@ -238,6 +239,10 @@ void AddPlotCommand(CommandLine& program, Action* action) {
   auto const options = std::make_shared<Options>();
   AddOptions(command, options.get());
   command.OnParsed([options, action] {
+    if (options->outputs.empty() && options->to) options->outputs = {"-"};
+    if (options->outputs.empty()) {
+      throw Failure(FailureKind::BadArgument, "--output is required, or --to");
+    }
     TellContourFromPoints(options.get());
     RefuseSharedInput(*options);
     RefuseSharedFiles(options->Read(), options->Written());

@@ -8,7 +8,9 @@ namespace Vorn::Cli {
 
 char const* const kPointsFileText =
     R"(Points file: one point a line, x,y or x,y,w (w: the tolerance of the point), in the order of
-the contour. The first line may be a header. Fields are separated by a comma, a semicolon, a
+the contour. A header tells the columns: x and y, x and z, y and z, names that instruments write
+in English, German and French, with units in them. Where it does not tell, --columns must. Text
+ahead of the table is skipped. Fields are separated by a comma, a semicolon, a
 tab or blanks; decimal commas are read where the separator is none. What follows # or // is a
 comment; "# tolerance T" and "# units mm" are read.
 )";
@@ -61,7 +63,7 @@ void AddClosedChoice(Command& command, ClosedChoice* choice) {
 
 PointFile ReadPointsInput(PointsInput const& input, Console const& console) {
   PointFile file = ReadPoints(input.path, console.in, ColumnFor(input.tolerance), input.columns);
-  if (!input.units.empty()) file.units = input.units;
+  if (!input.units.empty()) file.units = Printable(input.units);
   return file;
 }
 

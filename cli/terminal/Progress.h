@@ -13,7 +13,7 @@ namespace Vorn::Cli {
 
 /// A bar that fills as the fit moves through the points, with their rate and the time left, redrawn
 /// in one line of a terminal and wiped off at the end. Anywhere else than on a terminal it stays
-/// silent.
+/// silent, and so on a dumb one.
 class ProgressBar final : public ExecutionState {
  public:
   static constexpr std::int32_t kFull = 100;
@@ -40,6 +40,10 @@ class ProgressBar final : public ExecutionState {
   Clock::time_point begin_ = Clock::now();
   Clock::time_point drawn_ = begin_;
 };
+
+/// The line for `percent` in a terminal of so many columns: bar and pace get shorter or go as the
+/// room does.
+std::string ProgressLine(std::int32_t percent, std::string const& pace, std::size_t columns);
 
 /// "12000 points/s, 3 s left": what follows from `percent` of the points in so many seconds. Empty
 /// while nothing can be said.

@@ -24,7 +24,10 @@ std::string Heading(ContourArea const& area) {
   auto const arcs = static_cast<std::size_t>(std::count_if(
       pieces.begin(), pieces.end(), [](Piece const& piece) { return piece.IsArc(); }));
   std::string const& units = area.contour.units;
-  return area.contour.path + ": " + Counted(pieces.size(), "piece") + ", " +
+  std::string const outline = area.outline == 0 ? ""
+                                                : ", outline " + std::to_string(area.outline) +
+                                                      (area.IsHole() ? " (a hole)" : "");
+  return area.contour.path + outline + ": " + Counted(pieces.size(), "piece") + ", " +
          Counted(pieces.size() - arcs, "line") + ", " + Counted(arcs, "arc") +
          (units.empty() ? "" : ", lengths in " + units) + "\n";
 }
@@ -47,6 +50,13 @@ std::string ToText(ContourArea const& area) {
   text += Fact("crossing", CrossingText(area));
   for (Gap const& gap : area.gaps) text += Fact("gap", Describe(gap) + ", bridged");
   return text;
+}
+
+std::string NetText(std::vector<ContourArea> const& areas) {
+  auto const holes = static_cast<std::size_t>(std::count_if(
+      areas.begin(), areas.end(), [](ContourArea const& area) { return area.IsHole(); }));
+  return areas.front().contour.path + ": " + Counted(areas.size(), "outline") + ", " +
+         Counted(holes, "hole") + "\n" + Fact("area", Number(NetArea(areas)) + ", holes taken off");
 }
 
 }  // namespace Vorn::Cli

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <vector>
 
 #include "cli/base/Library.h"
 #include "vorn/io/ContourArea.h"
@@ -9,5 +10,8 @@ namespace Vorn::Cli {
 
 /// For people.
 std::string ToText(ContourArea const& area);
+
+/// The area of all outlines of one file.
+std::string NetText(std::vector<ContourArea> const& areas);
 
 }  // namespace Vorn::Cli

@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include "cli/texts/Columns.h"
+#include "cli/texts/Relative.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -13,7 +14,6 @@ namespace {
 
 /// Gaps and places where the contour meets itself are listed up to here.
 constexpr std::size_t kMostPlaces = 10;
-constexpr int kRelativeDecimals = 6;
 
 std::string PlaceOf(CheckReport const& report, std::size_t point) {
   PointDeviation const& deviation = report.deviations[point];
@@ -36,9 +36,8 @@ std::string DeviationFacts(CheckReport const& report) {
   std::string text = Fact("largest", FormatShort(report.deviations[report.furthest].distance) +
                                          " at " + PlaceOf(report, report.furthest));
   if (!report.HasTolerances()) return text;
-  text +=
-      Fact("relative", FormatFixed(report.deviations[report.worst].relative, kRelativeDecimals) +
-                           " of the tolerance at " + PlaceOf(report, report.worst));
+  text += Fact("relative", RelativeText(report.deviations[report.worst].relative) +
+                               " of the tolerance at " + PlaceOf(report, report.worst));
   std::string const total = Counted(report.file.points.size(), "point");
   return text + Fact("outside", report.outside.empty()
                                     ? "none of " + total
@@ -101,10 +100,12 @@ std::string ResultText(CheckReport const& report) {
 }
 
 std::string Summary(CheckReport const& report) {
+  std::string const& columns = report.file.columns;
   return Fact("points", std::to_string(report.file.points.size())) +
-         Fact("pieces", PiecesText(report)) + Fact("tolerance", ToleranceText(report)) +
-         DeviationFacts(report) + JointFacts(report) + CrossingFacts(report) +
-         Fact("area", AreaText(report)) + Fact("result", ResultText(report));
+         (columns.empty() ? "" : Fact("columns", columns)) + Fact("pieces", PiecesText(report)) +
+         Fact("tolerance", ToleranceText(report)) + DeviationFacts(report) + JointFacts(report) +
+         CrossingFacts(report) + Fact("area", AreaText(report)) +
+         Fact("result", ResultText(report));
 }
 
 Row Header(CheckReport const& report) {
@@ -124,7 +125,7 @@ Row PointRow(CheckReport const& report, std::size_t point) {
              std::to_string(deviation.piece + 1)};
   if (report.HasTolerances()) {
     row.push_back(FormatShort(measured.w));
-    row.push_back(FormatFixed(deviation.relative, kRelativeDecimals));
+    row.push_back(RelativeText(deviation.relative));
   }
   return row;
 }

@@ -5,6 +5,7 @@
 #include <numbers>
 
 #include "cli/texts/Columns.h"
+#include "cli/texts/Relative.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -80,17 +81,23 @@ std::string ReportedText(FitReport const& report) {
     return WithUnits(FormatShort(fit.deviation), report) +
            " as a length (this strategy reports no relative deviation and no point)";
   }
-  std::string const text = FormatFixed(fit.deviation, 6) + " of the tolerance";
+  std::string const text = RelativeText(fit.deviation) + " of the tolerance";
   if (fit.deviationIndex < 0) return text + ", exact by construction";
   return text + " at " + report.file.NameOf(static_cast<std::size_t>(fit.deviationIndex));
 }
 
 std::string RemeasuredText(FitReport const& report) {
   PointDeviation const& worst = report.remeasured.Worst();
-  return FormatFixed(worst.relative, 6) + " of the tolerance at " +
+  return RelativeText(worst.relative) + " of the tolerance at " +
          report.file.NameOf(report.remeasured.worst) + ", " +
          WithUnits(FormatShort(worst.distance), report) + " from piece " +
          std::to_string(worst.piece + 1);
+}
+
+std::string LargestText(FitReport const& report) {
+  FitReport::Deviation const largest = report.LargestDeviation();
+  return RelativeText(largest.relative) + " of the tolerance at " +
+         report.file.NameOf(largest.point) + ", the largest that was found";
 }
 
 std::string ClosedText(FitReport const& report) {
@@ -110,13 +117,14 @@ std::string CompressionText(FitReport const& report) {
 }
 
 std::string Summary(FitReport const& report, std::string const& readBack) {
-  return "points      " + std::to_string(report.file.points.size()) + "\n" + "tolerance   " +
-         ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) + "\n" +
-         "closed      " + ClosedText(report) + "\n" + "pieces      " +
+  return "points      " + std::to_string(report.file.points.size()) + "\n" +
+         (report.file.columns.empty() ? "" : "columns     " + report.file.columns + "\n") +
+         "tolerance   " + ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) +
+         "\n" + "closed      " + ClosedText(report) + "\n" + "pieces      " +
          std::to_string(report.pieces.size()) + ": " + Counted(report.LineCount(), "line") + ", " +
          Counted(report.ArcCount(), "arc") + "\n" + "compression " + CompressionText(report) +
          "\n" + "reported    " + ReportedText(report) + "\n" + "re-measured " +
-         RemeasuredText(report) + "\n" +
+         RemeasuredText(report) + "\n" + "deviation   " + LargestText(report) + "\n" +
          (readBack.empty() ? "" : "read back   " + readBack + "\n") + "result      " +
          Describe(report.verdict) + "\n" + "time        " + FormatFixed(report.fit.seconds, 3) +
          " s\n";

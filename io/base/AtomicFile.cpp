@@ -26,6 +26,9 @@ namespace fs = std::filesystem;
 std::string Target(std::string const& path) {
   std::error_code error;
   if (!fs::is_symlink(path, error)) return path;
+  if (!fs::exists(path, error)) {
+    Refuse(path, "is a link to " + fs::read_symlink(path, error).string() + ", which is not there");
+  }
   fs::path const target = fs::weakly_canonical(path, error);
   if (error) Refuse(path, error.message());
   return target.string();
@@ -48,6 +51,11 @@ mode_t ModeFor(std::string const& target) {
   return stat(target.c_str(), &status) == 0 ? (status.st_mode & 07777) : DefaultMode();
 }
 
+/// A device such as /dev/null or a pipe with a name, which takes what it is given at once.
+bool IsStreamFile(fs::file_status const& status) {
+  return fs::is_character_file(status) || fs::is_fifo(status);
+}
+
 }  // namespace
 
 void RequireWritable(std::string const& path) {
@@ -55,6 +63,10 @@ void RequireWritable(std::string const& path) {
   std::error_code error;
   fs::file_status const status = fs::status(target, error);
   if (fs::is_directory(status)) Refuse(path, "is a directory");
+  if (IsStreamFile(status)) {
+    if (access(target.c_str(), W_OK) != 0) Refuse(path, std::strerror(errno));
+    return;
+  }
   if (fs::exists(status) && !fs::is_regular_file(status)) Refuse(path, "is not a regular file");
   if (fs::path(target).filename().empty()) Refuse(path, "names no file");
   if (access(FolderOf(target).c_str(), W_OK | X_OK) != 0) Refuse(path, std::strerror(errno));
@@ -63,6 +75,10 @@ void RequireWritable(std::string const& path) {
 AtomicFile::AtomicFile(std::string const& path, std::string_view contents)
     : path_(path), target_(Target(path)) {
   RequireWritable(path);
+  if (IsStreamFile(fs::status(target_))) {
+    contents_ = contents;
+    return;
+  }
   int const descriptor = MakeTemporary();
   try {
     Write(descriptor, contents);
@@ -102,6 +118,7 @@ void AtomicFile::Write(int descriptor, std::string_view contents) const {
     if (written < 0) Refuse(path_, std::strerror(errno));
     contents.remove_prefix(static_cast<std::size_t>(written));
   }
+  if (temporary_.empty()) return;
   if (fchmod(descriptor, ModeFor(target_)) != 0) Refuse(path_, std::strerror(errno));
   if (fsync(descriptor) != 0) Refuse(path_, std::strerror(errno));
 }
@@ -110,7 +127,23 @@ AtomicFile::~AtomicFile() {
   if (!temporary_.empty()) RemoveTemporary();
 }
 
+bool AtomicFile::IsStream() const { return contents_.has_value(); }
+
+/// Nobody may be reading yet, so no lock is held here.
+void AtomicFile::WriteStream() const {
+  int const descriptor = open(target_.c_str(), O_WRONLY);
+  if (descriptor < 0) Refuse(path_, std::strerror(errno));
+  try {
+    Write(descriptor, *contents_);
+  } catch (...) {
+    close(descriptor);
+    throw;
+  }
+  if (close(descriptor) != 0) Refuse(path_, std::strerror(errno));
+}
+
 void AtomicFile::Commit() {
+  if (IsStream()) return WriteStream();
   auto const lock = LockStagedFiles();
   if (std::rename(temporary_.c_str(), target_.c_str()) != 0) {
     Refuse(path_, std::strerror(errno));

@@ -1,8 +1,10 @@
+
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
 #include <fstream>
 #include <istream>
+#include <string_view>
 
 #include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
@@ -13,8 +15,12 @@ namespace {
 
 constexpr std::size_t kFirstBlock = 64 * 1024;
 
-/// Far above any measurement; a device without an end must not fill the memory.
+/// Far above any measurement.
 constexpr std::size_t kLargestText = std::size_t{4} << 30;
+
+/// The same for what does not say how long it is: a pipe or a device without an end must not fill
+/// the memory.
+constexpr std::size_t kLargestStream = std::size_t{512} << 20;
 
 [[noreturn]] void Refuse(std::string const& path, std::string const& message) {
   throw Failure(FailureKind::File, {InputName(path)}, message);
@@ -28,14 +34,27 @@ std::size_t SizeToExpect(std::string const& path) {
                                                     : static_cast<std::size_t>(size) + 1;
 }
 
+/// Binary files need not be read to their end to be told from text.
+void RefuseBinary(std::string const& path, std::string_view block, std::size_t offset) {
+  std::size_t const zero = block.find('\0');
+  if (zero == std::string_view::npos) return;
+  Refuse(path, "is not text: byte " + std::to_string(offset + zero) + " is zero");
+}
+
 std::string ReadAll(std::string const& path, std::istream& in, std::size_t expected) {
+  std::size_t const largest = expected == kFirstBlock ? kLargestStream : kLargestText;
   std::string text;
   std::size_t size = 0;
   for (std::size_t room = expected; in; room = 2 * room) {
-    if (room > kLargestText) Refuse(path, "is too large");
-    text.resize(room);
-    in.read(text.data() + size, static_cast<std::streamsize>(room - size));
-    size += static_cast<std::size_t>(in.gcount());
+    if (size >= largest) {
+      Refuse(path, "is too large: more than " + std::to_string(largest >> 20) + " MiB");
+    }
+    text.resize(std::min(room, largest + 1));
+    in.read(text.data() + size, static_cast<std::streamsize>(text.size() - size));
+    auto const count = static_cast<std::size_t>(in.gcount());
+    if (expected == kFirstBlock)
+      RefuseBinary(path, std::string_view(text).substr(size, count), size);
+    size += count;
   }
   if (in.bad()) Refuse(path, "cannot be read");
   text.resize(size);

@@ -62,6 +62,10 @@ Drawing DrawingOf(FitReport const& report) {
   drawing.deviations = report.remeasured.points;
   drawing.verdict = report.verdict;
   drawing.facts = {DescribeTolerance(drawing), "strategy " + NameOf(report.strategy)};
+  if (report.closure.isClosed && report.Gap() != 0.0) {
+    drawing.facts.push_back(WithUnits("GAP of " + FormatShort(report.Gap()), drawing) + " at " +
+                            report.file.NameOf(report.seam));
+  }
   return drawing;
 }
 

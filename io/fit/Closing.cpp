@@ -128,10 +128,78 @@ double WorstOf(std::vector<WPoint> const& points, std::vector<Piece> const& piec
   return Remeasure(points, pieces).Worst().relative;
 }
 
-}  // namespace
+/// What is left of a piece without the first or last stretch; nothing when that is all of it.
+std::optional<Piece> Shortened(Piece const& piece, double atStart, double atEnd) {
+  if (!(atStart + atEnd < piece.length)) return {};
+  if (piece.IsArc()) {
+    XY const start = atStart > 0.0 ? PointOnArc(piece, atStart / piece.radius) : piece.start;
+    XY const end = atEnd > 0.0 ? PointOnArc(piece, piece.sweep - atEnd / piece.radius) : piece.end;
+    return MakeArc(start, end, piece.center, piece.radius, piece.counterClockwise);
+  }
+  double const x = (piece.end.x - piece.start.x) / piece.length;
+  double const y = (piece.end.y - piece.start.y) / piece.length;
+  return MakeLine({piece.start.x + atStart * x, piece.start.y + atStart * y},
+                  {piece.end.x - atEnd * x, piece.end.y - atEnd * y});
+}
 
-bool CloseExactly(std::vector<WPoint> const& points, std::vector<Piece>* pieces) {
-  if (GapOf(*pieces) == 0.0) return true;
+double StepBetween(WPoint const& a, WPoint const& b) { return std::hypot(b.x - a.x, b.y - a.y); }
+
+/// The last and the first piece with a line between them.
+struct Bridge {
+  Piece last;
+  Piece line;
+  Piece first;
+};
+
+/// A bridge that begins and ends this part of a step away from the seam.
+std::optional<Bridge> BridgeOver(std::vector<WPoint> const& points,
+                                 std::vector<Piece> const& pieces, double part) {
+  auto const last =
+      Shortened(pieces.back(), 0.0, part * StepBetween(points[points.size() - 2], points.back()));
+  auto const first = Shortened(pieces.front(), part * StepBetween(points[0], points[1]), 0.0);
+  if (!last || !first) return {};
+  return Bridge{*last, MakeLine(last->end, first->start), *first};
+}
+
+/// Whether both ends of the line are within the tolerance of the seam, and so all of it.
+bool IsAtSeam(Piece const& line, WPoint const& seam) {
+  double const largest = kLargestRelative * seam.w;
+  return std::hypot(line.start.x - seam.x, line.start.y - seam.y) <= largest &&
+         std::hypot(line.end.x - seam.x, line.end.y - seam.y) <= largest;
+}
+
+/// The parts of a step to try, the longest first: the longer a bridge, the less it turns.
+constexpr double kPartsOfStep[] = {0.5, 0.3, 0.1};
+
+std::optional<Bridge> FindBridge(std::vector<WPoint> const& points,
+                                 std::vector<Piece> const& pieces) {
+  if (pieces.size() > 1) {
+    std::vector<WPoint> const near = PointsAtSeam(points, pieces);
+    double const largest =
+        std::max(kLargestRelative, WorstOf(near, {pieces.front(), pieces.back()}));
+    for (double const part : kPartsOfStep) {
+      std::optional<Bridge> const bridge = BridgeOver(points, pieces, part);
+      if (bridge && WorstOf(near, {bridge->last, bridge->line, bridge->first}) <= largest) {
+        return bridge;
+      }
+    }
+  }
+  Bridge const shortest = {pieces.back(), MakeLine(pieces.back().end, pieces.front().start),
+                           pieces.front()};
+  if (IsAtSeam(shortest.line, points.front())) return shortest;
+  return {};
+}
+
+bool CloseWithOneMore(std::vector<WPoint> const& points, std::vector<Piece>* pieces) {
+  std::optional<Bridge> const bridge = FindBridge(points, *pieces);
+  if (!bridge) return false;
+  pieces->front() = bridge->first;
+  if (pieces->size() > 1) pieces->back() = bridge->last;
+  pieces->push_back(bridge->line);
+  return true;
+}
+
+bool CloseInOnePoint(std::vector<WPoint> const& points, std::vector<Piece>* pieces) {
   if (pieces->size() < 2) return false;
   std::vector<WPoint> const near = PointsAtSeam(points, *pieces);
   // Only where the end pieces stand for all of them may the others lend a hand.
@@ -151,6 +219,13 @@ bool CloseExactly(std::vector<WPoint> const& points, std::vector<Piece>* pieces)
   pieces->front() = best->front();
   pieces->back() = best->back();
   return true;
+}
+
+}  // namespace
+
+bool CloseExactly(std::vector<WPoint> const& points, std::vector<Piece>* pieces) {
+  if (GapOf(*pieces) == 0.0) return true;
+  return CloseInOnePoint(points, pieces) || CloseWithOneMore(points, pieces);
 }
 
 double GapOf(std::vector<Piece> const& pieces) {

@@ -15,6 +15,10 @@ namespace Vorn::IO {
 /// end.
 ///
 /// @param points from the seam to the seam again
+/// Where no such place keeps the tolerances, the contour gets one piece more: a line over the seam,
+/// from between the two last points to between the two first ones or, if nothing longer fits, from
+/// end to start. It stays within the tolerance of the seam.
+///
 /// @return whether the contour is closed exactly now; if not, the pieces are as they were
 bool CloseExactly(std::vector<WPoint> const& points, std::vector<Piece>* pieces);
 

@@ -16,6 +16,7 @@ Json InputJson(FitReport const& report) {
   return {
       {"file", report.file.path},
       {"points", report.file.points.size()},
+      {"columns", report.file.columns},
       {"units", units},
       {"tolerance",
        {{"source", report.toleranceSource},
@@ -43,6 +44,12 @@ Json ReportedJson(FitReport const& report) {
   };
 }
 
+/// The larger of the two.
+Json LargestJson(FitReport const& report) {
+  FitReport::Deviation const largest = report.LargestDeviation();
+  return {{"value", largest.relative}, {"kind", "relative"}, {"point", largest.point}};
+}
+
 Json RemeasuredJson(FitReport const& report) {
   PointDeviation const& worst = report.remeasured.Worst();
   return {
@@ -65,6 +72,8 @@ char const* VerdictName(Verdict verdict) {
       return "within tolerance";
     case Verdict::OutsideTolerance:
       return "outside tolerance";
+    case Verdict::NotClosed:
+      return "not closed";
     case Verdict::StopsEarly:
       return "stops early";
   }
@@ -88,7 +97,10 @@ std::string ToJson(FitReport const& report) {
        {{"elements", report.pieces.size()},
         {"lines", report.LineCount()},
         {"arcs", report.ArcCount()}}},
-      {"deviation", {{"reported", ReportedJson(report)}, {"remeasured", RemeasuredJson(report)}}},
+      {"deviation",
+       {{"largest", LargestJson(report)},
+        {"reported", ReportedJson(report)},
+        {"remeasured", RemeasuredJson(report)}}},
   };
   document.update(ClosureJson(report));
   document["elements"] = elements;

@@ -17,10 +17,9 @@ bool IsWithin(double relative) { return relative <= kLargestRelative; }
 
 Verdict Judge(FitReport const& report, bool reachesLastPoint) {
   if (!reachesLastPoint) return Verdict::StopsEarly;
-  bool const reportsRelative = !report.isFullCircle && IsDeviationRelative(report.strategy);
-  bool const within = (!reportsRelative || IsWithin(report.fit.deviation)) &&
-                      IsWithin(report.remeasured.Worst().relative);
-  return within ? Verdict::WithinTolerance : Verdict::OutsideTolerance;
+  if (!IsWithin(report.LargestDeviation().relative)) return Verdict::OutsideTolerance;
+  bool const hasGap = report.closure.isClosed && report.Gap() != 0.0;
+  return hasGap ? Verdict::NotClosed : Verdict::WithinTolerance;
 }
 
 /// The ranges over the points of the circuit as ranges over those of the file. The seam stands at
@@ -55,6 +54,15 @@ double FitReport::LargestTolerance() const {
 
 double FitReport::Gap() const { return GapOf(pieces); }
 
+FitReport::Deviation FitReport::LargestDeviation() const {
+  bool const reportsRelative = !isFullCircle && IsDeviationRelative(strategy);
+  double const measured = remeasured.Worst().relative;
+  // Written so that what is not a number counts as the larger.
+  if (!reportsRelative || fit.deviation <= measured) return {measured, remeasured.worst};
+  if (fit.deviationIndex < 0) return {fit.deviation, remeasured.worst};
+  return {fit.deviation, static_cast<std::size_t>(fit.deviationIndex)};
+}
+
 FitReport MakeReport(PointFile file, std::string toleranceSource,
                      GeometryUtils::FittingStrategy strategy, FitAnswer fit) {
   FitReport report;
@@ -87,11 +95,11 @@ FitReport MakeClosedReport(PointFile file, std::string toleranceSource,
   if (reachesLastPoint) CloseExactly(circuit.points, &report.pieces);
   report.ranges = RangesInFile(circuit, report.pieces);
   report.remeasured = Remeasure(report.file.points, report.pieces);
-  report.verdict = Judge(report, reachesLastPoint);
   if (report.fit.deviationIndex >= 0) {
     auto const inCircuit = static_cast<std::size_t>(report.fit.deviationIndex);
     report.fit.deviationIndex = static_cast<std::int32_t>(circuit.origin[inCircuit]);
   }
+  report.verdict = Judge(report, reachesLastPoint);
   return report;
 }
 
@@ -101,6 +109,8 @@ std::string Describe(Verdict verdict) {
       return "within tolerance";
     case Verdict::OutsideTolerance:
       return "OUTSIDE TOLERANCE";
+    case Verdict::NotClosed:
+      return "NOT CLOSED: the ends of a closed contour do not meet";
     case Verdict::StopsEarly:
       return "NO FIT: the contour stops before the last point";
   }

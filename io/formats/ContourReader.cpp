@@ -7,6 +7,7 @@
 #include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
 
 namespace Vorn::IO {
 
@@ -54,7 +55,8 @@ ContourFile ParseContour(std::string_view text, std::string const& path,
   RefuseBinary(text, path);
   RefuseEmpty(text, path);
   ContourFile contour = ParseAs(format ? *format : RecognisedFormat(text, path), text, path);
-  contour.path = path;
+  contour.path = Printable(path);
+  contour.units = Printable(contour.units);
   if (contour.pieces.empty()) RefuseFile(path, "holds no contour: there are no pieces");
   contour.leftOut = RemovePiecesWithoutLength(&contour.pieces);
   if (contour.pieces.empty()) RefuseFile(path, "holds no contour: no piece has a length");

@@ -31,6 +31,8 @@ Json AreaJson(ContourArea const& area) {
       {"box", {{"low", PointJson(area.extent.low)}, {"high", PointJson(area.extent.high)}}},
       {"crossesItself", area.crossesItself},
       {"gaps", gaps},
+      {"outline", area.outline == 0 ? Json(nullptr) : Json(area.outline)},
+      {"isHole", area.IsHole()},
   };
 }
 
@@ -39,7 +41,8 @@ Json AreaJson(ContourArea const& area) {
 std::string ToJson(std::vector<ContourArea> const& areas) {
   Json list = Json::array();
   for (ContourArea const& area : areas) list.push_back(AreaJson(area));
-  Json const document = {{"schemaVersion", kSchemaVersion}, {"contours", list}};
+  Json const document = {
+      {"schemaVersion", kSchemaVersion}, {"contours", list}, {"netArea", NetArea(areas)}};
   // A file name need not be UTF-8; a replacement character is better than no document.
   return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
 }

@@ -11,6 +11,7 @@
 #include <cmath>
 
 #include "vorn/io/Intersections.h"
+#include "vorn/io/Outlines.h"
 
 namespace Vorn::IO {
 
@@ -153,6 +154,26 @@ ContourArea MeasureArea(ContourFile contour) {
 std::string SenseOf(ContourArea const& area) {
   if (area.signedArea == 0.0) return "none";
   return area.signedArea > 0.0 ? "counter-clockwise" : "clockwise";
+}
+
+std::vector<ContourArea> MeasureOutlines(std::vector<ContourFile> outlines) {
+  std::vector<std::size_t> const depths = DepthsOf(outlines);
+  std::vector<ContourArea> areas;
+  for (ContourFile& outline : outlines) {
+    ContourArea area = MeasureArea(std::move(outline));
+    area.outline = depths.size() > 1 ? areas.size() + 1 : 0;
+    area.depth = depths[areas.size()];
+    areas.push_back(std::move(area));
+  }
+  return areas;
+}
+
+double NetArea(std::vector<ContourArea> const& areas) {
+  double net = 0.0;
+  for (ContourArea const& area : areas) {
+    net += area.IsHole() ? -std::fabs(area.signedArea) : std::fabs(area.signedArea);
+  }
+  return net;
 }
 
 }  // namespace Vorn::IO

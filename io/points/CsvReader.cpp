@@ -7,6 +7,8 @@
 #include "io/base/Fields.h"
 #include "io/base/TextLines.h"
 #include "io/base/Words.h"
+#include "io/points/ColumnNames.h"
+#include "io/points/TableStart.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Messages.h"
@@ -23,6 +25,9 @@ constexpr std::size_t kMostNamesInMessage = 8;
 constexpr std::size_t kLongestColumnNumber = 9;
 constexpr std::size_t kShortestLine = 4;  // 1,2 and its end
 
+/// A million columns fit; taking a longer line apart would take many times its memory.
+constexpr std::size_t kLongestLine = std::size_t{16} << 20;
+
 std::string_view TakeWord(std::string_view* text) {
   *text = Trimmed(*text);
   std::size_t const end = std::min(text->find_first_of(" \t:="), text->size());
@@ -32,17 +37,7 @@ std::string_view TakeWord(std::string_view* text) {
   return word;
 }
 
-/// Also what begins like a number without being one, such as 3mm: it is meant as data and must not
-/// pass for the name of a column.
-bool LooksLikeNumber(std::string_view field) {
-  field = Unquoted(field);
-  if (ParseNumber(field)) return true;
-  std::string_view const digits =
-      field.substr(std::min(field.find_first_not_of("+-.,"), field.size()));
-  return !digits.empty() && digits.front() >= '0' && digits.front() <= '9';
-}
-
-std::string ColumnName(std::string_view field) { return LowerCase(Trimmed(Unquoted(field))); }
+std::string LowerName(std::string_view field) { return LowerCase(Trimmed(Unquoted(field))); }
 
 /// The index of the column with this number, counted from 1; nothing for other text.
 std::optional<std::size_t> IndexOfNumber(std::string_view text) {
@@ -54,25 +49,11 @@ std::optional<std::size_t> IndexOfNumber(std::string_view text) {
   return number - 1;
 }
 
-bool IsBlank(char c) { return c == ' ' || c == '\t'; }
-
-/// Where the comment of a line begins. A // within other text is none: it stands in addresses.
-std::size_t FindComment(std::string_view line) {
-  std::size_t const hash = line.find('#');
-  std::size_t slashes = line.find('/');
-  while (slashes < hash) {
-    bool const isFree = slashes == 0 || IsBlank(line[slashes - 1]);
-    if (isFree && line.substr(slashes, 2) == "//") return slashes;
-    slashes = line.find('/', slashes + 1);
-  }
-  return hash;
-}
-
 class Parser {
  public:
   Parser(std::string const& path, ToleranceColumn const& tolerance, ColumnChoice const& columns)
       : tolerance_(tolerance), columns_(columns) {
-    file_.path = InputName(path);
+    file_.path = Printable(InputName(path));
     if (columns.w.empty()) return;
     if (tolerance.use == ToleranceColumn::Use::Required) {
       throw Failure(
@@ -90,6 +71,7 @@ class Parser {
     std::size_t const mostPoints = std::min(lineFeeds, text.size() / kShortestLine) + 1;
     file_.points.reserve(mostPoints);
     file_.lines.reserve(mostPoints);
+    table_ = FindTable(text);
     TextLines lines(text);
     while (!lines.AtEnd()) {
       ++line_;
@@ -97,17 +79,24 @@ class Parser {
       ParseLine();
     }
     RefuseTooFewPoints();
+    file_.columns = DescribeColumns();
     return std::move(file_);
   }
 
  private:
   void ParseLine() {
+    if (lineText_.size() > kLongestLine) {
+      throw Failure(FailureKind::File, file_.path + ":" + std::to_string(line_) +
+                                           ": the line is longer than 16 MiB: no points file has "
+                                           "such lines");
+    }
     std::size_t const comment = FindComment(lineText_);
     std::string_view line = lineText_.substr(0, comment);
     if (comment != std::string_view::npos && file_.points.empty()) {
       ParseComment(lineText_.substr(comment));
     }
-    if (Trimmed(line).empty()) return;
+    if (Trimmed(line).empty() || line_ <= table_.first) return;
+    if (isUnitLineNext_) return ParseUnits(line);
     if (columnCount_ != 0) return ParseLineOfData(line);
     separator_ = FindSeparator(Trimmed(line));
     SplitFields(Trimmed(line), separator_, &fields_);
@@ -116,6 +105,26 @@ class Parser {
     if (columnCount_ < 2) RefuseOneColumn();
     isHeader ? ParseHeader() : ChooseColumnsWithoutHeader();
     if (!isHeader) ParsePoint();
+    isUnitLineNext_ = isHeader && table_.hasUnitLine;
+  }
+
+  /// The line below the header, of units alone.
+  void ParseUnits(std::string_view line) {
+    isUnitLineNext_ = false;
+    SplitFields(Trimmed(line), FindSeparator(Trimmed(line)), &fields_);
+    if (!HasAllFields()) return;
+    std::string const unit = ReadColumnName("x " + std::string(Unquoted(fields_[xColumn_]))).unit;
+    TakeUnits(unit, ReadColumnName("y " + std::string(Unquoted(fields_[yColumn_]))).unit);
+  }
+
+  /// Those that header or unit line give for the two coordinates. A comment goes before them.
+  void TakeUnits(std::string const& ofX, std::string const& ofY) {
+    if (ofX.empty() || ofY.empty()) return;
+    if (ofX != ofY) {
+      RefuseAt(fields_.front(), "one coordinate is in " + Quoted(ofX) + ", the other in " +
+                                    Quoted(ofY) + ": a contour needs one unit");
+    }
+    if (file_.units.empty()) file_.units = Printable(ofX);
   }
 
   void ParseLineOfData(std::string_view line) {
@@ -138,28 +147,50 @@ class Parser {
   void ParseComment(std::string_view comment) {
     comment.remove_prefix(comment.front() == '#' ? 1 : 2);
     std::string const key = LowerCase(TakeWord(&comment));
-    if (key == "units" || key == "unit") file_.units = std::string(TakeWord(&comment));
+    if (key == "units" || key == "unit") file_.units = Printable(TakeWord(&comment));
     if (key != "tolerance") return;
     std::string_view const word = TakeWord(&comment);
-    std::optional<double> const value = ParseNumber(word);
+    std::optional<double> value = ParseNumber(word);
+    if (!value) value = ParseNumber(word, DecimalMark::Comma);
     // A sentence that merely begins with the word is no statement of a tolerance.
     if (!value) return;
     file_.tolerance = CheckedTolerance(*value, "tolerance in the comment", word);
   }
 
   void ParseHeader() {
-    std::transform(fields_.begin(), fields_.end(), std::back_inserter(names_), ColumnName);
-    if (columns_.IsGiven()) {
-      ChooseGivenColumns();
-    } else if (FindName("x") && FindName("y")) {
-      xColumn_ = *FindName("x");
-      yColumn_ = *FindName("y");
-    }
+    std::transform(fields_.begin(), fields_.end(), std::back_inserter(names_), LowerName);
+    if (columns_.IsGiven()) ChooseGivenColumns();
     if (tolerance_.use == ToleranceColumn::Use::Required) {
       ChooseTolerance(IndexOf(tolerance_.name));
     } else if (tolerance_.use == ToleranceColumn::Use::IfPresent && FindName(tolerance_.name)) {
       ChooseTolerance(*FindName(tolerance_.name));
     }
+    if (!columns_.IsGiven()) ChooseColumnsByName();
+    TakeUnits(ReadColumnName(fields_[xColumn_]).unit, ReadColumnName(fields_[yColumn_]).unit);
+  }
+
+  void ChooseColumnsByName() {
+    std::vector<ColumnName> names;
+    std::transform(fields_.begin(), fields_.end(), std::back_inserter(names), ReadColumnName);
+    std::optional<std::size_t> tolerance = FindName("w");
+    if (file_.hasTolerances) tolerance = wColumn_;
+    std::optional<PointColumns> const columns = FindPointColumns(names, tolerance);
+    if (!columns) {
+      RefuseAt(fields_.front(), "cannot tell which two columns hold the points: the header has " +
+                                    NamesInHeader() + "; say it with --columns X,Y");
+    }
+    xColumn_ = columns->x;
+    yColumn_ = columns->y;
+  }
+
+  /// "1 (x) and 2 (y)", numbers alone without a header.
+  std::string DescribeColumns() const {
+    auto const column = [this](std::size_t index) {
+      std::string const number = std::to_string(index + 1);
+      return names_.empty() ? number : number + " (" + Printable(names_[index]) + ")";
+    };
+    std::string const text = column(xColumn_) + " and " + column(yColumn_);
+    return file_.hasTolerances ? text + ", the tolerance in " + column(wColumn_) : text;
   }
 
   void ChooseColumnsWithoutHeader() {
@@ -329,6 +360,8 @@ class Parser {
   std::size_t xColumn_ = 0;
   std::size_t yColumn_ = 1;
   std::size_t wColumn_ = 2;
+  TableStart table_;
+  bool isUnitLineNext_ = false;
   DecimalMark mark_ = DecimalMark::Point;
   std::size_t lineOfMark_ = 0;  ///< where the decimal mark was seen first; 0: not yet
 };

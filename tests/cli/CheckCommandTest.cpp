@@ -57,6 +57,7 @@ TEST_F(CheckCommand, WithoutAToleranceGivesLengthsAndExitCode0) {
                          ", lengths in mm\n"
                          "\n"
                          "points      5\n"
+                         "columns     1 (x) and 2 (y)\n"
                          "pieces      3: 2 lines, 1 arc, 12.1416 long, open\n"
                          "tolerance   none given: deviations are lengths\n"
                          "largest     0.5 at point 3 (line 6), to the left of piece 3\n"

@@ -148,7 +148,7 @@ TEST(ConvertCommand, WrongUsageIsRefused) {
     EXPECT_EQ(result.out, "");
     return result.err.substr(0, result.err.find('\n'));
   };
-  EXPECT_EQ(complaint({"p.json"}), "contour: --output is required");
+  EXPECT_EQ(complaint({"p.json"}), "contour: --output is required, or --to");
   EXPECT_EQ(complaint({"-", "-o", "-"}),
             "contour: the standard output: --to must say which format to write");
   EXPECT_EQ(complaint({"-", "-o", "p.txt"}), "contour: p.txt: --to must say which format to write");

@@ -19,6 +19,7 @@ TEST(InfoCommand, TellsTheFactsOnStandardOutput) {
             "standard input, lengths in mm\n"
             "\n"
             "points      5\n"
+            "columns     1 (x) and 2 (y)\n"
             "extent      x 0 to 4 (4), y 0 to 1 (1)\n"
             "length      9 from point to point\n"
             "spacing     least 0 between point 2 (line 5) and point 3 (line 6)\n"

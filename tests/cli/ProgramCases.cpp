@@ -19,23 +19,26 @@ TEST_F(Program, TwoPointsGiveOneLine) {
   EXPECT_EQ(ended.code, 0);
   EXPECT_EQ(ended.err, "");
   std::string const table = ended.out.substr(0, ended.out.find("time"));
-  EXPECT_EQ(table,
-            "p.csv, sweeps in degrees\n"
-            "\n"
-            "no  kind  start x  start y  end x  end y  centre x  centre y  radius  direction  "
-            "sweep  length  points\n"
-            " 1  line    0.000    0.000  3.000  4.000         -         -       -  -          "
-            "    -   5.000       2\n"
-            "\n"
-            "points      2\n"
-            "tolerance   0.1 (given by --tolerance)\n"
-            "strategy    mixed\n"
-            "closed      no (the last point is not the first)\n"
-            "pieces      1: 1 line, 0 arcs\n"
-            "compression 2.0 points a piece, 50.0 % of the points\n"
-            "reported    0.000000 of the tolerance, exact by construction\n"
-            "re-measured 0.000000 of the tolerance at point 0 (line 1), 0 from piece 1\n"
-            "result      within tolerance\n");
+  EXPECT_EQ(
+      table,
+      "p.csv, sweeps in degrees\n"
+      "\n"
+      "no  kind  start x  start y  end x  end y  centre x  centre y  radius  direction  "
+      "sweep  length  points\n"
+      " 1  line    0.000    0.000  3.000  4.000         -         -       -  -          "
+      "    -   5.000       2\n"
+      "\n"
+      "points      2\n"
+      "columns     1 and 2\n"
+      "tolerance   0.1 (given by --tolerance)\n"
+      "strategy    mixed\n"
+      "closed      no (the last point is not the first)\n"
+      "pieces      1: 1 line, 0 arcs\n"
+      "compression 2.0 points a piece, 50.0 % of the points\n"
+      "reported    0.000000 of the tolerance, exact by construction\n"
+      "re-measured 0.000000 of the tolerance at point 0 (line 1), 0 from piece 1\n"
+      "deviation   0.000000 of the tolerance at point 0 (line 1), the largest that was found\n"
+      "result      within tolerance\n");
 }
 
 TEST_F(Program, CornerBecomesTwoLinesInTableJsonAndDrawing) {

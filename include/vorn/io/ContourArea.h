@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstddef>
 #include <optional>
 #include <string>
 #include <vector>
@@ -19,6 +20,11 @@ struct ContourArea {
   double perimeter = 0.0;      ///< with the bridges
   std::optional<XY> centroid;  ///< of a contour that does not cross itself and encloses something
   Extent extent;               ///< the box around the contour
+  std::size_t outline = 0;     ///< which one of its file, from 1; 0: the only one
+  std::size_t depth = 0;       ///< in how many outlines of the file it lies
+
+  /// Whether it takes away from the outline around it.
+  bool IsHole() const { return depth % 2 == 1; }
 
   /// Whether the contour is the border of one region, so that its area is that of the region.
   bool IsSimple() const { return !crossesItself; }
@@ -39,6 +45,12 @@ VORN_IO_EXPORT double SignedAreaOf(ContourFile const& contour);
 /// of its loops, each positive where it runs counter-clockwise and counted as often as it is run
 /// round.
 VORN_IO_EXPORT ContourArea MeasureArea(ContourFile contour);
+
+/// Measures each of the outlines of one file, all closed, and finds out which lie in which.
+VORN_IO_EXPORT std::vector<ContourArea> MeasureOutlines(std::vector<ContourFile> outlines);
+
+/// The areas of outlines without their senses, those of holes taken off.
+VORN_IO_EXPORT double NetArea(std::vector<ContourArea> const& areas);
 
 /// "counter-clockwise", "clockwise" or, of an area of zero, "none".
 VORN_IO_EXPORT std::string SenseOf(ContourArea const& area);

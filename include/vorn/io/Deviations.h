@@ -17,9 +17,12 @@ struct PointDeviation {
   std::size_t piece = 0;  ///< the piece with that place; the first of several
 };
 
-/// A relative deviation counts as within tolerance up to here. A piece may touch the tolerance of
-/// a point exactly, and re-measuring it by other formulas then ends some bits above 1.
-inline constexpr double kLargestRelative = 1.0 + 1e-9;
+/// A relative deviation counts as within tolerance up to here: a millionth of the tolerance more
+/// than all of it. A piece may touch the tolerance of a point exactly, and another formula then
+/// ends above 1 by the rounding of coordinates and radii, which are up to 1e9 times the tolerance
+/// (2^-53 * 1e9 = 1.1e-7). Every judgement uses this one bound: that of a fit, of a check, of a
+/// drawing and of the files written.
+inline constexpr double kLargestRelative = 1.0 + 1e-6;
 
 /// What is found when it measures every point, without a word from the fit.
 struct Remeasured {

@@ -2,6 +2,7 @@
 
 #include <iosfwd>
 #include <mutex>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -24,7 +25,8 @@ VORN_IO_EXPORT std::string ReadTextFile(std::string const& path, std::istream& i
 /// was; dropped before, it leaves nothing behind.
 ///
 /// Stage all files of a run first and commit them together: what commonly fails (no folder, no
-/// permission, a full disk) fails while staging, with none of the files changed.
+/// permission, a full disk) fails while staging, with none of the files changed. A device or a
+/// named pipe cannot be staged: it is written when it is committed, so commit it after the others.
 class VORN_IO_EXPORT AtomicFile {
  public:
   /// @throws Failure (FailureKind::File) naming the file when it cannot be written.
@@ -36,7 +38,12 @@ class VORN_IO_EXPORT AtomicFile {
   /// @throws Failure (FailureKind::File) naming the file.
   void Commit();
 
+  /// Whether it is a device or a named pipe, which may keep Commit() waiting for a reader.
+  bool IsStream() const;
+
  private:
+  /// Writes the contents to the device or pipe.
+  void WriteStream() const;
   /// Makes the file under another name and gives its descriptor.
   int MakeTemporary();
   /// Takes the file under the other name away.
@@ -44,9 +51,10 @@ class VORN_IO_EXPORT AtomicFile {
   /// Writes the contents through to the disk.
   void Write(int descriptor, std::string_view contents) const;
 
-  std::string path_;       ///< as the user wrote it, for messages
-  std::string target_;     ///< behind symbolic links
-  std::string temporary_;  ///< empty when there is none
+  std::string path_;                     ///< as the user wrote it, for messages
+  std::string target_;                   ///< behind symbolic links
+  std::string temporary_;                ///< empty when there is none
+  std::optional<std::string> contents_;  ///< of a device or a named pipe
 };
 
 /// Finds out before a long computation that a file could not be written afterwards.

@@ -44,9 +44,9 @@ VORN_IO_EXPORT std::string NameOf(GeometryUtils::FittingStrategy strategy);
 /// "23, NoFit: no arc fits a run of points", for messages.
 VORN_IO_EXPORT std::string Describe(ErrorCode code);
 
-/// How a fit ended: every point within its tolerance, one outside, or a contour that stops before
-/// the last point.
-enum class Verdict { WithinTolerance, OutsideTolerance, StopsEarly };
+/// How a fit ended: every point within its tolerance, one outside, a closed contour whose ends do
+/// not meet though every point is within, or a contour that stops before the last point.
+enum class Verdict { WithinTolerance, OutsideTolerance, NotClosed, StopsEarly };
 
 /// All that the table, the JSON file and the drawing tell about one fit.
 struct VORN_IO_EXPORT FitReport {
@@ -65,6 +65,14 @@ struct VORN_IO_EXPORT FitReport {
 
   /// From the end of the contour to its start; 0 when it is closed exactly.
   double Gap() const;
+
+  /// The larger of the relative deviations that the fit reports and that are measured again.
+  struct Deviation {
+    double relative = 0.0;  ///< to the tolerance of the point
+    std::size_t point = 0;  ///< index in the file
+  };
+  /// The deviation that the verdict goes by.
+  Deviation LargestDeviation() const;
   /// How many pieces are straight.
   std::size_t LineCount() const;
   /// How many pieces are arcs.

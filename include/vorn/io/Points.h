@@ -49,7 +49,8 @@ struct VORN_IO_EXPORT PointFile {
   bool hasTolerances = false;         ///< a column gave every point's `w`
   std::string toleranceColumn = "w";  ///< which one that was, as it was asked for
   std::optional<double> tolerance;    ///< of a comment `# tolerance T`
-  std::string units;                  ///< of a comment `# units mm`; may be empty
+  std::string units;    ///< of a comment `# units mm`, else of the header; may be empty
+  std::string columns;  ///< which ones hold the points, in words: "1 (x) and 2 (y)"
 
   /// "point 4 (line 6)", points counted from 0 as the library does.
   std::string NameOf(std::size_t index) const;
@@ -61,11 +62,12 @@ struct VORN_IO_EXPORT PointFile {
 /// data holds; see FindSeparator. Fields may stand in double quotes. Numbers have a decimal point
 /// or, where the separator is no comma, a decimal comma: one of the two throughout a file.
 ///
-/// A first line without any number is a header; columns called x and y are found by it, else the
-/// first two columns are taken. Without a header there must be two or three columns, unless the
-/// choice names columns by their numbers. Empty lines and comments are skipped: what follows a `#`,
-/// and what follows a `//` at the beginning of a line or behind a blank. Line ends may be of any
-/// system; a UTF-8 byte order mark is allowed.
+/// A first line without any number is a header, which tells the columns of the points as
+/// FindPointColumns says, and their units; a line of units alone may follow. The preamble of an
+/// instrument is skipped, see FindTable. Without a header there must be two or three columns,
+/// unless the choice names columns by their numbers. Empty lines and comments are skipped: what
+/// follows a `#`, and what follows a `//` at the beginning of a line or behind a blank. Line ends
+/// may be of any system; a UTF-8 byte order mark is allowed.
 ///
 /// @throws Failure (FailureKind::File) naming file, line, column and offending text when a number
 /// is

@@ -26,7 +26,7 @@ export class Occupancy {
 export const FEW_POINTS = 4000;
 
 /** The largest relative deviation that counts as within tolerance, as everywhere here. */
-export const LARGEST_RELATIVE = 1 + 1e-9;
+export const LARGEST_RELATIVE = 1 + 1e-6;
 
 export class Scene {
   constructor(data) {

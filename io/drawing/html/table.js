@@ -36,10 +36,9 @@ export class PieceTable {
     return row;
   }
 
-  /** Degrees, positive counter-clockwise. */
+  /** Degrees, without a sign as everywhere, and the direction. */
   sweep(piece) {
-    const degrees = piece.sweep * 180 / Math.PI;
-    return `${short(piece.ccw ? degrees : -degrees, 5)}\u00b0`;
+    return `${short(piece.sweep * 180 / Math.PI, 5)}\u00b0 ${piece.ccw ? 'ccw' : 'cw'}`;
   }
 
   worstCell(piece) {

@@ -54,8 +54,8 @@ TEST(ProgressBar, DrawsGrowingValuesOnceAndWipesItselfOff) {
     for (std::int32_t const percent : {50, 50, 20, 50, 100, 200}) bar.SetProgress(percent);
   });
   std::string const half = std::string(15, '#') + std::string(15, '.');
-  EXPECT_EQ(text, "\rfitting [" + half + "]  50 % \x1b[K\rfitting [" + std::string(30, '#') +
-                      "] 100 % \x1b[K\r\x1b[K");
+  EXPECT_EQ(text, "\rfitting [" + half + "]  50 %\x1b[K\rfitting [" + std::string(30, '#') +
+                      "] 100 %\x1b[K\r\x1b[K");
 }
 
 TEST(ProgressBar, SilentWhereAsked) {
@@ -64,6 +64,22 @@ TEST(ProgressBar, SilentWhereAsked) {
 
 TEST(ProgressBar, UnusedBarWritesNothing) {
   EXPECT_EQ(OnTerminal([] { ProgressBar const bar(stderr, 1000); }), "");
+}
+
+TEST(ProgressLine, FitsIntoTheColumns) {
+  EXPECT_EQ(ProgressLine(50, "9 points/s", 80),
+            "fitting [###############...............]  50 % 9 points/s");
+  EXPECT_EQ(ProgressLine(50, "9 points/s", 40), "fitting [######......]  50 % 9 points/s");
+  EXPECT_EQ(ProgressLine(50, "9 points/s", 30), "fitting [######.......]  50 %");
+  EXPECT_EQ(ProgressLine(50, "", 80), "fitting [###############...............]  50 %");
+  EXPECT_EQ(ProgressLine(100, "9 points/s", 12), "100 %");
+  EXPECT_EQ(ProgressLine(100, "", 0), "");
+  for (std::size_t columns = 0; columns < 100; ++columns) {
+    for (std::int32_t percent : {0, 7, 99, 100}) {
+      EXPECT_LE(ProgressLine(percent, "1200 points/s, 3 min 05 s left", columns).size(),
+                columns > 0 ? columns - 1 : 0);
+    }
+  }
 }
 
 TEST(ProgressBar, SilentWithoutATerminal) {

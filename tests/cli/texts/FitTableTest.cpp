@@ -10,26 +10,28 @@ namespace Vorn::Cli {
 namespace {
 
 TEST(Table, ShowsPiecesAndSummary) {
-  EXPECT_EQ(ToTable(Contours::LineAndArcReport()),
-            "part.csv, sweeps in degrees\n"
-            "\n"
-            "no  kind  start x  start y   end x    end y  centre x  centre y  radius  direction  "
-            "  sweep  length  points\n"
-            " 1  line   0.0000   0.0000  4.0000   0.0000         -         -       -  -          "
-            "      -  4.0000       3\n"
-            " 2  arc    4.0000   0.0000  3.0000  -1.0000    4.0000   -1.0000  1.0000  cw         "
-            "270.000  4.7124       4\n"
-            "\n"
-            "points      7\n"
-            "tolerance   0.02 (given by --tolerance)\n"
-            "strategy    mixed\n"
-            "closed      no\n"
-            "pieces      2: 1 line, 1 arc\n"
-            "compression 3.5 points a piece, 28.6 % of the points\n"
-            "reported    0.500000 of the tolerance at point 1 (line 3)\n"
-            "re-measured 0.750000 of the tolerance at point 3 (line 5), 0.015 from piece 2\n"
-            "result      within tolerance\n"
-            "time        0.250 s\n");
+  EXPECT_EQ(
+      ToTable(Contours::LineAndArcReport()),
+      "part.csv, sweeps in degrees\n"
+      "\n"
+      "no  kind  start x  start y   end x    end y  centre x  centre y  radius  direction  "
+      "  sweep  length  points\n"
+      " 1  line   0.0000   0.0000  4.0000   0.0000         -         -       -  -          "
+      "      -  4.0000       3\n"
+      " 2  arc    4.0000   0.0000  3.0000  -1.0000    4.0000   -1.0000  1.0000  cw         "
+      "270.000  4.7124       4\n"
+      "\n"
+      "points      7\n"
+      "tolerance   0.02 (given by --tolerance)\n"
+      "strategy    mixed\n"
+      "closed      no\n"
+      "pieces      2: 1 line, 1 arc\n"
+      "compression 3.5 points a piece, 28.6 % of the points\n"
+      "reported    0.500000 of the tolerance at point 1 (line 3)\n"
+      "re-measured 0.750000 of the tolerance at point 3 (line 5), 0.015 from piece 2\n"
+      "deviation   0.750000 of the tolerance at point 3 (line 5), the largest that was found\n"
+      "result      within tolerance\n"
+      "time        0.250 s\n");
 }
 
 TEST(Table, SaysThatTheSingleArcReportsALength) {

@@ -65,6 +65,30 @@ TEST(CloseExactly, GapStaysWhereNoCommonPointKeepsTheTolerance) {
   EXPECT_EQ(pieces[2].end.y, 1.0);
 }
 
+/// Two lines that end 0.9 of a tolerance to the right and to the left of the seam, with points that
+/// let neither turn.
+TEST(CloseExactly, EndsBesideEachOtherAreJoinedByOnePieceMore) {
+  double const w = 0.1;
+  std::vector<WPoint> points;
+  for (int i = -20; i <= 20; ++i) {
+    double const side = i < 0 ? -0.18 : 0.18;
+    points.push_back({1.0 * i, i % 2 == 0 ? 0.0 : side, w});
+  }
+  std::vector<Piece> pieces = {MakeLine({0, 0.09}, {20, 0.09}), MakeLine({20, 0.09}, {20, 9}),
+                               MakeLine({20, 9}, {-20, 9}), MakeLine({-20, 9}, {-20, -0.09}),
+                               MakeLine({-20, -0.09}, {0, -0.09})};
+  // From the seam (0, 0) round to it again.
+  std::vector<WPoint> circuit(points.begin() + 20, points.end());
+  circuit.insert(circuit.end(), points.begin(), points.begin() + 21);
+  ASSERT_TRUE(CloseExactly(circuit, &pieces));
+  ASSERT_EQ(pieces.size(), 6u);
+  EXPECT_EQ(GapOf(pieces), 0.0);
+  EXPECT_GT(pieces.back().end.x, pieces.back().start.x) << "the line goes on, not back";
+  EXPECT_EQ(pieces[4].end.x, pieces[5].start.x);
+  EXPECT_EQ(pieces[4].end.y, pieces[5].start.y);
+  EXPECT_LE(Remeasure(circuit, pieces).Worst().relative, kLargestRelative);
+}
+
 TEST(CloseExactly, ArcsKeepTheirMiddleAndStayCircles) {
   // A lens of two arcs through (0, 0) and (2, 0), whose second stops off the seam.
   auto const arc = [](XY const& from, XY const& to, double centerY) {

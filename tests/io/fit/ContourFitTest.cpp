@@ -7,6 +7,7 @@
 #include "io/Contours.h"
 #include "io/fit/Closing.h"
 #include "support/SharedData.h"
+#include "vorn/io/Drawing.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/FitContour.h"
 #include "vorn/io/FitReport.h"
@@ -243,6 +244,96 @@ TEST(FitContour, FullCircleIsTwoArcsWithEveryStrategy) {
     auto const json = nlohmann::json::parse(ToJson(report));
     EXPECT_TRUE(json.at("deviation").at("reported").at("value").is_null());
   }
+}
+
+/// An oval of 805 points, a step of 5 between neighbours but for the last one.
+std::vector<WPoint> Oval(double ratio, double turn) {
+  constexpr int kPoints = 805;
+  constexpr double kStep = 5.0;
+  constexpr int kFine = 200000;
+  double const full = std::atan(1.0) * 8.0;
+  auto const at = [&](int i) {
+    double const angle = full * i / kFine;
+    return WPoint{ratio * std::cos(angle), std::sin(angle), 0.0};
+  };
+  double around = 0.0;
+  for (int i = 0; i < kFine; ++i) {
+    around += std::hypot(at(i + 1).x - at(i).x, at(i + 1).y - at(i).y);
+  }
+  double const scale = kPoints * kStep / around;
+  std::vector<WPoint> points;
+  double length = 0.0;
+  for (int i = 0; i < kFine && points.size() < kPoints; ++i) {
+    if (length * scale >= static_cast<double>(points.size()) * kStep) {
+      double const x = scale * at(i).x;
+      double const y = scale * at(i).y;
+      points.push_back(
+          {x * std::cos(turn) - y * std::sin(turn), x * std::sin(turn) + y * std::cos(turn), 0.0});
+    }
+    length += std::hypot(at(i + 1).x - at(i).x, at(i + 1).y - at(i).y);
+  }
+  return points;
+}
+
+void ExpectClosed(std::vector<WPoint> const& points, FitChoice const& choice) {
+  FitReport const report = FitContour(Contours::FileWith(points), choice, nullptr);
+  EXPECT_TRUE(report.closure.isClosed);
+  EXPECT_EQ(report.Gap(), 0.0);
+  EXPECT_EQ(report.verdict, Verdict::WithinTolerance);
+  EXPECT_LE(report.LargestDeviation().relative, kLargestRelative);
+}
+
+TEST(FitContour, OvalsClose) {
+  for (double const ratio : {1.2, 1.5, 1.8, 2.0, 2.5, 3.0}) {
+    for (int k = 0; k < 8; ++k) {
+      SCOPED_TRACE(std::to_string(ratio) + " turned " + std::to_string(k));
+      std::vector<WPoint> points = Oval(ratio, 0.3 * k);
+      std::rotate(points.begin(), points.begin() + 97 * k, points.end());
+      for (double const tolerance : {0.2, 0.5}) ExpectClosed(points, Same(tolerance));
+    }
+  }
+}
+
+TEST(FitContour, TurnedClosedContoursClose) {
+  auto const folder = Testing::SharedDataFolder();
+  if (!folder) GTEST_SKIP() << "VORN_DATA_DIR is not set";
+  struct Closed {
+    char const* name;
+    FitChoice choice;
+  };
+  for (Closed const& closed :
+       {Closed{"hatch_boundary", Same(0.002)}, Closed{"glyph_five", PerPoint(2.0)},
+        Closed{"gcode_letter_d", Same(0.015)}, Closed{"circle_r3", Same(0.001)}}) {
+    std::vector<WPoint> const points = Testing::ReadPoints(*folder + "/" + closed.name + ".csv");
+    for (int k = 0; k < 48; ++k) {
+      SCOPED_TRACE(std::string(closed.name) + " turned " + std::to_string(k));
+      double const turn = std::atan(1.0) * k / 6.0;
+      std::vector<WPoint> turned = points;
+      for (WPoint& p : turned) {
+        p = {p.x * std::cos(turn) - p.y * std::sin(turn),
+             p.x * std::sin(turn) + p.y * std::cos(turn), p.w};
+      }
+      if (points.front().x == points.back().x && points.front().y == points.back().y) {
+        turned.back() = turned.front();
+      }
+      ExpectClosed(turned, closed.choice);
+    }
+  }
+}
+
+TEST(FitContour, AGapThatCannotBeClosedIsAVerdictAndInEveryReport) {
+  FitReport report = FitRectangle(FromCorner(0.01));
+  report.pieces.back().end.x += 0.25;
+  report.verdict = Verdict::NotClosed;
+  Drawing const drawing = DrawingOf(report);
+  std::string const gap = "GAP of 0.25 at point 38 (line 40)";
+  EXPECT_NE(ToSvg(drawing).find(gap), std::string::npos);
+  EXPECT_NE(ToHtml(drawing).find(gap), std::string::npos);
+  EXPECT_NE(ToHtml(drawing).find(Describe(Verdict::NotClosed)), std::string::npos);
+  auto const json = nlohmann::json::parse(ToJson(report));
+  EXPECT_EQ(json.at("verdict"), "not closed");
+  EXPECT_EQ(json.at("gap"), 0.25);
+  EXPECT_EQ(json.at("seam"), 38);
 }
 
 struct Measured {

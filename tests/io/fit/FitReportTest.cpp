@@ -25,10 +25,26 @@ FitReport StraightReport(double offset, double reported, Strategy strategy, doub
 
 TEST(Verdict, RoundingBeyondOneIsForgivenAndNoMore) {
   EXPECT_EQ(StraightReport(0.125, 1.0, Strategy::Mixed).verdict, Verdict::WithinTolerance);
-  EXPECT_EQ(StraightReport(0.125 * (1.0 + 0.9e-9), 1.0, Strategy::Mixed).verdict,
+  EXPECT_EQ(StraightReport(0.125 * (1.0 + 0.9e-6), 1.0, Strategy::Mixed).verdict,
             Verdict::WithinTolerance);
-  EXPECT_EQ(StraightReport(0.125 * (1.0 + 1.1e-9), 1.0, Strategy::Mixed).verdict,
+  EXPECT_EQ(StraightReport(0.125 * (1.0 + 1.1e-6), 1.0, Strategy::Mixed).verdict,
             Verdict::OutsideTolerance);
+}
+
+/// Seen on a contour a thousand times as large as a part in millimetres.
+TEST(Verdict, RoundingOfLargeCoordinatesIsForgiven) {
+  EXPECT_EQ(StraightReport(0.125 * 1.000000013, 1.0, Strategy::Mixed).verdict,
+            Verdict::WithinTolerance);
+  EXPECT_EQ(StraightReport(0.0, 1.000000013, Strategy::Mixed).verdict, Verdict::WithinTolerance);
+}
+
+TEST(LargestDeviation, IsTheLargerOfReportedAndMeasured) {
+  FitReport const reported = StraightReport(0.0625, 0.75, Strategy::Mixed);
+  EXPECT_EQ(reported.LargestDeviation().relative, 0.75);
+  EXPECT_EQ(reported.LargestDeviation().point, 1u);
+  EXPECT_EQ(StraightReport(0.0625, 0.25, Strategy::Mixed).LargestDeviation().relative, 0.5);
+  EXPECT_EQ(StraightReport(0.0625, 0.75, Strategy::SingleArc).LargestDeviation().relative, 0.5)
+      << "a length is no multiple of the tolerance";
 }
 
 TEST(Verdict, ReportedDeviationCountsToo) {

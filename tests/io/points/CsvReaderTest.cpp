@@ -158,7 +158,7 @@ INSTANTIATE_TEST_SUITE_P(
                 "p.csv:1:3: y is not a number: 'two'"},
         BadText{"ColumnBehindBlanks", "  1   2\n  3   four\n",
                 "p.csv:2:7: y is not a number: 'four'"},
-        BadText{"TruncatedLine", "x,y,z\n1,2,3\n4,5\n6",
+        BadText{"TruncatedLine", "x,y,q\n1,2,3\n4,5\n6",
                 "p.csv:3:1: expected 3 columns, found 2: '4,5'"},
         BadText{"NegativeTolerance", "x,y,w\n1,2,0.1\n3,4,-0.1\n",
                 "p.csv:3:5: tolerance '-0.1' must be a finite number above 0"},
@@ -189,7 +189,7 @@ TEST(CsvReader, ThirdColumnWithoutHeaderIsTheTolerance) {
 }
 
 TEST(CsvReader, ThirdColumnOfAnotherNameIsNoTolerance) {
-  PointFile const file = Parse("x,y,z\n1,2,-7\n3,4,abc\n");
+  PointFile const file = Parse("x,y,q\n1,2,-7\n3,4,abc\n");
   EXPECT_FALSE(file.hasTolerances);
   EXPECT_EQ(file.points[1].w, 0.0);
 }

@@ -1,0 +1,40 @@
+#pragma once
+
+#include <ostream>
+#include <streambuf>
+#include <string>
+
+#include "cli/base/Library.h"
+
+namespace Vorn::Cli {
+
+/// A stream for messages: what the terminal would take for a command, or could not show, is
+/// replaced before it gets there, line by line.
+class PrintableStream final : public std::ostream {
+ public:
+  explicit PrintableStream(std::ostream& target) : std::ostream(nullptr), buffer_(target) {
+    rdbuf(&buffer_);
+  }
+
+ private:
+  /// Keeps a line until it ends.
+  class Buffer final : public std::streambuf {
+   public:
+    explicit Buffer(std::ostream& target) : target_(target) {}
+    Buffer(Buffer const&) = delete;
+    Buffer& operator=(Buffer const&) = delete;
+    ~Buffer() override { WriteLine(); }
+
+   private:
+    int_type overflow(int_type character) override;
+    int sync() override;
+    void WriteLine();
+
+    std::ostream& target_;
+    std::string line_;
+  };
+
+  Buffer buffer_;
+};
+
+}  // namespace Vorn::Cli

@@ -1,0 +1,13 @@
+#pragma once
+
+#include <string>
+
+#include "cli/base/Library.h"
+
+namespace Vorn::Cli {
+
+/// A deviation over its tolerance with six digits after the point; a huge one, as a tolerance far
+/// below any deviation makes it, with an exponent.
+std::string RelativeText(double relative);
+
+}  // namespace Vorn::Cli
