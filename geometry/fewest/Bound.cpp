@@ -23,6 +23,7 @@ Cover CoverGreedily(std::span<WPoint const> points, Limits const& limits,
     start = end;
     tell(start);
   }
+  cover.last = run.Covering();
   return cover;
 }
 

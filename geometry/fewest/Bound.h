@@ -5,6 +5,7 @@
 #include <span>
 #include <vector>
 
+#include "geometry/fewest/Circle.h"
 #include "geometry/fewest/Limits.h"
 #include "vorn/Types.h"
 
@@ -16,6 +17,8 @@ namespace Vorn::Fewest {
 struct Cover {
   /// The first point of each run.
   std::vector<std::int32_t> starts;
+  /// A normalised circle or line that covers the last run, unless this has three points or fewer.
+  Circle last;
 };
 
 /// Covers the points one run after the other; each end is proven. `tell` hears how many points are

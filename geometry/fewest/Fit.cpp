@@ -6,11 +6,13 @@
 #include <limits>
 #include <numbers>
 
+#include "geometry/fewest/Answer.h"
 #include "geometry/fewest/Assembly.h"
 #include "geometry/fewest/Bound.h"
 #include "geometry/fewest/Centring.h"
 #include "geometry/fewest/Chain.h"
 #include "geometry/fewest/LocalFrame.h"
+#include "geometry/fewest/OnePiece.h"
 #include "geometry/fewest/Progress.h"
 #include "geometry/fewest/Seam.h"
 #include "geometry/fewest/promises/Promises.h"
@@ -20,6 +22,7 @@ namespace Vorn {
 
 namespace {
 
+using Fewest::Answer;
 using Fewest::Chain;
 using Fewest::Path;
 using Options = FewestPieces::Options;
@@ -79,30 +82,6 @@ bool DoCoincide(std::vector<WPoint> const& points) {
                      [&](WPoint const& p) { return Fewest::DistanceBetween(p, tightest) <= p.w; });
 }
 
-/// A contour in the coordinates of the caller.
-struct Answer {
-  std::vector<GeometryUtils::Elem> contour;
-  std::vector<FewestPieces::Range> ranges;
-};
-
-Answer Restore(Fewest::Shift const& shift, Chain const& chain,
-               std::vector<Fewest::BuiltPiece> const& pieces) {
-  Answer answer;
-  answer.contour.push_back(Fewest::BuildSegment({}, shift.Restore(pieces.front().start)).elem);
-  for (std::size_t k = 0; k < pieces.size(); ++k) {
-    GeometryUtils::Elem const& elem = pieces[k].elem;
-    GeometryUtils::Point const start = answer.contour.back().end;
-    GeometryUtils::Point const end = shift.Restore(elem.end);
-    bool const isSegment = elem.type == GeometryUtils::ElemType::Segment;
-    Fewest::BuiltPiece const restored =
-        isSegment ? Fewest::BuildSegment(start, end)
-                  : Fewest::BuildArc(start, end, shift.Restore(elem.center), elem.direction);
-    answer.contour.push_back(restored.elem);
-    answer.ranges.push_back({chain.pieces[k].first, chain.pieces[k].end - 1});
-  }
-  return answer;
-}
-
 /// Looks for contours and measures what they promise.
 class Fitter {
  public:
@@ -113,6 +92,16 @@ class Fitter {
         shift_(shift),
         path_(std::move(path)),
         progress_(*progress) {}
+
+  /// Whether one piece along a circle that covers all points keeps every promise.
+  bool RunAsOne(Fewest::Circle const& covering, Answer* answer, Promises::Report* report) const {
+    for (Chain const& chain : Fewest::MakeOnePiece(path_, covering)) {
+      if (KeepsCentred(path_, 0, chain, answer, report)) return true;
+      Fewest::RoundEnds(Tightest(points_).w, answer);
+      if (Measure(*answer, report)) return true;
+    }
+    return false;
+  }
 
   /// The first contour found that keeps every promise; false when there is none.
   bool Run(Answer* answer, Promises::Report* report) {
@@ -228,16 +217,18 @@ class Fitter {
 
   bool Keeps(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
              Promises::Report* report) const {
-    *answer = Restore(shift_, chain, Fewest::BuildPieces(path, chain));
+    *answer = Fewest::Restore(shift_, chain, Fewest::BuildPieces(path, chain));
     std::int32_t const count = path.Count();
-    std::vector<Promises::PieceRange> ranges;
     for (FewestPieces::Range& range : answer->ranges) {
       range = {(range.first + rotation) % count, (range.last + rotation) % count};
-      ranges.push_back({range.first, range.last});
     }
-    *report = Promises::Measure({points_, answer->contour, ranges, options_.closed,
+    return Measure(*answer, report);
+  }
+
+  bool Measure(Answer const& answer, Promises::Report* report) const {
+    *report = Promises::Measure({points_, answer.contour, answer.ranges, options_.closed,
                                  options_.largestStep, options_.farthestBetweenPoints});
-    return report->violations.empty() && AreRadiiAllowed(answer->contour);
+    return report->violations.empty() && AreRadiiAllowed(answer.contour);
   }
 
   std::vector<WPoint> const& points_;
@@ -265,9 +256,10 @@ ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& op
       path.points, path.limits, [&](std::int32_t done) { progress.Tell(0, 20, done); });
   Answer answer;
   Promises::Report report;
-  if (!Fitter(points, options, shift, std::move(path), &progress).Run(&answer, &report)) {
-    return ErrorCode::NoFit;
-  }
+  Fitter fitter(points, options, shift, std::move(path), &progress);
+  bool const isOne = !options.closed && cover.starts.size() == 1 && points.size() > 3 &&
+                     fitter.RunAsOne(cover.last, &answer, &report);
+  if (!isOne && !fitter.Run(&answer, &report)) return ErrorCode::NoFit;
   progress.Finish();
   result->contour = std::move(answer.contour);
   result->ranges = std::move(answer.ranges);

@@ -23,6 +23,10 @@ class FreeRun {
   /// `expected` is a guess of its length, which only changes the time.
   std::int32_t FindEnd(std::int32_t start, std::int32_t expected);
 
+  /// The circle that covers the run found last, in the coordinates of the points. Runs of three
+  /// points or fewer are covered without one.
+  Circle Covering() const { return LocalFrame().Convert(frame_, circle_); }
+
  private:
   void Begin(std::int32_t start, std::int32_t expected);
   void Extend(std::int32_t end);

@@ -31,6 +31,34 @@ TEST(FewestPiecesHostile, ZigzagsJustWithinTheToleranceAreOneSegment) {
   }
 }
 
+TEST(FewestPiecesHostile, ZigzagsExactlyAtTheToleranceAreOneSegment) {
+  for (double const spacing : {1.0, 0.3}) {
+    for (double const w : {0.01, 0.05, 3e-4}) {
+      SCOPED_TRACE(testing::Message() << "spacing " << spacing << ", w " << w);
+      FewestResult const result = FitKept(MakeZigzag(101, spacing, w, 1.0));
+      EXPECT_EQ(result.fewestPossible, 1);
+      EXPECT_EQ(PieceCount(result), 1);
+      EXPECT_EQ(result.largestDeviation, 1.0);
+    }
+  }
+}
+
+TEST(FewestPiecesHostile, ExactLinesInAnyDirectionAreOneSegment) {
+  for (double const heading : {0.0, 0.6, 2.0, 3.1, -2.4}) {
+    for (std::int32_t const count : {5, 1000, 10000}) {
+      SCOPED_TRACE(testing::Message() << "heading " << heading << ", count " << count);
+      Scan scan;
+      for (std::int32_t i = 0; i < count; ++i) {
+        scan.push_back({0.2 * i * std::cos(heading), 0.2 * i * std::sin(heading), 0.05});
+      }
+      FewestResult const result = FitKept(scan);
+      EXPECT_EQ(PieceCount(result), 1);
+      EXPECT_EQ(ArcCount(result), 0);
+      EXPECT_LT(result.largestDeviation, 0.01);
+    }
+  }
+}
+
 TEST(FewestPiecesHostile, ZigzagsBeyondTheToleranceTakeTwoPointsEach) {
   // Any circle leaves one of four points in turn above and below a line 1.1 w away; three are
   // always covered.

@@ -1,0 +1,16 @@
+#pragma once
+
+#include <vector>
+
+#include "geometry/fewest/Chain.h"
+#include "geometry/fewest/Path.h"
+
+/// Paths for which one circle is enough.
+namespace Vorn::Fewest {
+
+/// Chains of one piece for an open path that `covering` passes within tolerance, the one of the
+/// smallest largest ratio first. The whole tolerances count, so that points exactly at theirs are
+/// covered; what the chains promise has to be measured.
+std::vector<Chain> MakeOnePiece(Path const& path, Circle const& covering);
+
+}  // namespace Vorn::Fewest
