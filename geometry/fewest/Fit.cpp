@@ -38,6 +38,10 @@ constexpr std::size_t kSources[] = {2, 4, 64};
 /// By how much rounding may change a radius, relative to it.
 constexpr double kRadiusRounding = 1e-9;
 
+/// Percent of the progress that is done after the bound, and after the search of the open contour.
+constexpr std::int32_t kCovered = 20;
+constexpr std::int32_t kSearched = 80;
+
 /// Searches with smaller tolerances where promises fail.
 constexpr int kMostRepairs = 4;
 
@@ -142,7 +146,7 @@ class Fitter {
     return Fewest::FindChain(path_, share * kSearchShare, [&](std::int32_t done) { Tell(done); });
   }
 
-  void Tell(std::int32_t done) { progress_.Tell(20, 80, done); }
+  void Tell(std::int32_t done) { progress_.Tell(kCovered, kSearched, done); }
 
   /// Halves the tolerances of the search about the places where promises fail, which leaves room
   /// for them and costs a piece there.
@@ -253,7 +257,7 @@ ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& op
   path.leastTolerance = Tightest(points).w * shift.scale;
 
   Fewest::Cover const cover = Fewest::CoverGreedily(
-      path.points, path.limits, [&](std::int32_t done) { progress.Tell(0, 20, done); });
+      path.points, path.limits, [&](std::int32_t done) { progress.Tell(0, kCovered, done); });
   Answer answer;
   Promises::Report report;
   Fitter fitter(points, options, shift, std::move(path), &progress);

@@ -65,6 +65,18 @@ RunFit FreeRun::Try(std::int32_t end) {
   return fit;
 }
 
+/// The circle may hold for more points than it was asked for: the end of those below `bad`.
+std::int32_t FreeRun::ExtendCovered(std::int32_t good, std::int32_t bad) {
+  auto const count = static_cast<std::int32_t>(points_.size());
+  while (good + 1 < bad && good < count) {
+    Extend(good + 1);
+    std::int32_t const next = good - start_;
+    if (columns_.FindFirstAbove(next, next + 1, circle_, 1.0) <= next) break;
+    ++good;
+  }
+  return good;
+}
+
 std::int32_t FreeRun::FindEnd(std::int32_t start, std::int32_t expected) {
   auto const count = static_cast<std::int32_t>(points_.size());
   Begin(start, std::max(expected, 2));
@@ -79,15 +91,7 @@ std::int32_t FreeRun::FindEnd(std::int32_t start, std::int32_t expected) {
   while (good < count) {
     RunFit const fit = Try(target);
     if (fit.isFound && fit.ratio <= 1.0 + simplex.Slack()) {
-      // The circle may hold for more points than it was asked for.
-      good = target;
-      while (good + 1 < bad && good < count) {
-        Extend(good + 1);
-        if (columns_.FindFirstAbove(good - start, good + 1 - start, circle_, 1.0) <= good - start) {
-          break;
-        }
-        ++good;
-      }
+      good = ExtendCovered(target, bad);
     } else {
       bad = target;
     }

@@ -31,6 +31,7 @@ class FreeRun {
   void Begin(std::int32_t start, std::int32_t expected);
   void Extend(std::int32_t end);
   RunFit Try(std::int32_t end);
+  std::int32_t ExtendCovered(std::int32_t good, std::int32_t bad);
 
   std::span<WPoint const> points_;
   Limits limits_;
@@ -45,6 +46,12 @@ class FreeRun {
 
 /// Relative violation of a row that rounding may cause on a run of the given extent in units of its
 /// least tolerance: the inverse of a basis loses about extent / tolerance units in the last place.
-inline double SlackFor(double extentOverTolerance) { return 1e-10 + 4e-15 * extentOverTolerance; }
+inline double SlackFor(double extentOverTolerance) {
+  // Far below what the tolerance of a measured point tells apart.
+  constexpr double kLeastSlack = 1e-10;
+  // Some 18 units in the last place of 1.
+  constexpr double kSlackPerExtent = 4e-15;
+  return kLeastSlack + kSlackPerExtent * extentOverTolerance;
+}
 
 }  // namespace Vorn::Fewest

@@ -34,6 +34,14 @@ Place PlaceOf(Sample const& s) { return {s.x, s.y}; }
 /// Box of a programme without a limit of curvature.
 constexpr double kDefaultBox = 1024.0;
 
+/// Stands for no limit of curvature.
+constexpr double kUnlimited = 1e300;
+
+/// Size of the box in units of 1 + the limit of curvature. On a normalised circle the gradient has
+/// length 1, so at a place p on it |b| <= 1 + 2 |a| |p| and |d| <= |p| + 3 |a| |p|^2: this holds
+/// those that pass within 1.6 of the origin, and local coordinates are of the order of 1.
+constexpr double kBoxPerCurvature = 8.0;
+
 /// A step back along the path that is shorter than this many times the sum of the tolerances of its
 /// points counts as noise: each point may be off by its tolerance in any direction, which accounts
 /// for 1, and neighbours of a reversal add the rest.
@@ -161,16 +169,16 @@ void PieceSearch::LimitCurvature(Opening const& from, std::int32_t end) {
   for (std::int32_t i = first + 1; i < end; ++i) {
     widest = std::max(widest, DistanceBetween(path_.At(i - 1), path_.At(i)));
   }
-  double limit = 1e300;
+  double limit = kUnlimited;
   // The chord of a step of angle s on a radius r is 2 r sin(s / 2), and |a| = 1 / (2 r).
   if (widest > 0.0) limit = kStepShare * path_.limits.sineOfHalfStep / widest;
   if (path_.limits.smallestRadius > 0.0) limit = std::min(limit, 0.5 / path_.limits.smallestRadius);
   Row const row{1.0, 0.0, 0.0, 0.0};
   if (path_.limits.segmentsOnly) {
     programme_.Add({row, Condition::Kind::Equality, 0.0});
-  } else if (limit < 1e300) {
+  } else if (limit < kUnlimited) {
     programme_.Add({row, Condition::Kind::Slab, limit / frame_.scale});
-    programme_.box = 8.0 * (1.0 + limit / frame_.scale);
+    programme_.box = kBoxPerCurvature * (1.0 + limit / frame_.scale);
   }
 }
 

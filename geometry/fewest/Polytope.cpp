@@ -79,31 +79,41 @@ void Polytope::AddCornersOnEdges(std::array<double, kMostCorners> const& excess,
       std::int16_t const n = corners_[At(i)].neighbours[At(j)];
       if (n < 0 || n >= oldCount || !(excess[At(n)] > 0.0)) continue;
       if (count_ == kMostCorners) {
-        // Undo: the links of kept corners to the new ones go back to the corners cut off.
-        for (int k = oldCount; k < count_; ++k) {
-          Corner const& made = corners_[At(k)];
-          corners_[At(made.neighbours[3])].neighbours[At(made.neighbours[0])] = made.neighbours[1];
-        }
-        count_ = oldCount;
+        RemoveAdded(oldCount);
         *added = -1;
         return;
       }
-      Corner& fresh = corners_[At(count_)];
-      double const share = excess[At(i)] / (excess[At(i)] - excess[At(n)]);
-      fresh.at = Between(corners_[At(i)].at, corners_[At(n)].at, share);
-      int kept = 0;
-      for (int k = 0; k < 4; ++k) {
-        if (k != j) fresh.planes[At(kept++)] = corners_[At(i)].planes[At(k)];
-      }
-      fresh.planes[3] = planeCount_;
-      // Leaving the new plane leads back to the kept corner; the others are linked later. Until
-      // then two of them remember the edge for the undo above.
-      fresh.neighbours = {static_cast<std::int16_t>(j), n, kNone, static_cast<std::int16_t>(i)};
-      corners_[At(i)].neighbours[At(j)] = static_cast<std::int16_t>(count_);
-      ++count_;
+      AddCorner(i, j, excess[At(i)] / (excess[At(i)] - excess[At(n)]));
       ++*added;
     }
   }
+}
+
+/// Adds the corner at a share of the edge that leads from a corner off one of its planes.
+void Polytope::AddCorner(int from, int plane, double share) {
+  Corner& old = corners_[At(from)];
+  Corner& fresh = corners_[At(count_)];
+  std::int16_t const n = old.neighbours[At(plane)];
+  fresh.at = Between(old.at, corners_[At(n)].at, share);
+  int kept = 0;
+  for (int k = 0; k < 4; ++k) {
+    if (k != plane) fresh.planes[At(kept++)] = old.planes[At(k)];
+  }
+  fresh.planes[3] = planeCount_;
+  // Leaving the new plane leads back to the kept corner; the others are linked later. Until then
+  // two of them remember the edge for RemoveAdded().
+  fresh.neighbours = {static_cast<std::int16_t>(plane), n, kNone, static_cast<std::int16_t>(from)};
+  old.neighbours[At(plane)] = static_cast<std::int16_t>(count_);
+  ++count_;
+}
+
+/// The links of kept corners to the new ones go back to the corners cut off.
+void Polytope::RemoveAdded(int firstNew) {
+  for (int k = firstNew; k < count_; ++k) {
+    Corner const& made = corners_[At(k)];
+    corners_[At(made.neighbours[3])].neighbours[At(made.neighbours[0])] = made.neighbours[1];
+  }
+  count_ = firstNew;
 }
 
 void Polytope::LinkNewCorners(int firstNew) {
@@ -112,30 +122,32 @@ void Polytope::LinkNewCorners(int firstNew) {
     corner.neighbours[0] = corner.neighbours[1] = corner.neighbours[2] = kNone;
   }
   for (int i = firstNew; i < count_; ++i) {
-    for (int k = i + 1; k < count_; ++k) {
-      Corner& one = corners_[At(i)];
-      Corner& other = corners_[At(k)];
-      // Neighbours share the new plane and two of the three others.
-      int oneLeaves = -1;
-      int shared = 0;
-      bool isOtherShared[3] = {false, false, false};
-      for (int p = 0; p < 3; ++p) {
-        bool isFound = false;
-        for (int q = 0; q < 3; ++q) {
-          if (one.planes[At(p)] == other.planes[At(q)]) isFound = isOtherShared[q] = true;
-        }
-        if (isFound) {
-          ++shared;
-        } else {
-          oneLeaves = p;
-        }
-      }
-      if (shared != 2) continue;
-      int const otherLeaves = !isOtherShared[0] ? 0 : !isOtherShared[1] ? 1 : 2;
-      one.neighbours[At(oneLeaves)] = static_cast<std::int16_t>(k);
-      other.neighbours[At(otherLeaves)] = static_cast<std::int16_t>(i);
+    for (int k = i + 1; k < count_; ++k) LinkIfNeighbours(i, k);
+  }
+}
+
+/// Neighbours share the new plane and two of the three others.
+void Polytope::LinkIfNeighbours(int i, int k) {
+  Corner& one = corners_[At(i)];
+  Corner& other = corners_[At(k)];
+  int oneLeaves = -1;
+  int shared = 0;
+  bool isOtherShared[3] = {false, false, false};
+  for (int p = 0; p < 3; ++p) {
+    bool isFound = false;
+    for (int q = 0; q < 3; ++q) {
+      if (one.planes[At(p)] == other.planes[At(q)]) isFound = isOtherShared[q] = true;
+    }
+    if (isFound) {
+      ++shared;
+    } else {
+      oneLeaves = p;
     }
   }
+  if (shared != 2) return;
+  int const otherLeaves = !isOtherShared[0] ? 0 : !isOtherShared[1] ? 1 : 2;
+  one.neighbours[At(oneLeaves)] = static_cast<std::int16_t>(k);
+  other.neighbours[At(otherLeaves)] = static_cast<std::int16_t>(i);
 }
 
 void Polytope::RemoveCut(std::array<double, kMostCorners> const& excess, int oldCount) {

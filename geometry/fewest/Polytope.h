@@ -43,7 +43,10 @@ class Polytope {
   };
 
   void AddCornersOnEdges(std::array<double, kMostCorners> const& excess, int* added);
+  void AddCorner(int from, int plane, double share);
+  void RemoveAdded(int firstNew);
   void LinkNewCorners(int firstNew);
+  void LinkIfNeighbours(int i, int k);
   void RemoveCut(std::array<double, kMostCorners> const& excess, int oldCount);
 
   std::array<Corner, kMostCorners> corners_;

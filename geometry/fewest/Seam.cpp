@@ -90,6 +90,7 @@ std::vector<CutPath> CutAtJoints(Path const& path, Chain const& open, std::size_
   if (seams.size() > most) seams.resize(most);
   if (seams.empty()) seams.push_back(SeamAtEnds(path, open.pieces.front().circle));
   std::vector<CutPath> cuts;
+  cuts.reserve(seams.size());
   for (Seam const& seam : seams) cuts.push_back(CutAt(path, seam));
   return cuts;
 }

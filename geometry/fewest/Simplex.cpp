@@ -23,6 +23,13 @@ constexpr double kLeastDeterminant = 1e-14;
 /// A pivot smaller than this share of the largest would spoil the inverse.
 constexpr double kLeastPivotShare = 1e-11;
 
+/// A row of the basis that is missed by more than this share of the slack tells that the inverse
+/// has lost too many digits.
+constexpr double kResidualShare = 0.1;
+
+/// A negative dual this close to 0 is what an exact tie leaves behind.
+constexpr double kLeastDual = 1e-300;
+
 Row Negated(Row const& r) { return {-r.a, -r.bx, -r.by, -r.d}; }
 
 double& Component(Circle* c, int k) {
@@ -41,6 +48,15 @@ double& Component(Circle* c, int k) {
 double Component(Circle const& c, int k) {
   Circle copy = c;
   return Component(&copy, k);
+}
+
+/// The number of the component of largest size.
+int LargestComponent(Circle const& c) {
+  int best = 0;
+  for (int k = 1; k < 4; ++k) {
+    if (std::fabs(Component(c, k)) > std::fabs(Component(c, best))) best = k;
+  }
+  return best;
 }
 
 Circle Sum(Circle const& c, double factor, Circle const& o) {
@@ -131,7 +147,7 @@ bool Simplex::Invert() {
 bool Simplex::IsAccurate(double slack) const {
   for (std::size_t j = 0; j < 4; ++j) {
     double const residual = std::fabs(Apply(rows_[j], solution_) - limits_[j]);
-    if (!(residual <= 0.1 * slack * (limits_[j] > 1.0 ? limits_[j] : 1.0))) return false;
+    if (!(residual <= kResidualShare * slack * (limits_[j] > 1.0 ? limits_[j] : 1.0))) return false;
   }
   return true;
 }
@@ -186,12 +202,7 @@ bool Simplex::MakeDualFeasible(Programme const& programme, Row const& objective,
         continue;
       }
       // A half space on the wrong side makes way for the box row that keeps the basis regular.
-      int best = 0;
-      for (int k = 1; k < 4; ++k) {
-        if (std::fabs(Component(inverse_[j], k)) > std::fabs(Component(inverse_[j], best))) {
-          best = k;
-        }
-      }
+      int const best = LargestComponent(inverse_[j]);
       basis->ids[j] = Basis::kBox + best;
       rows_[j] = UnitRow(best);
       limits_[j] = programme.box;
@@ -270,7 +281,7 @@ void Simplex::Exchange(int leaving, Entry const& entry, std::array<double, 4> co
     if (j == l) continue;
     inverse_[j] = Sum(inverse_[j], -step[j], inverse_[l]);
     duals_[j] -= theta * step[j];
-    if (duals_[j] < 0.0 && duals_[j] > -1e-300) duals_[j] = 0.0;
+    if (duals_[j] < 0.0 && duals_[j] > -kLeastDual) duals_[j] = 0.0;
   }
   duals_[l] = theta;
   rows_[l] = entry.row;

@@ -20,15 +20,16 @@ struct Condition {
 /// The rows that a circle has to obey: those of the points [first, last) and some more.
 struct Programme {
   static constexpr int kMostConditions = 24;
+  /// Local coordinates are of the order of 1, so this box holds every circle down to a radius of
+  /// 1e-6; the smaller, the better the rounding.
+  static constexpr double kWidestBox = 1048576.0;
 
   Columns const* columns = nullptr;
   std::int32_t first = 0;
   std::int32_t last = 0;
   int conditionCount = 0;
   /// Bounds every coefficient, so that the programme has an end where the points leave it without.
-  /// Local coordinates are of the order of 1, so this one holds every circle down to a radius of
-  /// 1e-6; the smaller, the better the rounding.
-  double box = 1048576.0;
+  double box = kWidestBox;
   std::array<Condition, kMostConditions> conditions;
 
   /// Adds a condition; one too many is left out and answers false.

@@ -5,6 +5,7 @@
 
 #include <cstdint>
 #include <limits>
+#include <numbers>
 #include <vector>
 
 #include "vorn/GeometryUtils.h"
@@ -62,7 +63,7 @@ class VORN_EXPORT FewestPieces {
     /// covers, and between its ends and the points next to them; above 0, at most pi. Points closer
     /// together than their tolerances count as one. 60 degrees by default: an arc then bulges at
     /// most 0.134 of the distance of two neighbours beyond the straight path between them.
-    double largestStep = 1.0471975511965976;
+    double largestStep = std::numbers::pi / 3.0;
     /// Least radius of an arc; 0 or more.
     double smallestRadius = 0.0;
     /// Greatest radius of an arc: what is flatter comes as a segment. Above 0 and not below
