@@ -39,16 +39,22 @@ std::string FolderOf(std::string const& path) {
   return folder.empty() ? "." : folder.string();
 }
 
+/// What a new file allows before the mask of the process: everybody reads and writes.
+constexpr mode_t kReadAndWrite = 0666;
+
+/// The bits of a mode that are permissions; the others tell the kind of the file.
+constexpr mode_t kPermissions = 07777;
+
 mode_t DefaultMode() {
   mode_t const mask = umask(0);
   umask(mask);
-  return static_cast<mode_t>(0666) & ~mask;
+  return kReadAndWrite & ~mask;
 }
 
 /// A replaced file keeps its permissions.
 mode_t ModeFor(std::string const& target) {
   struct stat status {};
-  return stat(target.c_str(), &status) == 0 ? (status.st_mode & 07777) : DefaultMode();
+  return stat(target.c_str(), &status) == 0 ? (status.st_mode & kPermissions) : DefaultMode();
 }
 
 /// A device such as /dev/null or a pipe with a name, which takes what it is given at once.

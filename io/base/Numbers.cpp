@@ -55,7 +55,8 @@ std::string FormatShort(double value, int digits) {
 
 std::string FormatFixed(double value, int decimals) {
   // The largest double has 309 digits ahead of the point.
-  std::array<char, 400> buffer{};
+  constexpr std::size_t kLongestFixed = 400;
+  std::array<char, kLongestFixed> buffer{};
   std::snprintf(buffer.data(), buffer.size(), "%.*f", decimals, value);
   return WithoutMinusOnZero(buffer.data());
 }

@@ -17,7 +17,7 @@ struct Staged {
 
 /// Never destroyed: a thread that removes the files may outlive main().
 Staged& TheStaged() {
-  static Staged* const staged = new Staged;
+  static auto* const staged = new Staged;
   return *staged;
 }
 

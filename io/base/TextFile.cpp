@@ -13,7 +13,9 @@ namespace Vorn::IO {
 
 namespace {
 
-constexpr std::size_t kFirstBlock = 64 * 1024;
+constexpr std::size_t kMebibyte = std::size_t{1} << 20;
+
+constexpr std::size_t kFirstBlock = std::size_t{64} * 1024;
 
 /// Far above any measurement.
 constexpr std::size_t kLargestText = std::size_t{4} << 30;
@@ -47,7 +49,7 @@ std::string ReadAll(std::string const& path, std::istream& in, std::size_t expec
   std::size_t size = 0;
   for (std::size_t room = expected; in; room = 2 * room) {
     if (size >= largest) {
-      Refuse(path, "is too large: more than " + std::to_string(largest >> 20) + " MiB");
+      Refuse(path, "is too large: more than " + std::to_string(largest / kMebibyte) + " MiB");
     }
     text.resize(std::min(room, largest + 1));
     in.read(text.data() + size, static_cast<std::streamsize>(text.size() - size));

@@ -68,7 +68,7 @@ void Labels::TakePiece(Piece const& piece) {
   constexpr double kMostSteps = 500.0;
   double const steps =
       std::clamp(std::ceil(piece.length * view_.Scale() / kTakenSize), 1.0, kMostSteps);
-  for (double i = 0.0; i <= steps; ++i) {
+  for (int i = 0; i <= steps; ++i) {
     GeometryUtils::Point const at = PlaceOn(piece, piece.length * i / steps);
     Take(view_(at.x, at.y));
     pieces_.push_back(taken_.back());
@@ -79,10 +79,11 @@ std::string Labels::Add(Piece const& piece, std::string const& text) {
   Anchor const anchor = AnchorOf(piece, view_);
   double const width = kLetterWidth * static_cast<double>(text.size());
   double const nearest = std::max(kLeastDistance, band_ + kBeyondBand);
-  for (double more = 0.0; more <= kFarther; more += kDistanceStep) {
+  for (int step = 0; step * kDistanceStep <= kFarther; ++step) {
+    double const distance = nearest + step * kDistanceStep;
     for (double const side : {1.0, -1.0}) {
-      Rect const rect = RectBeside(anchor, side, nearest + more, width);
-      if (!IsFree(rect) || IsCutOff(anchor, side, nearest + more)) continue;
+      Rect const rect = RectBeside(anchor, side, distance, width);
+      if (!IsFree(rect) || IsCutOff(anchor, side, distance)) continue;
       taken_.push_back(rect);
       return Text({rect.left + 0.5 * width, rect.top + 0.5 * kLabelHeight + 4.0},
                   "fill=\"" + TextColorOf(piece) + "\"", text);
@@ -98,8 +99,8 @@ bool Labels::IsFree(Rect const& rect) const {
 }
 
 bool Labels::IsCutOff(Anchor const& anchor, double side, double distance) const {
-  for (double reach = kOwnPiece; reach < distance; reach += kTakenSize) {
-    Rect const here = Around(AtDistance(anchor, side, reach));
+  for (int step = 0; kOwnPiece + step * kTakenSize < distance; ++step) {
+    Rect const here = Around(AtDistance(anchor, side, kOwnPiece + step * kTakenSize));
     if (std::any_of(pieces_.begin(), pieces_.end(),
                     [&](Rect const& other) { return here.Overlaps(other); })) {
       return true;

@@ -55,7 +55,7 @@ std::string ArcData(Piece const& arc, double from, double to, View const& view) 
       data += "L" + at;
     } else {
       // With y turned over by the view, counter-clockwise is SVG's negative sense.
-      std::string const sense = arc.counterClockwise ? "0" : "1";
+      char const* const sense = arc.counterClockwise ? "0" : "1";
       data += "A" + Px(radius) + "," + Px(radius) + " 0 0 " + sense + " " + at;
     }
   }

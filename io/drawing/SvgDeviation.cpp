@@ -139,7 +139,7 @@ std::string Joints(Chart const& chart) {
 
 /// Lines from zero to each deviation, where there are few enough to tell them apart.
 std::string Stems(Scene const& scene, Chart const& chart) {
-  double const count = static_cast<double>(scene.drawing.points.size());
+  auto const count = static_cast<double>(scene.drawing.points.size());
   if (count * kLeastStemGap > chart.Frame().width) return "";
   std::string data;
   for (std::size_t i = 0; i < scene.drawing.points.size(); ++i) {

@@ -27,7 +27,7 @@ struct Circle {
 /// for points all around.
 Circle FirstGuess(std::vector<WPoint> const& points) {
   Circle circle;
-  double const count = static_cast<double>(points.size() - 1);
+  auto const count = static_cast<double>(points.size() - 1);
   for (std::size_t i = 1; i < points.size(); ++i) {
     circle.center.x += points[i].x / count;
     circle.center.y += points[i].y / count;

@@ -1,6 +1,7 @@
 #include "io/formats/CsvPieces.h"
 
 #include <map>
+#include <utility>
 #include <vector>
 
 #include "io/base/Words.h"
@@ -56,7 +57,7 @@ std::vector<std::string_view> Cells(std::string_view line, char separator) {
 
 class Reader {
  public:
-  Reader(std::string_view text, std::string const& path) : path_(path), lines_(text) {}
+  Reader(std::string_view text, std::string path) : path_(std::move(path)), lines_(text) {}
 
   ContourFile Read() {
     std::string_view line;

@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <optional>
+#include <utility>
 
 #include "io/base/Words.h"
 #include "io/formats/Text.h"
@@ -18,7 +19,7 @@ constexpr double kLargestCode = 1071.0;
 /// Goes through the groups of a file.
 class Groups {
  public:
-  Groups(std::string_view text, std::string const& path) : lines_(text), path_(path) {}
+  Groups(std::string_view text, std::string path) : lines_(text), path_(std::move(path)) {}
 
   /// False at the end of the file.
   bool Next(Group* group) {

@@ -3,6 +3,7 @@
 #include <cstddef>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 namespace Vorn::IO::Dxf {
@@ -17,8 +18,8 @@ struct Group {
 /// One entity of a drawing, or one vertex of a polyline.
 class Entity {
  public:
-  Entity(std::string_view type, std::size_t number, std::size_t line, std::string const& path)
-      : type_(type), number_(number), line_(line), path_(path) {}
+  Entity(std::string_view type, std::size_t number, std::size_t line, std::string path)
+      : type_(type), number_(number), line_(line), path_(std::move(path)) {}
 
   void Add(Group const& group) { groups_.push_back(group); }
 
