@@ -2,6 +2,7 @@
 
 #include <cmath>
 #include <cstddef>
+#include <cstdint>
 
 namespace Vorn::Fewest {
 
@@ -26,6 +27,17 @@ Answer Restore(Shift const& shift, Chain const& chain, std::vector<BuiltPiece> c
     answer.ranges.push_back({chain.pieces[k].first, chain.pieces[k].end - 1});
   }
   return answer;
+}
+
+bool AppendClosingSegment(Answer* answer) {
+  GeometryUtils::Point const start = answer->contour.front().end;
+  GeometryUtils::Point const end = answer->contour.back().end;
+  FewestPieces::Range& last = answer->ranges.back();
+  if (last.first == last.last || (start.x == end.x && start.y == end.y)) return false;
+  answer->contour.push_back(BuildSegment(end, start).elem);
+  std::int32_t const taken = last.last--;
+  answer->ranges.push_back({taken, taken});
+  return true;
 }
 
 void RoundEnds(double leastTolerance, Answer* answer) {

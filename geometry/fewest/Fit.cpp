@@ -200,7 +200,23 @@ class Fitter {
       // No closed chain has fewer than the open one less the piece that the end of the input cuts.
       if (answer->ranges.size() + 1 <= open.pieces.size()) return true;
     }
-    return isFound;
+    if (isFound && answer->ranges.size() <= open.pieces.size() + 1) return true;
+    return CloseBySegment(open, answer, report) || isFound;
+  }
+
+  /// The open chain with a segment from its end back to its start; leaves the answer where that
+  /// breaks a promise.
+  bool CloseBySegment(Chain const& open, Answer* answer, Promises::Report* report) const {
+    Chain const centred = options_.centre ? Fewest::Centre(path_, open) : open;
+    for (Chain const* chain : {&centred, &open}) {
+      Answer closed = Fewest::Restore(shift_, *chain, Fewest::BuildPieces(path_, *chain));
+      Promises::Report closedReport;
+      if (!Fewest::AppendClosingSegment(&closed) || !Measure(closed, &closedReport)) continue;
+      *answer = std::move(closed);
+      *report = std::move(closedReport);
+      return true;
+    }
+    return false;
   }
 
   bool AreRadiiAllowed(std::vector<GeometryUtils::Elem> const& contour) const {

@@ -275,11 +275,16 @@ PieceSearch::Check PieceSearch::AddBrokenJoint(Circle const& circle, Opening con
   double const dx = p.x - joint.x;
   double const dy = p.y - joint.y;
   double const room = share_ * sample.w;
-  Check const step = AddBrokenStep(circle, dx * dx + dy * dy, sample, p);
-  if (step != Check::Holds) return step;
+  double const gap2 = dx * dx + dy * dy;
+  if (point == (sense > 0.0 ? gate.split : gate.split - 1)) {
+    Check const step = AddBrokenStep(circle, gap2, sample, p);
+    if (step != Check::Holds) return step;
+  }
+  // From a quarter turn on the direction at the point says nothing about its order.
+  if (2.0 * circle.a * circle.a * gap2 > 1.0) return Check::Holds;
   Row const advance = AdvanceRow(p, sense * dx, sense * dy);
   if (Apply(advance, circle) >= -kRoundingRoom * sample.w ||
-      dx * dx + dy * dy <= room * room * (1.0 + kRoundingRoom)) {
+      gap2 <= room * room * (1.0 + kRoundingRoom)) {
     return Check::Holds;
   }
   if (isFixed) {

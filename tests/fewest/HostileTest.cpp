@@ -67,11 +67,24 @@ TEST(FewestPiecesHostile, ZigzagsBeyondTheToleranceTakeTwoPointsEach) {
 }
 
 TEST(FewestPiecesHostile, SpiralsOfManyTurnsAreFollowed) {
-  for (double const w : {0.01, 0.1}) {
+  // At 0.3 the points beside a joint that count as near reach around more than half a lap.
+  for (double const w : {0.01, 0.1, 0.3}) {
     SCOPED_TRACE(testing::Message() << "w " << w);
     FewestResult const result = FitKept(MakeSpiral(6.0, 1.0, 800, w));
     EXPECT_GE(PieceCount(result), result.fewestPossible);
+    EXPECT_LE(PieceCount(result), result.fewestPossible + 3);
   }
+}
+
+TEST(FewestPiecesHostile, AFlatArcIsClosedByItsChord) {
+  Scan scan;
+  for (std::int32_t i = 0; i <= 240; ++i) {
+    double const angle = (i - 120) / 12000.0;
+    scan.push_back({1000.0 * std::sin(angle), 1000.0 * (std::cos(angle) - 1.0), 0.02});
+  }
+  FewestResult const result = FitKept(scan, Closed());
+  EXPECT_EQ(PieceCount(result), 2);
+  EXPECT_EQ(ArcCount(result), 1);
 }
 
 TEST(FewestPiecesHostile, AnOutlierFarAwayTakesAPieceOrTwoMore) {
