@@ -36,9 +36,9 @@ export class PieceTable {
     return row;
   }
 
-  /** Degrees, without a sign as everywhere, and the direction. */
+  /** Degrees, without a sign as everywhere, and an arrow for the direction. */
   sweep(piece) {
-    return `${short(piece.sweep * 180 / Math.PI, 5)}\u00b0 ${piece.ccw ? 'ccw' : 'cw'}`;
+    return `${short(piece.sweep * 180 / Math.PI, 5)}\u00b0 ${piece.ccw ? '\u21ba' : '\u21bb'}`;
   }
 
   worstCell(piece) {
