@@ -13,6 +13,7 @@
 #include "geometry/fewest/Chain.h"
 #include "geometry/fewest/LocalFrame.h"
 #include "geometry/fewest/OnePiece.h"
+#include "geometry/fewest/Polyline.h"
 #include "geometry/fewest/Progress.h"
 #include "geometry/fewest/Seam.h"
 #include "geometry/fewest/promises/Promises.h"
@@ -45,6 +46,10 @@ constexpr std::int32_t kSearched = 80;
 /// Searches with smaller tolerances where promises fail.
 constexpr int kMostRepairs = 4;
 
+/// By what the tolerances near a broken promise are multiplied after each of them: a little room is
+/// often enough and costs no piece.
+constexpr double kTightening[kMostRepairs] = {0.8, 0.8, 0.5, 0.5};
+
 /// At least so many points on either side of a broken promise get a smaller tolerance.
 constexpr std::int32_t kLeastReach = 4;
 
@@ -74,18 +79,6 @@ Fewest::Limits LimitsOf(Options const& options, double scale) {
           std::sin(0.5 * options.largestStep), options.farthestBetweenPoints * scale};
 }
 
-WPoint const& Tightest(std::vector<WPoint> const& points) {
-  return *std::min_element(points.begin(), points.end(),
-                           [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
-}
-
-/// The point of least tolerance lies within the tolerance of every other: one place stands for all.
-bool DoCoincide(std::vector<WPoint> const& points) {
-  WPoint const& tightest = Tightest(points);
-  return std::all_of(points.begin(), points.end(),
-                     [&](WPoint const& p) { return Fewest::DistanceBetween(p, tightest) <= p.w; });
-}
-
 /// Looks for contours and measures what they promise.
 class Fitter {
  public:
@@ -101,7 +94,7 @@ class Fitter {
   bool RunAsOne(Fewest::Circle const& covering, Answer* answer, Promises::Report* report) const {
     for (Chain const& chain : Fewest::MakeOnePiece(path_, covering)) {
       if (KeepsCentred(path_, 0, chain, answer, report)) return true;
-      Fewest::RoundEnds(Tightest(points_).w, answer);
+      Fewest::RoundEnds(Fewest::Tightest(points_).w, answer);
       if (Measure(*answer, report)) return true;
     }
     return false;
@@ -112,7 +105,7 @@ class Fitter {
     for (int round = 0; round < kMostRepairs; ++round) {
       if (Search(1.0, answer, report)) return true;
       if (answer->ranges.empty()) break;
-      Tighten(*answer, *report);
+      Tighten(*answer, *report, kTightening[round]);
     }
     path_.points = shift_.Apply(points_);
     // What does not yield near the place may yield when all pieces change.
@@ -121,7 +114,9 @@ class Fitter {
     }
     // Segments keep to the path between the points and have no radius.
     path_.limits.segmentsOnly = true;
-    return Search(1.0, answer, report);
+    if (Search(1.0, answer, report)) return true;
+    *answer = Fewest::FollowPoints(points_, options_.closed);
+    return Measure(*answer, report);
   }
 
  private:
@@ -148,19 +143,20 @@ class Fitter {
 
   void Tell(std::int32_t done) { progress_.Tell(kCovered, kSearched, done); }
 
-  /// Halves the tolerances of the search about the places where promises fail, which leaves room
-  /// for them and costs a piece there.
-  void Tighten(Answer const& answer, Promises::Report const& report) {
+  /// Multiplies the tolerances of the search about the places where promises fail by a factor below
+  /// 1, which leaves room for them and may cost a piece there.
+  void Tighten(Answer const& answer, Promises::Report const& report, double factor) {
     for (Promises::Violation const& violation : report.violations) {
-      TightenNear(answer.ranges[violation.piece], violation.at);
+      TightenNear(answer.ranges[violation.piece], violation.at, factor);
       if (violation.otherPiece != Promises::kNone) {
-        TightenNear(answer.ranges[violation.otherPiece], violation.at);
+        TightenNear(answer.ranges[violation.otherPiece], violation.at, factor);
       }
     }
-    path_.leastTolerance *= 0.5;
+    path_.leastTolerance *= factor;
   }
 
-  void TightenNear(FewestPieces::Range const& range, GeometryUtils::Point const& at) {
+  void TightenNear(FewestPieces::Range const& range, GeometryUtils::Point const& at,
+                   double factor) {
     std::int32_t const count = path_.Count();
     std::int32_t const length = (range.last - range.first + count) % count + 1;
     std::int32_t nearest = 0;
@@ -177,7 +173,7 @@ class Fitter {
     for (std::int32_t k = nearest - reach; k <= nearest + reach; ++k) {
       std::int32_t const i = range.first + k;
       if (!options_.closed && (i < 0 || i >= count)) continue;
-      path_.points[static_cast<std::size_t>((i % count + count) % count)].w *= 0.5;
+      path_.points[static_cast<std::size_t>((i % count + count) % count)].w *= factor;
     }
   }
 
@@ -264,13 +260,13 @@ ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& op
                             Result* result, ExecutionState* executionState,
                             std::int32_t maxPercent) {
   if (result == nullptr || !AreValid(points) || !IsValid(options)) return ErrorCode::Failed;
-  if (DoCoincide(points)) return ErrorCode::NoFit;
+  if (Fewest::DoCoincide(points)) return ErrorCode::NoFit;
   Fewest::Progress progress(executionState, maxPercent, static_cast<std::int32_t>(points.size()));
   Fewest::Shift const shift = Fewest::ShiftFor(points);
   Path path;
   path.points = shift.Apply(points);
   path.limits = LimitsOf(options, shift.scale);
-  path.leastTolerance = Tightest(points).w * shift.scale;
+  path.leastTolerance = Fewest::Tightest(points).w * shift.scale;
 
   Fewest::Cover const cover = Fewest::CoverGreedily(
       path.points, path.limits, [&](std::int32_t done) { progress.Tell(0, kCovered, done); });

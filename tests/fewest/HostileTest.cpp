@@ -76,6 +76,15 @@ TEST(FewestPiecesHostile, SpiralsOfManyTurnsAreFollowed) {
   }
 }
 
+TEST(FewestPiecesHostile, TolerancesOverSixOrdersAlwaysHaveAnAnswer) {
+  for (std::uint64_t seed = 1; seed <= 4; ++seed) {
+    SCOPED_TRACE(testing::Message() << "seed " << seed);
+    FewestResult const result = FitKept(MakeManyTolerances(seed, ProfileStyle::Mixed, 500));
+    EXPECT_LE(result.fewestPossible, 16);
+    EXPECT_LT(PieceCount(result), 400);
+  }
+}
+
 TEST(FewestPiecesHostile, AFlatArcIsClosedByItsChord) {
   Scan scan;
   for (std::int32_t i = 0; i <= 240; ++i) {
@@ -88,7 +97,7 @@ TEST(FewestPiecesHostile, AFlatArcIsClosedByItsChord) {
 }
 
 TEST(FewestPiecesHostile, AnOutlierFarAwayTakesAPieceOrTwoMore) {
-  for (double const distance : {1e3, 1e6}) {
+  for (double const distance : {10.0, 1e3, 1e6}) {
     SCOPED_TRACE(testing::Message() << "distance " << distance);
     FewestResult const result = FitKept(MakeOutlier(101, 0.1, distance));
     EXPECT_LE(result.fewestPossible, 3);

@@ -1,0 +1,17 @@
+#pragma once
+
+#include <vector>
+
+#include "geometry/fewest/Answer.h"
+#include "vorn/Types.h"
+
+/// Segments from measured point to measured point.
+namespace Vorn::Fewest {
+
+/// The segments that run from point to point, each as far as the points that it passes by stay
+/// within their tolerances. Far from the fewest, but there wherever the straight path itself keeps
+/// what is promised, however different the tolerances are. A closed one ends with a segment to the
+/// first point, unless the last point repeats it. Without ranges when all points are equal.
+Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed);
+
+}  // namespace Vorn::Fewest
