@@ -32,7 +32,7 @@ describe('Scene', () => {
     assert.equal(scene.relative(2), 0.3 / 0.2);
   });
   it('forgives a tolerance exceeded by rounding alone', () => {
-    const scene = new Scene(measuredData([0.2 * (1 + 1e-10), 0.2 * (1 + 1e-8), 0], 0.2));
+    const scene = new Scene(measuredData([0.2 * (1 + 9e-7), 0.2 * (1 + 1.1e-6), 0], 0.2));
     assert.deepEqual([0, 1, 2].map((i) => scene.isOutside(i)), [false, true, false]);
   });
   it('takes a deviation that is not a number for outside', () => {
