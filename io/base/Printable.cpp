@@ -10,6 +10,26 @@ namespace {
 
 constexpr std::string_view kReplacement = "\xEF\xBF\xBD";
 
+/// Where the first bytes of characters of 1, 2, 3 and 4 bytes end or begin. 0xC0 and 0xC1 begin
+/// none, as they would write ASCII in two bytes; from 0xF5 on the codes would be too large.
+constexpr unsigned char kEndOfSingle = 0x80;
+constexpr unsigned char kFirstOfTwo = 0xC2;
+constexpr unsigned char kFirstOfThree = 0xE0;
+constexpr unsigned char kFirstOfFour = 0xF0;
+constexpr unsigned char kEndOfFour = 0xF5;
+
+/// A byte after the first has the mark 10 in its upper two bits, and six bits of the code below.
+constexpr std::uint32_t kMarkBits = 0xC0;
+constexpr std::uint32_t kMark = 0x80;
+constexpr std::uint32_t kCodeBits = 0x3F;
+constexpr std::uint32_t kFirstCodeBits = 0x7F;
+
+constexpr std::uint32_t kLargestCode = 0x10FFFF;
+
+/// The control characters above ASCII's printable ones: delete and those of ISO 6429.
+constexpr std::uint32_t kDelete = 0x7F;
+constexpr std::uint32_t kEndOfControls = 0xA0;
+
 /// A character of UTF-8; a length of 0 says that the bytes are none.
 struct Character {
   std::size_t length = 0;
@@ -17,10 +37,10 @@ struct Character {
 };
 
 std::size_t LengthFrom(unsigned char first) {
-  if (first < 0x80) return 1;
-  if (first >= 0xC2 && first < 0xE0) return 2;
-  if (first >= 0xE0 && first < 0xF0) return 3;
-  return first >= 0xF0 && first < 0xF5 ? 4 : 0;
+  if (first < kEndOfSingle) return 1;
+  if (first >= kFirstOfTwo && first < kFirstOfThree) return 2;
+  if (first >= kFirstOfThree && first < kFirstOfFour) return 3;
+  return first >= kFirstOfFour && first < kEndOfFour ? 4 : 0;
 }
 
 Character CharacterAt(std::string_view text) {
@@ -29,18 +49,20 @@ Character CharacterAt(std::string_view text) {
   if (length == 0 || length > text.size()) return {};
   if (length == 1) return {1, byte(0)};
   // The first byte has as many leading ones as the character has bytes.
-  std::uint32_t code = byte(0) & (0x7Fu >> length);
+  std::uint32_t code = byte(0) & (kFirstCodeBits >> length);
   for (std::size_t i = 1; i < length; ++i) {
-    if ((byte(i) & 0xC0u) != 0x80u) return {};
-    code = code << 6 | (byte(i) & 0x3Fu);
+    if ((byte(i) & kMarkBits) != kMark) return {};
+    code = code << 6 | (byte(i) & kCodeBits);
   }
   constexpr std::array<std::uint32_t, 5> kLeast = {0, 0, 0x80, 0x800, 0x10000};
   bool const isSurrogate = code >= 0xD800 && code < 0xE000;
-  if (code < kLeast.at(length) || code > 0x10FFFF || isSurrogate) return {};
+  if (code < kLeast.at(length) || code > kLargestCode || isSurrogate) return {};
   return {length, code};
 }
 
-bool IsControl(std::uint32_t code) { return code < 0x20 || (code >= 0x7F && code < 0xA0); }
+bool IsControl(std::uint32_t code) {
+  return code < 0x20 || (code >= kDelete && code < kEndOfControls);
+}
 
 }  // namespace
 

@@ -34,8 +34,11 @@ struct Moments {
 double MinusSine(double t) {
   constexpr double kSmall = 0.1;
   if (t > kSmall) return t - std::sin(t);
+  // Ratios of neighbouring terms of the series: 2 * 3, 4 * 5, 6 * 7, 8 * 9.
+  constexpr double kRatios[] = {6.0, 20.0, 42.0, 72.0};
   double const t2 = t * t;
-  return t * t2 / 6.0 * (1.0 - t2 / 20.0 * (1.0 - t2 / 42.0 * (1.0 - t2 / 72.0)));
+  return t * t2 / kRatios[0] *
+         (1.0 - t2 / kRatios[1] * (1.0 - t2 / kRatios[2] * (1.0 - t2 / kRatios[3])));
 }
 
 /// The triangle from the origin to the two points.
