@@ -43,12 +43,9 @@ constexpr double kRadiusRounding = 1e-9;
 constexpr std::int32_t kCovered = 20;
 constexpr std::int32_t kSearched = 80;
 
-/// Searches with smaller tolerances where promises fail.
-constexpr int kMostRepairs = 4;
-
-/// By what the tolerances near a broken promise are multiplied after each of them: a little room is
-/// often enough and costs no piece.
-constexpr double kTightening[kMostRepairs] = {0.8, 0.8, 0.5, 0.5};
+/// By what the tolerances near a broken promise are multiplied after each search that breaks one: a
+/// little room is often enough and costs no piece.
+constexpr double kTightening[] = {0.8, 0.8, 0.5, 0.5};
 
 /// At least so many points on either side of a broken promise get a smaller tolerance.
 constexpr std::int32_t kLeastReach = 4;
@@ -102,10 +99,10 @@ class Fitter {
 
   /// The first contour found that keeps every promise; false when there is none.
   bool Run(Answer* answer, Promises::Report* report) {
-    for (int round = 0; round < kMostRepairs; ++round) {
+    for (double const factor : kTightening) {
       if (Search(1.0, answer, report)) return true;
       if (answer->ranges.empty()) break;
-      Tighten(*answer, *report, kTightening[round]);
+      Tighten(*answer, *report, factor);
     }
     path_.points = shift_.Apply(points_);
     // What does not yield near the place may yield when all pieces change.

@@ -12,8 +12,9 @@ namespace {
 constexpr double kSizesToStep = 32.0;
 
 double StepFor(double size) {
+  constexpr double kBase = 10.0;
   double step = 1.0;
-  while (step < kSizesToStep * size) step *= 10.0;
+  while (step < kSizesToStep * size) step *= kBase;
   return step;
 }
 

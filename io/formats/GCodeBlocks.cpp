@@ -1,6 +1,7 @@
 #include "io/formats/GCodeBlocks.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "io/base/Words.h"
 #include "io/formats/Text.h"
@@ -15,8 +16,8 @@ namespace {
 /// Takes a line apart.
 class Scanner {
  public:
-  Scanner(std::string_view line, std::size_t number, std::string const& path)
-      : line_(line), number_(number), path_(path) {}
+  Scanner(std::string_view line, std::size_t number, std::string path)
+      : line_(line), number_(number), path_(std::move(path)) {}
 
   GCodeBlock Read() {
     GCodeBlock block;

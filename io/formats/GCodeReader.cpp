@@ -4,6 +4,7 @@
 #include <cmath>
 #include <iterator>
 #include <optional>
+#include <utility>
 #include <vector>
 
 #include "io/base/Words.h"
@@ -46,7 +47,7 @@ constexpr Plane kPlaneXZ = {0, 2, 'I', 'K', 1, true};
 /// What a machine would remember, and the pieces it has cut.
 class Machine {
  public:
-  explicit Machine(std::string const& path) : path_(path) {}
+  explicit Machine(std::string path) : path_(std::move(path)) {}
 
   void Run(GCodeBlock const& block, std::size_t line) {
     line_ = line;

@@ -1,5 +1,7 @@
 #include "io/formats/Wkt.h"
 
+#include <utility>
+
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Failure.h"
@@ -65,7 +67,7 @@ std::optional<Piece> ThroughPoints(XY const& start, XY const& middle, XY const& 
 
 class Reader {
  public:
-  Reader(std::string_view text, std::string const& path) : text_(text), path_(path) {}
+  Reader(std::string_view text, std::string path) : text_(text), path_(std::move(path)) {}
 
   std::vector<Piece> Read() {
     SkipReference();

@@ -137,9 +137,10 @@ class Merger {
  private:
   bool IsKnown(Intersection const& next) const {
     // Along the first path only neighbours can be the same, but for its seam.
-    for (auto other = kept_.rbegin(); other != kept_.rend(); ++other) {
-      if (next.a.position - other->a.position > 4.0 * a_.tolerance) break;
-      if (AreSame(*other, next)) return true;
+    for (std::size_t i = kept_.size(); i > 0; --i) {
+      Intersection const& other = kept_[i - 1];
+      if (next.a.position - other.a.position > 4.0 * a_.tolerance) break;
+      if (AreSame(other, next)) return true;
     }
     for (Intersection const& other : kept_) {
       if (other.a.position > 4.0 * a_.tolerance) break;

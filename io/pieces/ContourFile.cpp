@@ -16,6 +16,9 @@ std::size_t RemovePiecesWithoutLength(std::vector<Piece>* pieces) {
 }
 
 double JointTolerance(std::vector<Piece> const& pieces) {
+  // Nine digits of a file are kept, and a centre far away loses some last digits at the ends.
+  constexpr double kOfCoordinates = 1e-9;
+  constexpr double kOfRadius = 1e-14;
   double coordinate = 0.0;
   double radius = 0.0;
   for (Piece const& piece : pieces) {
@@ -24,7 +27,7 @@ double JointTolerance(std::vector<Piece> const& pieces) {
     }
     radius = std::max(radius, piece.radius);
   }
-  return std::max(1e-9 * coordinate, 1e-14 * radius);
+  return std::max(kOfCoordinates * coordinate, kOfRadius * radius);
 }
 
 bool ReturnsToStart(std::vector<Piece> const& pieces) {

@@ -25,9 +25,11 @@ double LargestCoordinate(Piece const& piece) {
 /// How far an end may be from where the circle has it: three good digits of the arc, six of what
 /// it is worked out from.
 double AllowedError(Piece const& arc) {
+  constexpr double kOfArc = 1e-3;
+  constexpr double kOfTerms = 1e-6;
   double const terms =
       arc.radius + LargestCoordinate(arc) + std::fabs(arc.center.x) + std::fabs(arc.center.y);
-  return 1e-3 * std::min(arc.radius, arc.length) + 1e-6 * terms;
+  return kOfArc * std::min(arc.radius, arc.length) + kOfTerms * terms;
 }
 
 void Include(XY const& point, Extent* extent) {

@@ -106,6 +106,7 @@ class Walk {
 
 double MedianTolerance(std::vector<WPoint> const& points) {
   std::vector<double> tolerances;
+  tolerances.reserve(points.size());
   for (WPoint const& point : points) tolerances.push_back(point.w);
   auto const middle = tolerances.begin() + static_cast<std::ptrdiff_t>(tolerances.size() / 2);
   std::nth_element(tolerances.begin(), middle, tolerances.end());

@@ -24,12 +24,13 @@ std::vector<double> PlacesAlong(std::vector<WPoint> const& points) {
 
 Corner CornerAt(std::vector<WPoint> const& points, std::size_t before, std::size_t at,
                 std::size_t after) {
+  constexpr double kHalfTurn = 180.0;  // in degrees
   double const inX = points[at].x - points[before].x;
   double const inY = points[at].y - points[before].y;
   double const outX = points[after].x - points[at].x;
   double const outY = points[after].y - points[at].y;
   double const turn = std::atan2(inX * outY - inY * outX, inX * outX + inY * outY);
-  return {at, std::fabs(turn) * 180.0 / std::numbers::pi, turn > 0.0};
+  return {at, std::fabs(turn) * kHalfTurn / std::numbers::pi, turn > 0.0};
 }
 
 /// Every point with a turn of a corner, however near to the next such point.
@@ -95,7 +96,7 @@ std::vector<Corner> CornersOfRound(std::vector<WPoint> points, double reach) {
   if (repeatsFirst) points.pop_back();
   std::size_t const round = points.size();
   points.reserve(3 * round);
-  for (std::size_t i = 0; i < 2 * round; ++i) points.push_back(WPoint(points[i]));
+  for (std::size_t i = 0; i < 2 * round; ++i) points.push_back(points[i]);
   std::vector<double> const places = PlacesAlong(points);
   if (round == 0 || !(places[round] > 2.0 * reach)) return {};
   std::vector<Corner> corners = Merged(

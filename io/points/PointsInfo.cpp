@@ -41,7 +41,7 @@ Suggestion ToleranceForShape(PointsBox const& box) {
 
 /// The points, and the first one again where it is the neighbour of the last.
 std::vector<WPoint> WithClosingPair(std::vector<WPoint> points, Closure const& closure) {
-  if (closure.isClosed && !closure.repeatsFirst) points.push_back(WPoint(points.front()));
+  if (closure.isClosed && !closure.repeatsFirst) points.push_back(points.front());
   return points;
 }
 
