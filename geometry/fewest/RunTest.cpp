@@ -20,6 +20,10 @@ constexpr double kHopeless = 0.5;
 /// The form may fall short of 1 by this much through rounding.
 constexpr double kFormSlack = 1e-9;
 
+/// Share of a limit by which a cut leaves more than it may: a corner inherits the rounding of the
+/// corners that it lies between, and what is proven must not hang on it.
+constexpr double kCutSlack = 5e-9;
+
 constexpr int kMostCuts = 200;
 
 /// The circle on the way from one to another, both within the rows, at which the form is largest.
@@ -69,7 +73,8 @@ RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex
       return {circle, value / broken.limit, true};
     }
     Row const& r = broken.row;
-    if (!polytope.Cut(r, broken.limit) || !polytope.Cut({-r.a, -r.bx, -r.by, -r.d}, broken.limit)) {
+    double const limit = broken.limit * (1.0 + kCutSlack);
+    if (!polytope.Cut(r, limit) || !polytope.Cut({-r.a, -r.bx, -r.by, -r.d}, limit)) {
       break;
     }
   }

@@ -5,13 +5,15 @@
 
 #include <cstdint>
 #include <limits>
-#include <numbers>
 #include <vector>
 
 #include "vorn/GeometryUtils.h"
 #include "vorn/Types.h"
 
 namespace Vorn {
+
+/// 60 degrees in radians.
+inline constexpr double kSixtyDegrees = 1.0471975511965976;
 
 /// Turns measured points into as few segments and arcs as their tolerances allow, and says below
 /// which number no chain of segments and arcs can go. A service of its own beside
@@ -63,7 +65,7 @@ class VORN_EXPORT FewestPieces {
     /// covers, and between its ends and the points next to them; above 0, at most pi. Points closer
     /// together than their tolerances count as one. 60 degrees by default: an arc then bulges at
     /// most 0.134 of the distance of two neighbours beyond the straight path between them.
-    double largestStep = std::numbers::pi / 3.0;
+    double largestStep = kSixtyDegrees;
     /// Least radius of an arc; 0 or more.
     double smallestRadius = 0.0;
     /// Greatest radius of an arc: what is flatter comes as a segment. Above 0 and not below
