@@ -95,7 +95,7 @@ std::int32_t FreeRun::FindEnd(std::int32_t start, std::int32_t expected) {
     } else {
       bad = target;
     }
-    if (bad == good + 1) {
+    if (bad == good + 1 && bad <= count) {
       Extend(bad);
       RunFit const proof = ProveRun(programme_, basis_, &simplex);
       if (!proof.isFound) return good;

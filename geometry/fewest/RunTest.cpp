@@ -17,12 +17,9 @@ constexpr double kLeastGain = 1e-4;
 /// Below this largest value of the linearised form no further linearisation brings it to 1.
 constexpr double kHopeless = 0.5;
 
-/// The form may fall short of 1 by this much through rounding.
+/// The form may fall short of 1 by this much through rounding; being quadratic it also takes up the
+/// slack of the rows twice.
 constexpr double kFormSlack = 1e-9;
-
-/// Share of a limit by which a cut leaves more than it may: a corner inherits the rounding of the
-/// corners that it lies between, and what is proven must not hang on it.
-constexpr double kCutSlack = 5e-9;
 
 constexpr int kMostCuts = 200;
 
@@ -65,7 +62,7 @@ RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex
   for (int cut = 0; cut < kMostCuts; ++cut) {
     if (polytope.IsEmpty()) return {};
     Polytope::Peak const peak = polytope.FindPeak();
-    if (peak.form < 1.0 - kFormSlack) return {};
+    if (peak.form < 1.0 - kFormSlack - 2.0 * simplex->Slack()) return {};
     Circle const circle = Scaled(peak.circle, 1.0 / std::sqrt(peak.form));
     Condition const broken = simplex->FindBrokenSlab(programme, circle);
     double const value = std::fabs(Apply(broken.row, circle));
@@ -73,7 +70,8 @@ RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex
       return {circle, value / broken.limit, true};
     }
     Row const& r = broken.row;
-    double const limit = broken.limit * (1.0 + kCutSlack);
+    // What rounding does to a row must not cut off a circle that meets it.
+    double const limit = broken.limit * (1.0 + simplex->Slack());
     if (!polytope.Cut(r, limit) || !polytope.Cut({-r.a, -r.bx, -r.by, -r.d}, limit)) {
       break;
     }

@@ -99,8 +99,10 @@ class VORN_EXPORT FewestPieces {
     /// The first point with that distance.
     std::int32_t largestDeviationIndex = -1;
     /// No chain of segments and arcs that passes within the tolerances has fewer pieces than this,
-    /// wherever its joints are and in whatever order it meets the points. Proven, not estimated;
-    /// arcs of a radius below the tolerance of a point that they cover are left out of account.
+    /// wherever its joints are and in whatever order it meets the points. Proven, not estimated,
+    /// but for rounding: a run that would need its tolerances to be wider by less than a
+    /// ten-millionth may count either way. Arcs of a radius below the tolerance of a point that
+    /// they cover are left out of account.
     std::int32_t fewestPossible = 0;
     /// Whether the contour has exactly that many pieces.
     bool isFewest = false;

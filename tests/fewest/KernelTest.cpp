@@ -104,7 +104,8 @@ TEST(FewestKernel, NeverDeniesWhatExactNumbersCover) {
     if (set.size() > 6) set.resize(6);
     long double const border = BorderOf(set);
     if (border == 0.0L) continue;
-    for (long double const off : {1e-8L, 1e-7L, 1e-6L}) {
+    // Nearer to the border rounding decides: the header leaves a ten-millionth open.
+    for (long double const off : {1e-7L, 1e-6L}) {
       Set const wider = Scaled(set, border * (1 + off));
       if (IsCovered(wider)) continue;
       EXPECT_FALSE(IsCoverableIn<Exact>(wider, 1)) << "off by " << static_cast<double>(off);
