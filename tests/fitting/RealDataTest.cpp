@@ -20,12 +20,6 @@ using Elem = GeometryUtils::Elem;
 using ElemType = GeometryUtils::ElemType;
 using Strategy = GeometryUtils::FittingStrategy;
 
-#if defined(__SANITIZE_ADDRESS__)
-constexpr bool kIsSanitized = true;
-#else
-constexpr bool kIsSanitized = false;
-#endif
-
 /// A measured contour and the tolerance that suits it: one for all points, or a cap for tolerances
 /// that follow the spacing where that is very uneven.
 struct DataFile {
@@ -194,7 +188,6 @@ TEST_P(RealData, SingleArcComesToASoundAnswer) {
 }
 
 TEST_P(RealData, AgreesWithTheReference) {
-  if (kIsSanitized) GTEST_SKIP() << "too slow for the reference with the address sanitizer";
   std::vector<WPoint> points = Load(GetParam());
   // The reference saves nothing; the whole of the longest contours would take it minutes.
   bool const wantsWhole = std::getenv("VORN_WHOLE_CONTOURS") != nullptr;
