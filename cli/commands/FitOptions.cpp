@@ -1,0 +1,172 @@
+#include "cli/commands/FitOptions.h"
+
+#include <algorithm>
+#include <limits>
+#include <sstream>
+
+#include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourOutput.h"
+#include "cli/commands/FitHelp.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Messages.h"
+
+namespace Vorn::Cli {
+
+namespace {
+
+using Strategy = GeometryUtils::FittingStrategy;
+
+constexpr int kMostDigits = 15;
+
+/// The formats of a list as --to takes it; nothing when a word is none or comes twice.
+std::optional<std::vector<Format>> ParseFormats(std::string const& text) {
+  std::vector<Format> formats;
+  std::istringstream words(text + ",");
+  for (std::string word; std::getline(words, word, ',');) {
+    std::optional<Format> const format = FormatNamed(word);
+    if (!format || std::find(formats.begin(), formats.end(), *format) != formats.end()) return {};
+    formats.push_back(*format);
+  }
+  return formats;
+}
+
+void AddFormats(Command& command, FitOptions* options) {
+  auto const complaint = [](std::string const& text) -> std::string {
+    return ParseFormats(text) ? ""
+                              : Quoted(text) +
+                                    " names none of json, csv, dxf, gcode, wkt, svg, png, html, or "
+                                    "one of them twice";
+  };
+  auto const take = [options](std::string const& text) {
+    options->formats = ParseFormats(text).value();
+  };
+  command.AddChecked(
+      "--to", complaint, take, "NAME[,NAME]...",
+      "The format of outputs whose name does not tell, such as -: json, csv, dxf, gcode, wkt, "
+      "svg, png, html; with --out-dir the formats to write, separated by commas; json if not said");
+}
+
+void AddManyOptions(Command& command, FitOptions* options) {
+  constexpr int kMostJobs = 1024;
+  command.AddText("--out-dir", &options->outFolder, "FOLDER",
+                  "Fit one or many files and write the contours into this folder, named after the "
+                  "inputs; it is made if need be");
+  AddWholeNumber(command, "-j,--jobs", &options->jobs, 1, kMostJobs, "N",
+                 "Fit so many files at once; as many as there are processors if not said");
+  command.AddFlag("--no-time", &options->hideTime,
+                  "Leave the times out of the lines of many files");
+}
+
+}  // namespace
+
+FitChoice FitOptions::Choice() const {
+  FitChoice choice = {points.tolerance, strategy, closed, {}};
+  if (start) choice.start = static_cast<std::size_t>(*start);
+  return choice;
+}
+
+std::vector<Target> FitOptions::Targets() const {
+  std::vector<Target> targets;
+  for (std::string const& path : outputs) {
+    targets.push_back({{"--output", path}, FormatFor(path)});
+  }
+  if (!json.empty()) targets.push_back({{"--json", json}, Format::Json});
+  if (!svg.empty()) targets.push_back({{"--svg", svg}, Format::Svg});
+  return targets;
+}
+
+std::vector<NamedFile> FitOptions::Written() const {
+  std::vector<NamedFile> files;
+  for (Target const& target : Targets()) files.push_back(target.file);
+  return files;
+}
+
+bool FitOptions::WritesGCode() const {
+  if (!outFolder.empty()) {
+    return std::find(formats.begin(), formats.end(), Format::GCode) != formats.end();
+  }
+  std::vector<Target> const targets = Targets();
+  return std::any_of(targets.begin(), targets.end(),
+                     [](Target const& target) { return target.format == Format::GCode; });
+}
+
+Format FitOptions::FormatFor(std::string const& path) const {
+  std::optional<Format> otherwise;
+  if (!formats.empty()) otherwise = formats.front();
+  return OutputFormat(path, otherwise, "--to");
+}
+
+void AddFitOptions(Command& command, FitOptions* options) {
+  command
+      .AddTexts("POINTS", &options->paths, "FILE",
+                "CSV files with the measured points, each a contour; - is the standard input")
+      .Require();
+  AddPointsOptions(command, &options->points);
+  AddChoice<Strategy>(
+      command, "--strategy", &options->strategy,
+      {{"mixed", Strategy::Mixed}, {"cells", Strategy::MixedCells}, {"arc", Strategy::SingleArc}},
+      "mixed: lines and arcs compared run by run (default); cells: lines first, arcs between "
+      "them; arc: one arc for all points");
+  AddChoice<ClosedChoice>(
+      command, "--closed", &options->closed,
+      {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
+      "Whether the contour runs back to its start; auto (default): see below");
+  AddWholeNumber(command, "--start", &options->start, 0, std::numeric_limits<int>::max(), "INDEX",
+                 "Cut a closed contour open at this point, counted from 0; without it, at its "
+                 "sharpest corner");
+  command.AddRepeatable(
+      "-o,--output", &options->outputs, "FILE",
+      "Write the contour to this file, in the format that its ending names; may be "
+      "given several times; - is the standard output");
+  AddFormats(command, options);
+  AddManyOptions(command, options);
+  AddWriteOptions(command, &options->write);
+  AddWholeNumber(command, "--digits", &options->digits, 0, kMostDigits, "N",
+                 "Digits after the point of lengths in the table; files always hold every digit");
+  command.AddText("--json", &options->json, "FILE", "The same as -o, always as JSON");
+  command.AddText("--svg", &options->svg, "FILE", "The same as -o, always as SVG");
+  command.AddFlag("-q,--quiet", &options->isQuiet, "Draw no progress bar on the terminal");
+  command.SetFooter(std::string(kPointsFileText) + kFitFooter);
+}
+
+void CompleteFitOptions(FitOptions* options) {
+  options->points.path = options->paths.front();
+  bool const namesNoFile =
+      options->outputs.empty() && options->json.empty() && options->svg.empty();
+  if (namesNoFile && !options->AreMany() && options->formats.size() == 1) {
+    options->outputs = {"-"};
+  }
+}
+
+FitMany ManyOf(FitOptions const& options) {
+  FitMany many;
+  many.paths = options.paths;
+  many.outFolder = options.outFolder;
+  many.formats = options.formats.empty() ? std::vector{Format::Json} : options.formats;
+  many.jobs = options.jobs;
+  many.showTime = !options.hideTime;
+  many.render = [&options](FitReport const& report, std::string const& path, Format format) {
+    return RenderFit(report, path, format, options.write);
+  };
+  return many;
+}
+
+void RefuseWrongUse(FitOptions const& options) {
+  auto const refuse = [](std::string const& message) {
+    throw Failure(FailureKind::BadArgument, message);
+  };
+  if (options.AreMany()) {
+    if (!options.outputs.empty() || !options.json.empty() || !options.svg.empty()) {
+      refuse("many files are written with --out-dir and --to, not with -o, --json or --svg");
+    }
+    if (options.digits) refuse("--digits is for the table of a single file");
+    RefuseCollisions(ManyOf(options));
+    return;
+  }
+  if (options.jobs) refuse("--jobs is for many files");
+  if (options.hideTime) refuse("--no-time is for many files");
+  if (options.formats.size() > 1) refuse("--to names one format, unless --out-dir is given");
+  RefuseSharedFiles({{"POINTS", options.points.path}}, options.Written());
+}
+
+}  // namespace Vorn::Cli
