@@ -30,7 +30,7 @@ namespace {
 
 using Strategy = GeometryUtils::FittingStrategy;
 
-constexpr std::uint64_t kRecordedLibm = 0xd2f7a421b4f534c6;
+constexpr std::uint64_t kRecordedLibm = 0xca6642742352b6f5;
 
 std::map<std::string, std::uint64_t> const kRecordedSections = {
     {"mixedFits", 0x34c636288ac6f106},

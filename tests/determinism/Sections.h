@@ -24,7 +24,8 @@ struct Section {
 /// Every section, whole fits first.
 std::vector<Section> const& AllSections();
 
-/// A digest of the platform's own functions at many arguments. Sections that depend on them can be
+/// A digest of the platform's own functions at many arguments. Its hypot is not among them: no
+/// section comes to it, and it differs between processors. Sections that depend on them can be
 /// compared with records only where it is the recorded one: the functions differ in last bits from
 /// one C library to the next, and on one C library between processors with and without fused
 /// multiply-add.
