@@ -6,14 +6,6 @@
 
 namespace Vorn::IO {
 
-/// The place of a piece that is nearest to a point.
-struct Foot {
-  GeometryUtils::Point at;
-  double along = 0.0;  ///< length of the piece from its start to here
-};
-
-Foot FootOn(Piece const& piece, double x, double y);
-
 /// The place of the piece at this length from its start.
 GeometryUtils::Point PlaceOn(Piece const& piece, double along);
 

@@ -383,7 +383,8 @@ std::optional<ColumnChoice> ParseColumnChoice(std::string_view text) {
 }
 
 std::string PointFile::NameOf(std::size_t index) const {
-  return "point " + std::to_string(index) + " (line " + std::to_string(lines[index]) + ")";
+  std::string const name = "point " + std::to_string(index);
+  return lines.empty() ? name : name + " (line " + std::to_string(lines[index]) + ")";
 }
 
 PointFile ParsePoints(std::string_view text, std::string const& path,

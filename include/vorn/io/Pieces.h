@@ -44,6 +44,15 @@ VORN_IO_EXPORT XY PointOnArc(Piece const& arc, double angle);
 /// Distance of (x, y) from the nearest place of the piece.
 VORN_IO_EXPORT double DistanceTo(Piece const& piece, double x, double y);
 
+/// The place of a piece that is nearest to a point.
+struct Foot {
+  XY at;               ///< the place
+  double along = 0.0;  ///< length of the piece from its start to here
+};
+
+/// The place of the piece that is nearest to (x, y).
+VORN_IO_EXPORT Foot FootOn(Piece const& piece, double x, double y);
+
 /// The distance of two places.
 VORN_IO_EXPORT double Distance(XY const& a, XY const& b);
 

@@ -45,14 +45,14 @@ VORN_IO_EXPORT std::optional<ColumnChoice> ParseColumnChoice(std::string_view te
 struct VORN_IO_EXPORT PointFile {
   std::string path;                   ///< as it stands in messages
   std::vector<WPoint> points;         ///< `w` is 0 unless hasTolerances
-  std::vector<std::size_t> lines;     ///< line of each point, counted from 1
+  std::vector<std::size_t> lines;     ///< line of each point, counted from 1; empty: no file
   bool hasTolerances = false;         ///< a column gave every point's `w`
   std::string toleranceColumn = "w";  ///< which one that was, as it was asked for
   std::optional<double> tolerance;    ///< of a comment `# tolerance T`
   std::string units;    ///< of a comment `# units mm`, else of the header; may be empty
   std::string columns;  ///< which ones hold the points, in words: "1 (x) and 2 (y)"
 
-  /// "point 4 (line 6)", points counted from 0 as the library does.
+  /// "point 4 (line 6)", points counted from 0 as the library does; without lines "point 4".
   std::string NameOf(std::size_t index) const;
 };
 

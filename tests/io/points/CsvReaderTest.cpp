@@ -425,6 +425,12 @@ TEST(CsvReader, PointsAreNamedByIndexAndLine) {
   EXPECT_EQ(Parse("x,y\n1,2\n\n3,4\n").NameOf(1), "point 1 (line 4)");
 }
 
+TEST(NameOf, IsShorterForPointsOfNoFile) {
+  PointFile file;
+  file.points = {{0.0, 0.0}, {1.0, 0.0}};
+  EXPECT_EQ(file.NameOf(1), "point 1");
+}
+
 TEST(CsvReader, MissingFileAndDirectoryAreRefused) {
   auto refusal = [](std::string const& path) -> std::string {
     try {
