@@ -1,0 +1,171 @@
+"""Fitting: strategies, closing, progress, failures."""
+
+import threading
+import _thread
+
+import numpy as np
+import pytest
+import vorn
+
+
+def test_a_corner_is_two_lines(corner):
+    contour = vorn.fit(corner, tol=0.01)
+    assert [type(piece) for piece in contour] == [vorn.Line, vorn.Line]
+    assert [contour[0].start, contour[0].end, contour[1].end] == [
+        pytest.approx(place, abs=1e-15) for place in [(0, 0), (3, 0), (3, 3)]]
+    assert contour.verdict == "within tolerance"
+    assert contour.max_deviation == pytest.approx(0, abs=1e-12)
+    assert not contour.is_closed
+
+
+def test_a_circle_is_two_half_circles(circle):
+    contour = vorn.fit(circle, tol=0.01)
+    assert contour.is_closed
+    assert [type(piece) for piece in contour] == [vorn.Arc, vorn.Arc]
+    for arc in contour:
+        assert arc.radius == pytest.approx(10, abs=1e-9)
+        assert arc.center == pytest.approx((0, 0), abs=1e-9)
+        assert arc.ccw
+    assert contour.length == pytest.approx(20 * np.pi)
+    assert contour.area == pytest.approx(100 * np.pi)
+
+
+@pytest.mark.parametrize("closed", [False, "no"])
+def test_closed_can_be_denied(circle, closed):
+    assert not vorn.fit(circle, tol=0.01, closed=closed).is_closed
+
+
+@pytest.mark.parametrize("closed", [True, "yes"])
+def test_closed_can_be_demanded(corner, closed):
+    contour = vorn.fit(corner, tol=0.01, closed=closed)
+    assert contour.is_closed
+    assert contour[-1].end == contour[0].start
+    assert abs(contour.area) == pytest.approx(4.5)
+
+
+@pytest.mark.parametrize("strategy", ["mixed", "cells"])
+def test_every_strategy_keeps_the_tolerance(examples, strategy):
+    points = vorn.read_points(examples / "gear_tooth.csv")
+    contour = vorn.fit(points, strategy=strategy)
+    assert contour.strategy == strategy
+    assert contour.verdict == "within tolerance"
+    relative = contour.deviations(points) / points[:, 2]
+    assert relative.max() <= 1 + 1e-6
+    assert relative.max() <= contour.max_deviation <= 1 + 1e-6
+
+
+def test_the_strategy_arc_is_one_arc():
+    angles = np.linspace(0.2, 1.9, 40)
+    points = np.column_stack((5 * np.cos(angles) + 1, 5 * np.sin(angles) - 2))
+    contour = vorn.fit(points, tol=0.01, strategy="arc")
+    assert len(contour) == 1
+    assert contour[0].radius == pytest.approx(5)
+    assert contour[0].center == pytest.approx((1, -2))
+
+
+def test_pieces_tell_the_points_that_they_cover(corner):
+    assert [piece.points for piece in vorn.fit(corner, tol=0.01)] == [(0, 2), (3, 6)]
+
+
+def test_start_is_the_seam_of_a_closed_contour():
+    t = np.arange(40) / 10
+    side = np.column_stack((t, np.zeros_like(t)))
+    turn = np.array([[0, 1], [-1, 0]])
+    points = np.vstack([side, side @ turn + (4, 0), side @ turn @ turn + (4, 4),
+                        side @ turn @ turn @ turn + (0, 4)])
+    contour = vorn.fit(points, tol=0.01, strategy="mixed", start=40)
+    assert contour.start == pytest.approx((4, 0), abs=0.01)
+    assert len(contour) == 4
+
+
+@pytest.mark.parametrize("options, error", [
+    ({"strategy": "best"}, ValueError),
+    ({"closed": "maybe"}, ValueError),
+    ({"start": "here"}, TypeError),
+    ({"start": -1}, TypeError),
+    ({"colour": "red"}, TypeError),
+])
+def test_wrong_options_are_refused(corner, options, error):
+    with pytest.raises(error):
+        vorn.fit(corner, tol=0.01, **options)
+
+
+def test_points_too_close_are_named(corner):
+    corner[4] = (3, 0.02)
+    with pytest.raises(vorn.PointsTooCloseError) as caught:
+        vorn.fit(corner, tol=0.01, strategy="mixed")
+    assert caught.value.indices == (3, 4)
+    assert caught.value.code is vorn.ErrorCode.POINTS_TOO_CLOSE
+
+
+def test_points_without_an_arc_have_no_fit(corner):
+    with pytest.raises(vorn.ContourError) as caught:
+        vorn.fit(corner, tol=0.0001, strategy="arc")
+    assert caught.value.code is not vorn.ErrorCode.OK
+
+
+def test_progress_rises_to_its_end(examples):
+    told = []
+    vorn.fit(vorn.read_points(examples / "gear_tooth.csv"), progress=told.append)
+    assert told == sorted(set(told))
+    assert 1 <= told[0] and told[-1] == 100
+
+
+class Bar:
+    """What of a tqdm bar is used."""
+
+    def __init__(self, total=None):
+        self.n = 0
+        self.total = total
+        self.is_open = True
+        Bar.latest = self
+
+    def update(self, by):
+        assert by > 0
+        self.n += by
+
+    def close(self):
+        self.is_open = False
+
+
+def test_a_bar_is_filled(corner):
+    bar = Bar(100)
+    vorn.fit(corner, tol=0.01, progress=bar)
+    assert bar.n == 100 and bar.is_open
+    vorn.fit(corner, tol=0.01, progress=bar)
+    assert bar.n == 200
+
+
+def test_a_class_of_bars_is_made_and_closed(corner):
+    vorn.fit(corner, tol=0.01, progress=Bar)
+    assert (Bar.latest.total, Bar.latest.n, Bar.latest.is_open) == (100, 100, False)
+
+
+def test_tqdm_works(corner, capsys):
+    tqdm = pytest.importorskip("tqdm")
+    vorn.fit(corner, tol=0.01, progress=tqdm.tqdm)
+    assert "100%" in capsys.readouterr().err
+
+
+@pytest.mark.parametrize("error", [KeyboardInterrupt, ZeroDivisionError, SystemExit])
+def test_what_progress_raises_comes_out(examples, error):
+    points = vorn.read_points(examples / "gear_tooth.csv")
+
+    def stop(percent):
+        if percent >= 30:
+            raise error("enough")
+
+    with pytest.raises(error, match="enough"):
+        vorn.fit(points, progress=stop)
+    assert len(vorn.fit(points)) > 0
+
+
+def test_an_interruption_ends_a_fit(examples):
+    t = np.arange(20000.0)
+    wave = np.column_stack((t, 50 * np.sin(t / 300)))
+    timer = threading.Timer(0.2, _thread.interrupt_main)
+    timer.start()
+    with pytest.raises(KeyboardInterrupt):
+        for _ in range(1000):
+            vorn.fit(wave, tol=0.01, strategy="mixed")
+    timer.join()

@@ -1,0 +1,147 @@
+"""What fit and read_points take as points."""
+
+import collections
+
+import numpy as np
+import pytest
+import vorn
+
+
+def test_a_third_column_holds_the_tolerances(corner):
+    with_tolerances = np.column_stack((corner, np.full(len(corner), 0.01)))
+    assert vorn.fit(with_tolerances) == vorn.fit(corner, tol=0.01)
+
+
+def test_tol_goes_before_the_third_column(corner):
+    with_tolerances = np.column_stack((corner, np.full(len(corner), 100.0)))
+    assert vorn.fit(with_tolerances, tol=0.01) == vorn.fit(corner, tol=0.01)
+
+
+def test_each_point_may_have_its_own_tolerance(corner):
+    wide = np.full(len(corner), 0.01)
+    moved = corner.copy()
+    moved[1, 1] = 0.2
+    wide[1] = 0.25
+    assert vorn.fit(moved, tol=wide).verdict == "within tolerance"
+    assert len(vorn.fit(moved, tol=wide)) < len(vorn.fit(moved, tol=0.01))
+
+
+@pytest.mark.parametrize("dtype", [np.float64, np.float32, np.float16, np.longdouble, np.int32,
+                                   np.uint8, ">f8"])
+def test_every_number_type_gives_the_same(corner, dtype):
+    assert vorn.fit(corner.astype(dtype), tol=0.01) == vorn.fit(corner, tol=0.01)
+
+
+@pytest.mark.parametrize("strided", [
+    lambda p: np.asfortranarray(p),
+    lambda p: np.repeat(p, 2, axis=0)[::2],
+    lambda p: p[::-1].copy()[::-1],
+    lambda p: np.column_stack((p[:, 1], p[:, 0]))[:, ::-1],
+    lambda p: np.broadcast_to(p, (3, *p.shape))[1],
+    lambda p: p.tolist(),
+    lambda p: tuple(map(tuple, p)),
+    lambda p: memoryview(np.ascontiguousarray(p)),
+])
+def test_every_layout_gives_the_same(corner, strided):
+    assert vorn.fit(strided(corner), tol=0.01) == vorn.fit(corner, tol=0.01)
+
+
+def test_points_are_not_changed(corner):
+    before = corner.copy()
+    corner.flags.writeable = False
+    vorn.fit(corner, tol=0.01)
+    assert np.array_equal(before, corner)
+
+
+def test_a_pandas_frame_is_taken_by_its_columns(corner):
+    pandas = pytest.importorskip("pandas")
+    frame = pandas.DataFrame({"w": 0.01, "y": corner[:, 1], "other": "a", "x": corner[:, 0]})
+    assert vorn.fit(frame) == vorn.fit(corner, tol=0.01)
+    assert vorn.fit(frame[["x", "y"]], tol=0.01) == vorn.fit(corner, tol=0.01)
+    with pytest.raises(ValueError, match="no column 'x'"):
+        vorn.fit(frame.rename(columns={"x": "X"}))
+
+
+def test_a_frame_needs_no_pandas(corner):
+    class Frame(dict):
+        @property
+        def columns(self):
+            return list(self)
+
+        def __len__(self):
+            return len(corner)
+
+    frame = Frame(x=corner[:, 0], y=corner[:, 1])
+    assert vorn.fit(frame, tol=0.01) == vorn.fit(corner, tol=0.01)
+
+
+@pytest.mark.parametrize("points, tol, error", [
+    ([], 0.1, ValueError),
+    ([(1, 2)], 0.1, vorn.ContourError),
+    ([(1, 2, 3, 4), (5, 6, 7, 8)], 0.1, ValueError),
+    ([1, 2, 3], 0.1, ValueError),
+    ([("a", "b"), ("c", "d")], 0.1, (TypeError, ValueError)),
+    ([(1j, 0), (1, 0)], 0.1, TypeError),
+    (None, 0.1, ValueError),
+    ([(0, 0), (1, 0)], None, vorn.ContourError),
+    ([(0, 0), (1, 0)], 0, vorn.ContourError),
+    ([(0, 0), (1, 0)], -1, vorn.ContourError),
+    ([(0, 0), (1, 0)], float("nan"), vorn.ContourError),
+    ([(0, 0), (1, 0)], float("inf"), vorn.ContourError),
+    ([(0, 0), (1, 0)], [0.1, 0.1, 0.1], ValueError),
+    ([(0, 0), (1, 0)], "wide", (TypeError, ValueError)),
+])
+def test_what_cannot_be_points_is_refused(points, tol, error):
+    with pytest.raises(error):
+        vorn.fit(points, tol=tol)
+
+
+@pytest.mark.parametrize("value", [float("nan"), float("inf"), float("-inf")])
+@pytest.mark.parametrize("column", [0, 1])
+def test_a_value_that_is_no_place_is_named(corner, value, column):
+    corner[4, column] = value
+    with pytest.raises(vorn.ContourError, match="point 4") as caught:
+        vorn.fit(corner, tol=0.01)
+    assert caught.value.indices == (4,)
+
+
+def test_named_tuples_are_points():
+    point = collections.namedtuple("point", "x y w")
+    contour = vorn.fit([point(0, 0, 0.01), point(1, 0, 0.01), point(2, 0, 0.01)])
+    assert [piece.end for piece in contour] == [pytest.approx((2, 0), abs=1e-15)]
+
+
+def test_read_points_reads_what_the_program_reads(tmp_path):
+    path = tmp_path / "scan.csv"
+    path.write_text("# units mm\nX;Z;w\n0,5;1;0,01\n\n2;3;0,02\n")
+    points = vorn.read_points(path)
+    assert points.tolist() == [[0.5, 1, 0.01], [2, 3, 0.02]]
+    assert vorn.read_points(str(path), columns="Z,X").tolist() == [
+        [1, 0.5, 0.01], [3, 2, 0.02]]
+
+
+def test_read_points_takes_the_tolerance_of_a_comment(tmp_path):
+    path = tmp_path / "scan.csv"
+    path.write_text("# tolerance 0.25\nx,y\n0,1\n2,3\n")
+    assert vorn.read_points(path).tolist() == [[0, 1, 0.25], [2, 3, 0.25]]
+
+
+def test_an_error_in_a_file_names_the_place(tmp_path):
+    path = tmp_path / "scan.csv"
+    path.write_text("x,y\n0,1\n2,abc\n")
+    with pytest.raises(vorn.FileError, match="abc") as caught:
+        vorn.read_points(path)
+    assert (caught.value.path, caught.value.line, caught.value.column) == (str(path), 3, 3)
+
+
+def test_a_missing_file_is_an_os_error(tmp_path):
+    with pytest.raises(OSError, match="no.csv"):
+        vorn.read_points(tmp_path / "no.csv")
+
+
+@pytest.mark.parametrize("columns", ["x", "x,x", "1,2,3,4", ","])
+def test_columns_must_be_two_or_three(tmp_path, columns):
+    path = tmp_path / "scan.csv"
+    path.write_text("x,y\n0,1\n2,3\n")
+    with pytest.raises(ValueError, match="columns"):
+        vorn.read_points(path, columns=columns)

@@ -1,0 +1,112 @@
+"""What the functions of this package raise."""
+
+from __future__ import annotations
+
+import enum
+from typing import Sequence
+
+__all__ = ["ContourError", "ErrorCode", "FileError", "NoFitError", "PointsTooCloseError",
+           "SelfIntersectionError", "error_for"]
+
+
+class ErrorCode(enum.IntEnum):
+    """Why an operation failed; the numbers are those of the library.
+
+    >>> ErrorCode(20).name
+    'POINTS_TOO_CLOSE'
+    """
+
+    OK = 0
+    INVALID_ARC_RADIUS = 1
+    FAILED = 2
+    OUT_OF_MEMORY = 4
+    INTERSECTION_UNDEFINED = 6
+    SELF_INTERSECTION = 19
+    POINTS_TOO_CLOSE = 20
+    ORIENTATION_MISMATCH = 21
+    NO_FIT = 23
+    INVALID_LINE_CELL = 24
+
+
+class ContourError(ValueError):
+    """An operation on points or contours that has no answer.
+
+    Attributes
+    ----------
+    code : ErrorCode
+        Why.
+    indices : tuple of int
+        The points concerned, as positions in the input; empty where it is about no point.
+
+    Errors can be pickled, so they come back whole from other processes.
+
+    >>> import vorn
+    >>> try:
+    ...     vorn.fit([(0, 0), (1, 0), (float("nan"), 0)], tol=0.01)
+    ... except vorn.ContourError as error:
+    ...     print(error, error.code.name, error.indices)
+    point 2: x or y is not finite FAILED (2,)
+    """
+
+    def __init__(self, message: str, code: int = ErrorCode.FAILED,
+                 indices: Sequence[int] = ()) -> None:
+        super().__init__(message)
+        self.code = ErrorCode(code)
+        self.indices = tuple(indices)
+
+    def __reduce__(self) -> tuple[type, tuple[str, int, tuple[int, ...]]]:
+        return type(self), (str(self), int(self.code), self.indices)
+
+
+class PointsTooCloseError(ContourError):
+    """Two neighbouring points are too close for their tolerances; `indices` names the two.
+
+    The strategies "mixed" and "cells" need neighbours more than 1.5 times the sum of their
+    tolerances apart. The strategy "fewest" does not.
+    """
+
+
+class NoFitError(ContourError):
+    """The points have no contour within their tolerances."""
+
+
+class SelfIntersectionError(ContourError):
+    """A contour crosses or touches itself where it must not."""
+
+
+class FileError(ContourError, OSError):
+    """A file cannot be read or written, or holds something else than it should.
+
+    Attributes
+    ----------
+    path : str
+        The file.
+    line, column : int
+        Where, both counted from 1; 0 where it is about no line or no column.
+    """
+
+    def __init__(self, message: str, path: str = "", line: int = 0, column: int = 0) -> None:
+        ContourError.__init__(self, message)
+        self.path = path
+        self.line = line
+        self.column = column
+
+    def __str__(self) -> str:
+        return str(self.args[0])
+
+    def __reduce__(self) -> tuple[type, tuple[str, str, int, int]]:  # type: ignore[override]
+        return type(self), (str(self), self.path, self.line, self.column)
+
+
+_TYPES = {ErrorCode.POINTS_TOO_CLOSE: PointsTooCloseError,
+          ErrorCode.NO_FIT: NoFitError,
+          ErrorCode.SELF_INTERSECTION: SelfIntersectionError}
+
+
+def error_for(message: str, code: int, indices: Sequence[int] = ()) -> ContourError:
+    """The exception that goes with a code.
+
+    >>> error_for("no arc", ErrorCode.NO_FIT)
+    NoFitError('no arc')
+    """
+    return _TYPES.get(ErrorCode(code), ContourError)(message, code, indices)

@@ -1,0 +1,124 @@
+"""From points to contours."""
+
+from __future__ import annotations
+
+import os
+from typing import Any, Callable, Optional, Tuple, Union
+
+import numpy as np
+import numpy.typing as npt
+
+from vorn import _core
+from vorn.contour import Contour, fitted
+
+__all__ = ["fit", "read_points"]
+
+#: Told the percentage that is done; or a tqdm bar, or tqdm itself.
+Progress = Union[Callable[[int], Any], Any]
+
+
+def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str] = None,
+        closed: Union[str, bool] = "auto", progress: Optional[Progress] = None,
+        **options: Any) -> Contour:
+    """A contour of lines and arcs that passes every point within its tolerance.
+
+    Parameters
+    ----------
+    points : array-like
+        In the order of the path: (n, 2) with x and y, (n, 3) with x, y and tolerance, of any number
+        type and strides, or a frame with the columns x, y and perhaps w (the tolerance). They are
+        copied once.
+    tol : float or (n,) array-like, optional
+        How far the contour may pass from the points, in their unit; goes before the tolerances that
+        the points bring.
+    strategy : str, optional
+        "mixed": lines and arcs compared run by run. "cells": lines first, arcs between them.
+        "arc": one arc for all points. If not said, what the program ``contour fit`` uses.
+    closed : "auto", bool, "yes" or "no"
+        Whether the contour runs back to its start; "auto" judges by the ends of the points.
+    progress : callable, optional
+        Called with the percentage that is done, never falling. A tqdm bar does as well, and so
+        does ``tqdm.tqdm`` itself. What it raises comes out of the fit.
+    start : int, optional
+        Where a closed contour is cut open, as a position in the points.
+
+    Returns
+    -------
+    Contour
+        Look at its `verdict` and `max_deviation`.
+
+    Raises
+    ------
+    PointsTooCloseError
+        Two neighbours are too close for their tolerances; for "mixed" and "cells".
+    NoFitError
+        There is no contour within the tolerances.
+    ContourError
+        The points have no tolerances, or a value that is none, or are too few.
+
+    The interpreter lock is released, so fits in several threads run side by side, and an
+    interruption from the keyboard ends a fit.
+
+    >>> import vorn
+    >>> vorn.fit([(0, 0), (1, 0), (2, 0), (2, 1), (2, 2)], tol=0.01)
+    <Contour: 2 pieces (2 lines, 0 arcs), open, length 4>
+    """
+    options.update(strategy=strategy, closed=closed)
+    report, close = _reporter(progress)
+    try:
+        return fitted(*_core.fit(points, tol, options, report))
+    finally:
+        close()
+
+
+def read_points(path: Union[str, "os.PathLike[str]"],
+                columns: str = "") -> npt.NDArray[np.float64]:
+    """Reads points from a file of text, as the program ``contour`` reads them.
+
+    Parameters
+    ----------
+    path : path-like
+        Lines of ``x,y`` or ``x,y,w`` with any usual separator, header and comments.
+    columns : str, optional
+        "x,y" or "x,y,w" as names of the header or numbers counted from 1; found if not said.
+
+    Returns
+    -------
+    (n, 3) array
+        With tolerances, from a column w or a comment ``# tolerance T``; (n, 2) without them.
+
+    Raises
+    ------
+    FileError
+        The file cannot be read, or a line of it is wrong: `line` and `column` tell which.
+
+    >>> import tempfile
+    >>> with tempfile.NamedTemporaryFile("w+", suffix=".csv") as file:
+    ...     print("x;y\\n0,5;1\\n2;3", file=file, flush=True)
+    ...     read_points(file.name)
+    array([[0.5, 1. ],
+           [2. , 3. ]])
+    """
+    return _core.read_points(os.fspath(path), columns)[0]
+
+
+def _nothing() -> None:
+    pass
+
+
+def _reporter(
+        progress: Optional[Progress]
+) -> Tuple[Optional[Callable[[int], Any]], Callable[[], Any]]:
+    """What is called with percentages, and what is called at the end."""
+    if isinstance(progress, type) and hasattr(progress, "update"):
+        bar = progress(total=100)
+        return _filling(bar), bar.close
+    if hasattr(progress, "update") and hasattr(progress, "n"):
+        return _filling(progress), _nothing
+    return progress, _nothing
+
+
+def _filling(bar: Any) -> Callable[[int], Any]:
+    """Moves a bar on from where this fit found it."""
+    begin = bar.n
+    return lambda percent: bar.update(begin + percent - bar.n)

@@ -1,0 +1,91 @@
+"""The pieces of a contour."""
+
+from __future__ import annotations
+
+import dataclasses
+from typing import Optional, Tuple, Union
+
+import numpy as np
+
+__all__ = ["Arc", "Line", "Piece", "Place"]
+
+#: A place in the plane: x and y, in the unit of the points.
+Place = Tuple[float, float]
+
+
+@dataclasses.dataclass(frozen=True)
+class Line:
+    """A straight piece of a contour.
+
+    Attributes
+    ----------
+    start, end : (float, float)
+        Where it begins and ends.
+    points : (int, int) or None
+        Positions of the first and the last point that it covers; None when that is not known. In
+        a closed contour first > last means from first to the end of the input and on from its
+        beginning to last. Neighbouring pieces may share a point.
+
+    >>> Line((0, 0), (3, 4)).length
+    5.0
+    """
+
+    start: Place
+    end: Place
+    points: Optional[Tuple[int, int]] = None
+
+    @property
+    def length(self) -> float:
+        """From start to end."""
+        # As the library rounds it; math.hypot may differ in the last bit.
+        return float(np.hypot(self.end[0] - self.start[0], self.end[1] - self.start[1]))
+
+
+@dataclasses.dataclass(frozen=True)
+class Arc:
+    """A piece of a contour along a circle, always less than a full turn.
+
+    Attributes
+    ----------
+    start, end : (float, float)
+        Where it begins and ends.
+    center : (float, float)
+        Of the circle.
+    radius : float
+        Of the circle, above 0.
+    ccw : bool
+        Whether it runs counter-clockwise, the y axis pointing up.
+    sweep : float
+        Radians turned from start to end, never negative.
+    points : (int, int) or None
+        As for Line.
+
+    >>> Arc((1, 0), (0, 1), (0, 0), 1.0, True, 1.5).length
+    1.5
+    """
+
+    start: Place
+    end: Place
+    center: Place
+    radius: float
+    ccw: bool
+    sweep: float
+    points: Optional[Tuple[int, int]] = None
+
+    @property
+    def length(self) -> float:
+        """Along the arc."""
+        return self.radius * self.sweep
+
+
+#: What a contour is made of.
+Piece = Union[Line, Arc]
+
+
+def piece_of(row: np.void) -> Piece:
+    """The piece that a row of ``Contour.as_arrays`` describes."""
+    r = row.item()
+    points = None if r[11] < 0 else (r[11], r[12])
+    if not r[13]:
+        return Line((r[0], r[1]), (r[2], r[3]), points)
+    return Arc((r[0], r[1]), (r[2], r[3]), (r[4], r[5]), r[6], r[14], r[9], points)
