@@ -304,8 +304,10 @@ class VORN_EXPORT GeometryUtils {
   /// @note Deliberate: parallel segments are told apart by their raw line constants
   ///       c = x1*y2 - y1*x2, without normalising. Segments on one line that is not through the
   ///       origin are reported Parallel unless their constants agree exactly: (0,1)-(1,2) and
-  ///       (1,2)-(3,4) are Parallel though they touch. Segments whose bounding boxes do not meet
-  ///       are Disjoint, parallel or not. Absolute thresholds; O(1).
+  ///       (1,2)-(3,4) are Parallel though they touch, and parallel ones of different lengths whose
+  ///       constants happen to agree are Collinear though they lie apart: (7,-16)-(-16,7) and
+  ///       (-7,-16)-(-16,-7). Segments whose bounding boxes do not meet are Disjoint, parallel or
+  ///       not. Absolute thresholds; O(1).
   static SegmentsRelPosition GetLineSegmentsIntersection(double x1, double y1, double x2, double y2,
                                                          double x3, double y3, double x4, double y4,
                                                          double* x, double* y);
