@@ -88,6 +88,8 @@ extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size
   Vorn::WPoint const triple[3] = {Fuzz::MeasuredPoint(&input), Fuzz::MeasuredPoint(&input),
                                   Fuzz::MeasuredPoint(&input)};
   Fuzz::CompareLineCell(triple[0], triple[1]);
-  Fuzz::CompareCirclePolygon(triple, input.Flip(), input.Flip(), input.Integer(-1, 1));
+  bool const isFirstFixed = input.Flip();
+  bool const isLastFixed = input.Flip();
+  Fuzz::CompareCirclePolygon(triple, isFirstFixed, isLastFixed, input.Integer(-1, 1));
   return 0;
 }
