@@ -22,6 +22,11 @@ inline double Apply(Row const& r, Circle const& c) {
   return r.a * c.a + r.bx * c.bx + r.by * c.by + r.d * c.d;
 }
 
+/// The row times a factor.
+inline Row Scaled(Row const& r, double factor) {
+  return {r.a * factor, r.bx * factor, r.by * factor, r.d * factor};
+}
+
 /// The row of f at a place.
 inline Row ValueRow(Place const& p) { return {p.x * p.x + p.y * p.y, p.x, p.y, 1.0}; }
 

@@ -53,16 +53,18 @@ void FreeRun::Extend(std::int32_t end) {
   programme_.last = end - start_;
 }
 
-RunFit FreeRun::Try(std::int32_t end) {
+bool FreeRun::Try(std::int32_t end) {
   Extend(end);
   Simplex simplex(slack_);
   Basis basis = basis_;
   RunFit const fit = FitRun(programme_, {circle_, 0.0, false}, true, &simplex, &basis);
-  if (fit.isFound && fit.ratio <= 1.0 + simplex.Slack()) {
-    basis_ = basis;
-    circle_ = fit.circle;
-  }
-  return fit;
+  if (!fit.isFound || fit.ratio > 1.0 + slack_) return false;
+  // The slack of a programme grows with its objective, which may exceed the size of the circle.
+  Columns::Worst const worst = columns_.FindWorst(programme_.first, programme_.last, fit.circle);
+  if (worst.value > 1.0 + 2.0 * slack_) return false;
+  basis_ = basis;
+  circle_ = fit.circle;
+  return true;
 }
 
 /// The circle may hold for more points than it was asked for: the end of those below `bad`.
@@ -89,15 +91,14 @@ std::int32_t FreeRun::FindEnd(std::int32_t start, std::int32_t expected) {
   std::int32_t target = std::min(count, std::max(good + 2, start + expected));
   Simplex simplex(slack_);
   while (good < count) {
-    RunFit const fit = Try(target);
-    if (fit.isFound && fit.ratio <= 1.0 + simplex.Slack()) {
+    if (Try(target)) {
       good = ExtendCovered(target, bad);
     } else {
       bad = target;
     }
     if (bad == good + 1 && bad <= count) {
       Extend(bad);
-      RunFit const proof = ProveRun(programme_, basis_, &simplex);
+      RunFit const proof = ProveRun(programme_, basis_, &simplex, &polytope_);
       if (!proof.isFound) return good;
       good = bad;
       bad = count + 1;

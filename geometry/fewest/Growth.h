@@ -6,6 +6,7 @@
 #include "geometry/fewest/Columns.h"
 #include "geometry/fewest/Limits.h"
 #include "geometry/fewest/LocalFrame.h"
+#include "geometry/fewest/Polytope.h"
 #include "geometry/fewest/RunTest.h"
 #include "geometry/fewest/Simplex.h"
 #include "vorn/Types.h"
@@ -30,7 +31,7 @@ class FreeRun {
  private:
   void Begin(std::int32_t start, std::int32_t expected);
   void Extend(std::int32_t end);
-  RunFit Try(std::int32_t end);
+  bool Try(std::int32_t end);
   std::int32_t ExtendCovered(std::int32_t good, std::int32_t bad);
 
   std::span<WPoint const> points_;
@@ -39,6 +40,7 @@ class FreeRun {
   Columns columns_;
   Programme programme_;
   Basis basis_;
+  Polytope polytope_;
   Circle circle_;
   std::int32_t start_ = 0;
   double slack_ = 0.0;

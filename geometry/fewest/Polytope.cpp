@@ -16,21 +16,42 @@ Circle Difference(Circle const& c, Circle const& o) {
 
 }  // namespace
 
-Polytope::Polytope(std::array<Circle, 4> const& inverse, std::array<double, 4> const& limits) {
+void Polytope::Begin(InvertedRows const& inverted, std::array<double, 4> const& limits) {
+  planeCount_ = 0;
+  for (std::size_t j = 0; j < 4; ++j) {
+    AddPlane(Scaled(inverted.rows[j], -1.0), limits[j]);
+    AddPlane(inverted.rows[j], limits[j]);
+  }
   for (int mask = 0; mask < 16; ++mask) {
     Corner& corner = corners_[At(mask)];
-    corner.at = {};
+    std::array<double, 4> values;
     for (int j = 0; j < 4; ++j) {
       bool const isPlus = (mask >> j & 1) != 0;
-      Circle const& column = inverse[At(j)];
-      double const factor = isPlus ? limits[At(j)] : -limits[At(j)];
-      corner.at = {corner.at.a + factor * column.a, corner.at.bx + factor * column.bx,
-                   corner.at.by + factor * column.by, corner.at.d + factor * column.d};
+      values[At(j)] = isPlus ? limits[At(j)] : -limits[At(j)];
       corner.planes[At(j)] = static_cast<std::int16_t>(2 * j + (isPlus ? 1 : 0));
       corner.neighbours[At(j)] = static_cast<std::int16_t>(mask ^ (1 << j));
     }
+    corner.at = Solve(inverted, values);
   }
   count_ = 16;
+}
+
+void Polytope::AddPlane(Row const& row, double limit) { planes_[At(planeCount_++)] = {row, limit}; }
+
+/// Places a corner where its four planes meet. Between its neighbours it is known only to the
+/// rounding of the larger of them, which is a million units where the box bounds the polytope: rows
+/// of 1 / w would then be missed by 1e6 / w units in the last place, far more than the slack of a
+/// proof. On its own planes it misses each row by a few units in the last place of the row's terms
+/// at the corner, which is what the slack of the programmes allows for.
+void Polytope::Sharpen(Corner* corner) const {
+  InvertedRows inverted;
+  std::array<double, 4> limits;
+  for (std::size_t k = 0; k < 4; ++k) {
+    Plane const& plane = planes_[At(corner->planes[k])];
+    inverted.rows[k] = plane.row;
+    limits[k] = plane.limit;
+  }
+  if (InvertRows(inverted.rows, &inverted.inverse)) corner->at = Solve(inverted, limits);
 }
 
 Polytope::Peak Polytope::FindPeak() const {
@@ -61,11 +82,15 @@ bool Polytope::Cut(Row const& row, double limit) {
     isCut = isCut || excess[At(i)] > 0.0;
   }
   if (!isCut) return true;
+  if (planeCount_ == kMostPlanes) return false;
+  AddPlane(row, limit);
   int const oldCount = count_;
   int added = 0;
   AddCornersOnEdges(excess, &added);
-  if (added < 0) return false;
-  ++planeCount_;
+  if (added < 0) {
+    --planeCount_;
+    return false;
+  }
   LinkNewCorners(oldCount);
   RemoveCut(excess, oldCount);
   return true;
@@ -99,7 +124,8 @@ void Polytope::AddCorner(int from, int plane, double share) {
   for (int k = 0; k < 4; ++k) {
     if (k != plane) fresh.planes[At(kept++)] = old.planes[At(k)];
   }
-  fresh.planes[3] = planeCount_;
+  fresh.planes[3] = static_cast<std::int16_t>(planeCount_ - 1);
+  Sharpen(&fresh);
   // Leaving the new plane leads back to the kept corner; the others are linked later. Until then
   // two of them remember the edge for RemoveAdded().
   fresh.neighbours = {static_cast<std::int16_t>(plane), n, kNone, static_cast<std::int16_t>(from)};

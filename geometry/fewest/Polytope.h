@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "geometry/fewest/Columns.h"
+#include "geometry/fewest/Inverse.h"
 
 /// Polytopes in the space of the four coefficients, kept as a list of corners with their neighbours
 /// and cut by one half space after another (the double description of Motzkin and others 1953, for
@@ -13,9 +14,10 @@ namespace Vorn::Fewest {
 class Polytope {
  public:
   static constexpr int kMostCorners = 400;
+  static constexpr int kMostPlanes = 512;
 
-  /// The parallelepiped |row_j| <= limit_j, given the columns of the inverse of its rows.
-  Polytope(std::array<Circle, 4> const& inverse, std::array<double, 4> const& limits);
+  /// Begins with the parallelepiped |row_j| <= limit_j. What was there before is forgotten.
+  void Begin(InvertedRows const& inverted, std::array<double, 4> const& limits);
 
   /// Where Form(c, c) is largest: at a corner or inside an edge, since the form has one negative
   /// direction only and so no largest value inside a face of two dimensions.
@@ -25,8 +27,8 @@ class Polytope {
   };
   Peak FindPeak() const;
 
-  /// Cuts off row > limit. Answers false when there is no room for the new corners; the polytope is
-  /// then as before.
+  /// Cuts off row > limit. Answers false when there is no room for the new corners or the new
+  /// plane; the polytope is then as before.
   bool Cut(Row const& row, double limit);
 
   /// Whether nothing is left.
@@ -42,6 +44,14 @@ class Polytope {
     std::array<std::int16_t, 4> neighbours;
   };
 
+  /// The boundary of a half space: row = limit.
+  struct Plane {
+    Row row;
+    double limit = 0.0;
+  };
+
+  void AddPlane(Row const& row, double limit);
+  void Sharpen(Corner* corner) const;
   void AddCornersOnEdges(std::array<double, kMostCorners> const& excess, int* added);
   void AddCorner(int from, int plane, double share);
   void RemoveAdded(int firstNew);
@@ -50,8 +60,9 @@ class Polytope {
   void RemoveCut(std::array<double, kMostCorners> const& excess, int oldCount);
 
   std::array<Corner, kMostCorners> corners_;
+  std::array<Plane, kMostPlanes> planes_;
   int count_ = 0;
-  std::int16_t planeCount_ = 8;
+  int planeCount_ = 0;
 };
 
 }  // namespace Vorn::Fewest

@@ -2,8 +2,6 @@
 
 #include <cmath>
 
-#include "geometry/fewest/Polytope.h"
-
 namespace Vorn::Fewest {
 
 namespace {
@@ -54,11 +52,13 @@ RunFit FitRun(Programme const& programme, RunFit const& start, bool isTest, Simp
   return best;
 }
 
-RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex) {
-  std::array<Circle, 4> inverse;
+RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex,
+                Polytope* workspace) {
+  InvertedRows inverted;
   std::array<double, 4> limits;
-  if (!simplex->InvertBasis(programme, basis, &inverse, &limits)) return {{}, 2.0, true};
-  Polytope polytope(inverse, limits);
+  if (!simplex->InvertBasis(programme, basis, &inverted, &limits)) return {{}, 2.0, true};
+  Polytope& polytope = *workspace;
+  polytope.Begin(inverted, limits);
   for (int cut = 0; cut < kMostCuts; ++cut) {
     if (polytope.IsEmpty()) return {};
     Polytope::Peak const peak = polytope.FindPeak();

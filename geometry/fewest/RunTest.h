@@ -1,6 +1,7 @@
 #pragma once
 
 #include "geometry/fewest/Columns.h"
+#include "geometry/fewest/Polytope.h"
 #include "geometry/fewest/Simplex.h"
 
 /// Whether one circle or line passes within tolerance of a run of points: a search that finds one
@@ -37,8 +38,10 @@ RunFit FitRun(Programme const& programme, RunFit const& start, bool isTest, Simp
 /// @param[in] programme the rows; slabs only
 /// @param[in] basis     the rows to begin with
 /// @param[in] simplex   inverts them
+/// @param[in] workspace room for the polytope, which takes long to create
 /// @return a fit that isFound unless there is none. When the polytope grows beyond its room, which
 ///         no input is known to do, the run counts as covered: isFound with a ratio above 1.
-RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex);
+RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex,
+                Polytope* workspace);
 
 }  // namespace Vorn::Fewest

@@ -17,9 +17,6 @@ constexpr int kMostPivots = 80;
 /// After so many exchanges the inverse is computed anew.
 constexpr int kExchangesBeforeInversion = 12;
 
-/// A determinant below this share of its terms is rounding.
-constexpr double kLeastDeterminant = 1e-14;
-
 /// A pivot smaller than this share of the largest would spoil the inverse.
 constexpr double kLeastPivotShare = 1e-11;
 
@@ -57,10 +54,6 @@ int LargestComponent(Circle const& c) {
     if (std::fabs(Component(c, k)) > std::fabs(Component(c, best))) best = k;
   }
   return best;
-}
-
-Circle Sum(Circle const& c, double factor, Circle const& o) {
-  return {c.a + factor * o.a, c.bx + factor * o.bx, c.by + factor * o.by, c.d + factor * o.d};
 }
 
 Row UnitRow(int k) {
@@ -106,44 +99,6 @@ double Simplex::LimitOf(Programme const& programme, std::int32_t id) const {
   return programme.conditions[static_cast<std::size_t>(-1 - id)].limit;
 }
 
-bool Simplex::Invert() {
-  // Cofactors from the minors of the upper and the lower two rows.
-  Row const& p = rows_[0];
-  Row const& q = rows_[1];
-  Row const& r = rows_[2];
-  Row const& s = rows_[3];
-  double const u0 = p.a * q.bx - q.a * p.bx;
-  double const u1 = p.a * q.by - q.a * p.by;
-  double const u2 = p.a * q.d - q.a * p.d;
-  double const u3 = p.bx * q.by - q.bx * p.by;
-  double const u4 = p.bx * q.d - q.bx * p.d;
-  double const u5 = p.by * q.d - q.by * p.d;
-  double const l0 = r.a * s.bx - s.a * r.bx;
-  double const l1 = r.a * s.by - s.a * r.by;
-  double const l2 = r.a * s.d - s.a * r.d;
-  double const l3 = r.bx * s.by - s.bx * r.by;
-  double const l4 = r.bx * s.d - s.bx * r.d;
-  double const l5 = r.by * s.d - s.by * r.d;
-  double const terms[6] = {u0 * l5, -u1 * l4, u2 * l3, u3 * l2, -u4 * l1, u5 * l0};
-  double determinant = 0.0;
-  double size = 0.0;
-  for (double term : terms) {
-    determinant += term;
-    size += std::fabs(term);
-  }
-  if (!(std::fabs(determinant) > kLeastDeterminant * size)) return false;
-  double const f = 1.0 / determinant;
-  inverse_[0] = {(q.bx * l5 - q.by * l4 + q.d * l3) * f, (-q.a * l5 + q.by * l2 - q.d * l1) * f,
-                 (q.a * l4 - q.bx * l2 + q.d * l0) * f, (-q.a * l3 + q.bx * l1 - q.by * l0) * f};
-  inverse_[1] = {(-p.bx * l5 + p.by * l4 - p.d * l3) * f, (p.a * l5 - p.by * l2 + p.d * l1) * f,
-                 (-p.a * l4 + p.bx * l2 - p.d * l0) * f, (p.a * l3 - p.bx * l1 + p.by * l0) * f};
-  inverse_[2] = {(s.bx * u5 - s.by * u4 + s.d * u3) * f, (-s.a * u5 + s.by * u2 - s.d * u1) * f,
-                 (s.a * u4 - s.bx * u2 + s.d * u0) * f, (-s.a * u3 + s.bx * u1 - s.by * u0) * f};
-  inverse_[3] = {(-r.bx * u5 + r.by * u4 - r.d * u3) * f, (r.a * u5 - r.by * u2 + r.d * u1) * f,
-                 (-r.a * u4 + r.bx * u2 - r.d * u0) * f, (r.a * u3 - r.bx * u1 + r.by * u0) * f};
-  return true;
-}
-
 bool Simplex::IsAccurate(double slack) const {
   for (std::size_t j = 0; j < 4; ++j) {
     double const residual = std::fabs(Apply(rows_[j], solution_) - limits_[j]);
@@ -161,7 +116,7 @@ bool Simplex::Load(Programme const& programme, Basis* basis) {
     rows_[static_cast<std::size_t>(j)] = RowOf(programme, id);
     limits_[static_cast<std::size_t>(j)] = LimitOf(programme, id);
   }
-  return Invert() && TakeEqualities(programme, basis);
+  return InvertRows(rows_, &inverse_) && TakeEqualities(programme, basis);
 }
 
 bool Simplex::TakeEqualities(Programme const& programme, Basis* basis) {
@@ -183,7 +138,7 @@ bool Simplex::TakeEqualities(Programme const& programme, Basis* basis) {
     basis->ids[l] = -1 - k;
     rows_[l] = condition.row;
     limits_[l] = condition.limit;
-    if (!Invert()) return false;
+    if (!InvertRows(rows_, &inverse_)) return false;
   }
   return true;
 }
@@ -210,7 +165,7 @@ bool Simplex::MakeDualFeasible(Programme const& programme, Row const& objective,
       break;
     }
     if (!isChanged) return true;
-    if (!Invert()) return false;
+    if (!InvertRows(rows_, &inverse_)) return false;
   }
   return false;
 }
@@ -288,11 +243,11 @@ void Simplex::Exchange(int leaving, Entry const& entry, std::array<double, 4> co
   limits_[l] = entry.limit;
 }
 
-bool Simplex::InvertBasis(Programme const& programme, Basis const& basis,
-                          std::array<Circle, 4>* inverse, std::array<double, 4>* limits) {
+bool Simplex::InvertBasis(Programme const& programme, Basis const& basis, InvertedRows* inverted,
+                          std::array<double, 4>* limits) {
   Basis held = basis;
   if (!Load(programme, &held)) return false;
-  *inverse = inverse_;
+  *inverted = {rows_, inverse_};
   *limits = limits_;
   return true;
 }
@@ -334,7 +289,7 @@ Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objecti
     Entry const entry = Price(programme, slack);
     if (!entry.isFound) {
       if (exchanges == 0 || IsAccurate(slack)) return Status::Optimal;
-      if (!Invert()) return Status::Stalled;
+      if (!InvertRows(rows_, &inverse_)) return Status::Stalled;
       if (!MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
       Solve();
       exchanges = 0;
@@ -349,7 +304,8 @@ Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objecti
     basis->ids[static_cast<std::size_t>(leaving)] = entry.id;
     Exchange(leaving, entry, step);
     if (++exchanges >= kExchangesBeforeInversion) {
-      if (!Invert() || !MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
+      if (!InvertRows(rows_, &inverse_) || !MakeDualFeasible(programme, objective, basis))
+        return Status::Stalled;
       exchanges = 0;
     }
     Solve();

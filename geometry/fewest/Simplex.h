@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "geometry/fewest/Columns.h"
+#include "geometry/fewest/Inverse.h"
 
 /// Linear programmes in the four coefficients of a circle, solved by the dual simplex method with
 /// an explicit inverse of the basis (Dantzig 1963; pricing by the largest violation).
@@ -66,9 +67,9 @@ class Simplex {
   /// Largest relative violation of a row that counts as none.
   double Slack() const { return slack_; }
 
-  /// The columns of the inverse of the rows of a basis, and the limits of the rows; false when the
-  /// rows depend on each other.
-  bool InvertBasis(Programme const& programme, Basis const& basis, std::array<Circle, 4>* inverse,
+  /// The rows of a basis with their inverse, and the limits of the rows; false when the rows depend
+  /// on each other.
+  bool InvertBasis(Programme const& programme, Basis const& basis, InvertedRows* inverted,
                    std::array<double, 4>* limits);
   /// The slab or point row that a circle breaks most, in units of its limit.
   Condition FindBrokenSlab(Programme const& programme, Circle const& circle) const;
@@ -87,7 +88,6 @@ class Simplex {
   Row RowOf(Programme const& programme, std::int32_t id) const;
   Condition::Kind KindOf(Programme const& programme, std::int32_t id) const;
   double LimitOf(Programme const& programme, std::int32_t id) const;
-  bool Invert();
   bool IsAccurate(double slack) const;
   bool MakeDualFeasible(Programme const& programme, Row const& objective, Basis* basis);
   void Solve();

@@ -100,9 +100,10 @@ class VORN_EXPORT FewestPieces {
     std::int32_t largestDeviationIndex = -1;
     /// No chain of segments and arcs that passes within the tolerances has fewer pieces than this,
     /// wherever its joints are and in whatever order it meets the points. Proven, not estimated,
-    /// but for rounding: a run that would need its tolerances to be wider by less than a
-    /// ten-millionth may count either way. Arcs of a radius below the tolerance of a point that
-    /// they cover are left out of account.
+    /// and never too high: what one piece covers in exact numbers counts as covered. So does, where
+    /// rounding decides, a run that would need tolerances wider by less than 1e-8 of them and 2e-14
+    /// of its extent. Arcs of a radius below the tolerance of a point that they cover are left out
+    /// of account.
     std::int32_t fewestPossible = 0;
     /// Whether the contour has exactly that many pieces.
     bool isFewest = false;

@@ -33,15 +33,17 @@ TEST(ProveRun, ASquareWithItsMiddleNeedsTheGoldenRatioLessOne) {
   // farthest at the root of 5, and half of the difference is what the tolerance has to be.
   double const least = 0.5 * (std::sqrt(5.0) - 1.0);
   Simplex simplex(1e-10);
+  Polytope polytope;
   Columns const narrow = SquareWithMiddle(least - 1e-6);
   Columns const wide = SquareWithMiddle(least + 1e-6);
-  EXPECT_FALSE(ProveRun(ProgrammeOf(narrow), Basis(), &simplex).isFound);
-  EXPECT_TRUE(ProveRun(ProgrammeOf(wide), Basis(), &simplex).isFound);
+  EXPECT_FALSE(ProveRun(ProgrammeOf(narrow), Basis(), &simplex, &polytope).isFound);
+  EXPECT_TRUE(ProveRun(ProgrammeOf(wide), Basis(), &simplex, &polytope).isFound);
 }
 
 TEST(ProveRun, FindsTheCircleThatWasDisturbedByLessThanTheTolerance) {
   RandomGeometry random(11);
   Simplex simplex(1e-10);
+  Polytope polytope;
   for (int trial = 0; trial < 300; ++trial) {
     Columns columns;
     double const radius = random.Uniform(0.5, 20.0);
@@ -53,7 +55,7 @@ TEST(ProveRun, FindsTheCircleThatWasDisturbedByLessThanTheTolerance) {
       double const r = radius + 0.01 * random.Uniform(-0.99, 0.99);
       columns.Append({r * std::cos(angle), r * std::sin(angle), 0.01});
     }
-    RunFit const fit = ProveRun(ProgrammeOf(columns), Basis(), &simplex);
+    RunFit const fit = ProveRun(ProgrammeOf(columns), Basis(), &simplex, &polytope);
     ASSERT_TRUE(fit.isFound) << "trial " << trial;
     ASSERT_LE(fit.ratio, 1.0 + 1e-9) << "trial " << trial;
   }
@@ -62,6 +64,7 @@ TEST(ProveRun, FindsTheCircleThatWasDisturbedByLessThanTheTolerance) {
 TEST(ProveRun, AgreesWithTheSearchWhereTheSearchFinds) {
   RandomGeometry random(12);
   Simplex simplex(1e-10);
+  Polytope polytope;
   int found = 0;
   int refused = 0;
   for (int trial = 0; trial < 2000; ++trial) {
@@ -74,7 +77,7 @@ TEST(ProveRun, AgreesWithTheSearchWhereTheSearchFinds) {
     Basis basis;
     RunFit const search =
         FitRun(ProgrammeOf(columns), {{0.0, 0.0, 1.0, 0.0}, 0.0, false}, false, &simplex, &basis);
-    RunFit const proof = ProveRun(ProgrammeOf(columns), basis, &simplex);
+    RunFit const proof = ProveRun(ProgrammeOf(columns), basis, &simplex, &polytope);
     if (search.isFound && search.ratio <= 1.0) {
       ++found;
       ASSERT_TRUE(proof.isFound) << "trial " << trial;
