@@ -3,6 +3,25 @@
 #include "Bindings.h"
 #include "Errors.h"
 #include "PieceRow.h"
+#include "geometry/Values.h"
+
+namespace {
+
+void BindGeometry(pybind11::module_ module) {
+  using namespace Vorn::Python;
+  module.doc() = "The operations of the core, one by one.";
+  BindElements(module);
+  BindElementary(module);
+  BindChains(module);
+  BindPolylines(module);
+  BindCells(module);
+  BindCurves(module);
+  BindNumeric(module);
+  BindMatrix(module);
+  BindBatches(module);
+}
+
+}  // namespace
 
 PYBIND11_MODULE(_core, module) {
   using namespace Vorn::Python;
@@ -14,4 +33,5 @@ PYBIND11_MODULE(_core, module) {
   BindContours(module);
   BindFormats(module);
   BindDrawings(module);
+  BindGeometry(module.def_submodule("geometry"));
 }

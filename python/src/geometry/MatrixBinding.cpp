@@ -1,0 +1,132 @@
+#include <pybind11/numpy.h>
+#include <pybind11/operators.h>
+
+#include <algorithm>
+#include <cstring>
+
+#include "../Errors.h"
+#include "Values.h"
+#include "vorn/Matrix.h"
+
+namespace py = pybind11;
+
+namespace Vorn::Python {
+
+namespace {
+
+using Numbers = py::array_t<double, py::array::c_style | py::array::forcecast>;
+
+constexpr py::ssize_t kOrder = 3;
+constexpr py::ssize_t kElements = 9;
+
+Matrix FromArray(Numbers const& elements) {
+  if (elements.size() != kElements) throw py::value_error("a matrix has nine elements");
+  Mtrx values = {};
+  std::copy_n(elements.data(), kElements, values.m);
+  return Matrix(values);
+}
+
+/// A matrix is its nine doubles, which no member gives out.
+Numbers ToArray(Matrix const& matrix) {
+  static_assert(sizeof(Matrix) == kElements * sizeof(double));
+  Numbers array({kOrder, kOrder});
+  std::memcpy(array.mutable_data(), static_cast<void const*>(&matrix), sizeof matrix);
+  return array;
+}
+
+SpatVector VectorOf(Numbers const& numbers) {
+  SpatVector vector;
+  if (numbers.size() != kOrder && numbers.size() != vector.QuantityOfDataElements()) {
+    throw py::value_error("a vector has three numbers, or five");
+  }
+  std::copy_n(numbers.data(), numbers.size(), vector.v);
+  return vector;
+}
+
+/// As many numbers as came in.
+Numbers Result(SpatVector const& vector, Numbers const& like) {
+  Numbers array(like.size());
+  std::copy_n(vector.v, like.size(), array.mutable_data());
+  return array;
+}
+
+Numbers TimesColumn(Matrix& matrix, Numbers const& numbers) {
+  SpatVector vector = VectorOf(numbers);
+  return Result(matrix.MxV(vector), numbers);
+}
+
+Numbers TimesRow(Matrix& matrix, Numbers const& numbers) {
+  SpatVector vector = VectorOf(numbers);
+  return Result(matrix.VxM(vector), numbers);
+}
+
+Triple AnglesMxMyMz(Matrix& matrix) {
+  Triple angles = {};
+  matrix.GetAnglesFromMxMyMz(&angles[0], &angles[1], &angles[2]);
+  return angles;
+}
+
+Triple AnglesMzMyMx(Matrix& matrix) {
+  Triple angles = {};
+  matrix.GetAnglesFromMzMyMx(&angles[0], &angles[1], &angles[2]);
+  return angles;
+}
+
+/// A failure answers no array.
+Numbers Reorth(int dimension, Numbers const& elements, int terms) {
+  if (elements.size() != kElements) throw py::value_error("a matrix has nine elements");
+  Numbers result({kOrder, kOrder});
+  std::copy_n(elements.data(), kElements, result.mutable_data());
+  RequireSuccess(Matrix::Reorth(dimension, result.mutable_data(), terms), "reorth_elements");
+  return result;
+}
+
+}  // namespace
+
+void BindMatrix(py::module_& module) {
+  py::class_<Matrix>(module, "Matrix", R"(
+A 3x3 rotation matrix; angles are radians, and the elementary rotations turn the frame, not the
+point.
+
+>>> import math
+>>> turn = Matrix()
+>>> turn.init_mx_my_mz(0.0, 0.0, math.pi / 2)
+>>> [round(float(v), 12) for v in turn.mxv([1, 0, 0])]
+[0.0, -1.0, 0.0]
+)")
+      .def(py::init<>(), "The identity.")
+      .def(py::init(&FromArray), py::arg("elements"), "Takes nine elements, row by row.")
+      .def("det", &Matrix::Det, "The determinant.")
+      .def("init_i", &Matrix::InitI, "Makes it the identity.")
+      .def("init_mx_my_mz", &Matrix::InitMxMyMz, py::arg("ax"), py::arg("ay"), py::arg("az"),
+           "Makes it the product of the rotations about x, y and z.")
+      .def("init_mz_my_mx", &Matrix::InitMzMyMx, py::arg("ax"), py::arg("ay"), py::arg("az"),
+           "Makes it the product of the rotations about z, y and x.")
+      .def("get_angles_from_mx_my_mz", &AnglesMxMyMz, "The angles [ax, ay, az] of init_mx_my_mz.")
+      .def("get_angles_from_mz_my_mx", &AnglesMzMyMx, "The angles [ax, ay, az] of init_mz_my_mx.")
+      .def("mxv", &TimesColumn, py::arg("vector"),
+           "The matrix times a column of three numbers; a fourth and fifth ride along.")
+      .def("vxm", &TimesRow, py::arg("vector"), "A row of numbers times the matrix.")
+      .def("quantity_of_data_elements", &Matrix::QuantityOfDataElements, "9.")
+      .def("reorth", py::overload_cast<int>(&Matrix::Reorth), py::arg("terms"),
+           "Pulls it back to a rotation by so many terms of a series.")
+      .def("transpose", &Matrix::Transpose, "Exchanges rows and columns.")
+      .def("to_array", &ToArray, "The elements as an array (3, 3).")
+      .def(
+          "__mul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
+          "The product of two matrices.")
+      .def(
+          "__matmul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
+          "The product of two matrices.")
+      .def(py::pickle(&ToArray, &FromArray));
+  module.def("reorth_elements", &Reorth, py::arg("dimension"), py::arg("elements"),
+             py::arg("terms"), R"(
+The nine elements of a matrix pulled back to a rotation, as an array (3, 3). Raises ContourError for
+another dimension than 3.
+
+>>> reorth_elements(3, [[1, 0, 0], [0, 1, 0], [0, 0, 1]], 4)[0]
+array([1., 0., 0.])
+)");
+}
+
+}  // namespace Vorn::Python
