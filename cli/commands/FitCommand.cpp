@@ -55,14 +55,18 @@ void WriteResults(FitOptions const& options, FitReport const& report,
 FitReport FitWithProgress(FitOptions const& options, Console const& console) {
   PointFile file = ReadPointsInput(options.points, console);
   ProgressBar progress(stderr, file.points.size(), options.isQuiet);
-  return FitContour(std::move(file), options.Choice(), &progress);
+  FitReport report = FitContour(std::move(file), options.Choice(), &progress);
+  report.head = options.head;
+  return report;
 }
 
 /// Reads from the file alone: a standard input is not among many.
 FitReport FitOneOfMany(FitOptions const& options, std::string const& path, Console const& console) {
   PointsInput input = options.points;
   input.path = path;
-  return FitContour(ReadPointsInput(input, console), options.Choice(), nullptr);
+  FitReport report = FitContour(ReadPointsInput(input, console), options.Choice(), nullptr);
+  report.head = options.head;
+  return report;
 }
 
 ExitCode RunMany(FitOptions const& options, Console const& console) {

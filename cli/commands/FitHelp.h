@@ -36,6 +36,12 @@ that they read back as the same doubles, but for G-code, which is rounded. Every
 the contour is read back and measured before the word "within" is said. With -o - the table is
 not printed.
 
+Measurement: below the table stands what the points of each piece say by themselves: radius or
+direction of least squares with its standard deviation (+-), the form error (from the outermost
+point on one side to that on the other), the standard deviation of the points and the angle at which
+the next piece goes on. A fitted radius is one of many that the tolerance admits and no measurement.
+The points of a piece are those that are nearest to it.
+
 Many files: each is fitted by itself, several at once, and has a line with its points, pieces,
 largest deviation, time and result. Those that fail do not stop the others; their whole messages go
 to standard error. Lines come in the order of the files, and the same files give the same bytes
@@ -61,6 +67,7 @@ Examples:
   contour fit part.csv -t 0.02 -o part.nc --feed 600
   contour fit - -t 0.02 -o - --to dxf < part.csv > part.dxf
   contour fit part.csv --tolerance-per-point 0.05 --strategy cells -o part.json
+  contour fit part.csv -t 0.02 -o part.html --field part=Cam --field date=2026-11-30
   contour fit outline.csv -t 0.01 --closed yes --start 120
   contour fit scans/*.csv -t 0.02 --out-dir fitted --to json,dxf -j 8
 )";

@@ -7,6 +7,7 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
 #include "cli/commands/FitHelp.h"
+#include "cli/commands/ReportFields.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Messages.h"
 
@@ -125,12 +126,14 @@ void AddFitOptions(Command& command, FitOptions* options) {
                  "Digits after the point of lengths in the table; files always hold every digit");
   command.AddText("--json", &options->json, "FILE", "The same as -o, always as JSON");
   command.AddText("--svg", &options->svg, "FILE", "The same as -o, always as SVG");
+  AddFieldOption(command, &options->fields);
   command.AddFlag("-q,--quiet", &options->isQuiet, "Draw no progress bar on the terminal");
   command.SetFooter(std::string(kPointsFileText) + kFitFooter);
 }
 
 void CompleteFitOptions(FitOptions* options) {
   options->points.path = options->paths.front();
+  options->head = HeadOf(options->fields);
   bool const namesNoFile =
       options->outputs.empty() && options->json.empty() && options->svg.empty();
   if (namesNoFile && !options->AreMany() && options->formats.size() == 1) {

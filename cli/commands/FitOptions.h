@@ -11,6 +11,7 @@
 #include "cli/commands/PointsInput.h"
 #include "vorn/io/FitContour.h"
 #include "vorn/io/Formats.h"
+#include "vorn/io/ReportHead.h"
 
 namespace Vorn::Cli {
 
@@ -37,6 +38,8 @@ struct FitOptions {
   std::string json;
   std::string svg;
   bool isQuiet = false;
+  std::vector<std::string> fields;
+  ReportHead head;  ///< of the fields
 
   /// Whether files are fitted side by side, a line for each.
   bool AreMany() const { return paths.size() > 1 || !outFolder.empty(); }

@@ -48,7 +48,7 @@ _contour_endings() {
 _contour_takes_number() {
   case $1 in
     -t | --tolerance | --tolerance-column | --tolerance-per-point | --columns | --start | --outline | \
-      --digits | --feed | --gcode-decimals | --safe-height | --cut-height | --plunge-feed | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
+      --digits | --field | --feed | --gcode-decimals | --safe-height | --cut-height | --plunge-feed | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
     *) return 1 ;;
   esac
 }

@@ -5,6 +5,8 @@
 #include <numbers>
 
 #include "cli/texts/Columns.h"
+#include "cli/texts/LengthFormat.h"
+#include "cli/texts/MeasureTable.h"
 #include "cli/texts/Relative.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
@@ -12,33 +14,6 @@
 namespace Vorn::Cli {
 
 namespace {
-
-constexpr int kMostDecimals = 9;
-constexpr double kLargestFixed = 1e9;
-
-/// Coordinates are printed to a hundredth of the smallest tolerance, as long as that gives
-/// columns of a readable width.
-class LengthFormat {
- public:
-  LengthFormat(FitReport const& report, std::optional<int> wanted) {
-    if (wanted) {
-      decimals_ = *wanted;
-      return;
-    }
-    double const digits = 2.0 - std::floor(std::log10(report.SmallestTolerance()));
-    decimals_ = static_cast<int>(std::clamp(digits, 0.0, static_cast<double>(kMostDecimals)));
-    isFixed_ = digits <= kMostDecimals;
-  }
-
-  std::string operator()(double value) const {
-    if (isFixed_ && std::fabs(value) < kLargestFixed) return FormatFixed(value, decimals_);
-    return FormatShort(value, kMostDecimals);
-  }
-
- private:
-  int decimals_ = 0;
-  bool isFixed_ = true;
-};
 
 Row Header() {
   return {"no",       "kind",   "start x",   "start y", "end x",  "end y", "centre x",
@@ -116,8 +91,26 @@ std::string CompressionText(FitReport const& report) {
          FormatFixed(100.0 * pieces / points, 1) + " % of the points";
 }
 
+std::string FieldsText(FitReport const& report) {
+  std::string text;
+  for (ReportField const& field : report.head.fields) {
+    // A long name keeps a blank behind it.
+    text += Fact(field.name + " ", field.value);
+  }
+  return text;
+}
+
+std::string ScatterText(FitReport const& report) {
+  DeviationSummary const summary = Summarise(report);
+  std::string const total = Counted(report.file.points.size(), "point");
+  return "root mean square " + WithUnits(FormatShort(summary.rootMeanSquare, 4), report) +
+         ", mean " + WithUnits(FormatShort(summary.mean, 3), report) + ", " +
+         (summary.outside == 0 ? "none" : std::to_string(summary.outside)) + " of " + total +
+         " outside";
+}
+
 std::string Summary(FitReport const& report, std::string const& readBack) {
-  return "points      " + std::to_string(report.file.points.size()) + "\n" +
+  return FieldsText(report) + "points      " + std::to_string(report.file.points.size()) + "\n" +
          (report.file.columns.empty() ? "" : "columns     " + report.file.columns + "\n") +
          "tolerance   " + ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) +
          "\n" + "closed      " + ClosedText(report) + "\n" + "pieces      " +
@@ -125,6 +118,7 @@ std::string Summary(FitReport const& report, std::string const& readBack) {
          Counted(report.ArcCount(), "arc") + "\n" + "compression " + CompressionText(report) +
          "\n" + "reported    " + ReportedText(report) + "\n" + "re-measured " +
          RemeasuredText(report) + "\n" + "deviation   " + LargestText(report) + "\n" +
+         "scatter     " + ScatterText(report) + "\n" +
          (readBack.empty() ? "" : "read back   " + readBack + "\n") + "result      " +
          Describe(report.verdict) + "\n" + "time        " + FormatFixed(report.fit.seconds, 3) +
          " s\n";
@@ -134,14 +128,15 @@ std::string Summary(FitReport const& report, std::string const& readBack) {
 
 std::string ToTable(FitReport const& report, std::optional<int> digits,
                     std::string const& readBack) {
-  LengthFormat const length(report, digits);
+  LengthFormat const length(report.SmallestTolerance(), digits);
   std::vector<Row> rows = {Header()};
   for (std::size_t i = 0; i < report.pieces.size(); ++i) {
     rows.push_back(PieceRow(report, i, length));
   }
   std::string const units = report.file.units.empty() ? "" : ", lengths in " + report.file.units;
   return report.file.path + units + ", sweeps in degrees\n\n" +
-         Aligned(rows, {"kind", "direction"}) + "\n" + Summary(report, readBack);
+         Aligned(rows, {"kind", "direction"}) + "\n" + MeasureTable(report, length) + "\n" +
+         Summary(report, readBack);
 }
 
 }  // namespace Vorn::Cli

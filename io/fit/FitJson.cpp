@@ -1,6 +1,7 @@
 #include <nlohmann/json.hpp>
 
 #include "io/formats/JsonPieces.h"
+#include "io/measure/MeasureJson.h"
 #include "vorn/io/FitReport.h"
 #include "vorn/io/Formats.h"
 
@@ -80,15 +81,39 @@ char const* VerdictName(Verdict verdict) {
   return "unknown";
 }
 
+Json DeviationsJson(FitReport const& report) {
+  DeviationSummary const summary = Summarise(report);
+  return {
+      {"largest", LargestJson(report)},           {"reported", ReportedJson(report)},
+      {"remeasured", RemeasuredJson(report)},     {"mean", summary.mean},
+      {"rootMeanSquare", summary.rootMeanSquare}, {"outside", summary.outside},
+      {"histogram", HistogramJson(summary)},
+  };
+}
+
+Json ElementsJson(FitReport const& report) {
+  std::vector<PieceMeasure> const measures = MeasurePieces(report);
+  Json elements = Json::array();
+  for (std::size_t i = 0; i < report.pieces.size(); ++i) {
+    Json element = PieceJson(report.pieces[i], i + 1, RangeJson(report.ranges, i));
+    element["leastSquares"] = LeastSquaresJson(measures[i]);
+    element["turn"] = OrNull(measures[i].turn);
+    elements.push_back(std::move(element));
+  }
+  return elements;
+}
+
+Json ProgramJson(FitReport const& report) {
+  return report.head.program.empty() ? Json(nullptr) : Json(report.head.program);
+}
+
 }  // namespace
 
 std::string ToJson(FitReport const& report) {
-  Json elements = Json::array();
-  for (std::size_t i = 0; i < report.pieces.size(); ++i) {
-    elements.push_back(PieceJson(report.pieces[i], i + 1, RangeJson(report.ranges, i)));
-  }
   Json document = {
       {"schemaVersion", kJsonSchemaVersion},
+      {"program", ProgramJson(report)},
+      {"fields", FieldsJson(report.head)},
       {"input", InputJson(report)},
       {"strategy", NameOf(report.strategy)},
       {"code", static_cast<std::int32_t>(report.fit.code)},
@@ -97,13 +122,10 @@ std::string ToJson(FitReport const& report) {
        {{"elements", report.pieces.size()},
         {"lines", report.LineCount()},
         {"arcs", report.ArcCount()}}},
-      {"deviation",
-       {{"largest", LargestJson(report)},
-        {"reported", ReportedJson(report)},
-        {"remeasured", RemeasuredJson(report)}}},
+      {"deviation", DeviationsJson(report)},
   };
   document.update(ClosureJson(report));
-  document["elements"] = elements;
+  document["elements"] = ElementsJson(report);
   // A file name need not be UTF-8; a replacement character is better than no document.
   return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
 }

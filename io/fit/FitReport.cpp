@@ -103,6 +103,15 @@ FitReport MakeClosedReport(PointFile file, std::string toleranceSource,
   return report;
 }
 
+std::vector<PieceMeasure> MeasurePieces(FitReport const& report) {
+  return MeasurePieces(report.file.points, report.remeasured.points, report.pieces,
+                       report.closure.isClosed);
+}
+
+DeviationSummary Summarise(FitReport const& report) {
+  return Summarise(report.file.points, report.remeasured.points, true);
+}
+
 std::string Describe(Verdict verdict) {
   switch (verdict) {
     case Verdict::WithinTolerance:

@@ -28,6 +28,13 @@ TEST_F(Program, TwoPointsGiveOneLine) {
       " 1  line    0.000    0.000  3.000  4.000         -         -       -  -          "
       "    -   5.000       2\n"
       "\n"
+      "Measured by least squares over the points of each piece, angles in degrees. A radius of "
+      "the\n"
+      "table above is one of those that the tolerance admits; the one here is that of the points.\n"
+      "\n"
+      "no  kind  points  radius  direction  +-  form error  deviation  turn to next\n"
+      " 1  line       2       -     53.130   -      0.0000          -             -\n"
+      "\n"
       "points      2\n"
       "columns     1 and 2\n"
       "tolerance   0.1 (given by --tolerance)\n"
@@ -38,7 +45,30 @@ TEST_F(Program, TwoPointsGiveOneLine) {
       "reported    0.000000 of the tolerance, exact by construction\n"
       "re-measured 0.000000 of the tolerance at point 0 (line 1), 0 from piece 1\n"
       "deviation   0.000000 of the tolerance at point 0 (line 1), the largest that was found\n"
+      "scatter     root mean square 0, mean 0, none of 2 points outside\n"
       "result      within tolerance\n");
+}
+
+TEST_F(Program, FieldsStandInEveryReport) {
+  Write("p.csv", Corner());
+  Ended const ended =
+      Run("fit p.csv -t 0.01 -o p.json --field part='Cam <7>' --field 'drawing number'=12=3");
+  EXPECT_EQ(ended.code, 0) << ended.err;
+  EXPECT_NE(ended.out.find("\npart        Cam <7>\ndrawing number 12=3\npoints "),
+            std::string::npos)
+      << ended.out;
+  auto const json = nlohmann::ordered_json::parse(Contents(folder_ / "p.json"));
+  EXPECT_EQ(json.at("fields").dump(), R"({"part":"Cam <7>","drawing number":"12=3"})");
+  EXPECT_EQ(json.at("program").get<std::string>().rfind("contour ", 0), 0u);
+}
+
+TEST_F(Program, FieldsNeedANameAndComeOnce) {
+  Write("p.csv", Corner());
+  ExpectRefusal("fit p.csv -t 0.01 --field part", 2,
+                "--field 'part': NAME=VALUE is wanted, such as part=Cam");
+  ExpectRefusal("fit p.csv -t 0.01 --field =7", 2,
+                "--field '=7': NAME=VALUE is wanted, such as part=Cam");
+  ExpectRefusal("fit p.csv -t 0.01 --field a=1 --field a=2", 2, "--field 'a' is given twice");
 }
 
 TEST_F(Program, CornerBecomesTwoLinesInTableJsonAndDrawing) {
@@ -179,9 +209,9 @@ TEST_F(Program, FullDiskLeavesTheOldFilesWhole) {
   Write("p.csv", Corner());
   Write("p.json", "old json");
   Write("p.svg", "old svg");
-  // A limit of 4 blocks of 512 or 1024 bytes holds the JSON of two lines, not the drawing.
+  // A limit of 6 blocks of 512 or 1024 bytes holds the JSON of two lines, not the drawing.
   Ended const ended =
-      Run("fit p.csv --tolerance 0.01 --json p.json --svg p.svg", "trap '' XFSZ && ulimit -f 4 &&");
+      Run("fit p.csv --tolerance 0.01 --json p.json --svg p.svg", "trap '' XFSZ && ulimit -f 6 &&");
   EXPECT_EQ(ended.code, 3) << ended.err;
   EXPECT_EQ(ended.err, "contour: p.svg: cannot be written: File too large\n");
   EXPECT_EQ(Contents(folder_ / "p.json"), "old json");

@@ -10,8 +10,10 @@
 #include "vorn/io/Closure.h"
 #include "vorn/io/Deviations.h"
 #include "vorn/io/Export.h"
+#include "vorn/io/PieceMeasures.h"
 #include "vorn/io/Pieces.h"
 #include "vorn/io/Points.h"
+#include "vorn/io/ReportHead.h"
 
 namespace Vorn::IO {
 
@@ -62,6 +64,7 @@ struct VORN_IO_EXPORT FitReport {
   std::optional<std::vector<PointRange>> ranges;  ///< one for each piece; nothing: too many to tell
   Remeasured remeasured;                          ///< the deviation of every point
   Verdict verdict = Verdict::WithinTolerance;     ///< how the fit ended
+  ReportHead head;                                ///< what the user puts at the head
 
   /// From the end of the contour to its start; 0 when it is closed exactly.
   double Gap() const;
@@ -82,6 +85,12 @@ struct VORN_IO_EXPORT FitReport {
   /// The largest tolerance of a point.
   double LargestTolerance() const;
 };
+
+/// What the points of each piece say by themselves: see PieceMeasures.h.
+VORN_IO_EXPORT std::vector<PieceMeasure> MeasurePieces(FitReport const& report);
+
+/// All deviations together.
+VORN_IO_EXPORT DeviationSummary Summarise(FitReport const& report);
 
 /// One line of words.
 VORN_IO_EXPORT std::string Describe(Verdict verdict);

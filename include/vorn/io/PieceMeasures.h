@@ -14,7 +14,7 @@ namespace Vorn::IO {
 
 /// What the points of one piece say by themselves. A fitted radius or direction is one of many that
 /// the tolerances admit; what was measured is the one of least squares here.
-struct PieceMeasure {
+struct VORN_IO_EXPORT PieceMeasure {
   std::size_t points = 0;                    ///< how many have this piece as their nearest
   std::optional<LeastSquaresLine> line;      ///< of a straight piece with two different points; its
                                              ///< direction is that of travel, in (-pi, pi]

@@ -21,6 +21,14 @@ TEST(Table, ShowsPiecesAndSummary) {
       " 2  arc    4.0000   0.0000  3.0000  -1.0000    4.0000   -1.0000  1.0000  cw         "
       "270.000  4.7124       4\n"
       "\n"
+      "Measured by least squares over the points of each piece, angles in degrees. A radius of "
+      "the\n"
+      "table above is one of those that the tolerance admits; the one here is that of the points.\n"
+      "\n"
+      "no  kind  points  radius  direction      +-  form error  deviation  turn to next\n"
+      " 1  line       3       -      0.000    0.17     0.01000    0.00816         0.000\n"
+      " 2  arc        4  1.0070          -  0.0039     0.00712    0.00557             -\n"
+      "\n"
       "points      7\n"
       "tolerance   0.02 (given by --tolerance)\n"
       "strategy    mixed\n"
@@ -30,6 +38,7 @@ TEST(Table, ShowsPiecesAndSummary) {
       "reported    0.500000 of the tolerance at point 1 (line 3)\n"
       "re-measured 0.750000 of the tolerance at point 3 (line 5), 0.015 from piece 2\n"
       "deviation   0.750000 of the tolerance at point 3 (line 5), the largest that was found\n"
+      "scatter     root mean square 0.006814, mean 0.00357, none of 7 points outside\n"
       "result      within tolerance\n"
       "time        0.250 s\n");
 }

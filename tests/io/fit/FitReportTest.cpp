@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <bit>
+#include <cmath>
 #include <limits>
 #include <nlohmann/json.hpp>
 
@@ -101,6 +102,42 @@ TEST(Json, HoldsEveryFieldWithItsExactBits) {
   expectBits(arc.at("sweep"), piece.sweep);
   expectBits(arc.at("length"), piece.length);
   EXPECT_EQ(arc.at("direction"), "cw");
+}
+
+TEST(Json, HoldsWhatThePointsSayByThemselves) {
+  FitReport const report = Contours::LineAndArcReport();
+  auto const json = nlohmann::json::parse(ToJson(report));
+  // Three points at the heights 0, 0.01, 0: the line of least squares is level.
+  auto const& line = json.at("elements").at(0).at("leastSquares");
+  EXPECT_EQ(line.at("points"), 3);
+  EXPECT_NEAR(line.at("direction").get<double>(), 0.0, 1e-15);
+  EXPECT_NEAR(line.at("formError").get<double>(), 0.01, 1e-15);
+  EXPECT_NEAR(line.at("standardDeviation").get<double>(),
+              std::sqrt(0.01 * 0.01 * (1.0 / 9 + 1.0 / 9 + 4.0 / 9)), 1e-15);
+  auto const& arc = json.at("elements").at(1).at("leastSquares");
+  EXPECT_EQ(arc.at("points"), 4);
+  EXPECT_FALSE(arc.contains("direction"));
+  EXPECT_NEAR(arc.at("radius").get<double>(), 1.0, 0.02);
+  EXPECT_GT(arc.at("radiusDeviation").get<double>(), 0.0);
+  EXPECT_NEAR(json.at("elements").at(0).at("turn").get<double>(), 0.0, 1e-15) << "tangential";
+  EXPECT_TRUE(json.at("elements").at(1).at("turn").is_null());
+
+  auto const& deviation = json.at("deviation");
+  EXPECT_NEAR(deviation.at("mean").get<double>(), (0.01 + 0.015) / 7, 1e-15) << "both to the left";
+  EXPECT_NEAR(deviation.at("rootMeanSquare").get<double>(),
+              std::sqrt((0.01 * 0.01 + 0.015 * 0.015) / 7), 1e-15);
+  EXPECT_EQ(deviation.at("outside"), 0);
+  EXPECT_EQ(deviation.at("histogram").at("kind"), "relative");
+  EXPECT_EQ(deviation.at("histogram").at("counts").size(), 20u);
+}
+
+TEST(Json, HoldsTheFieldsInTheirOrderAndTheProgram) {
+  FitReport report = Contours::LineAndArcReport();
+  EXPECT_TRUE(nlohmann::json::parse(ToJson(report)).at("program").is_null());
+  report.head = {{{"part", "Cam"}, {"drawing", "7 \"b\""}}, "contour 1.2.3"};
+  auto const json = nlohmann::ordered_json::parse(ToJson(report));
+  EXPECT_EQ(json.at("program"), "contour 1.2.3");
+  EXPECT_EQ(json.at("fields").dump(), R"({"part":"Cam","drawing":"7 \"b\""})");
 }
 
 TEST(Json, WritesNullForWhatIsNotKnown) {
