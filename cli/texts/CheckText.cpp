@@ -117,8 +117,9 @@ Row Header(CheckReport const& report) {
 Row PointRow(CheckReport const& report, std::size_t point) {
   WPoint const& measured = report.file.points[point];
   PointDeviation const& deviation = report.deviations[point];
+  std::optional<std::size_t> const line = report.file.LineOf(point);
   Row row = {std::to_string(point),
-             std::to_string(report.file.lines[point]),
+             line ? std::to_string(*line) : "-",
              FormatShort(measured.x),
              FormatShort(measured.y),
              FormatShort(SignedDistance(deviation)),

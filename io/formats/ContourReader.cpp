@@ -2,6 +2,7 @@
 #include "io/formats/Dxf.h"
 #include "io/formats/GCode.h"
 #include "io/formats/JsonPieces.h"
+#include "io/formats/Svg.h"
 #include "io/formats/Text.h"
 #include "io/formats/Wkt.h"
 #include "vorn/io/Failure.h"
@@ -27,21 +28,25 @@ void RefuseEmpty(std::string_view text, std::string const& path) {
 Format RecognisedFormat(std::string_view text, std::string const& path) {
   if (std::optional<Format> const byName = FormatOf(path)) return *byName;
   if (std::optional<Format> const byContent = FormatOfContent(text)) return *byContent;
-  RefuseFile(path, "holds no contour: it looks like none of JSON, CSV, DXF, G-code and WKT");
+  RefuseFile(path, "holds no contour: it looks like none of JSON, CSV, DXF, G-code, WKT and SVG");
 }
 
-ContourFile ParseAs(Format format, std::string_view text, std::string const& path) {
+ContourFile ParseAs(Format format, std::string_view text, std::string const& path,
+                    std::optional<double> flattening) {
   switch (format) {
     case Format::Json:
+    case Format::GeoJson:
       return ParseJsonPieces(text, path);
     case Format::Csv:
       return ParseCsvPieces(text, path);
     case Format::Dxf:
-      return ParseDxf(text, path);
+      return ParseDxf(text, path, flattening);
     case Format::GCode:
       return ParseGCode(text, path);
     case Format::Wkt:
       return ParseWkt(text, path);
+    case Format::Svg:
+      return ParseSvg(text, path, flattening);
     default:
       throw Failure(FailureKind::BadArgument, {path},
                     "a contour cannot be read from " + NameOf(format));
@@ -51,10 +56,11 @@ ContourFile ParseAs(Format format, std::string_view text, std::string const& pat
 }  // namespace
 
 ContourFile ParseContour(std::string_view text, std::string const& path,
-                         std::optional<Format> format) {
+                         ReadOptions const& options) {
   RefuseBinary(text, path);
   RefuseEmpty(text, path);
-  ContourFile contour = ParseAs(format ? *format : RecognisedFormat(text, path), text, path);
+  Format const format = options.format ? *options.format : RecognisedFormat(text, path);
+  ContourFile contour = ParseAs(format, text, path, options.flattening);
   contour.path = Printable(path);
   contour.units = Printable(contour.units);
   if (contour.pieces.empty()) RefuseFile(path, "holds no contour: there are no pieces");
@@ -63,8 +69,17 @@ ContourFile ParseContour(std::string_view text, std::string const& path,
   return contour;
 }
 
+ContourFile ParseContour(std::string_view text, std::string const& path,
+                         std::optional<Format> format) {
+  return ParseContour(text, path, ReadOptions{format, {}});
+}
+
+ContourFile ReadContour(std::string const& path, std::istream& in, ReadOptions const& options) {
+  return ParseContour(ReadTextFile(path, in), InputName(path), options);
+}
+
 ContourFile ReadContour(std::string const& path, std::istream& in, std::optional<Format> format) {
-  return ParseContour(ReadTextFile(path, in), InputName(path), format);
+  return ReadContour(path, in, ReadOptions{format, {}});
 }
 
 }  // namespace Vorn::IO

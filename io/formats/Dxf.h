@@ -1,5 +1,6 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -22,8 +23,12 @@ std::string ToDxf(ContourFile const& contour, DxfStyle style = DxfStyle::Polylin
 /// Reads LINE, ARC, CIRCLE, LWPOLYLINE and POLYLINE in the order of the file, of R12 or later. An
 /// entity that ends where the one before ends is turned round; arcs have no sense of their own and
 /// are turned to the nearer end. A circle becomes two halves. Texts, points, dimensions, viewports,
-/// paper space and blocks are passed over.
-/// @throws Failure (FailureKind::File) naming file, line and entity.
-ContourFile ParseDxf(std::string_view text, std::string const& path);
+/// paper space and blocks are passed over. SPLINE and ELLIPSE become chords no further than
+/// `flattening` from them.
+/// @throws Failure (FailureKind::File) naming file, line and entity, of a curve without
+/// `flattening`
+///         as well.
+ContourFile ParseDxf(std::string_view text, std::string const& path,
+                     std::optional<double> flattening = {});
 
 }  // namespace Vorn::IO

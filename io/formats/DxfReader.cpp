@@ -5,6 +5,7 @@
 #include <set>
 
 #include "io/formats/Dxf.h"
+#include "io/formats/DxfCurves.h"
 #include "io/formats/DxfEntities.h"
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Numbers.h"
@@ -46,6 +47,11 @@ bool IsPassedOver(Entity const& entity) {
                                                           "POINT",  "TEXT",      "VIEWPORT"};
   constexpr int kInPaperSpace = 67;
   return kAnnotations.count(entity.Type()) > 0 || entity.FlagsOr(kInPaperSpace, 0) == 1;
+}
+
+/// Whether its places are told in the plane of the entity, not in that of the drawing.
+bool IsInOwnPlane(Entity const& entity) {
+  return entity.Type() != "LINE" && entity.Type() != "ELLIPSE" && entity.Type() != "SPLINE";
 }
 
 /// Whether the entity is drawn on the back of the plane, where x runs the other way.
@@ -141,7 +147,10 @@ void Mirror(Stretch* stretch) {
 /// Goes through the entities of a drawing.
 class Reader {
  public:
-  explicit Reader(Dxf::Drawing const& drawing) : entities_(drawing.entities) {}
+  Reader(Dxf::Drawing const& drawing, std::optional<double> flattening)
+      : entities_(drawing.entities) {
+    flattening_.tolerance = flattening;
+  }
 
   std::vector<Stretch> Read() {
     std::vector<Stretch> stretches;
@@ -152,8 +161,7 @@ class Reader {
         continue;
       }
       stretches.push_back(StretchOf(entity));
-      bool const isLine = entity.Type() == "LINE";  // the only one not drawn in its own plane
-      if (!isLine && IsMirrored(entity)) Mirror(&stretches.back());
+      if (IsInOwnPlane(entity) && IsMirrored(entity)) Mirror(&stretches.back());
       RequireSameHeight(entity);
     }
     return stretches;
@@ -166,7 +174,9 @@ class Reader {
     if (entity.Type() == "CIRCLE") return CircleOf(entity);
     if (entity.Type() == "LWPOLYLINE") return LightPolylineOf(entity);
     if (entity.Type() == "POLYLINE") return HeavyPolylineOf(entity);
-    entity.Refuse("is none of LINE, ARC, CIRCLE, LWPOLYLINE and POLYLINE");
+    if (entity.Type() == "ELLIPSE") return {Dxf::EllipsePieces(entity, &flattening_)};
+    if (entity.Type() == "SPLINE") return {Dxf::SplinePieces(entity, &flattening_)};
+    entity.Refuse("is none of LINE, ARC, CIRCLE, LWPOLYLINE, POLYLINE, ELLIPSE and SPLINE");
   }
 
   Stretch HeavyPolylineOf(Entity const& entity) {
@@ -206,6 +216,7 @@ class Reader {
 
   std::vector<Entity> const& entities_;
   std::size_t next_ = 0;
+  Flattening flattening_;
   bool hasHeight_ = false;
   double height_ = 0.0;
 };
@@ -254,9 +265,10 @@ std::vector<Piece> Joined(std::vector<Stretch> const& stretches) {
 
 }  // namespace
 
-ContourFile ParseDxf(std::string_view text, std::string const& path) {
+ContourFile ParseDxf(std::string_view text, std::string const& path,
+                     std::optional<double> flattening) {
   Dxf::Drawing const drawing = Dxf::ReadDrawing(text, path);
-  std::vector<Stretch> stretches = Reader(drawing).Read();
+  std::vector<Stretch> stretches = Reader(drawing, flattening).Read();
   ContourFile contour;
   contour.units = drawing.units;
   if (stretches.empty()) return contour;

@@ -23,13 +23,14 @@ struct NamedFormat {
 };
 
 /// The first name of a format is the one it goes by; each is the ending of a file as well.
-constexpr std::array<NamedFormat, 11> kFormats = {{
+constexpr std::array<NamedFormat, 12> kFormats = {{
     {"json", Format::Json},
     {"csv", Format::Csv},
     {"dxf", Format::Dxf},
     {"gcode", Format::GCode},
     {"nc", Format::GCode},
     {"wkt", Format::Wkt},
+    {"geojson", Format::GeoJson},
     {"svg", Format::Svg},
     {"html", Format::Html},
     {"htm", Format::Html},
@@ -39,7 +40,7 @@ constexpr std::array<NamedFormat, 11> kFormats = {{
 
 constexpr std::string_view kCurves[] = {"srid",         "linestring",    "circularstring",
                                         "multicurve",   "compoundcurve", "multilinestring",
-                                        "curvepolygon", "polygon"};
+                                        "curvepolygon", "polygon",       "multipolygon"};
 
 bool IsComment(std::string_view line) { return line.starts_with('#'); }
 
@@ -95,6 +96,7 @@ std::optional<Format> FormatOfContent(std::string_view text) {
   std::string const line = FirstLine(text);
   if (line.empty()) return {};
   if (line.front() == '{') return Format::Json;
+  if (line.front() == '<') return Format::Svg;
   if (line == "0" || line == "999") return Format::Dxf;
   if (LooksLikeWkt(line)) return Format::Wkt;
   if (line.find("start_x") != std::string::npos) return Format::Csv;
@@ -102,9 +104,9 @@ std::optional<Format> FormatOfContent(std::string_view text) {
   return {};
 }
 
-bool HoldsContour(Format format) {
-  return format != Format::Svg && format != Format::Html && format != Format::Png;
-}
+bool HoldsContour(Format format) { return format != Format::Svg && IsReadAsContour(format); }
+
+bool IsReadAsContour(Format format) { return format != Format::Html && format != Format::Png; }
 
 namespace {
 

@@ -18,8 +18,9 @@ nlohmann::ordered_json PieceJson(Piece const& piece, std::size_t number,
 /// read back as the same bits, and gaps are kept.
 std::string ToJson(ContourFile const& contour);
 
-/// Reads the contour of a document written by a fit or by the function above. Derived numbers
-/// (length, angles, sweep) are taken as written and worked out where they are missing.
+/// Reads the contour of a document written by a fit or by the function above, or of GeoJSON.
+/// Derived numbers (length, angles, sweep) are taken as written and worked out where they are
+/// missing.
 /// @throws Failure (FailureKind::File) naming the file and the path of the bad field, or line and
 ///         column where the text is no JSON.
 ContourFile ParseJsonPieces(std::string_view text, std::string const& path);

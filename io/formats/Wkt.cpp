@@ -129,10 +129,9 @@ class Reader {
     if (word == "multicurve" || word == "multilinestring") {
       TakeMembers();
     } else if (word == "curvepolygon" || word == "polygon") {
-      RequireSign('(');
-      TakeMember();
-      if (Rest().starts_with(',')) Refuse("begins a second ring; a contour has one");
-      RequireSign(')');
+      TakeMembers();
+    } else if (word == "multipolygon") {
+      TakePolygons();
     } else if (!TakeCurve(word)) {
       at_ -= word.size();
       Refuse("is no curve that holds a contour");
@@ -152,7 +151,16 @@ class Reader {
     return true;
   }
 
-  /// Of a MULTICURVE: any curve; a list without a word holds lines.
+  /// Polygons, each a list of rings.
+  void TakePolygons() {
+    RequireSign('(');
+    do {
+      TakeMembers();
+    } while (TakeSign(','));
+    RequireSign(')');
+  }
+
+  /// Of a MULTICURVE or the rings of a polygon: any curve; a list without a word holds lines.
   void TakeMembers() {
     RequireSign('(');
     do {

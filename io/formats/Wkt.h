@@ -13,7 +13,8 @@ namespace Vorn::IO {
 /// a curve with a start and a sense, which a polygon need not keep. There are no units.
 std::string ToWkt(ContourFile const& contour);
 
-/// Reads what ToWkt writes, MULTILINESTRING, and POLYGON or CURVEPOLYGON with a single ring.
+/// Reads what ToWkt writes, MULTILINESTRING, POLYGON, CURVEPOLYGON and MULTIPOLYGON:
+/// every ring of a polygon is a closed outline.
 /// @throws Failure (FailureKind::File) naming file, line, column and offending text.
 ContourFile ParseWkt(std::string_view text, std::string const& path);
 

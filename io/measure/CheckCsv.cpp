@@ -9,7 +9,8 @@ std::string ToCsv(CheckReport const& report) {
   for (std::size_t i = 0; i < report.deviations.size(); ++i) {
     WPoint const& point = report.file.points[i];
     PointDeviation const& deviation = report.deviations[i];
-    text += std::to_string(i) + "," + std::to_string(report.file.lines[i]) + "," +
+    std::optional<std::size_t> const line = report.file.LineOf(i);
+    text += std::to_string(i) + "," + (line ? std::to_string(*line) : "") + "," +
             FormatExact(point.x) + "," + FormatExact(point.y) + "," +
             FormatExact(SignedDistance(deviation)) + "," + std::to_string(deviation.piece + 1);
     if (report.HasTolerances()) {

@@ -46,9 +46,14 @@ Json ToleranceJson(CheckReport const& report) {
 Json DeviationJson(CheckReport const& report, std::size_t point) {
   WPoint const& measured = report.file.points[point];
   PointDeviation const& deviation = report.deviations[point];
-  Json json = {
-      {"point", point},  {"line", report.file.lines[point]},       {"x", measured.x},
-      {"y", measured.y}, {"deviation", SignedDistance(deviation)}, {"piece", deviation.piece + 1}};
+  Json line = nullptr;
+  if (std::optional<std::size_t> const known = report.file.LineOf(point)) line = *known;
+  Json json = {{"point", point},
+               {"line", line},
+               {"x", measured.x},
+               {"y", measured.y},
+               {"deviation", SignedDistance(deviation)},
+               {"piece", deviation.piece + 1}};
   if (!report.HasTolerances()) return json;
   json["tolerance"] = measured.w;
   json["relative"] = deviation.relative;

@@ -382,11 +382,6 @@ std::optional<ColumnChoice> ParseColumnChoice(std::string_view text) {
   return choice;
 }
 
-std::string PointFile::NameOf(std::size_t index) const {
-  std::string const name = "point " + std::to_string(index);
-  return lines.empty() ? name : name + " (line " + std::to_string(lines[index]) + ")";
-}
-
 PointFile ParsePoints(std::string_view text, std::string const& path,
                       ToleranceColumn const& tolerance, ColumnChoice const& columns) {
   return Parser(path, tolerance, columns).Parse(text);

@@ -16,7 +16,7 @@ Json OrNull(std::optional<Value> const& value) {
 }
 
 Json PointName(PointFile const& file, std::size_t point) {
-  return {{"point", point}, {"line", file.lines[point]}};
+  return {{"point", point}, {"line", OrNull(file.LineOf(point))}};
 }
 
 Json PairNames(PointFile const& file, std::size_t first, std::size_t second) {

@@ -86,7 +86,10 @@ std::string DescribeClosePair(PointFile const& file, ClosePair const& pair,
 }
 
 std::string ArgumentFor(PointFile const& file) {
-  return file.path == kStandardInputName ? "-" : ShellQuoted(file.path);
+  std::string const suffix = OutlineSuffix(file.outline);
+  std::string const path = file.path.substr(0, file.path.size() - suffix.size());
+  std::string const argument = path == kStandardInputName ? "-" : ShellQuoted(path);
+  return file.outline == 0 ? argument : argument + " --outline " + std::to_string(file.outline);
 }
 
 }  // namespace Vorn::IO

@@ -11,13 +11,13 @@
 
 namespace Vorn::IO {
 
-/// What a file is written as. The first five hold a contour and are read again.
-enum class Format { Json, Csv, Dxf, GCode, Wkt, Svg, Html, Png };
+/// What a file is written as. All but the last two are read as well.
+enum class Format { Json, Csv, Dxf, GCode, Wkt, GeoJson, Svg, Html, Png };
 
 /// By the ending of the name, in any case; nothing when it is none of ours.
 VORN_IO_EXPORT std::optional<Format> FormatOf(std::string const& path);
 
-/// By the name used for options: json, csv, dxf, gcode (or nc), wkt, svg, html, png.
+/// By the name used for options: json, csv, dxf, gcode (or nc), wkt, geojson, svg, html, png.
 VORN_IO_EXPORT std::optional<Format> FormatNamed(std::string_view name);
 
 /// As FormatNamed takes it.
@@ -28,6 +28,10 @@ VORN_IO_EXPORT std::optional<Format> FormatOfContent(std::string_view text);
 
 /// Whether a contour can be read from and written to the format: all but the drawings.
 VORN_IO_EXPORT bool HoldsContour(Format format);
+
+/// Whether a contour can be read from the format: those that hold one, and SVG, whose shapes are
+/// one.
+VORN_IO_EXPORT bool IsReadAsContour(Format format);
 
 /// The version of the JSON documents that hold a contour; it grows when a field changes its meaning
 /// or goes away.
@@ -46,8 +50,17 @@ struct WriteOptions {
 VORN_IO_EXPORT std::string ToText(ContourFile const& contour, Format format,
                                   WriteOptions const& options);
 
-/// Reads a contour from JSON, CSV, DXF, G-code or WKT; "-" is `in`. Without `format` the
-/// ending of the name tells, and for other names the content.
+/// How a file with a contour is read.
+struct ReadOptions {
+  std::optional<Format> format;      ///< nothing: the ending of the name tells, or the content
+  std::optional<double> flattening;  ///< how far chords may be from curves; nothing: none are made
+};
+
+/// Reads a contour from JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG; "-" is `in`. Without `format`
+/// the ending of the name tells, and for other names the content.
+///
+/// Curves that are no arcs of circles become chords where `flattening` says how near these must be,
+/// and are refused otherwise.
 ///
 /// Gaps stay as they are: nothing is joined that the file does not join. Pieces without length are
 /// left out and counted, see RemovePiecesWithoutLength.
@@ -58,8 +71,16 @@ VORN_IO_EXPORT std::string ToText(ContourFile const& contour, Format format,
 VORN_IO_EXPORT ContourFile ReadContour(std::string const& path, std::istream& in,
                                        std::optional<Format> format = {});
 
+/// The same with options.
+VORN_IO_EXPORT ContourFile ReadContour(std::string const& path, std::istream& in,
+                                       ReadOptions const& options);
+
 /// The same for text already in memory; `path` serves the messages.
 VORN_IO_EXPORT ContourFile ParseContour(std::string_view text, std::string const& path,
                                         std::optional<Format> format = {});
+
+/// The same with options.
+VORN_IO_EXPORT ContourFile ParseContour(std::string_view text, std::string const& path,
+                                        ReadOptions const& options);
 
 }  // namespace Vorn::IO

@@ -45,16 +45,25 @@ VORN_IO_EXPORT std::optional<ColumnChoice> ParseColumnChoice(std::string_view te
 struct VORN_IO_EXPORT PointFile {
   std::string path;                   ///< as it stands in messages
   std::vector<WPoint> points;         ///< `w` is 0 unless hasTolerances
-  std::vector<std::size_t> lines;     ///< line of each point, counted from 1; empty: no file
+  std::vector<std::size_t> lines;     ///< line of each point, counted from 1; empty: no table
+  std::size_t outline = 0;            ///< which one of several in the file, from 1; 0: the only one
   bool hasTolerances = false;         ///< a column gave every point's `w`
   std::string toleranceColumn = "w";  ///< which one that was, as it was asked for
   std::optional<double> tolerance;    ///< of a comment `# tolerance T`
   std::string units;    ///< of a comment `# units mm`, else of the header; may be empty
   std::string columns;  ///< which ones hold the points, in words: "1 (x) and 2 (y)"
 
-  /// "point 4 (line 6)", points counted from 0 as the library does; without lines "point 4".
+  /// "point 4 (line 6)", points counted from 0 as the library does; without lines
+  /// "point 4 at (1.5, 2)".
   std::string NameOf(std::size_t index) const;
+
+  /// The line of the point; nothing of a file that is no table.
+  std::optional<std::size_t> LineOf(std::size_t index) const;
 };
+
+/// What the path of one of several outlines has behind the name of the file: ", outline 2";
+/// nothing for 0.
+VORN_IO_EXPORT std::string OutlineSuffix(std::size_t outline);
 
 /// Reads points written as `x,y` or `x,y,w`, one a line.
 ///

@@ -139,13 +139,13 @@ TEST(ParseContour, SaysWhereBinaryDataBegin) {
 
 TEST(ParseContour, SaysWhenNothingIsRecognised) {
   EXPECT_EQ(Refusal([] { ParseContour("x,y\n1,2\n", "p.txt"); }),
-            "p.txt: holds no contour: it looks like none of JSON, CSV, DXF, G-code and WKT");
+            "p.txt: holds no contour: it looks like none of JSON, CSV, DXF, G-code, WKT and SVG");
   EXPECT_EQ(Refusal([] { ParseContour("\n", "p.txt"); }), "p.txt: is empty");
 }
 
 TEST(ParseContour, ADrawingIsNoContour) {
-  EXPECT_EQ(Refusal([] { ParseContour("<svg/>", "p.svg"); }, FailureKind::BadArgument),
-            "p.svg: a contour cannot be read from svg");
+  EXPECT_EQ(Refusal([] { ParseContour("<html/>", "p.html"); }, FailureKind::BadArgument),
+            "p.html: a contour cannot be read from html");
 }
 
 TEST(ToText, KeepsGapsInEveryFormat) {

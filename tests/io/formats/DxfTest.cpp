@@ -137,8 +137,9 @@ TEST(ParseDxf, PassesOverAnnotationsBlocksAndPaperSpace) {
 }
 
 TEST(ParseDxf, NamesLineAndEntity) {
-  EXPECT_EQ(Complaint(kLineToRight + " 0 SPLINE 70 8"),
-            "p.dxf:17: entity 2 (SPLINE): is none of LINE, ARC, CIRCLE, LWPOLYLINE and POLYLINE");
+  EXPECT_EQ(Complaint(kLineToRight + " 0 SOLID 70 8"),
+            "p.dxf:17: entity 2 (SOLID): is none of LINE, ARC, CIRCLE, LWPOLYLINE, POLYLINE, "
+            "ELLIPSE and SPLINE");
   EXPECT_EQ(Complaint("0 LINE 10 0 20 zero 11 4 21 0"),
             "p.dxf:10: entity 1 (LINE): group 20 'zero' is not a number");
   EXPECT_EQ(Complaint("0 LINE 10 0 20 1e999 11 4 21 0"),

@@ -1,0 +1,56 @@
+#pragma once
+
+#include <vector>
+
+#include "io/formats/Affine.h"
+#include "io/formats/Xml.h"
+#include "io/pieces/Flattening.h"
+
+namespace Vorn::IO {
+
+/// What has been read of a drawing.
+struct SvgOutcome {
+  std::vector<Piece> pieces;
+  Flattening flattening;
+};
+
+/// An arc of SVG: half axes, the turn of the first one against x, and which of the four there are.
+struct SvgArc {
+  double rx = 0.0;
+  double ry = 0.0;
+  double turn = 0.0;  ///< radians
+  bool isLarge = false;
+  bool isSweep = false;  ///< towards growing angles in the coordinates of the element
+};
+
+/// Draws the shapes of one element; places are in the coordinates of the element.
+class SvgPen {
+ public:
+  /// All three must outlive it.
+  SvgPen(XmlElement const& element, Affine const& map, SvgOutcome* outcome)
+      : element_(element), map_(map), outcome_(*outcome) {}
+
+  XY const& At() const { return at_; }
+
+  void MoveTo(XY const& to);
+  void LineTo(XY const& to);
+  /// A Bezier curve whose control points follow that where the pen stands.
+  void CurveTo(std::vector<XY> const& controls);
+  void ArcTo(SvgArc const& arc, XY const& to);
+  /// Back to where the pen was moved to last.
+  void Close();
+
+ private:
+  void Add(Piece const& piece);
+  void CircleTo(SvgArc const& arc, XY const& to);
+  void EllipseTo(SvgArc const& arc, XY const& to);
+  void AddChords(std::vector<BezierCurve> const& curves);
+
+  XmlElement const& element_;
+  Affine const& map_;
+  SvgOutcome& outcome_;
+  XY begin_;
+  XY at_;
+};
+
+}  // namespace Vorn::IO
