@@ -8,6 +8,7 @@ std::string PointFile::NameOf(std::size_t index) const {
   if (std::optional<std::size_t> const line = LineOf(index)) {
     return name + " (line " + std::to_string(*line) + ")";
   }
+  if (path.empty()) return name;
   return name + " at (" + FormatShort(points[index].x) + ", " + FormatShort(points[index].y) + ")";
 }
 

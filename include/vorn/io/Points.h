@@ -54,7 +54,7 @@ struct VORN_IO_EXPORT PointFile {
   std::string columns;  ///< which ones hold the points, in words: "1 (x) and 2 (y)"
 
   /// "point 4 (line 6)", points counted from 0 as the library does; without lines
-  /// "point 4 at (1.5, 2)".
+  /// "point 4 at (1.5, 2)", of no file "point 4".
   std::string NameOf(std::size_t index) const;
 
   /// The line of the point; nothing of a file that is no table.
