@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "geometry/fewest/Turn.h"
+
 namespace Vorn::Fewest {
 
 namespace {
@@ -165,15 +167,9 @@ constexpr double kNearFullTurn = 6.0;
 
 /// The angle that the points of a piece turn about its centre.
 double TurnOf(Path const& path, ChainPiece const& piece) {
-  double turn = 0.0;
-  Place before;
-  for (std::int32_t i = piece.first; i < piece.end; ++i) {
-    Place const radial = GradientAt(piece.circle, {path.At(i).x, path.At(i).y});
-    double const cross = before.x * radial.y - before.y * radial.x;
-    if (i > piece.first) turn += std::atan2(cross, before.x * radial.x + before.y * radial.y);
-    before = radial;
-  }
-  return std::fabs(turn);
+  Turn turn(piece.circle);
+  for (std::int32_t i = piece.first; i < piece.end; ++i) turn.Add({path.At(i).x, path.At(i).y});
+  return turn.Angle();
 }
 
 }  // namespace

@@ -19,98 +19,11 @@ struct State {
 
 using Level = std::vector<State>;
 
-std::int32_t FirstOf(Opening const& opening) { return opening.isFree ? 0 : opening.gate.split; }
-
 Opening StartOn(Gate const& gate, Interval const& interval) {
   Gate const behind = SeenFromBehind(gate);
   return gate.isCusp ? Opening{behind, -interval.high, -interval.low, false}
                      : Opening{behind, interval.low, interval.high, false};
 }
-
-/// Where a piece may start.
-struct Link {
-  Opening opening;
-  /// A circle that covers the points of the piece.
-  Circle guess;
-  /// The pieces before it that end at the ends of the opening.
-  Circle atLow;
-  Circle atHigh;
-};
-
-/// A ratio that counts as 1: the tolerances of the search are smaller than the true ones by more.
-constexpr double kWholeTolerance = 1.0 + 2e-7;
-
-/// How often a piece behind is asked for a joint nearer to the middle of its interval.
-constexpr int kMostRetries = 6;
-
-/// Determines the pieces from the last to the first, each of the smallest largest ratio that ends
-/// where the piece behind begins.
-class BackwardPass {
- public:
-  BackwardPass(Path const& path, std::vector<Link> links, PieceSearch* search)
-      : path_(path), links_(std::move(links)), search_(*search) {}
-
-  /// Empty when a piece cannot end where it has to.
-  Chain Run() {
-    std::size_t const count = links_.size();
-    chain_.pieces.resize(count);
-    chain_.gates.resize(count - 1);
-    chain_.offsets.resize(count - 1);
-    std::vector<int> retries(count);
-    for (std::size_t k = count; k-- > 0;) {
-      if (Place(k)) continue;
-      if (k + 1 == count || ++retries[k] > kMostRetries) return {};
-      // Try the piece behind again, from a joint nearer to the middle.
-      Opening& behind = links_[k + 1].opening;
-      double const quarter = 0.25 * (behind.high - behind.low);
-      behind.low += quarter;
-      behind.high -= quarter;
-      k += 2;
-    }
-    return chain_;
-  }
-
- private:
-  bool Place(std::size_t k) {
-    Link const& link = links_[k];
-    Opening end = path_.finish;
-    if (k + 1 < links_.size()) {
-      end = {chain_.gates[k], chain_.offsets[k], chain_.offsets[k], false};
-    }
-    std::int32_t const first = FirstOf(link.opening);
-    std::int32_t const last = end.isFree ? path_.Count() : end.gate.split;
-    search_.MoveTo(first, last);
-    RunFit const fit = search_.FindBest(link.opening, end, StartFor(k));
-    if (!fit.isFound || fit.ratio > kWholeTolerance) return false;
-    chain_.pieces[k] = {first, last, fit.circle, fit.ratio};
-    if (k == 0) return true;
-    double offset = 0.0;
-    if (!FindCrossing(fit.circle, link.opening.gate, &offset)) return false;
-    chain_.gates[k - 1] = SeenFromBehind(link.opening.gate);
-    chain_.offsets[k - 1] = link.opening.gate.isCusp ? -offset : offset;
-    return true;
-  }
-
-  /// Between two pieces that end on both sides of a joint there is one that ends there.
-  RunFit StartFor(std::size_t k) const {
-    if (k + 1 == links_.size()) return {links_[k].guess, 0.0, false};
-    Link const& next = links_[k + 1];
-    Fewest::Place const joint = PlaceOn(chain_.gates[k], chain_.offsets[k]);
-    double const low = ValueAt(next.atLow, joint);
-    double const high = ValueAt(next.atHigh, joint);
-    double const share = low != high ? low / (low - high) : 0.5;
-    Circle const circle = Between(next.atLow, next.atHigh, std::clamp(share, 0.0, 1.0));
-    double const form = Form(circle, circle);
-    if (!(form > 0.0)) return {links_[k].guess, 0.0, false};
-    double const ratio = 1.0 / std::sqrt(form);
-    return {Scaled(circle, ratio), std::max(ratio, 1.0), true};
-  }
-
-  Path const& path_;
-  std::vector<Link> links_;
-  PieceSearch& search_;
-  Chain chain_;
-};
 
 /// Points behind a gate whose circle tells whether there is a corner.
 constexpr std::int32_t kPointsBehind = 16;
@@ -132,7 +45,7 @@ class ChainSearch {
       Level& level = levels_.back();
       std::int32_t farthest = 0;
       std::int32_t first = path_.Count() - 1;
-      for (State const& state : level) first = std::min(first, FirstOf(state.opening));
+      for (State const& state : level) first = std::min(first, state.opening.First());
       search_.MoveTo(first, std::min(path_.Count(), std::max(expected, first + 2)));
       Reach rival;
       for (State& state : level) {
@@ -237,7 +150,7 @@ class ChainSearch {
   void AddState(Level const& level, Gate const& gate, Level* next) {
     std::vector<State const*> order;
     for (State const& state : level) {
-      if (state.reach.end >= gate.split && FirstOf(state.opening) < gate.split) {
+      if (state.reach.end >= gate.split && state.opening.First() < gate.split) {
         order.push_back(&state);
       }
     }
@@ -272,7 +185,7 @@ class ChainSearch {
     Level const& last = levels_.back();
     double least = 0.0;
     std::int32_t at = -1;
-    search_.MoveTo(FirstOf(last.front().opening), path_.Count());
+    search_.MoveTo(last.front().opening.First(), path_.Count());
     for (std::size_t i = 0; i < last.size(); ++i) {
       if (last[i].reach.end < path_.Count()) continue;
       RunFit const fit = search_.FindBest(last[i].opening, path_.finish,
@@ -292,7 +205,7 @@ class ChainSearch {
       links[k] = {state.opening, state.reach.circle, state.atLow, state.atHigh};
       at = state.previous;
     }
-    return BackwardPass(path_, std::move(links), &search_).Run();
+    return PlacePieces(path_, std::move(links), &search_);
   }
 
   Path const& path_;
@@ -317,14 +230,14 @@ Chain FollowGates(Path const& path, double share, Chain const& known) {
     links.push_back(link);
     if (k + 1 == known.pieces.size()) break;
     Gate const& gate = known.gates[k];
-    search.MoveTo(FirstOf(link.opening), gate.split);
+    search.MoveTo(link.opening.First(), gate.split);
     Interval const interval = search.FindInterval(link.opening, gate, link.guess);
     if (!interval.isFound) return {};
     link.opening = StartOn(gate, interval);
     link.atLow = interval.atLow;
     link.atHigh = interval.atHigh;
   }
-  return BackwardPass(path, std::move(links), &search).Run();
+  return PlacePieces(path, std::move(links), &search);
 }
 
 }  // namespace Vorn::Fewest

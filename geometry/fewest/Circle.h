@@ -39,6 +39,17 @@ struct Place {
   double y = 0.0;
 };
 
+/// The line from one place to another; a line along x for places that coincide.
+inline Circle LineThrough(Place const& p, Place const& q) {
+  double const dx = q.x - p.x;
+  double const dy = q.y - p.y;
+  double const length = std::sqrt(dx * dx + dy * dy);
+  if (!(length > 0.0)) return {0.0, 0.0, 1.0, -p.y};
+  Circle line{0.0, -dy / length, dx / length, 0.0};
+  line.d = -(line.bx * p.x + line.by * p.y);
+  return line;
+}
+
 /// f at a place.
 inline double ValueAt(Circle const& c, Place const& p) {
   return c.a * (p.x * p.x + p.y * p.y) + c.bx * p.x + c.by * p.y + c.d;

@@ -22,10 +22,8 @@ inline double Apply(Row const& r, Circle const& c) {
   return r.a * c.a + r.bx * c.bx + r.by * c.by + r.d * c.d;
 }
 
-/// The row times a factor.
-inline Row Scaled(Row const& r, double factor) {
-  return {r.a * factor, r.bx * factor, r.by * factor, r.d * factor};
-}
+/// The row with the opposite signs.
+inline Row Negated(Row const& r) { return {-r.a, -r.bx, -r.by, -r.d}; }
 
 /// The row of f at a place.
 inline Row ValueRow(Place const& p) { return {p.x * p.x + p.y * p.y, p.x, p.y, 1.0}; }
@@ -39,6 +37,9 @@ struct Sample {
   double y = 0.0;
   double w = 1.0;
 };
+
+/// Where a sample lies.
+inline Place PlaceOf(Sample const& s) { return {s.x, s.y}; }
 
 /// Rows of points, scaled so that a circle is within tolerance of point i exactly when
 /// |row i applied to the circle| <= 1. Positions count from the first point appended.

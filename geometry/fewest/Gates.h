@@ -38,6 +38,9 @@ inline Place PlaceOn(Gate const& gate, double offset) {
   return {gate.origin.x + offset * gate.across.x, gate.origin.y + offset * gate.across.y};
 }
 
+/// Offset at which a circle crosses a gate, in the coordinates of both; false when it does not.
+bool FindCrossing(Circle const& circle, Gate const& gate, double* offset);
+
 /// A gate with the offsets at which the piece before can end.
 struct Opening {
   Gate gate;
@@ -45,6 +48,9 @@ struct Opening {
   double high = 0.0;
   /// No gate at all: the chain begins, or ends, at the end of the path.
   bool isFree = true;
+
+  /// The first point of a piece that starts here.
+  std::int32_t First() const { return isFree ? 0 : gate.split; }
 };
 
 }  // namespace Vorn::Fewest

@@ -1,24 +1,8 @@
 #include "geometry/fewest/Growth.h"
 
 #include <algorithm>
-#include <cmath>
 
 namespace Vorn::Fewest {
-
-namespace {
-
-/// A circle through the first, the middle and the last of a run, or the line of its ends.
-Circle FirstGuess(Sample const& first, Sample const& last) {
-  double const dx = last.x - first.x;
-  double const dy = last.y - first.y;
-  double const length = std::sqrt(dx * dx + dy * dy);
-  if (!(length > 0.0)) return {0.0, 0.0, 1.0, -first.y};
-  Circle line{0.0, -dy / length, dx / length, 0.0};
-  line.d = -(line.bx * first.x + line.by * first.y);
-  return line;
-}
-
-}  // namespace
 
 void FreeRun::Begin(std::int32_t start, std::int32_t expected) {
   start_ = start;
@@ -84,8 +68,8 @@ std::int32_t FreeRun::FindEnd(std::int32_t start, std::int32_t expected) {
   Begin(start, std::max(expected, 2));
   if (count - start <= 3) return count;
   std::int32_t const probe = std::min(count - 1, start + std::max(expected / 2, 2));
-  circle_ = FirstGuess(frame_.ToLocal(points_[static_cast<std::size_t>(start)]),
-                       frame_.ToLocal(points_[static_cast<std::size_t>(probe)]));
+  circle_ = LineThrough(PlaceOf(frame_.ToLocal(points_[static_cast<std::size_t>(start)])),
+                        PlaceOf(frame_.ToLocal(points_[static_cast<std::size_t>(probe)])));
   std::int32_t good = start + 2;
   std::int32_t bad = count + 1;
   std::int32_t target = std::min(count, std::max(good + 2, start + expected));

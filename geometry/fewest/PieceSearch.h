@@ -6,6 +6,7 @@
 #include "geometry/fewest/Gates.h"
 #include "geometry/fewest/LocalFrame.h"
 #include "geometry/fewest/Path.h"
+#include "geometry/fewest/PieceRules.h"
 #include "geometry/fewest/RunTest.h"
 #include "geometry/fewest/Simplex.h"
 
@@ -69,12 +70,6 @@ class PieceSearch {
   void BeginProgramme(Opening const& from, std::int32_t end);
   void AddOpening(Opening const& opening);
   void LimitCurvature(Opening const& from, std::int32_t end);
-  struct Ends {
-    Opening const* from = nullptr;
-    Opening const* to = nullptr;  ///< null while the end is open
-    std::int32_t first = 0;
-    std::int32_t end = 0;
-  };
   struct Extreme {
     double offset = 0.0;
     Circle circle;
@@ -82,14 +77,8 @@ class PieceSearch {
   };
   Extreme FindExtreme(Ends const& ends, RunFit const& inner, bool isLow);
 
-  enum class Check { Holds, Added, Hopeless };
-
   RunFit Fit(RunFit const& start, bool isTest, Ends const& ends);
-  Check AddBroken(Circle const& circle, Ends const& ends);
-  Check AddBrokenOrder(Circle const& circle, Ends const& ends);
-  Check AddBrokenStep(Circle const& circle, double gap2, Sample const& p, Place const& q);
-  bool IsFullTurn(Circle const& circle, Ends const& ends) const;
-  Check AddBrokenJoint(Circle const& circle, Opening const& opening, std::int32_t point);
+  PieceRules Rules() { return {path_, frame_, share_, &programme_}; }
   Reach FindFirstReach(Opening const& from);
   void Grow(Opening const& from, std::int32_t expected, Reach* reach);
   RunFit FirstFit(Opening const& from, std::int32_t end);
@@ -106,8 +95,5 @@ class PieceSearch {
   Basis basis_;
   int normalisation_ = 0;
 };
-
-/// Offset at which a circle crosses a gate, in the coordinates of both; false when it does not.
-bool FindCrossing(Circle const& circle, Gate const& gate, double* offset);
 
 }  // namespace Vorn::Fewest

@@ -19,7 +19,7 @@ Circle Difference(Circle const& c, Circle const& o) {
 void Polytope::Begin(InvertedRows const& inverted, std::array<double, 4> const& limits) {
   planeCount_ = 0;
   for (std::size_t j = 0; j < 4; ++j) {
-    AddPlane(Scaled(inverted.rows[j], -1.0), limits[j]);
+    AddPlane(Negated(inverted.rows[j]), limits[j]);
     AddPlane(inverted.rows[j], limits[j]);
   }
   for (int mask = 0; mask < 16; ++mask) {

@@ -72,7 +72,7 @@ RunFit ProveRun(Programme const& programme, Basis const& basis, Simplex* simplex
     Row const& r = broken.row;
     // What rounding does to a row must not cut off a circle that meets it.
     double const limit = broken.limit * (1.0 + simplex->Slack());
-    if (!polytope.Cut(r, limit) || !polytope.Cut({-r.a, -r.bx, -r.by, -r.d}, limit)) {
+    if (!polytope.Cut(r, limit) || !polytope.Cut(Negated(r), limit)) {
       break;
     }
   }

@@ -27,8 +27,6 @@ constexpr double kResidualShare = 0.1;
 /// A negative dual this close to 0 is what an exact tie leaves behind.
 constexpr double kLeastDual = 1e-300;
 
-Row Negated(Row const& r) { return {-r.a, -r.bx, -r.by, -r.d}; }
-
 double& Component(Circle* c, int k) {
   switch (k) {
     case 0:
@@ -56,48 +54,7 @@ int LargestComponent(Circle const& c) {
   return best;
 }
 
-Row UnitRow(int k) {
-  return {k == 0 ? 1.0 : 0.0, k == 1 ? 1.0 : 0.0, k == 2 ? 1.0 : 0.0, k == 3 ? 1.0 : 0.0};
-}
-
-bool Holds(Basis const& basis, std::int32_t id) {
-  for (std::int32_t held : basis.ids) {
-    if (held == id) return true;
-  }
-  return false;
-}
-
-/// The id of a box row that the basis does not hold.
-std::int32_t FreeBox(Basis const& basis) {
-  std::int32_t id = Basis::kBox;
-  while (Holds(basis, id)) ++id;
-  return id;
-}
-
 }  // namespace
-
-bool Programme::Add(Condition const& condition) {
-  if (conditionCount == kMostConditions) return false;
-  conditions[static_cast<std::size_t>(conditionCount++)] = condition;
-  return true;
-}
-
-Row Simplex::RowOf(Programme const& programme, std::int32_t id) const {
-  if (id >= 0) return programme.columns->At(id);
-  if (id > Basis::kBox + 3) return programme.conditions[static_cast<std::size_t>(-1 - id)].row;
-  return UnitRow(id - Basis::kBox);
-}
-
-Condition::Kind Simplex::KindOf(Programme const& programme, std::int32_t id) const {
-  if (id >= 0 || id <= Basis::kBox + 3) return Condition::Kind::Slab;
-  return programme.conditions[static_cast<std::size_t>(-1 - id)].kind;
-}
-
-double Simplex::LimitOf(Programme const& programme, std::int32_t id) const {
-  if (id >= 0) return 1.0;
-  if (id <= Basis::kBox + 3) return programme.box;
-  return programme.conditions[static_cast<std::size_t>(-1 - id)].limit;
-}
 
 bool Simplex::IsAccurate(double slack) const {
   for (std::size_t j = 0; j < 4; ++j) {
@@ -110,11 +67,9 @@ bool Simplex::IsAccurate(double slack) const {
 bool Simplex::Load(Programme const& programme, Basis* basis) {
   for (std::int32_t j = 0; j < 4; ++j) {
     std::int32_t& id = basis->ids[static_cast<std::size_t>(j)];
-    bool const isStale = id >= 0 ? id < programme.first || id >= programme.last
-                                 : id > Basis::kBox + 3 && -1 - id >= programme.conditionCount;
-    if (isStale) id = FreeBox(*basis);
-    rows_[static_cast<std::size_t>(j)] = RowOf(programme, id);
-    limits_[static_cast<std::size_t>(j)] = LimitOf(programme, id);
+    if (programme.IsStale(id)) id = basis->FreeBox();
+    rows_[static_cast<std::size_t>(j)] = programme.RowOf(id);
+    limits_[static_cast<std::size_t>(j)] = programme.LimitOf(id);
   }
   return InvertRows(rows_, &inverse_) && TakeEqualities(programme, basis);
 }
@@ -122,11 +77,11 @@ bool Simplex::Load(Programme const& programme, Basis* basis) {
 bool Simplex::TakeEqualities(Programme const& programme, Basis* basis) {
   for (int k = 0; k < programme.conditionCount; ++k) {
     Condition const& condition = programme.conditions[static_cast<std::size_t>(k)];
-    if (condition.kind != Condition::Kind::Equality || Holds(*basis, -1 - k)) continue;
+    if (condition.kind != Condition::Kind::Equality || basis->Holds(-1 - k)) continue;
     int best = -1;
     double largest = 0.0;
     for (std::size_t j = 0; j < 4; ++j) {
-      if (KindOf(programme, basis->ids[j]) == Condition::Kind::Equality) continue;
+      if (programme.KindOf(basis->ids[j]) == Condition::Kind::Equality) continue;
       double const step = std::fabs(Apply(condition.row, inverse_[j]));
       if (step > largest) {
         largest = step;
@@ -148,7 +103,7 @@ bool Simplex::MakeDualFeasible(Programme const& programme, Row const& objective,
     bool isChanged = false;
     for (std::size_t j = 0; j < 4; ++j) {
       duals_[j] = Apply(objective, inverse_[j]);
-      Condition::Kind const kind = KindOf(programme, basis->ids[j]);
+      Condition::Kind const kind = programme.KindOf(basis->ids[j]);
       if (duals_[j] >= 0.0 || kind == Condition::Kind::Equality) continue;
       if (kind == Condition::Kind::Slab) {
         rows_[j] = Negated(rows_[j]);
@@ -159,7 +114,7 @@ bool Simplex::MakeDualFeasible(Programme const& programme, Row const& objective,
       // A half space on the wrong side makes way for the box row that keeps the basis regular.
       int const best = LargestComponent(inverse_[j]);
       basis->ids[j] = Basis::kBox + best;
-      rows_[j] = UnitRow(best);
+      rows_[j] = programme.RowOf(Basis::kBox + best);
       limits_[j] = programme.box;
       isChanged = true;
       break;
@@ -216,7 +171,7 @@ int Simplex::FindLeaving(Programme const& programme, Basis const& basis,
   double least = 0.0;
   for (std::size_t j = 0; j < 4; ++j) {
     if (!(step[j] > kLeastPivotShare * largest)) continue;
-    if (KindOf(programme, basis.ids[j]) == Condition::Kind::Equality) continue;
+    if (programme.KindOf(basis.ids[j]) == Condition::Kind::Equality) continue;
     double const ratio = duals_[j] / step[j];
     if (leaving < 0 || ratio < least ||
         (ratio == least && step[j] > step[static_cast<std::size_t>(leaving)])) {

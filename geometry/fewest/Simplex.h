@@ -5,44 +5,11 @@
 
 #include "geometry/fewest/Columns.h"
 #include "geometry/fewest/Inverse.h"
+#include "geometry/fewest/Programme.h"
 
 /// Linear programmes in the four coefficients of a circle, solved by the dual simplex method with
 /// an explicit inverse of the basis (Dantzig 1963; pricing by the largest violation).
 namespace Vorn::Fewest {
-
-/// A condition besides the tolerance rows.
-struct Condition {
-  Row row;
-  /// Slab: |row| <= limit. HalfSpace: row <= limit. Equality: row = limit, always kept.
-  enum class Kind : std::int8_t { Slab, HalfSpace, Equality } kind = Kind::Slab;
-  double limit = 0.0;
-};
-
-/// The rows that a circle has to obey: those of the points [first, last) and some more.
-struct Programme {
-  static constexpr int kMostConditions = 24;
-  /// Local coordinates are of the order of 1, so this box holds every circle down to a radius of
-  /// 1e-6; the smaller, the better the rounding.
-  static constexpr double kWidestBox = 1048576.0;
-
-  Columns const* columns = nullptr;
-  std::int32_t first = 0;
-  std::int32_t last = 0;
-  int conditionCount = 0;
-  /// Bounds every coefficient, so that the programme has an end where the points leave it without.
-  double box = kWidestBox;
-  std::array<Condition, kMostConditions> conditions;
-
-  /// Adds a condition; one too many is left out and answers false.
-  bool Add(Condition const& condition);
-};
-
-/// The four rows that hold a corner of the polytope. An id of 0 or more is the position of a point,
-/// -1 - k condition k, kBox + k the box around coefficient k.
-struct Basis {
-  static constexpr std::int32_t kBox = -1000;
-  std::array<std::int32_t, 4> ids{kBox, kBox + 1, kBox + 2, kBox + 3};
-};
 
 /// Solves one programme after another, each from the basis of the one before.
 class Simplex {
@@ -85,9 +52,6 @@ class Simplex {
 
   bool Load(Programme const& programme, Basis* basis);
   bool TakeEqualities(Programme const& programme, Basis* basis);
-  Row RowOf(Programme const& programme, std::int32_t id) const;
-  Condition::Kind KindOf(Programme const& programme, std::int32_t id) const;
-  double LimitOf(Programme const& programme, std::int32_t id) const;
   bool IsAccurate(double slack) const;
   bool MakeDualFeasible(Programme const& programme, Row const& objective, Basis* basis);
   void Solve();

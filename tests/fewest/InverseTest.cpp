@@ -15,7 +15,7 @@ using Testing::RandomGeometry;
 TEST(InvertRows, RefusesRowsThatDependOnEachOther) {
   std::array<Circle, 4> inverse;
   Row const row{1.0, 2.0, 3.0, 4.0};
-  std::array<Row, 4> const rows{row, {0.0, 1.0, 0.0, 0.0}, Scaled(row, -2.0), {0.0, 0.0, 0.0, 1.0}};
+  std::array<Row, 4> const rows{row, {0.0, 1.0, 0.0, 0.0}, Negated(row), {0.0, 0.0, 0.0, 1.0}};
   EXPECT_FALSE(InvertRows(rows, &inverse));
   double const nan = std::numeric_limits<double>::quiet_NaN();
   EXPECT_FALSE(InvertRows(

@@ -1,0 +1,172 @@
+#include "geometry/fewest/PieceRules.h"
+
+#include <algorithm>
+#include <cmath>
+#include <numbers>
+
+#include "geometry/fewest/Turn.h"
+
+namespace Vorn::Fewest {
+
+namespace {
+
+/// The row of the advance of a circle along a step from a place: the unit direction of travel times
+/// the step, which is negative where the circle runs against it.
+Row AdvanceRow(Place const& p, double dx, double dy) {
+  return {2.0 * (p.y * dx - p.x * dy), -dy, dx, 0.0};
+}
+
+/// A step back along the path that is shorter than this many times the sum of the tolerances of its
+/// points counts as noise: each point may be off by its tolerance in any direction, which accounts
+/// for 1, and neighbours of a reversal add the rest.
+constexpr double kNoiseStep = 1.65;
+
+/// A turn in radians below which a piece need not be looked at for a full one. Steps are at most 60
+/// degrees, whose sine is 0.83 of their angle.
+constexpr double kTurnToCount = 4.5;
+
+/// Share of a tolerance by which rounding may break a row.
+constexpr double kRoundingRoom = 1e-6;
+
+/// A gate this flat to a piece has no offset for a place along it.
+constexpr double kLeastSlope = 1e-3;
+
+/// How many points at either end of a piece may lie beyond its joint.
+constexpr std::int32_t kPointsNearJoint = 4;
+
+}  // namespace
+
+PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& ends) const {
+  double worst = 0.0;
+  double length = 0.0;
+  Condition broken;
+  for (std::int32_t i = ends.first + 1; i < ends.end; ++i) {
+    Sample const p = frame_.ToLocal(path_.At(i - 1));
+    Sample const q = frame_.ToLocal(path_.At(i));
+    Row const row = AdvanceRow(PlaceOf(p), q.x - p.x, q.y - p.y);
+    double const room = kNoiseStep * (p.w + q.w);
+    double const advance = Apply(row, circle);
+    length += advance;
+    double const excess = -advance - room * (1.0 + kRoundingRoom);
+    if (excess > worst) {
+      worst = excess;
+      broken = {Negated(row), Condition::Kind::HalfSpace, room};
+    }
+    double const gap2 = (q.x - p.x) * (q.x - p.x) + (q.y - p.y) * (q.y - p.y);
+    Check const step = AddBrokenStep(circle, gap2, p, PlaceOf(q));
+    if (step != Check::Holds) return step;
+  }
+  // An advance is the radius times the sine of a step, so this is the turn or less.
+  if (2.0 * std::fabs(circle.a) * length > kTurnToCount && IsFullTurn(circle, ends)) {
+    return Check::Hopeless;
+  }
+  if (!(worst > 0.0)) return Check::Holds;
+  return programme_->Add(broken) ? Check::Added : Check::Hopeless;
+}
+
+PieceRules::Check PieceRules::AddBrokenStep(Circle const& circle, double gap2, Sample const& p,
+                                            Place const& q) const {
+  double const limit = kStepShare * path_.limits.sineOfHalfStep;
+  // The feet of two points on the circle are as far apart as the points, divided by the distance of
+  // the nearer one from the centre in radii.
+  Place const here = GradientAt(circle, PlaceOf(p));
+  Place const there = GradientAt(circle, q);
+  double const near2 =
+      std::min(here.x * here.x + here.y * here.y, there.x * there.x + there.y * there.y);
+  if (circle.a * circle.a * gap2 <= limit * limit * near2 || gap2 <= p.w * p.w) {
+    return Check::Holds;
+  }
+  double const most = limit * std::sqrt(near2 / gap2);
+  if (!(most > 0.0)) return Check::Hopeless;
+  Condition const condition{{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Slab, most};
+  return programme_->Add(condition) ? Check::Added : Check::Hopeless;
+}
+
+bool PieceRules::IsFullTurn(Circle const& circle, Ends const& ends) const {
+  Turn turn(circle);
+  if (!ends.from->isFree) turn.Add(frame_.ToLocal(ends.from->gate.origin));
+  for (std::int32_t i = ends.first; i < ends.end; ++i)
+    turn.Add(PlaceOf(frame_.ToLocal(path_.At(i))));
+  if (ends.to != nullptr && !ends.to->isFree) turn.Add(frame_.ToLocal(ends.to->gate.origin));
+  // Both ends of an open path may be drawn back within the tolerances of its ends.
+  bool const isWhole = ends.from->isFree && ends.end == path_.Count();
+  double const w = share_ * std::min(path_.At(ends.first).w, path_.At(ends.end - 1).w);
+  double const room = (isWhole ? 0.5 : -4.0) * w * frame_.scale * 2.0 * std::fabs(circle.a);
+  return turn.Angle() > 2.0 * std::numbers::pi + room;
+}
+
+PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const& opening,
+                                             std::int32_t point) const {
+  Sample const sample = frame_.ToLocal(path_.At(point));
+  Place const p = PlaceOf(sample);
+  Gate gate = opening.gate;
+  gate.origin = frame_.ToLocal(gate.origin);
+  double const sense = point >= gate.split ? 1.0 : -1.0;
+  bool const isFixed = opening.low == opening.high;
+  double offset = opening.low * frame_.scale;
+  if (!isFixed && !FindCrossing(circle, gate, &offset)) return Check::Hopeless;
+  Place const joint = PlaceOn(gate, offset);
+  double const dx = p.x - joint.x;
+  double const dy = p.y - joint.y;
+  double const room = share_ * sample.w;
+  double const gap2 = dx * dx + dy * dy;
+  if (point == (sense > 0.0 ? gate.split : gate.split - 1)) {
+    Check const step = AddBrokenStep(circle, gap2, sample, p);
+    if (step != Check::Holds) return step;
+  }
+  // From a quarter turn on the direction at the point says nothing about its order.
+  if (2.0 * circle.a * circle.a * gap2 > 1.0) return Check::Holds;
+  Row const advance = AdvanceRow(p, sense * dx, sense * dy);
+  if (Apply(advance, circle) >= -kRoundingRoom * sample.w ||
+      gap2 <= room * room * (1.0 + kRoundingRoom)) {
+    return Check::Holds;
+  }
+  if (isFixed) {
+    Condition const condition{Negated(advance), Condition::Kind::HalfSpace, 0.0};
+    return programme_->Add(condition) ? Check::Added : Check::Hopeless;
+  }
+  // The offsets for which the point lies beside the piece end at a limit; those within tolerance of
+  // the point may go beyond.
+  Place const normal = GradientAt(circle, p);
+  double const fromOriginX = p.x - gate.origin.x;
+  double const fromOriginY = p.y - gate.origin.y;
+  double const slope = normal.y * gate.across.x - normal.x * gate.across.y;
+  double const foot = fromOriginX * gate.across.x + fromOriginY * gate.across.y;
+  double const apart = fromOriginX * gate.across.y - fromOriginY * gate.across.x;
+  double const reach = room * room - apart * apart;
+  double const half = reach > 0.0 ? std::sqrt(reach) : -1.0;
+  bool const hasLimit = std::fabs(slope) > kLeastSlope;
+  double limit = hasLimit ? (normal.y * fromOriginX - normal.x * fromOriginY) / slope : foot;
+  bool const isUpper = offset > limit;
+  if (std::fabs(limit - foot) <= half) {
+    limit = isUpper ? foot + half : foot - half;
+  } else if (!hasLimit) {
+    return Check::Hopeless;
+  }
+  Row const value = ValueRow(PlaceOn(gate, limit));
+  Condition const condition{isUpper ? Negated(value) : value, Condition::Kind::HalfSpace, 0.0};
+  return programme_->Add(condition) ? Check::Added : Check::Hopeless;
+}
+
+PieceRules::Check PieceRules::AddBroken(Circle const& circle, Ends const& ends) const {
+  Check const order = AddBrokenOrder(circle, ends);
+  if (order != Check::Holds || ends.first >= ends.end) return order;
+  if (!ends.from->isFree) {
+    std::int32_t const last =
+        std::min(ends.end, ends.first + kPointsNearJoint * StrideFrom(path_, ends.first));
+    for (std::int32_t i = ends.first; i < last; ++i) {
+      Check const start = AddBrokenJoint(circle, *ends.from, i);
+      if (start != Check::Holds) return start;
+    }
+  }
+  if (ends.to == nullptr || ends.to->isFree) return Check::Holds;
+  std::int32_t const stride = StrideFrom(path_, std::max(ends.first, ends.end - kPointsNearJoint));
+  std::int32_t const last = std::max(ends.first, ends.end - kPointsNearJoint * stride);
+  for (std::int32_t i = ends.end; i-- > last;) {
+    Check const end = AddBrokenJoint(circle, *ends.to, i);
+    if (end != Check::Holds) return end;
+  }
+  return Check::Holds;
+}
+
+}  // namespace Vorn::Fewest
