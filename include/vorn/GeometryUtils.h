@@ -39,6 +39,9 @@ namespace Vorn {
 /// - Bad geometry never throws and never logs; the only exception that leaves is std::bad_alloc
 ///   from a growing vector (and what the caller's own ExecutionState throws).
 /// - There is no state: members may be called from several threads at once on distinct outputs.
+/// - Rounding to nearest is assumed. Under another mode, or with denormals flushed to zero, every
+///   operation still ends with an answer of the right form, but with other digits, which may miss
+///   what is promised by as much as rounding does; the modes stay as they are.
 /// - A not-a-number is not looked for; it runs through the arithmetic. Every loop ends on any
 ///   input, and nothing outside the given arrays is read.
 class VORN_EXPORT GeometryUtils {
