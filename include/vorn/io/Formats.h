@@ -45,6 +45,8 @@ struct WriteOptions {
 
 /// The contour as the text of a file. Pieces without length are left out, see
 /// RemovePiecesWithoutLength.
+/// @throws std::bad_alloc when memory runs out, but not with JSON: the JSON library takes memory to
+///         free a document, and ends the program where it gets none. The same holds for reading.
 /// @throws Failure (FailureKind::BadArgument) for the format of a drawing, when no piece has a
 ///         length, or when the format cannot say what the contour needs.
 VORN_IO_EXPORT std::string ToText(ContourFile const& contour, Format format,

@@ -38,9 +38,10 @@ TEST_P(FormatWithoutMemory, ThrowsFromWriterAndReader) {
   EXPECT_EQ(back.pieces.back().end.x, 6.0);
 }
 
+// JSON is not among them: the JSON library takes memory to free a document, and ends the program
+// where it gets none.
 INSTANTIATE_TEST_SUITE_P(Formats, FormatWithoutMemory,
-                         testing::Values(Format::Json, Format::Csv, Format::Dxf, Format::GCode,
-                                         Format::Wkt),
+                         testing::Values(Format::Csv, Format::Dxf, Format::GCode, Format::Wkt),
                          [](auto const& named) { return NameOf(named.param); });
 
 TEST(PointsWithoutMemory, Throw) {
