@@ -16,10 +16,11 @@ from vorn.contour import Contour, Nearest
 from vorn.errors import (ContourError, ErrorCode, FileError, NoFitError, PointsTooCloseError,
                          SelfIntersectionError)
 from vorn.fitting import fit, read_points
+from vorn.many import FitResult, fit_many
 from vorn.pieces import Arc, Line, Piece
 
-__all__ = ["Arc", "Contour", "ContourError", "ErrorCode", "FileError", "Line", "Nearest",
-           "NoFitError", "Piece", "PointsTooCloseError", "SelfIntersectionError", "fit",
-           "read_points"]
+__all__ = ["Arc", "Contour", "ContourError", "ErrorCode", "FileError", "FitResult", "Line",
+           "Nearest", "NoFitError", "Piece", "PointsTooCloseError", "SelfIntersectionError", "fit",
+           "fit_many", "read_points"]
 
 __version__ = "0.1.0"
