@@ -18,9 +18,10 @@ from vorn.errors import (ContourError, ErrorCode, FileError, NoFitError, PointsT
 from vorn.fitting import fit, read_points
 from vorn.many import FitResult, fit_many
 from vorn.pieces import Arc, Line, Piece
+from vorn.plotting import plot
 
 __all__ = ["Arc", "Contour", "ContourError", "ErrorCode", "FileError", "FitResult", "Line",
            "Nearest", "NoFitError", "Piece", "PointsTooCloseError", "SelfIntersectionError", "fit",
-           "fit_many", "read_points"]
+           "fit_many", "plot", "read_points"]
 
 __version__ = "0.1.0"
