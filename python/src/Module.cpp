@@ -26,6 +26,7 @@ void BindGeometry(pybind11::module_ module) {
 PYBIND11_MODULE(_core, module) {
   using namespace Vorn::Python;
   module.doc() = "The compiled part of vorn. Use the package, not this module.";
+  module.attr("__version__") = VORN_VERSION;
   RegisterErrors();
   RegisterPieceRow();
   BindFit(module);

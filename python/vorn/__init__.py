@@ -12,6 +12,7 @@ values that measures points, draws itself and knows the usual file formats. `vor
 operations below, one by one.
 """
 
+from vorn._core import __version__
 from vorn.contour import Contour, Nearest
 from vorn.errors import (ContourError, ErrorCode, FileError, NoFitError, PointsTooCloseError,
                          SelfIntersectionError)
@@ -21,7 +22,5 @@ from vorn.pieces import Arc, Line, Piece
 from vorn.plotting import plot
 
 __all__ = ["Arc", "Contour", "ContourError", "ErrorCode", "FileError", "FitResult", "Line",
-           "Nearest", "NoFitError", "Piece", "PointsTooCloseError", "SelfIntersectionError", "fit",
-           "fit_many", "plot", "read_points"]
-
-__version__ = "0.1.0"
+           "Nearest", "NoFitError", "Piece", "PointsTooCloseError", "SelfIntersectionError",
+           "__version__", "fit", "fit_many", "plot", "read_points"]

@@ -9,6 +9,8 @@ _Rows = npt.NDArray[np.void]
 _Floats = npt.NDArray[np.float64]
 _Place = Tuple[float, float]
 
+__version__: str
+
 class Drawing:
     title: str
     facts: List[str]
