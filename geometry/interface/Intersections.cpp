@@ -29,12 +29,6 @@ int Write(CirclePoints const& found, double* ax, double* ay, double* bx, double*
   return found.count;
 }
 
-/// An arc of which the end is not known and not needed.
-GeometryUtils::Arc ArcAround(double cx, double cy, double r, double d, double startAngle,
-                             double endAngle) {
-  return {{}, {cx, cy}, r, d, startAngle, endAngle};
-}
-
 }  // namespace
 
 SegmentsRelPosition GeometryUtils::GetLinesIntersection(double a1, double b1, double c1, double a2,
@@ -58,14 +52,13 @@ SegmentsRelPosition GeometryUtils::GetLineSegmentsIntersection(double x1, double
                                                                double y2, double x3, double y3,
                                                                double x4, double y4, double* x,
                                                                double* y) {
-  Point common;
-  SegmentsRelPosition const relation =
-      Intersections::IntersectSegments({{{x1, y1}, {x2, y2}}, {{x3, y3}, {x4, y4}}}, &common);
-  if (relation == SegmentsRelPosition::Intersecting || relation == SegmentsRelPosition::Collinear) {
-    *x = common.x;
-    *y = common.y;
+  Intersections::Meeting const meeting =
+      Intersections::Intersect({{{x1, y1}, {x2, y2}}, {{x3, y3}, {x4, y4}}});
+  if (meeting.HasCommon()) {
+    *x = meeting.common.x;
+    *y = meeting.common.y;
   }
-  return relation;
+  return meeting.relation;
 }
 
 int GeometryUtils::GetLineSegmentAndCircleIntersection(double x1, double y1, double x2, double y2,
@@ -87,7 +80,7 @@ int GeometryUtils::GetLineSegmentAndCircleArcIntersection(double x1, double y1, 
                                                           double endAngle, double* ax, double* ay,
                                                           double* bx, double* by) {
   std::optional<CirclePoints> const found = Intersections::CutArcBySegment(
-      ArcAround(cx, cy, r, d, startAngle, endAngle), {{x1, y1}, {x2, y2}});
+      {{{cx, cy}, r}, {d, startAngle, endAngle}}, {{x1, y1}, {x2, y2}});
   return found ? Write(*found, ax, ay, bx, by) : kInvalidArc;
 }
 
@@ -98,8 +91,8 @@ int GeometryUtils::GetCircleArcAndCircleArcIntersection(double cx1, double cy1, 
                                                         double endAngle2, double* ax, double* ay,
                                                         double* bx, double* by) {
   std::optional<CirclePoints> const found =
-      Intersections::CutArcByArc(ArcAround(cx1, cy1, r1, d1, startAngle1, endAngle1),
-                                 ArcAround(cx2, cy2, r2, d2, startAngle2, endAngle2));
+      Intersections::CutArcByArc({{{cx1, cy1}, r1}, {d1, startAngle1, endAngle1}},
+                                 {{{cx2, cy2}, r2}, {d2, startAngle2, endAngle2}});
   return found ? Write(*found, ax, ay, bx, by) : kInvalidArc;
 }
 

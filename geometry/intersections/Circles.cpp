@@ -1,5 +1,3 @@
-// Notation: D the direction of the segment, F its start seen from the centre, t the parameter along
-// it; the points on the circle solve A t^2 + B t + C = 0.
 #include "geometry/intersections/Circles.h"
 
 #include <cmath>
@@ -32,30 +30,6 @@ Segment StretchAround(ImplicitLine const& line, Point const& foot, double reach)
 }
 
 }  // namespace
-
-CirclePoints CutCircleBySegment(Circle const& circle, Segment const& segment) {
-  Point const& start = segment.start;
-  Point const& end = segment.end;
-  double const dx = end.x - start.x;
-  double const dy = end.y - start.y;
-  double const fx = start.x - circle.centre.x;
-  double const fy = start.y - circle.centre.y;
-  double const a = dx * dx + dy * dy;
-  double const b = 2.0 * (dx * fx + dy * fy);
-  double const c = fx * fx + fy * fy - circle.radius * circle.radius;
-  double const disc = b * b - 4.0 * a * c;
-  CirclePoints found;
-  if (disc < 0.0) return found;
-
-  auto const takeIfOnSegment = [&](double t) {
-    // A zero-length segment makes t infinite or a NaN, which is outside.
-    if (0.0 <= t && t <= 1.0) found.Add({start.x + t * dx, start.y + t * dy});
-  };
-  double const root = std::sqrt(disc);
-  takeIfOnSegment((root - b) / (2.0 * a));
-  if (disc > Numeric::kTangency) takeIfOnSegment((-b - root) / (2.0 * a));
-  return found;
-}
 
 CirclePoints CutCircleByLine(Circle const& circle, ImplicitLine const& line) {
   std::optional<double> const distance = Elementary::Deviation(line, circle.centre);

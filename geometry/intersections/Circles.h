@@ -1,13 +1,16 @@
-// A segment, a line or a point against a full circle.
+// A segment, a line or a point against a full circle. What the public members call with loose
+// numbers is inline, so that the numbers need not go through memory.
 
 #pragma once
 
+#include <cmath>
 #include <optional>
 
 #include "geometry/elementary/ImplicitLine.h"
 #include "geometry/elementary/Points.h"
 #include "geometry/elementary/Shapes.h"
 #include "math/Assert.h"
+#include "math/NumericConstants.h"
 
 namespace Vorn::Intersections {
 
@@ -32,7 +35,32 @@ struct CirclePoints {
 /// Where a segment, ends included, cuts a circle: of two points the one nearer to its end first.
 /// One point when the line is tangent to the circle (the discriminant is not above one double
 /// epsilon), none for a segment of zero length.
-CirclePoints CutCircleBySegment(Circle const& circle, Segment const& segment);
+///
+/// Notation: D the direction of the segment, F its start seen from the centre, t the parameter
+/// along it; the points on the circle solve A t^2 + B t + C = 0.
+inline CirclePoints CutCircleBySegment(Circle const& circle, Segment const& segment) {
+  Point const& start = segment.start;
+  Point const& end = segment.end;
+  double const dx = end.x - start.x;
+  double const dy = end.y - start.y;
+  double const fx = start.x - circle.centre.x;
+  double const fy = start.y - circle.centre.y;
+  double const a = dx * dx + dy * dy;
+  double const b = 2.0 * (dx * fx + dy * fy);
+  double const c = fx * fx + fy * fy - circle.radius * circle.radius;
+  double const disc = b * b - 4.0 * a * c;
+  CirclePoints found;
+  if (disc < 0.0) return found;
+
+  auto const takeIfOnSegment = [&](double t) {
+    // A zero-length segment makes t infinite or a NaN, which is outside.
+    if (0.0 <= t && t <= 1.0) found.Add({start.x + t * dx, start.y + t * dy});
+  };
+  double const root = std::sqrt(disc);
+  takeIfOnSegment((root - b) / (2.0 * a));
+  if (disc > Numeric::kTangency) takeIfOnSegment((-b - root) / (2.0 * a));
+  return found;
+}
 
 /// Where a line cuts a circle: of two points first the one with the lesser x, or the lesser y when
 /// |a| > |b|. None when the line is degenerate or farther from the centre than the radius.

@@ -77,30 +77,47 @@ inline bool AreParametersInRange(double s, double u, double det) {
   return det <= s && s <= 0.0 && det <= u && u <= 0.0;
 }
 
-/// How two segments lie whose determinant counts as zero: parallel ones and those of no length.
-/// `common` as in IntersectSegments.
-SegmentsRelPosition IntersectParallel(SegmentPair const& pair, Point* common);
+/// How two segments lie to each other.
+struct Meeting {
+  SegmentsRelPosition relation = SegmentsRelPosition::Disjoint;
+  /// The common point for Intersecting, the middle of the common part for Collinear.
+  Point common;
 
-/// How two segments lie to each other, ends included. `common` receives the common point for
-/// Intersecting and the middle of the common part for Collinear; otherwise it stays. See
+  /// Whether `common` says something.
+  bool HasCommon() const {
+    return relation == SegmentsRelPosition::Intersecting ||
+           relation == SegmentsRelPosition::Collinear;
+  }
+};
+
+/// How two segments lie whose determinant counts as zero: parallel ones and those of no length.
+Meeting IntersectParallel(SegmentPair const& pair);
+
+/// How two segments lie to each other, ends included. See
 /// GeometryUtils::GetLineSegmentsIntersection for what counts as parallel.
-inline SegmentsRelPosition IntersectSegments(SegmentPair const& pair, Point* common) {
-  if (pair.AreBoxesApart()) return SegmentsRelPosition::Disjoint;
+inline Meeting Intersect(SegmentPair const& pair) {
+  if (pair.AreBoxesApart()) return {};
   double const det = pair.Determinant();
-  if (!(std::fabs(det) > Numeric::kZero)) return IntersectParallel(pair, common);
+  if (!(std::fabs(det) > Numeric::kZero)) return IntersectParallel(pair);
   double const s = pair.ScaledParameter1();
   double const u = pair.ScaledParameter2();
-  if (!AreParametersInRange(s, u, det)) return SegmentsRelPosition::Disjoint;
+  if (!AreParametersInRange(s, u, det)) return {};
   // Products before the division: a crossing at an end point gives that end point exactly.
-  common->x = pair.x1 + s * pair.dx1 / det;
-  common->y = pair.y1 + s * pair.dy1 / det;
-  return SegmentsRelPosition::Intersecting;
+  return {SegmentsRelPosition::Intersecting,
+          {pair.x1 + s * pair.dx1 / det, pair.y1 + s * pair.dy1 / det}};
+}
+
+/// The same for two segments. `common` receives the common point, if there is one; otherwise it
+/// stays.
+inline SegmentsRelPosition IntersectSegments(SegmentPair const& pair, Point* common) {
+  Meeting const meeting = Intersect(pair);
+  if (meeting.HasCommon()) *common = meeting.common;
+  return meeting.relation;
 }
 
 /// Whether two segments have exactly one common point, as IntersectSegments tells it.
 inline bool HaveOneCommonPoint(Segment const& first, Segment const& second) {
-  Point common;
-  return IntersectSegments({first, second}, &common) == SegmentsRelPosition::Intersecting;
+  return Intersect({first, second}).relation == SegmentsRelPosition::Intersecting;
 }
 
 }  // namespace Vorn::Intersections
