@@ -4,6 +4,7 @@
 #include <new>
 #include <ostream>
 
+#include "cli/base/Advice.h"
 #include "cli/commands/AreaCommand.h"
 #include "cli/commands/CheckCommand.h"
 #include "cli/commands/Command.h"
@@ -62,7 +63,7 @@ ExitCode RunProgram(int argc, char const* const* argv, std::istream& in, std::os
   try {
     return Dispatch(argc, argv, {in, out, err});
   } catch (Failure const& failure) {
-    err << "contour: " << failure.what() << '\n';
+    err << "contour: " << WithAdvice(failure) << '\n';
     return ExitCodeOf(failure.Kind());
   } catch (std::bad_alloc const&) {
     err << "contour: the memory does not suffice\n";

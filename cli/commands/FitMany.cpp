@@ -14,6 +14,7 @@
 #include <ostream>
 #include <utility>
 
+#include "cli/base/Advice.h"
 #include "cli/commands/Outputs.h"
 #include "cli/texts/Relative.h"
 #include "vorn/io/Messages.h"
@@ -98,7 +99,7 @@ Outcome Guarded(std::string const& path, Step const& step) {
   try {
     return step();
   } catch (Failure const& failure) {
-    return Failed(path, ExitCodeOf(failure.Kind()), failure.what());
+    return Failed(path, ExitCodeOf(failure.Kind()), WithAdvice(failure));
   } catch (std::exception const& error) {
     return Failed(path, ExitCode::Internal, path + ": internal error: " + error.what());
   }

@@ -19,11 +19,12 @@ std::string Prefix(Place const& place) {
 
 Failure::Failure(FailureKind kind, std::string const& message) : Failure(kind, Place{}, message) {}
 
-Failure::Failure(FailureKind kind, Place place, std::string const& message)
+Failure::Failure(FailureKind kind, Place place, std::string const& message, Remedy help)
     : std::runtime_error(Prefix(place) + message),
       kind_(kind),
       place_(std::move(place)),
-      message_(message) {}
+      message_(message),
+      help_(help) {}
 
 Failure::~Failure() = default;
 

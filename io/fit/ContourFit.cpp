@@ -37,8 +37,8 @@ FitReport FitOpen(PointFile file, std::string toleranceSource, Closure const& cl
                   FitChoice const& choice, ExecutionState* progress) {
   if (choice.start) {
     throw Failure(FailureKind::BadArgument, {file.path},
-                  "--start is for closed contours, and this one is open (" + closure.reason +
-                      "); --closed yes closes it");
+                  "a start is for closed contours, and this one is open (" + closure.reason + ")",
+                  Remedy::CloseContour);
   }
   FitAnswer answer = Fit(file.points, choice.strategy, progress);
   if (answer.code == ErrorCode::PointsTooClose) {
@@ -58,8 +58,7 @@ std::optional<std::size_t> SeamOf(PointFile const& file, Closure const& closure,
   if (!choice.start) return SharpestCorner(file.points, closure);
   if (*choice.start >= file.points.size()) {
     throw Failure(FailureKind::BadArgument, {file.path},
-                  "--start " + std::to_string(*choice.start) +
-                      ": the points are counted from 0 to " +
+                  "start " + std::to_string(*choice.start) + ": the points are counted from 0 to " +
                       std::to_string(file.points.size() - 1));
   }
   return *choice.start;

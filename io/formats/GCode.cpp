@@ -37,8 +37,8 @@ void WriteUnits(ContourFile const& contour, ToolPath* tool) {
     tool->Line("(units not known: neither G20 nor G21)");
   } else {
     throw Failure(FailureKind::BadArgument, {contour.path},
-                  "G-code is in mm or inch, and the contour is in " + Quoted(contour.units) +
-                      "; see --units");
+                  "G-code is in mm or inch, and the contour is in " + Quoted(contour.units),
+                  Remedy::ChooseUnits);
   }
 }
 

@@ -73,9 +73,9 @@ void CsvColumns::TakeFirstLine(Fields const& fields, CsvPlace const& place) {
   if (choice_.IsGiven()) {
     ChooseGiven(fields, place);
   } else if (count_ > 3) {
-    place.RefuseAt(fields[3], std::to_string(count_) +
-                                  " columns without a header; expected x,y or x,y,w, or the "
-                                  "numbers of the columns to take");
+    place.RefuseAt(fields[3],
+                   std::to_string(count_) + " columns without a header; expected x,y or x,y,w",
+                   Remedy::ChooseColumns);
   }
   bool const isThird =
       !choice_.IsGiven() && count_ == 3 && !fields[2].empty() && LowerCase(wanted_.name) == "w";
@@ -101,9 +101,10 @@ void CsvColumns::ChooseByName(Fields const& fields, CsvPlace const& place) {
   std::optional<PointColumns> const columns =
       FindPointColumns(names, tolerance_ ? tolerance_ : FindName("w"));
   if (!columns) {
-    place.RefuseAt(fields.front(),
-                   "cannot tell which two columns hold the points: the header has " +
-                       NamesIn(fields) + "; say which ones to take");
+    place.RefuseAt(
+        fields.front(),
+        "cannot tell which two columns hold the points: the header has " + NamesIn(fields),
+        Remedy::ChooseColumns);
   }
   x_ = columns->x;
   y_ = columns->y;

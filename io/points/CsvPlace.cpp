@@ -2,7 +2,6 @@
 
 #include <algorithm>
 
-#include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Messages.h"
 
@@ -31,10 +30,10 @@ void CsvPlace::RefuseLine(std::string const& message) const {
   throw Failure(FailureKind::File, {path_, line_}, message);
 }
 
-void CsvPlace::RefuseAt(std::string_view field, std::string const& message) const {
+void CsvPlace::RefuseAt(std::string_view field, std::string const& message, Remedy help) const {
   auto const begin = static_cast<std::size_t>(field.data() - lineText_.data());
   std::size_t const column = 1 + CountCharacters(lineText_.substr(0, begin));
-  throw Failure(FailureKind::File, {path_, line_, column}, message);
+  throw Failure(FailureKind::File, {path_, line_, column}, message, help);
 }
 
 }  // namespace Vorn::IO

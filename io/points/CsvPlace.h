@@ -4,6 +4,8 @@
 #include <string>
 #include <string_view>
 
+#include "vorn/io/Failure.h"
+
 namespace Vorn::IO {
 
 /// Where a reader of points is in its file, and how it refuses what it finds there.
@@ -31,7 +33,8 @@ class CsvPlace {
   [[noreturn]] void RefuseLine(std::string const& message) const;
 
   /// Says something of a part of the current line.
-  [[noreturn]] void RefuseAt(std::string_view field, std::string const& message) const;
+  [[noreturn]] void RefuseAt(std::string_view field, std::string const& message,
+                             Remedy help = Remedy::None) const;
 
  private:
   std::string path_;

@@ -85,10 +85,9 @@ std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, boo
     AssignOne(*file->tolerance, file);
     return "comment in the file";
   }
-  throw Failure(FailureKind::BadArgument,
-                "no tolerance: give --tolerance T, --tolerance-column NAME or "
-                "--tolerance-per-point CAP (" +
-                    file->path + " has no column 'w' and no comment '# tolerance T')");
+  throw Failure(FailureKind::BadArgument, {},
+                "no tolerance: " + file->path + " has no column 'w' and no comment '# tolerance T'",
+                Remedy::GiveTolerance);
 }
 
 std::string OptionsFor(ToleranceChoice const& choice) {

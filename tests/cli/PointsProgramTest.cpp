@@ -16,8 +16,8 @@ TEST_F(Program, MessagesNameFileLineAndColumn) {
   ExpectRefusal("info truncated.csv", 3, "truncated.csv:3:3: y is missing");
   ExpectRefusal("info binary.csv", 3, "binary.csv: is not text: byte 1 is zero");
   ExpectRefusal("info wide.csv", 3,
-                "wide.csv:1:7: 1000000 columns without a header; expected x,y or x,y,w, or "
-                "--columns with the numbers of those to take");
+                "wide.csv:1:7: 1000000 columns without a header; expected x,y or x,y,w; say it "
+                "with --columns X,Y");
 }
 
 TEST_F(Program, ClosePointsAreSeenDroppedFittedAndChecked) {

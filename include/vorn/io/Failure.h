@@ -17,6 +17,15 @@ enum class FailureKind {
   Internal,        ///< a defect of this library
 };
 
+/// What would help, for a program that tells its user how to say it.
+enum class Remedy {
+  None,           ///< nothing but another input
+  ChooseColumns,  ///< saying which columns hold the points
+  ChooseUnits,    ///< saying in which unit the coordinates are
+  GiveTolerance,  ///< a tolerance, or a column with one for each point
+  CloseContour,   ///< saying that the contour is closed
+};
+
 /// Where something is wrong.
 struct Place {
   std::string file;        ///< as messages call it: its path, or "standard input"
@@ -31,8 +40,8 @@ class VORN_IO_EXPORT Failure : public std::runtime_error {
   /// About no file.
   Failure(FailureKind kind, std::string const& message);
 
-  /// About a file, one of its lines or a place in a line.
-  Failure(FailureKind kind, Place place, std::string const& message);
+  /// About a file, one of its lines or a place in a line, with what would help.
+  Failure(FailureKind kind, Place place, std::string const& message, Remedy help = Remedy::None);
 
   /// Failures are copied when they are thrown and caught.
   Failure(Failure const&) = default;
@@ -50,10 +59,14 @@ class VORN_IO_EXPORT Failure : public std::runtime_error {
   /// what() without the place.
   std::string const& Message() const { return message_; }
 
+  /// What would help.
+  Remedy Help() const { return help_; }
+
  private:
   FailureKind kind_;     ///< what went wrong
   Place place_;          ///< where
   std::string message_;  ///< without the place
+  Remedy help_;          ///< what would help
 };
 
 }  // namespace Vorn::IO

@@ -187,12 +187,11 @@ TEST(FitContour, StartMustBeAPointOfAClosedContour) {
   };
   FitChoice choice = Same(0.01);
   choice.start = 100;
-  EXPECT_EQ(refusal(choice), "part.csv: --start 100: the points are counted from 0 to 99");
+  EXPECT_EQ(refusal(choice), "part.csv: start 100: the points are counted from 0 to 99");
   choice.start = 3;
   choice.closed = ClosedChoice::No;
   EXPECT_EQ(refusal(choice),
-            "part.csv: --start is for closed contours, and this one is open (given by --closed); "
-            "--closed yes closes it");
+            "part.csv: a start is for closed contours, and this one is open (given by --closed)");
 }
 
 TEST(FitContour, ClosedNeedsThreePoints) {

@@ -56,7 +56,7 @@ TEST(ToGCode, UnitsChooseTheWordAndTheDigits) {
             "G20\nG17 G90 G91.1\nG0 X0.00000 Y0.00000\nG1 X1.00000 Y0.00000\nM2\n");
   EXPECT_TRUE(ToGCode(Of(line, "")).starts_with("(units not known: neither G20 nor G21)\n"));
   EXPECT_EQ(Refusal([&] { ToGCode(Of(line, "m")); }, FailureKind::BadArgument),
-            "p.json: G-code is in mm or inch, and the contour is in 'm'; see --units");
+            "p.json: G-code is in mm or inch, and the contour is in 'm'");
 }
 
 TEST(ToGCode, FeedStandsOnTheFirstCut) {

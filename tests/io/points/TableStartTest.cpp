@@ -60,7 +60,7 @@ std::string Complaint(std::string const& text) {
 TEST(CsvReader, RefusesColumnsThatCannotBeTold) {
   EXPECT_EQ(Complaint("Nr,A,B,C\n1,2,3,4\n2,3,4,5\n"),
             "p.csv:1:1: cannot tell which two columns hold the points: the header has 'Nr', 'A', "
-            "'B', 'C'; say it with --columns X,Y");
+            "'B', 'C'");
   EXPECT_EQ(Complaint("X [mm],Z [\xC2\xB5m]\n1,2\n3,4\n"),
             "p.csv:1:1: one coordinate is in 'mm', the other in '\xC2\xB5m': a contour needs one "
             "unit");
