@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "geometry/fewest/LocalFrame.h"
 #include "geometry/fewest/Turn.h"
 
 namespace Vorn::Fewest {
@@ -68,7 +69,10 @@ BuiltPiece BuildArc(Point const& start, Point const& end, Point const& centre, d
   arc.type = GeometryUtils::ElemType::Arc;
   arc.end = end;
   arc.center = centre;
-  arc.radius = Length(Minus(start, centre));
+  Point const radial = Minus(start, centre);
+  // Scaled, since the squares of very small or very large lengths are no doubles.
+  double const scale = ScaleOf(std::max(std::fabs(radial.x), std::fabs(radial.y)));
+  arc.radius = Length({radial.x * scale, radial.y * scale}) / scale;
   arc.direction = direction;
   arc.startAngle = std::atan2(start.y - centre.y, start.x - centre.x);
   arc.endAngle = std::atan2(end.y - centre.y, end.x - centre.x);

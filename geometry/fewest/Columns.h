@@ -22,6 +22,11 @@ inline double Apply(Row const& r, Circle const& c) {
   return r.a * c.a + r.bx * c.bx + r.by * c.by + r.d * c.d;
 }
 
+/// The row times a factor above 0.
+inline Row Weighted(Row const& r, double factor) {
+  return {r.a * factor, r.bx * factor, r.by * factor, r.d * factor};
+}
+
 /// The row with the opposite signs.
 inline Row Negated(Row const& r) { return {-r.a, -r.bx, -r.by, -r.d}; }
 

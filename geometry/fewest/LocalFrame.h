@@ -42,12 +42,17 @@ struct LocalFrame {
   }
 };
 
-/// The power of two by which a length has to be multiplied to lie in [0.5, 1); 1 for a length of 0.
+/// The largest factor that lengths are scaled by: a hundredth of the range of doubles is left to
+/// the squares of coordinates.
+inline constexpr double kLargestScale = 0x1p1000;
+
+/// The power of two by which a length has to be multiplied to lie in [0.5, 1), up to
+/// kLargestScale; 1 for a length of 0.
 inline double ScaleOf(double length) {
   if (!(length > 0.0)) return 1.0;
   int exponent = 0;
   std::frexp(length, &exponent);
-  return std::ldexp(1.0, -exponent);
+  return std::fmin(kLargestScale, std::ldexp(1.0, -exponent));
 }
 
 /// Moves a whole path near the origin and to a size of about 1.
@@ -85,15 +90,13 @@ inline double ExtentOf(std::span<WPoint const> points) {
 
 /// The shift of the first point to the origin.
 inline Shift ShiftFor(std::span<WPoint const> points) {
-  // A hundredth of the range of doubles at either end is left to the squares of coordinates.
-  constexpr double kLargestScale = 0x1p1000;
   Shift shift{points.front().x, points.front().y, 1.0};
   double extent = 0.0;
   for (WPoint const& p : points) {
     extent = std::fmax(extent, std::fabs(0.5 * p.x - 0.5 * shift.originX));
     extent = std::fmax(extent, std::fabs(0.5 * p.y - 0.5 * shift.originY));
   }
-  shift.scale = std::fmin(kLargestScale, 0.5 * ScaleOf(extent));
+  shift.scale = 0.5 * ScaleOf(extent);
   return shift;
 }
 

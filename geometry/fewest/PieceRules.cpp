@@ -143,7 +143,8 @@ PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const
   } else if (!hasLimit) {
     return Check::Hopeless;
   }
-  Row const value = ValueRow(PlaceOn(gate, limit));
+  double const weight = 1.0 / (path_.leastTolerance * frame_.scale);
+  Row const value = Weighted(ValueRow(PlaceOn(gate, limit)), weight);
   Condition const condition{isUpper ? Negated(value) : value, Condition::Kind::HalfSpace, 0.0};
   return programme_->Add(condition) ? Check::Added : Check::Hopeless;
 }

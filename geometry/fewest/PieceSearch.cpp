@@ -64,14 +64,17 @@ void PieceSearch::Cover(std::int32_t first, std::int32_t last) {
 
 void PieceSearch::AddOpening(Opening const& opening) {
   if (opening.isFree) return;
-  Place const low = frame_.ToLocal(PlaceOn(opening.gate, opening.low));
+  // In units of the least tolerance, as the rows of the points are in units of theirs: the slack of
+  // the programme is a share of these units.
+  double const weight = 1.0 / (path_.leastTolerance * frame_.scale);
+  Row const low = Weighted(ValueRow(frame_.ToLocal(PlaceOn(opening.gate, opening.low))), weight);
   if (opening.low == opening.high) {
-    programme_.Add({ValueRow(low), Condition::Kind::Equality, 0.0});
+    programme_.Add({low, Condition::Kind::Equality, 0.0});
     return;
   }
-  Place const high = frame_.ToLocal(PlaceOn(opening.gate, opening.high));
-  programme_.Add({ValueRow(low), Condition::Kind::HalfSpace, 0.0});
-  programme_.Add({Negated(ValueRow(high)), Condition::Kind::HalfSpace, 0.0});
+  Row const high = Weighted(ValueRow(frame_.ToLocal(PlaceOn(opening.gate, opening.high))), weight);
+  programme_.Add({low, Condition::Kind::HalfSpace, 0.0});
+  programme_.Add({Negated(high), Condition::Kind::HalfSpace, 0.0});
 }
 
 void PieceSearch::LimitCurvature(Opening const& from, std::int32_t end) {

@@ -171,6 +171,32 @@ TEST(FewestPiecesFit, GivesTheSameBitsOnEveryCall) {
 
 // --- Options -------------------------------------------------------------------------------------
 
+TEST(FewestPiecesFit, AFullCircleComesAsTwoArcs) {
+  Scan scan = MakeRepeatedCircle(6104, 1.0, 10.0, 361, 0.01, 0.45);
+  scan.pop_back();
+  FewestResult const result = FitKept(scan, Closed());
+  EXPECT_EQ(PieceCount(result), 2);
+  EXPECT_EQ(ArcCount(result), 2);
+  EXPECT_EQ(result.fewestPossible, 1);
+}
+
+TEST(FewestPiecesFit, ASquareGivesFourSides) {
+  RandomGeometry random(6105);
+  double const quarter = 0.5 * kPi;
+  Scan const scan = SampleWithNormalNoise(&random,
+                                          {{5.0, 0.0},
+                                           {10.0, 0.0, quarter},
+                                           {10.0, 0.0, quarter},
+                                           {10.0, 0.0, quarter},
+                                           {5.0, 0.0, quarter}},
+                                          399, 0.01, 0.45);
+  FewestResult const closed = FitKept(scan, Closed());
+  EXPECT_EQ(PieceCount(closed), 4) << "the seam moves to a corner";
+  EXPECT_EQ(ArcCount(closed), 0);
+  FewestResult const open = FitKept(scan);
+  EXPECT_EQ(PieceCount(open), 5);
+}
+
 TEST(FewestPiecesOptions, SegmentsOnlyLeavesArcsOut) {
   FewestOptions options;
   options.segmentsOnly = true;
@@ -206,6 +232,30 @@ TEST(FewestPiecesOptions, StepsAreNoLargerThanAsked) {
   options.largestStep = 0.5;
   FewestResult const result = FitKept(scan, options);
   EXPECT_GT(PieceCount(result), 1);
+}
+
+TEST(FewestPiecesOptions, WhatIsFlatterThanTheLargestRadiusComesAsSegments) {
+  RandomGeometry random(6202);
+  Scan const scan = SampleWithNormalNoise(&random, {{40.0, 0.0005}, {20.0, 0.1}}, 600, 0.01, 0.4);
+  FewestOptions options;
+  options.largestRadius = 100.0;
+  FewestResult const result = FitKept(scan, options);
+  for (auto const& elem : result.contour) {
+    if (elem.type != GeometryUtils::ElemType::Arc) continue;
+    EXPECT_LE(elem.radius, 100.0);
+  }
+  EXPECT_GT(PieceCount(result), PieceCount(FitKept(scan)));
+}
+
+TEST(FewestPiecesOptions, PiecesStayNearThePathWhereAsked) {
+  Scan const scan = MakeRepeatedCircle(6205, 0.75, 10.0, 10, 0.05, 0.0);
+  FewestOptions options;
+  // Neighbours are 30 degrees apart: the arc bulges 0.34.
+  options.farthestBetweenPoints = 0.1;
+  FewestResult const result = FitKept(scan, options);
+  EXPECT_GT(PieceCount(result), 1);
+  options.farthestBetweenPoints = 0.35;
+  EXPECT_EQ(PieceCount(FitKept(scan, options)), 1);
 }
 
 TEST(FewestPiecesOptions, CentringBringsDeviationsDown) {

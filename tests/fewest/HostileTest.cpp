@@ -76,12 +76,23 @@ TEST(FewestPiecesHostile, SpiralsOfManyTurnsAreFollowed) {
   }
 }
 
-TEST(FewestPiecesHostile, TolerancesOverSixOrdersAlwaysHaveAnAnswer) {
+TEST(FewestPiecesHostile, TolerancesOverSixOrdersTakeFewPiecesMore) {
   for (std::uint64_t seed = 1; seed <= 4; ++seed) {
     SCOPED_TRACE(testing::Message() << "seed " << seed);
     FewestResult const result = FitKept(MakeManyTolerances(seed, ProfileStyle::Mixed, 500));
     EXPECT_LE(result.fewestPossible, 16);
-    EXPECT_LT(PieceCount(result), 400);
+    EXPECT_LE(PieceCount(result), 30);
+  }
+}
+
+TEST(FewestPiecesHostile, TinyAndHugeNumbersAreScaled) {
+  Scan const scan = MakeNoisyProfile(1, ProfileStyle::Mixed, 1, 300, 0.45);
+  for (double const factor : {0x1p-1000, 0x1p-500, 0x1p960}) {
+    SCOPED_TRACE(testing::Message() << "times " << factor);
+    FewestResult result;
+    ASSERT_EQ(FewestPieces::Fit(Magnified(scan, factor), {}, &result, nullptr, 100), ErrorCode::Ok);
+    EXPECT_EQ(PieceCount(result), 16);
+    EXPECT_EQ(result.fewestPossible, 16);
   }
 }
 

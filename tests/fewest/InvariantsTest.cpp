@@ -77,6 +77,60 @@ TEST(FewestPiecesInvariants, MovingByAHundredMillionTolerancesKeepsTheNumber) {
   }
 }
 
+TEST(FewestPiecesInvariants, PowersOfTwoScaleTheBits) {
+  for (Scan const& scan : Profiles(400)) {
+    FewestResult const result = FitKept(scan);
+    for (double const factor : {0x1p-1000, 0x1p-40, 0.5, 2.0, 0x1p40, 0x1p900}) {
+      SCOPED_TRACE(testing::Message() << "times " << factor);
+      FewestResult expected = result;
+      for (auto& elem : expected.contour) {
+        elem.end = Scale(elem.end, factor);
+        elem.center = Scale(elem.center, factor);
+        elem.radius *= factor;
+      }
+      FewestResult scaled;
+      ASSERT_EQ(FewestPieces::Fit(Magnified(scan, factor), {}, &scaled, nullptr, 100),
+                ErrorCode::Ok);
+      ExpectSameResult(scaled, expected);
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, TheSeamOfAClosedContourAddsNoPiece) {
+  RandomGeometry random(6303);
+  // A stadium with rounded ends: two lines and two half circles, and a hexagon.
+  double const halfTurn = 10.0 * 3.141592653589793;
+  std::vector<std::vector<NominalPiece>> const shapes{
+      {{30.0, 0.0}, {halfTurn, 0.1}, {30.0, 0.0}, {halfTurn, 0.1}},
+      {{20.0, 0.0, 0.0},
+       {20.0, 0.0, 1.0471975511965976},
+       {20.0, 0.0, 1.0471975511965976},
+       {20.0, 0.0, 1.0471975511965976},
+       {20.0, 0.0, 1.0471975511965976},
+       {20.0, 0.0, 1.0471975511965976}}};
+  for (auto const& pieces : shapes) {
+    Scan scan = SampleWithNormalNoise(&random, pieces, 481, 0.02, 0.45);
+    scan.pop_back();
+    for (std::ptrdiff_t const start : {0, 1, 17, 60, 100, 240, 333, 479}) {
+      SCOPED_TRACE(testing::Message() << "started at " << start);
+      Scan turned = scan;
+      std::rotate(turned.begin(), turned.begin() + start, turned.end());
+      FewestResult const result = FitKept(turned, Closed());
+      EXPECT_EQ(PieceCount(result), static_cast<std::int32_t>(pieces.size()));
+      EXPECT_LE(result.fewestPossible, static_cast<std::int32_t>(pieces.size()));
+    }
+  }
+}
+
+TEST(FewestPiecesInvariants, AClosedContourMayRepeatItsFirstPoint) {
+  RandomGeometry random(6304);
+  double const halfTurn = 10.0 * 3.141592653589793;
+  Scan scan = SampleWithNormalNoise(
+      &random, {{30.0, 0.0}, {halfTurn, 0.1}, {30.0, 0.0}, {halfTurn, 0.1}}, 481, 0.02, 0.45);
+  scan.back() = scan.front();
+  EXPECT_EQ(PieceCount(FitKept(scan, Closed())), 4);
+}
+
 TEST(FewestPiecesInvariants, RepeatedPointsChangeNothing) {
   RandomGeometry random(6301);
   for (Scan const& scan : Profiles(500)) {

@@ -30,8 +30,32 @@ TEST_P(FewestPiecesOnMeasured, HasTheKnownBound) {
 }
 
 TEST_P(FewestPiecesOnMeasured, HasNoMorePiecesThanKnown) {
-  if (GetParam().name == std::string("hatch_boundary")) GTEST_SKIP() << "takes four more so far";
   EXPECT_LE(PieceCount(FitKept(scan_)), GetParam().pieces);
+}
+
+TEST_P(FewestPiecesOnMeasured, BackwardsHasAsMany) {
+  FewestResult const result = FitKept(Reversed(scan_));
+  EXPECT_EQ(result.fewestPossible, GetParam().bound);
+  EXPECT_LE(PieceCount(result), GetParam().pieces);
+}
+
+TEST_P(FewestPiecesOnMeasured, TurnedHasAsMany) {
+  std::int32_t const pieces = PieceCount(FitKept(scan_));
+  for (double const degrees : {30.0, 45.0, 90.0, 217.0, 300.0}) {
+    SCOPED_TRACE(testing::Message() << degrees << " degrees");
+    FewestResult const result = FitKept(Rotated(scan_, degrees * 3.141592653589793 / 180.0));
+    EXPECT_EQ(result.fewestPossible, GetParam().bound);
+    EXPECT_EQ(PieceCount(result), pieces);
+  }
+}
+
+TEST_P(FewestPiecesOnMeasured, ClosedHasNoMoreThanOpen) {
+  FewestResult const open = FitKept(scan_);
+  if (!GetParam().isClosed) return;
+  FewestResult const closed = FitKept(scan_, Closed());
+  // A full circle is one arc when open and two when closed.
+  EXPECT_LE(PieceCount(closed), std::max(PieceCount(open), 2));
+  EXPECT_LE(closed.fewestPossible, GetParam().bound);
 }
 
 INSTANTIATE_TEST_SUITE_P(Contours, FewestPiecesOnMeasured, testing::ValuesIn(kSharedContours),

@@ -337,10 +337,14 @@ class Run {
       if (along <= rounding || along >= pieces_[k].Length() - rounding) return;
     }
     if (AreNeighbours(a, b) && IsAtJoint(a, b, x)) return;
+    if (!chain_.isClosed && IsWithin(0, x) && IsWithin(Count() - 1, x)) return;
     if (!PathCrossesNear(a, b, x)) {
       Complain("pieces ", a, " and ", b, " cross at (", x.x, ", ", x.y, ")");
     }
   }
+
+  /// An open path may begin and end at one place: no order of its ends is told apart there.
+  bool IsWithin(std::size_t i, Vec x) const { return Norm(PointAt(i) - x) <= ToleranceAt(i); }
 
   /// Does an edge of one strand meet an edge of the other near x? From x on, edges count for as
   /// long as the strand stays within four tolerances of the other piece.

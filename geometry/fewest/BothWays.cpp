@@ -1,0 +1,59 @@
+#include "geometry/fewest/BothWays.h"
+
+#include <algorithm>
+#include <utility>
+
+namespace Vorn::Fewest {
+
+namespace {
+
+/// A gate and the place on it where a chain crosses it.
+struct Joint {
+  Gate gate;
+  double offset = 0.0;
+};
+
+/// The joint as the path in the other direction has it: what was left is right. At a cusp the piece
+/// behind, which comes first now, crosses the gate the other way already.
+Joint Reversed(Joint joint, std::int32_t count) {
+  joint.gate.split = count - joint.gate.split;
+  if (joint.gate.isCusp) return joint;
+  Gate& gate = joint.gate;
+  gate.across = {-gate.across.x, -gate.across.y};
+  gate.least = -std::exchange(gate.greatest, -gate.least);
+  return {gate, -joint.offset};
+}
+
+}  // namespace
+
+Path Reversed(Path const& path) {
+  Path reversed = path;
+  std::reverse(reversed.points.begin(), reversed.points.end());
+  return reversed;
+}
+
+Chain Reversed(Chain const& chain, std::int32_t count) {
+  Chain reversed;
+  for (std::size_t k = chain.pieces.size(); k-- > 0;) {
+    ChainPiece const& piece = chain.pieces[k];
+    reversed.pieces.push_back(
+        {count - piece.end, count - piece.first, Scaled(piece.circle, -1.0), piece.ratio});
+    if (k == 0) break;
+    Joint const joint = Reversed({chain.gates[k - 1], chain.offsets[k - 1]}, count);
+    reversed.gates.push_back(joint.gate);
+    reversed.offsets.push_back(joint.offset);
+  }
+  return reversed;
+}
+
+Chain FindChainBothWays(Path const& path, double share, std::size_t enough,
+                        std::function<void(std::int32_t)> const& tell) {
+  Chain forwards = FindChain(path, share, tell);
+  if (!forwards.pieces.empty() && forwards.pieces.size() <= enough) return forwards;
+  Chain const backwards = FindChain(Reversed(path), share, [](std::int32_t) {});
+  bool const isShorter =
+      forwards.pieces.empty() || backwards.pieces.size() < forwards.pieces.size();
+  return isShorter && !backwards.pieces.empty() ? Reversed(backwards, path.Count()) : forwards;
+}
+
+}  // namespace Vorn::Fewest

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <functional>
+
+#include "geometry/fewest/Chain.h"
+
+/// The search of the chain from both ends of the path.
+namespace Vorn::Fewest {
+
+/// The path from its last point to its first; both ends have to be free.
+Path Reversed(Path const& path);
+
+/// A chain of a reversed path as a chain of the path itself, which has `count` points. Its own
+/// inverse.
+Chain Reversed(Chain const& chain, std::int32_t count);
+
+/// Searches a chain over an open path forwards and, where it has more than `enough` pieces,
+/// backwards: gates are laid from the end of the piece before, so that one direction may find a
+/// joint that the other misses. The shorter chain, the one found forwards of equal ones; empty when
+/// none was found. `tell` hears how many points are covered forwards.
+Chain FindChainBothWays(Path const& path, double share, std::size_t enough,
+                        std::function<void(std::int32_t)> const& tell);
+
+}  // namespace Vorn::Fewest

@@ -1,0 +1,245 @@
+#include "geometry/fewest/Fitter.h"
+
+#include <algorithm>
+#include <limits>
+#include <utility>
+
+#include "geometry/fewest/Assembly.h"
+#include "geometry/fewest/BothWays.h"
+#include "geometry/fewest/Centring.h"
+#include "geometry/fewest/OnePiece.h"
+#include "geometry/fewest/Polyline.h"
+#include "geometry/fewest/Seam.h"
+
+namespace Vorn::Fewest {
+
+namespace {
+
+using Options = FewestPieces::Options;
+
+/// The search works within this share of the tolerances, so that its rounding and its second order
+/// terms stay within the true ones.
+constexpr double kSearchShare = 1.0 - 1e-6;
+
+/// From how many states a gate takes offsets, for each effort.
+constexpr std::size_t kSources[] = {2, 4, 64};
+
+/// By how much rounding may change a radius, relative to it.
+constexpr double kRadiusRounding = 1e-9;
+
+/// Shares of the tolerances at which another chain is looked for when one breaks a promise.
+constexpr double kTighter[] = {0.97, 0.93, 0.88};
+
+/// By what the tolerances near a broken promise are multiplied after each search that breaks one: a
+/// little room is often enough and costs no piece.
+constexpr double kTightening[] = {0.8, 0.8, 0.5, 0.5};
+
+/// At least so many points on either side of a broken promise get a smaller tolerance.
+constexpr std::int32_t kLeastReach = 4;
+
+/// Joints of the open chain at which a closed one is tried to begin.
+constexpr std::size_t kMostSeams = 4;
+
+/// Looks for contours and measures what they promise.
+class Fitter {
+ public:
+  explicit Fitter(FitTask&& task)
+      : points_(task.points),
+        options_(task.options),
+        shift_(task.shift),
+        path_(std::move(task.path)),
+        bound_(task.bound),
+        progress_(task.progress) {}
+
+  /// Whether one piece along a circle that covers all points keeps every promise.
+  bool RunAsOne(Circle const& covering, Answer* answer, Promises::Report* report) const {
+    for (Chain const& chain : MakeOnePiece(path_, covering)) {
+      if (KeepsCentred(path_, 0, chain, answer, report)) return true;
+      RoundEnds(Tightest(points_).w, answer);
+      if (Measure(*answer, report)) return true;
+    }
+    return false;
+  }
+
+  /// The first contour found that keeps every promise; false when there is none.
+  bool Run(Answer* answer, Promises::Report* report) {
+    if (Search(1.0, answer, report) || RunTighter(answer, report)) return true;
+    for (double const factor : kTightening) {
+      if (answer->ranges.empty()) break;
+      Tighten(*answer, *report, factor);
+      if (Search(1.0, answer, report)) return true;
+    }
+    path_.points = shift_.Apply(points_);
+    // What does not yield near the place may yield when all pieces change.
+    for (double const share : {0.9, 0.7, 0.5, 0.3}) {
+      if (Search(share, answer, report)) return true;
+    }
+    // Segments keep to the path between the points and have no radius.
+    path_.limits.segmentsOnly = true;
+    if (Search(1.0, answer, report)) return true;
+    *answer = FollowPoints(points_, options_.closed);
+    return Measure(*answer, report);
+  }
+
+ private:
+  /// Tries tolerances that are a little tighter everywhere, in place of a contour that breaks a
+  /// promise: another chain of as many pieces may keep them all. Leaves the answer otherwise.
+  bool RunTighter(Answer* answer, Promises::Report* report) {
+    for (double const share : kTighter) {
+      Answer other;
+      Promises::Report otherReport;
+      bool const isKept = Search(share, &other, &otherReport);
+      if (other.ranges.size() > answer->ranges.size()) return false;
+      if (!isKept) continue;
+      *answer = std::move(other);
+      *report = std::move(otherReport);
+      return true;
+    }
+    return false;
+  }
+
+  /// Finds and measures one contour; `answer` is without ranges when there was none to measure.
+  bool Search(double share, Answer* answer, Promises::Report* report) {
+    *answer = {};
+    path_.limits.mostSources = kSources[0];
+    Chain chain = FindOpen(share);
+    // A wider look starts from other gates, so it may also end with more pieces.
+    for (std::int32_t effort = 1; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
+      path_.limits.mostSources = kSources[effort];
+      Chain wider = FindOpen(share);
+      bool const isBetter = chain.pieces.empty() || wider.pieces.size() < chain.pieces.size();
+      if (isBetter && !wider.pieces.empty()) chain = std::move(wider);
+    }
+    if (chain.pieces.empty()) return false;
+    if (options_.closed) return Close(chain, share * kSearchShare, answer, report);
+    return KeepsCentred(path_, 0, chain, answer, report);
+  }
+
+  Chain FindOpen(double share) {
+    return FindChainBothWays(path_, share * kSearchShare, bound_,
+                             [&](std::int32_t done) { Tell(done); });
+  }
+
+  void Tell(std::int32_t done) { progress_.Tell(kCovered, kSearched, done); }
+
+  /// Multiplies the tolerances of the search about the places where promises fail by a factor below
+  /// 1, which leaves room for them and may cost a piece there.
+  void Tighten(Answer const& answer, Promises::Report const& report, double factor) {
+    for (Promises::Violation const& violation : report.violations) {
+      TightenNear(answer.ranges[violation.piece], violation.at, factor);
+      if (violation.otherPiece != Promises::kNone) {
+        TightenNear(answer.ranges[violation.otherPiece], violation.at, factor);
+      }
+    }
+    path_.leastTolerance *= factor;
+  }
+
+  void TightenNear(FewestPieces::Range const& range, GeometryUtils::Point const& at,
+                   double factor) {
+    std::int32_t const count = path_.Count();
+    std::int32_t const length = (range.last - range.first + count) % count + 1;
+    std::int32_t nearest = 0;
+    double least = std::numeric_limits<double>::infinity();
+    for (std::int32_t k = 0; k < length; ++k) {
+      WPoint const& p = points_[static_cast<std::size_t>((range.first + k) % count)];
+      double const distance = DistanceBetween(p, {at.x, at.y, 0.0});
+      if (distance < least) {
+        least = distance;
+        nearest = k;
+      }
+    }
+    std::int32_t const reach = std::max(kLeastReach, length / 8);
+    for (std::int32_t k = nearest - reach; k <= nearest + reach; ++k) {
+      std::int32_t const i = range.first + k;
+      if (!options_.closed && (i < 0 || i >= count)) continue;
+      path_.points[static_cast<std::size_t>((i % count + count) % count)].w *= factor;
+    }
+  }
+
+  /// The shortest of the chains that begin and end at one of the joints of an open one.
+  bool Close(Chain const& open, double share, Answer* answer, Promises::Report* report) {
+    bool isFound = false;
+    auto cuts = CutAtJoints(path_, open, kMostSeams);
+    for (CutPath& cut : cuts) {
+      Chain const chain = CloseChain(&cut, share, [&](std::int32_t done) { Tell(done); });
+      if (chain.pieces.empty()) continue;
+      if (isFound && chain.pieces.size() >= answer->ranges.size()) continue;
+      Answer closed;
+      Promises::Report closedReport;
+      bool const isKept = KeepsCentred(cut.path, cut.rotation, chain, &closed, &closedReport);
+      if (isFound && !isKept) continue;
+      *answer = std::move(closed);
+      *report = std::move(closedReport);
+      if (!isKept) continue;
+      isFound = true;
+      // No closed chain has fewer than the open one less the piece that the end of the input cuts.
+      if (answer->ranges.size() + 1 <= open.pieces.size()) return true;
+    }
+    if (isFound && answer->ranges.size() <= open.pieces.size() + 1) return true;
+    return CloseBySegment(open, answer, report) || isFound;
+  }
+
+  /// The open chain with a segment from its end back to its start; leaves the answer where that
+  /// breaks a promise.
+  bool CloseBySegment(Chain const& open, Answer* answer, Promises::Report* report) const {
+    Chain const centred = options_.centre ? Centre(path_, open) : open;
+    for (Chain const* chain : {&centred, &open}) {
+      Answer closed = Restore(shift_, *chain, BuildPieces(path_, *chain));
+      Promises::Report closedReport;
+      if (!AppendClosingSegment(&closed) || !Measure(closed, &closedReport)) continue;
+      *answer = std::move(closed);
+      *report = std::move(closedReport);
+      return true;
+    }
+    return false;
+  }
+
+  bool AreRadiiAllowed(std::vector<GeometryUtils::Elem> const& contour) const {
+    return std::all_of(contour.begin(), contour.end(), [&](GeometryUtils::Elem const& elem) {
+      return elem.type == GeometryUtils::ElemType::Segment ||
+             (elem.radius >= options_.smallestRadius * (1.0 - kRadiusRounding) &&
+              elem.radius <= options_.largestRadius * (1.0 + kRadiusRounding));
+    });
+  }
+
+  bool KeepsCentred(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
+                    Promises::Report* report) const {
+    if (options_.centre && Keeps(path, rotation, Centre(path, chain), answer, report)) {
+      return true;
+    }
+    return Keeps(path, rotation, chain, answer, report);
+  }
+
+  bool Keeps(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
+             Promises::Report* report) const {
+    *answer = Restore(shift_, chain, BuildPieces(path, chain));
+    std::int32_t const count = path.Count();
+    for (FewestPieces::Range& range : answer->ranges) {
+      range = {(range.first + rotation) % count, (range.last + rotation) % count};
+    }
+    return Measure(*answer, report);
+  }
+
+  bool Measure(Answer const& answer, Promises::Report* report) const {
+    *report = Promises::Measure({points_, answer.contour, answer.ranges, options_.closed,
+                                 options_.largestStep, options_.farthestBetweenPoints});
+    return report->violations.empty() && AreRadiiAllowed(answer.contour);
+  }
+
+  std::vector<WPoint> const& points_;
+  Options const& options_;
+  Shift const& shift_;
+  Path path_;
+  std::size_t bound_;
+  Progress& progress_;
+};
+
+}  // namespace
+
+bool FindContour(FitTask task, Circle const* covering, Answer* answer, Promises::Report* report) {
+  Fitter fitter(std::move(task));
+  if (covering != nullptr && fitter.RunAsOne(*covering, answer, report)) return true;
+  return fitter.Run(answer, report);
+}
+
+}  // namespace Vorn::Fewest

@@ -1,0 +1,40 @@
+#pragma once
+
+#include <cstddef>
+#include <cstdint>
+#include <vector>
+
+#include "geometry/fewest/Answer.h"
+#include "geometry/fewest/LocalFrame.h"
+#include "geometry/fewest/Path.h"
+#include "geometry/fewest/Progress.h"
+#include "geometry/fewest/promises/Promises.h"
+#include "vorn/FewestPieces.h"
+#include "vorn/Types.h"
+
+/// From chains to a contour that keeps every promise.
+namespace Vorn::Fewest {
+
+/// Percent of the progress that is done after the bound, and after the search of the open contour.
+inline constexpr std::int32_t kCovered = 20;
+inline constexpr std::int32_t kSearched = 80;
+
+/// What to fit. The references have to outlive the fit.
+struct FitTask {
+  std::vector<WPoint> const& points;
+  FewestPieces::Options const& options;
+  /// From the points to those of the path.
+  Shift const& shift;
+  /// The points moved near the origin, with the limits of the options.
+  Path path;
+  /// A number of pieces below which no chain can go.
+  std::size_t bound = 1;
+  Progress& progress;
+};
+
+/// The first contour found that keeps every promise, with what was measured on it; false when there
+/// is none. `covering` is a circle that covers all points, which is then tried first; null for
+/// none.
+bool FindContour(FitTask task, Circle const* covering, Answer* answer, Promises::Report* report);
+
+}  // namespace Vorn::Fewest
