@@ -15,9 +15,19 @@ namespace Vorn::Cli {
 
 namespace {
 
-using Strategy = GeometryUtils::FittingStrategy;
-
 constexpr int kMostDigits = 15;
+
+/// Each strategy takes its own options alone.
+void RefuseOtherStrategy(FitOptions const& options) {
+  if (options.strategy != Strategy::Fewest) {
+    RefuseFewestOptions(options.fewest, NameOf(options.strategy));
+    return;
+  }
+  RefuseContradiction(options.fewest);
+  if (!options.start) return;
+  throw Failure(FailureKind::BadArgument,
+                "--start is not for --strategy fewest, which finds the seam itself");
+}
 
 /// The formats of a list as --to takes it; nothing when a word is none or comes twice.
 std::optional<std::vector<Format>> ParseFormats(std::string const& text) {
@@ -61,7 +71,11 @@ void AddManyOptions(Command& command, FitOptions* options) {
 }  // namespace
 
 FitChoice FitOptions::Choice() const {
-  FitChoice choice = {points.tolerance, strategy, closed, {}};
+  FitChoice choice;
+  choice.tolerance = points.tolerance;
+  choice.strategy = strategy;
+  choice.closed = closed;
+  choice.fewest = Vorn::Cli::Choice(fewest);
   if (start) choice.start = static_cast<std::size_t>(*start);
   return choice;
 }
@@ -105,9 +119,15 @@ void AddFitOptions(Command& command, FitOptions* options) {
   AddPointsOptions(command, &options->points);
   AddChoice<Strategy>(
       command, "--strategy", &options->strategy,
-      {{"mixed", Strategy::Mixed}, {"cells", Strategy::MixedCells}, {"arc", Strategy::SingleArc}},
-      "mixed: lines and arcs compared run by run (default); cells: lines first, arcs between "
-      "them; arc: one arc for all points");
+      {{"mixed", Strategy::Mixed},
+       {"cells", Strategy::Cells},
+       {"arc", Strategy::Arc},
+       {"fewest", Strategy::Fewest}},
+      "mixed: lines and arcs compared run by run; cells: lines first, arcs between them; arc: one "
+      "arc for all points; fewest: as few pieces as the tolerances allow, for scans of any "
+      "density; " +
+          NameOf(kUsualStrategy) + " if not said");
+  AddFewestOptions(command, &options->fewest);
   AddChoice<ClosedChoice>(
       command, "--closed", &options->closed,
       {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
@@ -158,6 +178,7 @@ void RefuseWrongUse(FitOptions const& options) {
   auto const refuse = [](std::string const& message) {
     throw Failure(FailureKind::BadArgument, message);
   };
+  RefuseOtherStrategy(options);
   if (options.AreMany()) {
     if (!options.outputs.empty() || !options.json.empty() || !options.svg.empty()) {
       refuse("many files are written with --out-dir and --to, not with -o, --json or --svg");

@@ -5,6 +5,7 @@
 #include <vector>
 
 #include "cli/commands/CommandLine.h"
+#include "cli/commands/FewestOptions.h"
 #include "cli/commands/FitFiles.h"
 #include "cli/commands/FitMany.h"
 #include "cli/commands/Outputs.h"
@@ -25,7 +26,8 @@ struct Target {
 struct FitOptions {
   std::vector<std::string> paths;
   PointsInput points;
-  GeometryUtils::FittingStrategy strategy = GeometryUtils::FittingStrategy::Mixed;
+  Strategy strategy = kUsualStrategy;
+  FewestOptions fewest;
   ClosedChoice closed = ClosedChoice::Auto;
   std::optional<int> start;
   std::vector<std::string> outputs;

@@ -13,7 +13,8 @@ _contour_commands() {
 # The words that an option takes. Prints nothing and fails for one that takes a file or a number.
 _contour_words() {
   case $1:$2 in
-    *:--strategy) echo mixed cells arc ;;
+    *:--strategy) echo mixed cells arc fewest ;;
+    *:--effort) echo quick wide full ;;
     *:--closed) echo auto yes no ;;
     *:--units) echo mm inch ;;
     *:--end) echo m2 m30 none ;;
@@ -48,7 +49,8 @@ _contour_endings() {
 _contour_takes_number() {
   case $1 in
     -t | --tolerance | --tolerance-column | --tolerance-per-point | --columns | --start | --outline | \
-      --digits | --field | --feed | --gcode-decimals | --safe-height | --cut-height | --plunge-feed | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
+      --digits | --field | --feed | --gcode-decimals | --safe-height | --cut-height | --plunge-feed | --largest-step | \
+      --min-radius | --max-radius | --between | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
     *) return 1 ;;
   esac
 }

@@ -84,6 +84,18 @@ std::string ClosedText(FitReport const& report) {
   return text + "GAP of " + WithUnits(FormatShort(report.Gap()), report) + " at " + seam;
 }
 
+/// "29 (26 at least): 1 line, 28 arcs".
+std::string PiecesText(FitReport const& report) {
+  std::string text = std::to_string(report.pieces.size());
+  if (report.IsFewest()) {
+    text += " (proven the fewest)";
+  } else if (report.fit.fewestPossible) {
+    text += " (" + std::to_string(*report.fit.fewestPossible) + " at least)";
+  }
+  return text + ": " + Counted(report.LineCount(), "line") + ", " +
+         Counted(report.ArcCount(), "arc");
+}
+
 std::string CompressionText(FitReport const& report) {
   auto const points = static_cast<double>(report.file.points.size());
   auto const pieces = static_cast<double>(report.pieces.size());
@@ -113,12 +125,10 @@ std::string Summary(FitReport const& report, std::string const& readBack) {
   return FieldsText(report) + "points      " + std::to_string(report.file.points.size()) + "\n" +
          (report.file.columns.empty() ? "" : "columns     " + report.file.columns + "\n") +
          "tolerance   " + ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) +
-         "\n" + "closed      " + ClosedText(report) + "\n" + "pieces      " +
-         std::to_string(report.pieces.size()) + ": " + Counted(report.LineCount(), "line") + ", " +
-         Counted(report.ArcCount(), "arc") + "\n" + "compression " + CompressionText(report) +
-         "\n" + "reported    " + ReportedText(report) + "\n" + "re-measured " +
-         RemeasuredText(report) + "\n" + "deviation   " + LargestText(report) + "\n" +
-         "scatter     " + ScatterText(report) + "\n" +
+         "\n" + "closed      " + ClosedText(report) + "\n" + "pieces      " + PiecesText(report) +
+         "\n" + "compression " + CompressionText(report) + "\n" + "reported    " +
+         ReportedText(report) + "\n" + "re-measured " + RemeasuredText(report) + "\n" +
+         "deviation   " + LargestText(report) + "\n" + "scatter     " + ScatterText(report) + "\n" +
          (readBack.empty() ? "" : "read back   " + readBack + "\n") + "result      " +
          Describe(report.verdict) + "\n" + "time        " + FormatFixed(report.fit.seconds, 3) +
          " s\n";

@@ -97,6 +97,7 @@ void AddRule(InfoReport const& report, FactList* facts) {
                     : name + " coincide: no tolerance can follow from a spacing of zero");
   }
   facts->AddRest(rule.broken.size());
+  if (!rule.broken.empty()) facts->GoOn("way out: contour fit --strategy fewest takes them all");
 }
 
 void AddCorners(InfoReport const& report, FactList* facts) {
@@ -126,8 +127,8 @@ std::string SuggestionText(Suggestion const& suggestion) {
   switch (suggestion.way) {
     case Suggestion::Way::Same:
       return "--tolerance " + FormatShort(suggestion.tolerance) + " (" + suggestion.reason + ")";
-    case Suggestion::Way::PerPoint:
-      return "--tolerance-per-point " + FormatShort(suggestion.tolerance) + " (" +
+    case Suggestion::Way::Fewest:
+      return "--tolerance " + FormatShort(suggestion.tolerance) + " --strategy fewest (" +
              suggestion.reason + ")";
     case Suggestion::Way::None:
       return suggestion.reason;

@@ -7,6 +7,7 @@
 #include "vorn/io/ContourFile.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Formats.h"
+#include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 #include "vorn/io/Points.h"
 
@@ -18,6 +19,12 @@ bool ByTolerance(WPoint const& a, WPoint const& b) { return a.w < b.w; }
 
 std::string WithUnits(std::string text, Drawing const& drawing) {
   return drawing.units.empty() ? text : std::move(text) + " " + drawing.units;
+}
+
+std::string DescribeBound(FitReport const& report) {
+  std::string const pieces = Counted(report.pieces.size(), "piece");
+  if (report.IsFewest()) return pieces + ", proven the fewest";
+  return pieces + ", " + std::to_string(*report.fit.fewestPossible) + " at least";
 }
 
 }  // namespace
@@ -62,6 +69,7 @@ Drawing DrawingOf(FitReport const& report) {
   drawing.deviations = report.remeasured.points;
   drawing.verdict = report.verdict;
   drawing.facts = {DescribeTolerance(drawing), "strategy " + NameOf(report.strategy)};
+  if (report.fit.fewestPossible) drawing.facts.push_back(DescribeBound(report));
   if (report.closure.isClosed && report.Gap() != 0.0) {
     drawing.facts.push_back(WithUnits("GAP of " + FormatShort(report.Gap()), drawing) + " at " +
                             report.file.NameOf(report.seam));

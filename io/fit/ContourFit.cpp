@@ -3,6 +3,7 @@
 #include <limits>
 #include <utility>
 
+#include "io/fit/FewestFit.h"
 #include "io/fit/Fit.h"
 #include "io/fit/FullCircle.h"
 #include "io/fit/LocalFrame.h"
@@ -47,10 +48,8 @@ FitReport FitOpen(PointFile file, std::string toleranceSource, Closure const& cl
     }
   }
   RefuseFailedFit(file, answer);
-  FitReport report =
-      MakeReport(std::move(file), std::move(toleranceSource), choice.strategy, std::move(answer));
-  report.closure = closure;
-  return report;
+  return MakeReport(std::move(file), std::move(toleranceSource), choice.strategy, std::move(answer),
+                    closure);
 }
 
 std::optional<std::size_t> SeamOf(PointFile const& file, Closure const& closure,
@@ -66,7 +65,7 @@ std::optional<std::size_t> SeamOf(PointFile const& file, Closure const& closure,
 
 /// The spacing rule holds between any two neighbours of a closed contour, wherever it is cut.
 void RefuseClosePair(PointFile const& file, FitChoice const& choice, Circuit const& circuit) {
-  if (choice.strategy == GeometryUtils::FittingStrategy::SingleArc) return;
+  if (!NeedsSpacing(choice.strategy)) return;
   std::optional<ClosePair> pair = FindClosePair(circuit.points);
   if (!pair) return;
   pair->first = circuit.origin[pair->first];
@@ -170,8 +169,10 @@ FitReport FitLocally(PointFile file, FitChoice const& choice, ExecutionState* pr
   Closure const closure = FindClosure(file.points, choice.closed);
   if (closure.isClosed) RequirePoints(file, closure);
   std::string source = AssignTolerances(choice.tolerance, &file, closure.isClosed);
-  return (closure.isClosed ? FitClosed : FitOpen)(std::move(file), std::move(source), closure,
-                                                  choice, progress);
+  auto const fit = choice.strategy == Strategy::Fewest ? FitFewest
+                   : closure.isClosed                  ? FitClosed
+                                                       : FitOpen;
+  return fit(std::move(file), std::move(source), closure, choice, progress);
 }
 
 }  // namespace

@@ -5,6 +5,8 @@
 #include <cmath>
 #include <limits>
 
+#include "vorn/io/Failure.h"
+
 namespace Vorn::IO {
 
 namespace {
@@ -35,34 +37,31 @@ std::string Meaning(ErrorCode code) {
   return "unknown";
 }
 
+GeometryUtils::FittingStrategy InCore(Strategy strategy) {
+  switch (strategy) {
+    case Strategy::Mixed:
+      return GeometryUtils::FittingStrategy::Mixed;
+    case Strategy::Cells:
+      return GeometryUtils::FittingStrategy::MixedCells;
+    case Strategy::Arc:
+      return GeometryUtils::FittingStrategy::SingleArc;
+    case Strategy::Fewest:
+      break;
+  }
+  throw Failure(FailureKind::Internal, "a strategy that the core does not have");
+}
+
 }  // namespace
 
-FitAnswer Fit(std::vector<WPoint> const& points, GeometryUtils::FittingStrategy strategy,
-              ExecutionState* progress) {
+FitAnswer Fit(std::vector<WPoint> const& points, Strategy strategy, ExecutionState* progress) {
   FitAnswer answer;
   answer.deviation = std::numeric_limits<double>::quiet_NaN();
   auto const begin = std::chrono::steady_clock::now();
-  answer.code =
-      GeometryUtils::CreateFittingCurve(points, strategy, &answer.contour, &answer.deviation,
-                                        &answer.deviationIndex, progress, kFullProgress);
+  answer.code = GeometryUtils::CreateFittingCurve(points, InCore(strategy), &answer.contour,
+                                                  &answer.deviation, &answer.deviationIndex,
+                                                  progress, kFullProgress);
   answer.seconds = std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count();
   return answer;
-}
-
-bool IsDeviationRelative(GeometryUtils::FittingStrategy strategy) {
-  return strategy != GeometryUtils::FittingStrategy::SingleArc;
-}
-
-std::string NameOf(GeometryUtils::FittingStrategy strategy) {
-  switch (strategy) {
-    case GeometryUtils::FittingStrategy::Mixed:
-      return "mixed";
-    case GeometryUtils::FittingStrategy::MixedCells:
-      return "cells";
-    case GeometryUtils::FittingStrategy::SingleArc:
-      return "arc";
-  }
-  return "unknown";
 }
 
 std::string Describe(ErrorCode code) {
@@ -70,9 +69,9 @@ std::string Describe(ErrorCode code) {
 }
 
 bool ReachesLastPoint(std::vector<WPoint> const& points, std::vector<Piece> const& pieces,
-                      GeometryUtils::FittingStrategy strategy) {
+                      Strategy strategy) {
   if (pieces.empty()) return false;
-  if (strategy == GeometryUtils::FittingStrategy::SingleArc) return true;
+  if (strategy == Strategy::Arc || strategy == Strategy::Fewest) return true;
   GeometryUtils::Point const& end = pieces.back().end;
   WPoint const& last = points.back();
   WPoint const& before = points[points.size() - 2];

@@ -34,6 +34,12 @@ Json RangeJson(std::optional<std::vector<PointRange>> const& ranges, std::size_t
   return {{"first", first}, {"count", range.count}};
 }
 
+/// How few pieces there can be at least; null where nobody has proven it.
+Json FewestJson(FitReport const& report) {
+  if (!report.fit.fewestPossible) return nullptr;
+  return *report.fit.fewestPossible;
+}
+
 Json ReportedJson(FitReport const& report) {
   bool const hasIndex = report.fit.deviationIndex >= 0;
   Json index = nullptr;
@@ -121,7 +127,9 @@ std::string ToJson(FitReport const& report) {
       {"counts",
        {{"elements", report.pieces.size()},
         {"lines", report.LineCount()},
-        {"arcs", report.ArcCount()}}},
+        {"arcs", report.ArcCount()},
+        {"fewestPossible", FewestJson(report)},
+        {"isFewest", report.IsFewest()}}},
       {"deviation", DeviationsJson(report)},
   };
   document.update(ClosureJson(report));

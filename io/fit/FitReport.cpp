@@ -63,23 +63,26 @@ FitReport::Deviation FitReport::LargestDeviation() const {
   return {fit.deviation, static_cast<std::size_t>(fit.deviationIndex)};
 }
 
-FitReport MakeReport(PointFile file, std::string toleranceSource,
-                     GeometryUtils::FittingStrategy strategy, FitAnswer fit) {
+bool FitReport::IsFewest() const { return fit.fewestPossible == pieces.size(); }
+
+FitReport MakeReport(PointFile file, std::string toleranceSource, Strategy strategy, FitAnswer fit,
+                     Closure const& closure) {
   FitReport report;
   report.file = std::move(file);
   report.toleranceSource = std::move(toleranceSource);
   report.strategy = strategy;
   report.fit = std::move(fit);
+  report.closure = closure;
   report.pieces = PiecesOf(report.fit.contour);
-  report.ranges = AssignPoints(report.file.points, report.pieces);
+  report.ranges =
+      report.fit.ranges ? report.fit.ranges : AssignPoints(report.file.points, report.pieces);
   report.remeasured = Remeasure(report.file.points, report.pieces);
   report.verdict = Judge(report, ReachesLastPoint(report.file.points, report.pieces, strategy));
   return report;
 }
 
-FitReport MakeClosedReport(PointFile file, std::string toleranceSource,
-                           GeometryUtils::FittingStrategy strategy, FitAnswer fit,
-                           Closure const& closure, Circuit const& circuit,
+FitReport MakeClosedReport(PointFile file, std::string toleranceSource, Strategy strategy,
+                           FitAnswer fit, Closure const& closure, Circuit const& circuit,
                            std::optional<std::vector<Piece>> circle) {
   FitReport report;
   report.file = std::move(file);

@@ -14,7 +14,6 @@ namespace {
 
 using std::numbers::pi;
 
-constexpr double kLargestStep = 30.0 / 180.0 * pi;
 constexpr int kMostSteps = 20;
 constexpr double kSettled = 1e-15;
 
@@ -102,7 +101,7 @@ int RoundsAbout(XY const& center, std::vector<WPoint> const& points) {
   double turned = 0.0;
   for (std::size_t i = 1; i < points.size(); ++i) {
     double const step = TurnFrom(center, points[i - 1], points[i]);
-    if (!(std::fabs(step) <= kLargestStep)) return 0;
+    if (!(std::fabs(step) <= kLargestCircleStep)) return 0;
     turned += step;
   }
   return static_cast<int>(std::lround(turned / (2.0 * pi)));

@@ -8,15 +8,15 @@
 
 namespace Vorn::IO {
 
-/// Measures the contour of a fit that answered Ok with at least one piece, and judges it.
-FitReport MakeReport(PointFile file, std::string toleranceSource,
-                     GeometryUtils::FittingStrategy strategy, FitAnswer fit);
+/// Measures the contour of a fit that answered Ok with at least one piece, and judges it as open or
+/// closed as it is.
+FitReport MakeReport(PointFile file, std::string toleranceSource, Strategy strategy, FitAnswer fit,
+                     Closure const& closure = {});
 
-/// The same for a closed contour: closes the pieces exactly if it can. Without pieces in `fit` the
-/// contour is the full circle `circle`.
-FitReport MakeClosedReport(PointFile file, std::string toleranceSource,
-                           GeometryUtils::FittingStrategy strategy, FitAnswer fit,
-                           Closure const& closure, Circuit const& circuit,
+/// The same for a closed contour that was cut open: closes the pieces exactly if it can. Without
+/// pieces in `fit` the contour is the full circle `circle`.
+FitReport MakeClosedReport(PointFile file, std::string toleranceSource, Strategy strategy,
+                           FitAnswer fit, Closure const& closure, Circuit const& circuit,
                            std::optional<std::vector<Piece>> circle);
 
 }  // namespace Vorn::IO

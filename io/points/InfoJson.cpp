@@ -78,9 +78,11 @@ Json RuleJson(InfoReport const& report) {
 
 Json SuggestionJson(Suggestion const& suggestion) {
   if (suggestion.way == Suggestion::Way::None) return nullptr;
-  bool const isSame = suggestion.way == Suggestion::Way::Same;
-  return {{"option", isSame ? "--tolerance" : "--tolerance-per-point"},
+  Json strategy = nullptr;
+  if (suggestion.way == Suggestion::Way::Fewest) strategy = "fewest";
+  return {{"option", "--tolerance"},
           {"value", suggestion.tolerance},
+          {"strategy", strategy},
           {"reason", suggestion.reason}};
 }
 

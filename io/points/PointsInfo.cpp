@@ -62,22 +62,18 @@ std::vector<ClosePair> FindClosePairs(std::vector<WPoint> const& points, Closure
 }
 
 Suggestion SuggestTolerance(PointsInfo const& info) {
-  if (!info.largestTolerance) {
-    return {Suggestion::Way::None, 0.0,
-            "neighbours coincide: contour simplify --drop-close leaves them out"};
-  }
   double const forNoise = kTolerancePerNoise * info.noise.value_or(0.0);
   Suggestion const forShape = ToleranceForShape(info.box);
   bool const isNoisy = forNoise > forShape.tolerance;
   double const wanted = Rounded(isNoisy ? forNoise : forShape.tolerance);
   std::string const reason = isNoisy ? "five times the noise" : forShape.reason;
-  double const allowed = *info.largestTolerance;
+  if (!(wanted > 0.0)) return {Suggestion::Way::None, 0.0, "all points coincide"};
+  double const allowed = info.largestTolerance.value_or(0.0);
   if (wanted <= allowed) return {Suggestion::Way::Same, wanted, reason};
-  if (allowed >= forNoise && allowed >= kLeastShareOfWanted * wanted) {
+  if (allowed > 0.0 && allowed >= forNoise && allowed >= kLeastShareOfWanted * wanted) {
     return {Suggestion::Way::Same, allowed, "the largest that the spacing allows"};
   }
-  return {Suggestion::Way::PerPoint, wanted,
-          reason + "; the spacing allows no single tolerance that large"};
+  return {Suggestion::Way::Fewest, wanted, reason + "; the points are too close for the others"};
 }
 
 PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed) {

@@ -77,12 +77,13 @@ std::string DescribeClosePair(PointFile const& file, ClosePair const& pair,
   } else {
     text += "no tolerance would pass: neighbours in this file coincide\n";
   }
-  text += "see: contour info " + arguments + "\nways out: ";
+  text += "see: contour info " + arguments +
+          "\nways out: --strategy fewest, which takes points of any density\n";
   if (largest) {
-    text += "--tolerance " + FormatShort(*largest) +
-            ", or --tolerance-per-point CAP to follow the spacing, or leave points out: ";
+    text += "or --tolerance " + FormatShort(*largest) +
+            ", or --tolerance-per-point CAP to follow the spacing\n";
   }
-  return text + "contour simplify " + arguments + " --drop-close";
+  return text + "or leave points out: contour simplify " + arguments + " --drop-close";
 }
 
 std::string ArgumentFor(PointFile const& file) {

@@ -32,6 +32,7 @@ TEST(FitCommand, StrategyIsMixedUnlessSaid) {
   EXPECT_EQ(strategy({}), "mixed");
   EXPECT_EQ(strategy({"--strategy=cells"}), "cells");
   EXPECT_EQ(strategy({"--strategy", "arc"}), "arc");
+  EXPECT_EQ(strategy({"--strategy", "fewest"}), "fewest");
 }
 
 TEST(FitCommand, ToleranceIsReadInEveryForm) {
@@ -81,7 +82,7 @@ TEST(FitCommand, ContradictionsAndUnknownsAreUsageErrors) {
 
 TEST(FitCommand, UsageErrorsPointToTheHelpOfTheCommand) {
   EXPECT_NE(UsageError({"fit", "p.csv", "--strategy", "spline"})
-                .find("'spline' is none of mixed, cells, arc\nRun 'contour fit --help'"),
+                .find("'spline' is none of mixed, cells, arc, fewest\nRun 'contour fit --help'"),
             std::string::npos);
   EXPECT_NE(UsageError({"bend"}).find("\nRun 'contour --help'"), std::string::npos);
 }

@@ -167,6 +167,7 @@ TEST_F(FitProgram, ClosedContourIsClosedInTheFilesAsWell) {
 TEST_F(FitProgram, ExamplesOfTheHelpWork) {
   Write("part.csv", Contents(std::string(CONTOUR_EXAMPLES) + "/machined_profile.csv"));
   fs::create_directory(folder_ / "scans");
+  Write("scan.csv", Corner());
   Write("scans/one.csv", Corner());
   Write("scans/two.csv", Corner());
   std::string outline;

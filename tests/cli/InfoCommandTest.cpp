@@ -33,7 +33,8 @@ TEST(InfoCommand, TellsTheFactsOnStandardOutput) {
             "            point 2 (line 5): 90.0 degrees to the left\n"
             "limit       no tolerance passes: neighbours coincide\n"
             "noise       too few points to tell\n"
-            "suggestion  neighbours coincide: contour simplify --drop-close leaves them out\n");
+            "suggestion  --tolerance 0.00041 --strategy fewest (a ten-thousandth of the size; the "
+            "points are too close for the others)\n");
 }
 
 TEST(InfoCommand, ListsThePairsThatBreakTheRule) {
@@ -43,7 +44,8 @@ TEST(InfoCommand, ListsThePairsThatBreakTheRule) {
                          "            point 1 (line 4) and point 2 (line 5): distance 1, needed "
                          "more than 1.2\n"
                          "            point 2 (line 5) and point 3 (line 6): distance 0, needed "
-                         "more than 1.2\n"),
+                         "more than 1.2\n"
+                         "            way out: contour fit --strategy fewest takes them all\n"),
             std::string::npos)
       << run.out;
   EXPECT_NE(RunInProcess({"info", "-", "-t", "0.3"}, "0,0\n1,0\n2,0\n")
@@ -100,7 +102,9 @@ TEST(InfoCommand, JsonHoldsTheListsWhole) {
   EXPECT_EQ(json.at("corners").size(), 2u);
   EXPECT_TRUE(json.at("noise").is_null());
   EXPECT_TRUE(json.at("largestTolerance").is_null());
-  EXPECT_TRUE(json.at("suggestion").is_null());
+  EXPECT_EQ(json.at("suggestion").at("option"), "--tolerance");
+  EXPECT_EQ(json.at("suggestion").at("value"), 0.00041);
+  EXPECT_EQ(json.at("suggestion").at("strategy"), "fewest");
 }
 
 TEST(InfoCommand, RefusesWhatItCannotRead) {
@@ -143,12 +147,14 @@ TEST_P(InfoOfSharedData, AgreesWithTheirDescription) {
   EXPECT_NEAR(most / contour.most, 1.0, 1e-3);
   EXPECT_NEAR(json.at("largestTolerance").get<double>() / least, 1.0 / 3.0, 1e-5);
   EXPECT_GT(json.at("noise").get<double>(), 0.0);
-  // The suggestion must be one that the spacing rule lets pass.
+  // The suggestion must be one that the spacing rule lets pass, or name the strategy without it.
   auto const& suggestion = json.at("suggestion");
   RunResult const again = RunInProcess(
       {"info", path, "--json", suggestion.at("option"), suggestion.at("value").dump()});
   ASSERT_EQ(again.code, ExitCode::Ok) << again.err;
-  EXPECT_TRUE(nlohmann::json::parse(again.out).at("tolerance").at("tooClose").empty());
+  bool const hasNoClosePair =
+      nlohmann::json::parse(again.out).at("tolerance").at("tooClose").empty();
+  EXPECT_EQ(hasNoClosePair, suggestion.at("strategy").is_null());
 }
 
 INSTANTIATE_TEST_SUITE_P(InfoCommand, InfoOfSharedData,

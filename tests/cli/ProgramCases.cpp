@@ -166,8 +166,9 @@ TEST_F(Program, ExitCode4PointsTooClose) {
                 "more than 0.75 (1.5 times the sum of their tolerances)\n"
                 "the largest single tolerance that would pass for this file is 0.166666\n"
                 "see: contour info p.csv -t 0.25\n"
-                "ways out: --tolerance 0.166666, or --tolerance-per-point CAP to follow the "
-                "spacing, or leave points out: contour simplify p.csv -t 0.25 --drop-close");
+                "ways out: --strategy fewest, which takes points of any density\n"
+                "or --tolerance 0.166666, or --tolerance-per-point CAP to follow the spacing\n"
+                "or leave points out: contour simplify p.csv -t 0.25 --drop-close");
   EXPECT_EQ(Files(), std::vector<std::string>{"p.csv"});
   EXPECT_EQ(Run("fit p.csv --tolerance 0.166666").code, 0) << "the tolerance named must pass";
 }

@@ -63,7 +63,7 @@ inline FitReport LineAndArcReport() {
                               {4 + r, -1 - r, w},
                               {4, -2, w},
                               {3, -1, w}}),
-                    "given by --tolerance", GeometryUtils::FittingStrategy::Mixed, std::move(fit));
+                    "given by --tolerance", Strategy::Mixed, std::move(fit));
 }
 
 }  // namespace Vorn::IO::Contours

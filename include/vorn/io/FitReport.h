@@ -14,13 +14,14 @@
 #include "vorn/io/Pieces.h"
 #include "vorn/io/Points.h"
 #include "vorn/io/ReportHead.h"
+#include "vorn/io/Strategy.h"
 
 namespace Vorn::IO {
 
 /// How the progress of a fit is counted: from 0 to here.
 inline constexpr std::int32_t kFullProgress = 100;
 
-/// The stretch of points that one piece stands for. The fit does not tell, so it is found again.
+/// The stretch of points that one piece stands for. Where the fit does not tell, it is found again.
 /// On a closed contour it may run past the last point and on from the first.
 struct PointRange {
   std::size_t first = 0;  ///< index of the first point
@@ -34,14 +35,11 @@ struct FitAnswer {
   double deviation = 0.0;                    ///< see IsDeviationRelative
   std::int32_t deviationIndex = -1;          ///< -1: the library names no point
   double seconds = 0.0;                      ///< that it took
+  /// The points of each piece, where the fit tells.
+  std::optional<std::vector<PointRange>> ranges;
+  /// No contour within the tolerances has fewer pieces; nothing where the strategy proves none.
+  std::optional<std::size_t> fewestPossible;
 };
-
-/// The single arc reports its largest deviation as a length, the other strategies as a multiple
-/// of the point's tolerance.
-VORN_IO_EXPORT bool IsDeviationRelative(GeometryUtils::FittingStrategy strategy);
-
-/// As written on the command line: mixed, cells, arc.
-VORN_IO_EXPORT std::string NameOf(GeometryUtils::FittingStrategy strategy);
 
 /// "23, NoFit: no arc fits a run of points", for messages.
 VORN_IO_EXPORT std::string Describe(ErrorCode code);
@@ -52,12 +50,11 @@ enum class Verdict { WithinTolerance, OutsideTolerance, NotClosed, StopsEarly };
 
 /// All that the table, the JSON file and the drawing tell about one fit.
 struct VORN_IO_EXPORT FitReport {
-  PointFile file;               ///< the points, each with its tolerance
-  std::string toleranceSource;  ///< in words, where the tolerances came from
-  /// Which of the fits of the core.
-  GeometryUtils::FittingStrategy strategy = GeometryUtils::FittingStrategy::Mixed;
-  FitAnswer fit;              ///< what the core answered
-  Closure closure;            ///< whether the contour is closed
+  PointFile file;                      ///< the points, each with its tolerance
+  std::string toleranceSource;         ///< in words, where the tolerances came from
+  Strategy strategy = kUsualStrategy;  ///< how the contour was found
+  FitAnswer fit;                       ///< what the core answered
+  Closure closure;                     ///< whether the contour is closed
   std::size_t seam = 0;       ///< where a closed contour was cut open, as counted in the file
   bool isFullCircle = false;  ///< found by the program; the fit has nothing to say then
   std::vector<Piece> pieces;  ///< the contour
@@ -76,6 +73,8 @@ struct VORN_IO_EXPORT FitReport {
   };
   /// The deviation that the verdict goes by.
   Deviation LargestDeviation() const;
+  /// Whether the number of pieces is proven to be the smallest possible.
+  bool IsFewest() const;
   /// How many pieces are straight.
   std::size_t LineCount() const;
   /// How many pieces are arcs.

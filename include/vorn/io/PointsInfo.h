@@ -20,10 +20,10 @@ VORN_IO_EXPORT std::vector<ClosePair> FindClosePairs(std::vector<WPoint> const& 
 
 /// A tolerance that suits the points, and why.
 struct Suggestion {
-  /// One tolerance for all points, one by the spacing of each, or none that would do.
-  enum class Way { Same, PerPoint, None };
+  /// One tolerance for all points, the same for the fewest pieces alone, or none that would do.
+  enum class Way { Same, Fewest, None };
   Way way = Way::None;     ///< which of these
-  double tolerance = 0.0;  ///< for all points, or the cap for each
+  double tolerance = 0.0;  ///< for all points
   std::string reason;      ///< why, in words
 };
 
@@ -43,8 +43,8 @@ struct PointsInfo {
 VORN_IO_EXPORT PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed);
 
 /// Five times the noise, or what the shape asks for where that is more: a ten-thousandth of the
-/// size, of a flat profile at most a hundredth of its height. For all points where the spacing
-/// rule allows it or not much less, else by the spacing of each.
+/// size, of a flat profile at most a hundredth of its height. Where the spacing
+/// rule allows only much less, it is one for the fewest pieces, which have no such rule.
 VORN_IO_EXPORT Suggestion SuggestTolerance(PointsInfo const& info);
 
 }  // namespace Vorn::IO

@@ -45,7 +45,7 @@ TEST(Table, ShowsPiecesAndSummary) {
 
 TEST(Table, SaysThatTheSingleArcReportsALength) {
   FitReport report = Contours::LineAndArcReport();
-  report.strategy = GeometryUtils::FittingStrategy::SingleArc;
+  report.strategy = Strategy::Arc;
   report.fit.deviation = 0.0625;
   EXPECT_NE(ToTable(report).find("reported    0.0625 as a length (this strategy reports no "
                                  "relative deviation and no point)\n"),

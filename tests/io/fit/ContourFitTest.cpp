@@ -160,8 +160,9 @@ TEST(FitContour, CloseClosingPairIsNamedAsTheFileCountsIt) {
               "needed more than 0.6 (1.5 times the sum of their tolerances)\n"
               "the largest single tolerance that would pass for this file is 0.0333333\n"
               "see: contour info part.csv -t 0.2\n"
-              "ways out: --tolerance 0.0333333, or --tolerance-per-point CAP to follow the "
-              "spacing, or leave points out: contour simplify part.csv -t 0.2 --drop-close");
+              "ways out: --strategy fewest, which takes points of any density\n"
+              "or --tolerance 0.0333333, or --tolerance-per-point CAP to follow the spacing\n"
+              "or leave points out: contour simplify part.csv -t 0.2 --drop-close");
   }
   EXPECT_EQ(FitContour(Contours::FileWith(points), Same(0.0333333), nullptr).Gap(), 0.0);
 }
@@ -229,9 +230,7 @@ TEST(FitContour, FullCircleIsTwoArcsWithEveryStrategy) {
     double const radius = 10.0 + (i % 2 == 0 ? 0.004 : -0.004);
     points.push_back({radius * std::cos(angle), radius * std::sin(angle), 0.0});
   }
-  for (auto const strategy :
-       {GeometryUtils::FittingStrategy::Mixed, GeometryUtils::FittingStrategy::MixedCells,
-        GeometryUtils::FittingStrategy::SingleArc}) {
+  for (auto const strategy : {Strategy::Mixed, Strategy::Cells, Strategy::Arc}) {
     FitChoice choice = Same(0.01);
     choice.strategy = strategy;
     FitReport const report = FitContour(Contours::FileWith(points), choice, nullptr);

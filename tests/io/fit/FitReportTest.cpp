@@ -12,8 +12,6 @@
 namespace Vorn::IO {
 namespace {
 
-using Strategy = GeometryUtils::FittingStrategy;
-
 FitReport StraightReport(double offset, double reported, Strategy strategy, double lastX = 2.0) {
   FitAnswer fit;
   fit.code = ErrorCode::Ok;
@@ -44,7 +42,7 @@ TEST(LargestDeviation, IsTheLargerOfReportedAndMeasured) {
   EXPECT_EQ(reported.LargestDeviation().relative, 0.75);
   EXPECT_EQ(reported.LargestDeviation().point, 1u);
   EXPECT_EQ(StraightReport(0.0625, 0.25, Strategy::Mixed).LargestDeviation().relative, 0.5);
-  EXPECT_EQ(StraightReport(0.0625, 0.75, Strategy::SingleArc).LargestDeviation().relative, 0.5)
+  EXPECT_EQ(StraightReport(0.0625, 0.75, Strategy::Arc).LargestDeviation().relative, 0.5)
       << "a length is no multiple of the tolerance";
 }
 
@@ -55,14 +53,14 @@ TEST(Verdict, ReportedDeviationCountsToo) {
 }
 
 TEST(Verdict, LengthReportedByTheSingleArcIsNotTakenForARelativeOne) {
-  EXPECT_EQ(StraightReport(0.0, 1.1, Strategy::SingleArc).verdict, Verdict::WithinTolerance);
+  EXPECT_EQ(StraightReport(0.0, 1.1, Strategy::Arc).verdict, Verdict::WithinTolerance);
 }
 
 TEST(Verdict, ContourThatStopsEarlyIsNoFit) {
   EXPECT_EQ(StraightReport(0.0, 0.0, Strategy::Mixed, 1.0).verdict, Verdict::StopsEarly);
   EXPECT_EQ(StraightReport(0.0, 0.0, Strategy::Mixed, 1.6).verdict, Verdict::OutsideTolerance)
       << "nearer to the last point than half the spacing, but out of its tolerance";
-  EXPECT_EQ(StraightReport(0.0, 0.0, Strategy::MixedCells, 1.0).verdict, Verdict::StopsEarly);
+  EXPECT_EQ(StraightReport(0.0, 0.0, Strategy::Cells, 1.0).verdict, Verdict::StopsEarly);
 }
 
 TEST(Json, HoldsEveryFieldWithItsExactBits) {

@@ -7,8 +7,6 @@
 namespace Vorn::IO {
 namespace {
 
-using Strategy = GeometryUtils::FittingStrategy;
-
 TEST(Fit, HandsOnCodeContourAndDeviation) {
   FitAnswer const answer = Fit({{0, 0, 0.1}, {3, 4, 0.1}}, Strategy::Mixed, nullptr);
   EXPECT_EQ(answer.code, ErrorCode::Ok);
@@ -32,8 +30,9 @@ TEST(Describe, GivesNumberNameAndMeaning) {
 
 TEST(NameOf, IsWhatTheCommandLineTakes) {
   EXPECT_EQ(NameOf(Strategy::Mixed), "mixed");
-  EXPECT_EQ(NameOf(Strategy::MixedCells), "cells");
-  EXPECT_EQ(NameOf(Strategy::SingleArc), "arc");
+  EXPECT_EQ(NameOf(Strategy::Cells), "cells");
+  EXPECT_EQ(NameOf(Strategy::Arc), "arc");
+  EXPECT_EQ(NameOf(Strategy::Fewest), "fewest");
 }
 
 }  // namespace

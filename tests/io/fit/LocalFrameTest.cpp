@@ -99,8 +99,7 @@ TEST(LocalOrigin, DifferencesAreExactForAnyCoordinates) {
 }
 
 TEST(FitContour, CollinearPointsAreOnePieceWhereverTheyLie) {
-  using Strategy = GeometryUtils::FittingStrategy;
-  for (Strategy const strategy : {Strategy::Mixed, Strategy::MixedCells}) {
+  for (Strategy const strategy : {Strategy::Mixed, Strategy::Cells, Strategy::Fewest}) {
     FitChoice choice;
     choice.tolerance.same = 0.001;
     choice.strategy = strategy;

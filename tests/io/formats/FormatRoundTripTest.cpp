@@ -170,7 +170,7 @@ ContourFile FittedContour(SharedContour const& shared, std::string const& folder
   } else {
     Testing::SetTolerancePerPoint(&points, shared.cap);
   }
-  FitAnswer const answer = Fit(points, GeometryUtils::FittingStrategy::Mixed, nullptr);
+  FitAnswer const answer = Fit(points, Strategy::Mixed, nullptr);
   ContourFile contour;
   contour.path = shared.name;
   contour.units = "mm";

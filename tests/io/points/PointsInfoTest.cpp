@@ -90,19 +90,21 @@ TEST(SuggestTolerance, KeepsTheShapeOfAFlatProfile) {
   EXPECT_EQ(SuggestTolerance(InfoWith(200, 0.1, 1e-8, 1.0)).tolerance, 0.001);
 }
 
-TEST(SuggestTolerance, GoesDownToTheSpacingOrFollowsIt) {
+TEST(SuggestTolerance, GoesDownToTheSpacingOrNamesTheFewestPieces) {
   Suggestion const little = SuggestTolerance(InfoWith(30, 40, 0.0, 0.00244662));
   EXPECT_EQ(little.way, Suggestion::Way::Same);
   EXPECT_EQ(little.tolerance, 0.00244662);
   Suggestion const much = SuggestTolerance(InfoWith(30, 40, 0.0, 0.0001));
-  EXPECT_EQ(much.way, Suggestion::Way::PerPoint);
+  EXPECT_EQ(much.way, Suggestion::Way::Fewest);
   EXPECT_EQ(much.tolerance, 0.005);
   Suggestion const noisy = SuggestTolerance(InfoWith(30, 40, 0.01, 0.04));
-  EXPECT_EQ(noisy.way, Suggestion::Way::PerPoint) << "less than the noise asks for";
+  EXPECT_EQ(noisy.way, Suggestion::Way::Fewest) << "less than the noise asks for";
 }
 
-TEST(SuggestTolerance, IsNoneWhereNeighboursCoincide) {
-  EXPECT_EQ(SuggestTolerance(InfoWith(30, 40, 0.01, {})).way, Suggestion::Way::None);
+TEST(SuggestTolerance, NamesTheFewestPiecesWhereNeighboursCoincide) {
+  Suggestion const suggestion = SuggestTolerance(InfoWith(30, 40, 0.01, {}));
+  EXPECT_EQ(suggestion.way, Suggestion::Way::Fewest);
+  EXPECT_EQ(suggestion.tolerance, 0.05);
 }
 
 TEST(Analyse, TakesTwoPoints) {

@@ -75,7 +75,8 @@ TEST(DescribeClosePair, SaysWhichPairAndWhatToDo) {
             "more than 0.75 (1.5 times the sum of their tolerances)\n"
             "the largest single tolerance that would pass for this file is 0.166666\n"
             "see: contour info part.csv -t 0.25\n"
-            "ways out: --tolerance 0.166666, or --tolerance-per-point CAP to follow the spacing, "
+            "ways out: --strategy fewest, which takes points of any density\n"
+            "or --tolerance 0.166666, or --tolerance-per-point CAP to follow the spacing\n"
             "or leave points out: contour simplify part.csv -t 0.25 --drop-close");
 }
 
@@ -91,7 +92,8 @@ TEST(DescribeClosePair, CoincidingPointsHaveNoTolerance) {
             "more than 0.75 (1.5 times the sum of their tolerances)\n"
             "no tolerance would pass: neighbours in this file coincide\n"
             "see: contour info 'my part.csv'\n"
-            "ways out: contour simplify 'my part.csv' --drop-close");
+            "ways out: --strategy fewest, which takes points of any density\n"
+            "or leave points out: contour simplify 'my part.csv' --drop-close");
 }
 
 }  // namespace

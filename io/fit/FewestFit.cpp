@@ -1,0 +1,135 @@
+#include "io/fit/FewestFit.h"
+
+#include <algorithm>
+#include <chrono>
+#include <cmath>
+#include <limits>
+#include <utility>
+
+#include "io/fit/FullCircle.h"
+#include "io/fit/MakeReport.h"
+#include "vorn/FewestPieces.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Spacing.h"
+
+namespace Vorn::IO {
+
+namespace {
+
+/// One piece alone does not close: neither a segment nor an arc of less than a full turn ends where
+/// it begins.
+constexpr std::size_t kLeastClosedPieces = 2;
+
+/// Of a closed contour the piece across the end of the input has its first point behind its last.
+PointRange RangeOf(FewestPieces::Range const& range, std::size_t points) {
+  auto const first = static_cast<std::size_t>(range.first);
+  auto const last = static_cast<std::size_t>(range.last);
+  return {first, (last + points - first) % points + 1};
+}
+
+FitAnswer AnswerOf(FewestPieces::Result result, std::size_t points) {
+  FitAnswer answer;
+  answer.code = ErrorCode::Ok;
+  answer.contour = std::move(result.contour);
+  answer.deviation = result.largestDeviation;
+  answer.deviationIndex = result.largestDeviationIndex;
+  answer.fewestPossible = static_cast<std::size_t>(result.fewestPossible);
+  answer.ranges.emplace();
+  for (FewestPieces::Range const& range : result.ranges) {
+    answer.ranges->push_back(RangeOf(range, points));
+  }
+  return answer;
+}
+
+/// Whether the point of the smallest tolerance lies within that of every other one.
+bool DoCoincide(std::vector<WPoint> const& points) {
+  WPoint const& tightest = *std::min_element(
+      points.begin(), points.end(), [](WPoint const& a, WPoint const& b) { return a.w < b.w; });
+  return std::all_of(points.begin(), points.end(),
+                     [&](WPoint const& point) { return Distance(tightest, point) <= point.w; });
+}
+
+std::string WhyNone(ErrorCode code, std::vector<WPoint> const& points) {
+  if (code == ErrorCode::Failed) {
+    return "the points, their tolerances or the options are not what the fewest pieces can take";
+  }
+  if (DoCoincide(points)) return "all points coincide within their tolerances";
+  return "no lines and arcs pass the points in order, each within its tolerance, without crossing "
+         "where the points do not";
+}
+
+/// Whether an arc of this radius may be taken for the points of a full circle, which are up to
+/// kLargestCircleStep apart.
+bool IsCircleAllowed(FewestPieces::Options const& options, double radius) {
+  return !options.segmentsOnly && options.smallestRadius <= radius &&
+         radius <= options.largestRadius && options.largestStep >= kLargestCircleStep &&
+         std::isinf(options.farthestBetweenPoints);
+}
+
+/// The two half circles that pass all points of a closed contour, if there are any: two arcs of two
+/// radii, which the service may answer, are no more pieces, but no circle either.
+std::optional<std::vector<Piece>> CircleFor(FewestPieces::Options const& options,
+                                            FitAnswer const& answer, Circuit const& circuit) {
+  std::optional<std::vector<Piece>> circle = FitFullCircle(circuit.points);
+  if (!circle) circle = FullCircleOf(PiecesOf(answer.contour), circuit.points);
+  if (!circle || !IsCircleAllowed(options, circle->front().radius)) return {};
+  return circle;
+}
+
+/// The answer that goes with a full circle: what the service says of its own pieces does not hold
+/// for it, but for the bound.
+FitAnswer AnswerOfCircle(FitAnswer const& answer) {
+  FitAnswer ofCircle;
+  ofCircle.code = ErrorCode::Ok;
+  ofCircle.deviation = std::numeric_limits<double>::quiet_NaN();
+  ofCircle.seconds = answer.seconds;
+  ofCircle.fewestPossible = answer.fewestPossible;
+  return ofCircle;
+}
+
+FitReport ReportClosed(PointFile file, std::string toleranceSource, Closure const& closure,
+                       FitChoice const& choice, FitAnswer answer) {
+  answer.fewestPossible = std::max(*answer.fewestPossible, kLeastClosedPieces);
+  std::size_t const seam = answer.ranges->front().first;
+  Circuit const circuit = MakeCircuit(file.points, closure, seam);
+  if (auto circle = CircleFor(choice.fewest, answer, circuit)) {
+    return MakeClosedReport(std::move(file), std::move(toleranceSource), choice.strategy,
+                            AnswerOfCircle(answer), closure, circuit, std::move(circle));
+  }
+  FitReport report = MakeReport(std::move(file), std::move(toleranceSource), choice.strategy,
+                                std::move(answer), closure);
+  report.seam = seam;
+  return report;
+}
+
+void RefuseStart(PointFile const& file, FitChoice const& choice) {
+  if (!choice.start) return;
+  throw Failure(FailureKind::BadArgument, {file.path},
+                "--start is not for --strategy fewest, which finds the seam itself");
+}
+
+}  // namespace
+
+FitReport FitFewest(PointFile file, std::string toleranceSource, Closure const& closure,
+                    FitChoice const& choice, ExecutionState* progress) {
+  RefuseStart(file, choice);
+  FewestPieces::Options options = choice.fewest;
+  options.closed = closure.isClosed;
+  FewestPieces::Result result;
+  auto const begin = std::chrono::steady_clock::now();
+  ErrorCode const code = FewestPieces::Fit(file.points, options, &result, progress, kFullProgress);
+  std::chrono::duration<double> const taken = std::chrono::steady_clock::now() - begin;
+  if (code != ErrorCode::Ok) {
+    throw Failure(FailureKind::NoFit, {file.path}, "no fit: " + WhyNone(code, file.points));
+  }
+  FitAnswer answer = AnswerOf(std::move(result), file.points.size());
+  answer.seconds = taken.count();
+  if (closure.isClosed) {
+    return ReportClosed(std::move(file), std::move(toleranceSource), closure, choice,
+                        std::move(answer));
+  }
+  return MakeReport(std::move(file), std::move(toleranceSource), choice.strategy, std::move(answer),
+                    closure);
+}
+
+}  // namespace Vorn::IO
