@@ -58,7 +58,9 @@ std::vector<CoveredPoints> CoveredBy(IO::FitReport const& report) {
 /// In the order of the fields of FitFacts in Python.
 py::tuple FactsOf(IO::FitReport const& report) {
   IO::FitReport::Deviation const largest = report.LargestDeviation();
-  return py::make_tuple(largest.relative, largest.point, py::none(), NameOf(report.verdict),
+  py::object fewest = py::none();
+  if (report.fit.fewestPossible) fewest = py::cast(*report.fit.fewestPossible);
+  return py::make_tuple(largest.relative, largest.point, fewest, NameOf(report.verdict),
                         IO::NameOf(report.strategy));
 }
 

@@ -12,11 +12,13 @@ namespace {
 
 using IO::FitChoice;
 
-GeometryUtils::FittingStrategy StrategyFrom(py::handle given) {
-  using Strategy = GeometryUtils::FittingStrategy;
-  return Chosen<Strategy>(
-      {{"mixed", Strategy::Mixed}, {"cells", Strategy::MixedCells}, {"arc", Strategy::SingleArc}},
-      "strategy", given);
+IO::Strategy StrategyFrom(py::handle given) {
+  using IO::Strategy;
+  return Chosen<Strategy>({{"mixed", Strategy::Mixed},
+                           {"cells", Strategy::Cells},
+                           {"arc", Strategy::Arc},
+                           {"fewest", Strategy::Fewest}},
+                          "strategy", given);
 }
 
 IO::ClosedChoice ClosedFrom(py::handle given) {
