@@ -188,7 +188,7 @@ TEST_F(FitProgram, ExamplesOfTheHelpWork) {
     EXPECT_EQ(std::system(command.c_str()), 0) << line << '\n' << Contents(folder_ / ".log");
     ++count;
   }
-  EXPECT_EQ(count, 8);
+  EXPECT_EQ(count, 9);
   EXPECT_TRUE(fs::exists(folder_ / "fitted" / "two.dxf"));
 }
 
