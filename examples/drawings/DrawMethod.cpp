@@ -10,12 +10,14 @@
 #include <string>
 #include <vector>
 
+#include "Shapes.h"
 #include "Svg.h"
 #include "vorn/GeometryUtils.h"
 
 using Drawing::Canvas;
 using Drawing::Panel;
 using Drawing::Xy;
+using namespace Drawing::Shapes;
 using Vorn::ErrorCode;
 using Vorn::GeometryUtils;
 using Vorn::WPoint;
@@ -25,17 +27,8 @@ namespace {
 using Elem = GeometryUtils::Elem;
 using Polygon = std::vector<Xy>;
 
-constexpr char kDisc[] = R"(fill="#7a8794" fill-opacity="0.22" stroke="#7a8794")";
-constexpr char kPoint[] = R"(fill="#222222")";
-constexpr char kSegment[] = R"(fill="none" stroke="#1f6fb4" stroke-width="2.5")";
-constexpr char kArc[] = R"(fill="none" stroke="#d9730d" stroke-width="2.5")";
-constexpr char kJoint[] = R"(fill="#ffffff" stroke="#222222" stroke-width="1.5")";
 constexpr char kCell[] = R"(fill="#7a8794" fill-opacity="0.10" stroke="#8a95a1")";
 constexpr char kCommon[] = R"(fill="#2a9d4a" fill-opacity="0.45" stroke="#1d7a38")";
-constexpr char kStop[] = R"(fill="#d62728" fill-opacity="0.10" stroke="#d62728")";
-constexpr char kChosen[] = R"(fill="none" stroke="#1d7a38" stroke-width="2.5")";
-constexpr char kNote[] = R"(fill="#444444" font-size="13")";
-constexpr char kCentred[] = R"(fill="#444444" font-size="13" text-anchor="middle")";
 
 constexpr std::array<char const*, 6> kHues = {"#1f6fb4", "#d9730d", "#8e44ad",
                                               "#b8860b", "#0f8b8d", "#c2185b"};
@@ -47,9 +40,6 @@ std::string Stroke(std::size_t hue, char const* more = "") {
 std::string Fill(std::size_t hue) {
   return std::string("fill=\"") + kHues[hue % kHues.size()] + "\"";
 }
-
-Xy Position(WPoint const& p) { return {p.x, p.y}; }
-Xy Position(GeometryUtils::Point const& p) { return {p.x, p.y}; }
 
 Xy Middle(Polygon const& polygon) {
   Xy sum;
@@ -92,35 +82,6 @@ Polygon CommonPart(Polygon common, Polygon cutter) {
     common = CutByLine(common, cutter[i], cutter[(i + 1) % cutter.size()]);
   }
   return common;
-}
-
-Polygon ArcPoints(Xy centre, double radius, double from, double sweep) {
-  constexpr int kSteps = 120;
-  Polygon points;
-  for (int i = 0; i <= kSteps; ++i) {
-    double const angle = from + sweep * i / kSteps;
-    points.push_back({centre.x + radius * std::cos(angle), centre.y + radius * std::sin(angle)});
-  }
-  return points;
-}
-
-void DrawPoints(Panel const& panel, std::vector<WPoint> const& points, double dot) {
-  for (WPoint const& p : points) panel.Disc(Position(p), p.w, kDisc);
-  for (WPoint const& p : points) panel.Dot(Position(p), dot, kPoint);
-}
-
-void DrawContour(Panel const& panel, std::vector<Elem> const& contour) {
-  for (std::size_t i = 1; i < contour.size(); ++i) {
-    Elem const& elem = contour[i];
-    if (elem.type == GeometryUtils::ElemType::Segment) {
-      panel.Lines({Position(contour[i - 1].end), Position(elem.end)}, false, kSegment);
-    } else {
-      double const sweep = GeometryUtils::GetArcAngleRad(elem) * (elem.direction > 0.0 ? 1 : -1);
-      panel.Lines(ArcPoints(Position(elem.center), elem.radius, elem.startAngle, sweep), false,
-                  kArc);
-    }
-  }
-  for (Elem const& elem : contour) panel.Dot(Position(elem.end), 4.0, kJoint);
 }
 
 struct Fit {

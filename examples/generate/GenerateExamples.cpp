@@ -227,6 +227,26 @@ std::vector<Vec> GearTooth() {
   return Sample(path, 0.12);
 }
 
+/// A bent strip: a line, a bend, a line and around a sharp corner another line; `size` is its whole
+/// length.
+std::vector<Vec> BentStrip(double size, double step) {
+  double const bend = 0.15 * size;
+  double const quarter = 0.5 * pi * bend;
+  double const side = (size - quarter) / 3.0;
+  Vec const bendStart = {side, 0.0};
+  Vec const corner = {side + bend, bend + side};
+  return Sample(
+      {Line({0.0, 0.0}, bendStart), ArcOf(bendStart + Vec{0.0, bend}, bend, -0.5 * pi, 0.5 * pi),
+       Line({side + bend, bend}, corner), Line(corner, corner + Vec{-0.8 * side, 0.6 * side})},
+      step);
+}
+
+/// Points so dense that the noise makes them step backwards.
+std::vector<Vec> DenseScan() { return BentStrip(16.0, 0.004); }
+
+/// Too large to ship: see main.
+std::vector<Vec> LargeScan() { return BentStrip(100.0, 0.001); }
+
 struct Example {
   char const* file;
   char const* title;
@@ -259,9 +279,17 @@ bool Write(std::string const& directory, Example const& example) {
 }  // namespace
 
 int main(int argc, char** argv) {
-  if (argc != 2) {
-    std::cerr << "usage: generate_examples DIRECTORY\n";
+  bool const isLarge = argc == 3 && std::string(argv[2]) == "--large";
+  if (argc != 2 && !isLarge) {
+    std::cerr << "usage: generate_examples DIRECTORY [--large]\n"
+                 "With --large it writes the scan of 100,000 points that is not shipped.\n";
     return 2;
+  }
+  if (isLarge) {
+    return Write(argv[1], {"large_scan.csv", "bent strip, a point every micrometre", "0.01", 0.005,
+                           20240615, LargeScan})
+               ? 0
+               : 1;
   }
   Example const examples[] = {
       {"machined_profile.csv", "half section of a turned part: lines joined by fillets", "0.02",
@@ -270,6 +298,8 @@ int main(int argc, char** argv) {
        0.006, 20240612, Cam},
       {"gear_tooth.csv", "gear tooth: module 8, 20 teeth, pressure angle 20 degrees", "0.008",
        0.0024, 20240613, GearTooth},
+      {"dense_scan.csv", "bent strip, scanned far denser than the tolerance", "0.01", 0.005,
+       20240614, DenseScan},
   };
   bool ok = true;
   for (Example const& example : examples) ok = Write(argv[1], example) && ok;
