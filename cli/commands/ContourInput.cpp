@@ -26,14 +26,17 @@ ContourFile Read(ContourInput const& input, Console const& console) {
     console.err << "contour: " << contour.path << ": left out " << Counted(contour.leftOut, "piece")
                 << " without length\n";
   }
+  if (contour.hadHeights) {
+    console.err << "contour: " << contour.path << ": dropped the coordinates beside x and y\n";
+  }
   return contour;
 }
 
 }  // namespace
 
-void AddOutline(Command& command, std::optional<int>* outline) {
+void AddOutline(Command& command, std::optional<int>* outline, std::string const& name) {
   constexpr int kMost = 1000000;
-  AddWholeNumber(command, "--outline", outline, 1, kMost, "N",
+  AddWholeNumber(command, name, outline, 1, kMost, "N",
                  "Take only this one of the outlines in a file, counted from 1");
 }
 

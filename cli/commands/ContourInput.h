@@ -18,8 +18,9 @@ struct ContourInput {
   std::optional<int> outline;  ///< counted from 1; nothing: all there are
 };
 
-/// Adds --outline.
-void AddOutline(Command& command, std::optional<int>* outline);
+/// Adds --outline, or the option of another name for the outlines of another file.
+void AddOutline(Command& command, std::optional<int>* outline,
+                std::string const& name = "--outline");
 
 /// The outlines in the file, each chained from its pieces (see OutlinesOf), or the one asked for.
 /// @throws Failure as ReadContour does, or (FailureKind::BadArgument) when there are not so many.

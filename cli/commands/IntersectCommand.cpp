@@ -7,6 +7,7 @@
 #include "cli/commands/ContourInput.h"
 #include "cli/commands/Outputs.h"
 #include "cli/texts/IntersectionText.h"
+#include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Formats.h"
 #include "vorn/io/Intersections.h"
@@ -21,7 +22,8 @@ constexpr char const* kText =
 constexpr char const* kFooter =
     R"(
 Contours are read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
-by the content. Gaps between pieces are not bridged.
+by the content. Gaps between pieces are not bridged. Of a file with several outlines all are taken
+together, or that of --outline from A and that of --outline-b from B.
 
 Kinds: crossing, each passes to the other side of the other; touching, they stay on one side, run in
 one direction there, or one of them ends there; overlap, they share a stretch, told for each pair of
@@ -43,13 +45,15 @@ Examples:
   contour intersect part.json tool.dxf
   contour intersect part.dxf --fail-if-any
   contour intersect part.json tool.dxf -o points.csv
+  contour intersect plate.dxf plate.dxf --outline 1 --outline-b 2
 )";
 
 struct Options {
   std::string a;
   std::string b;  ///< empty: the first with itself
   std::optional<Format> from;
-  std::optional<int> outline;  ///< of the first file
+  std::optional<int> outline;   ///< of the first file
+  std::optional<int> outlineB;  ///< of the second file
   std::string output;
   bool asJson = false;
   bool failIfAny = false;
@@ -70,7 +74,8 @@ ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
   ContourFile const a = ReadContourInput({options.a, options.from, options.outline}, console);
   std::optional<ContourFile> other;
-  if (!options.b.empty()) other = ReadContourInput({options.b, options.from, {}}, console);
+  if (!options.b.empty())
+    other = ReadContourInput({options.b, options.from, options.outlineB}, console);
   ContourFile const* const b = other ? &*other : nullptr;
   std::vector<Intersection> const found =
       b == nullptr ? SelfIntersectionsOf(a) : IntersectionsOf(a, *b);
@@ -93,6 +98,7 @@ void AddOptions(Command& command, Options* options) {
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contours as this");
   AddOutline(command, &options->outline);
+  AddOutline(command, &options->outlineB, "--outline-b");
   command.AddText("-o,--output", &options->output, "FILE",
                   "Write the points to this CSV file; - is the standard output");
   command.AddFlag("--json", &options->asJson, "Write the points as JSON, with every digit");
@@ -103,6 +109,9 @@ void AddOptions(Command& command, Options* options) {
 void RefuseBadFiles(Options const& options) {
   if (options.a == kStandardInput && options.b == kStandardInput) {
     throw Failure(FailureKind::BadArgument, "A and B cannot both be the standard input");
+  }
+  if (options.outlineB && options.b.empty()) {
+    throw Failure(FailureKind::BadArgument, "--outline-b is for the file B, and there is none");
   }
   RefuseSharedFiles(options.Read(), options.Written());
 }

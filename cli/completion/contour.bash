@@ -48,7 +48,7 @@ _contour_endings() {
 # Options whose value is neither a word nor a file.
 _contour_takes_number() {
   case $1 in
-    -t | --tolerance | --tolerance-column | --tolerance-per-point | --columns | --start | --outline | \
+    -t | --tolerance | --tolerance-column | --tolerance-per-point | --columns | --start | --outline | --outline-b | \
       --digits | --field | --feed | --gcode-decimals | --safe-height | --cut-height | --plunge-feed | --largest-step | \
       --min-radius | --max-radius | --between | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
     *) return 1 ;;

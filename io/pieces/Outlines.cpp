@@ -31,7 +31,8 @@ bool Encloses(ContourFile const& outline, XY const& place) {
 }
 
 ContourFile OutlineOf(LinkChain const& chain, ContourFile const& contour) {
-  ContourFile outline = {contour.path, {}, false, contour.units, contour.leftOut};
+  ContourFile outline = {contour.path,      {}, false, contour.units, contour.leftOut,
+                         contour.hadHeights};
   for (Link const& link : chain.links) {
     Piece const& piece = contour.pieces[link.index];
     outline.pieces.push_back(link.isReversed ? Reversed(piece) : piece);

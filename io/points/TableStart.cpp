@@ -23,6 +23,7 @@ constexpr std::size_t kLongestLine = 4096;
 
 struct Row {
   std::size_t line = 0;
+  char separator = ',';
   std::vector<std::string_view> fields;
 
   bool IsData() const {
@@ -30,6 +31,17 @@ struct Row {
   }
   bool HasNumbers() const { return std::any_of(fields.begin(), fields.end(), LooksLikeNumber); }
   bool BeginsWithText() const { return !LooksLikeNumber(fields.front()); }
+  /// "Profile 7": words between blanks. A point whose x is no number would look the same only if a
+  /// word of letters stood in its place.
+  bool IsProse() const {
+    constexpr std::size_t kLeastLetters = 3;
+    std::string const word = LowerCase(fields.front());
+    bool const isWord =
+        word.size() >= kLeastLetters &&
+        std::all_of(word.begin(), word.end(), [](char c) { return c >= 'a' && c <= 'z'; });
+    return separator == ' ' && isWord && word != "nan" && word != "inf" && word != "infinity" &&
+           word != "null";
+  }
   /// A column without a unit has an empty field.
   bool IsUnits() const {
     return std::any_of(fields.begin(), fields.end(), IsUnit) &&
@@ -56,7 +68,8 @@ std::vector<Row> RowsToData(std::string_view text) {
     if (line.size() > kLongestLine) return {};
     Row row;
     row.line = number;
-    SplitFields(line, FindSeparator(line), &row.fields);
+    row.separator = FindSeparator(line);
+    SplitFields(line, row.separator, &row.fields);
     rows.push_back(std::move(row));
     std::size_t const count = rows.size();
     bool const isTable = count >= 2 && rows[count - 1].IsData() && rows[count - 2].IsData() &&
@@ -108,7 +121,8 @@ TableStart FindTable(std::string_view text) {
   }
   bool const hasHeader = first < data;
   for (std::size_t i = 0; i < first; ++i) {
-    bool const couldBeData = rows[i].fields.size() == columns && rows[i].HasNumbers();
+    bool const couldBeData =
+        rows[i].fields.size() == columns && rows[i].HasNumbers() && !rows[i].IsProse();
     bool const couldBeHeader = rows[i].fields.size() == columns && !rows[i].HasNumbers();
     if (!rows[i].BeginsWithText() || (couldBeData && !hasHeader)) return {};
     if (couldBeHeader && !hasHeader) return {};

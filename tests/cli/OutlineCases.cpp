@@ -61,5 +61,27 @@ TEST_F(Program, OneOutlineCanBeChosen) {
                 "two.dxf: there is no outline 3, the file has 2 outlines");
 }
 
+TEST_F(Program, IntersectTakesAnOutlineOfEitherFile) {
+  Write("two.dxf", Drawing(Circle(0, 2) + Circle(3, 2)));
+  auto const meetings = [&](std::string const& arguments) {
+    return nlohmann::json::parse(Run("intersect two.dxf two.dxf --json " + arguments).out)
+        .at("intersections")
+        .size();
+  };
+  // Circles of radius 2 about (0, 0) and (3, 0) cross in two points.
+  EXPECT_EQ(meetings("--outline 1 --outline-b 2"), 2u);
+  EXPECT_EQ(meetings("--outline 2 --outline-b 1"), 2u);
+  ExpectRefusal("intersect two.dxf two.dxf --outline-b 3", 2,
+                "two.dxf: there is no outline 3, the file has 2 outlines");
+  EXPECT_EQ(Run("intersect two.dxf --outline-b 1").code, 2);
+}
+
+TEST_F(Program, HeightsOfAFileAreToldAsDropped) {
+  Write("p.wkt", "LINESTRING Z (0 0 1, 3 4 1)");
+  Ended const ended = Run("convert p.wkt -o p.json");
+  EXPECT_EQ(ended.code, 0);
+  EXPECT_EQ(ended.err, "contour: p.wkt: dropped the coordinates beside x and y\n");
+}
+
 }  // namespace
 }  // namespace Vorn::Cli::Testing

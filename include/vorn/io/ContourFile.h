@@ -16,6 +16,7 @@ struct ContourFile {
   bool isClosed = false;      ///< the last piece leads back to the start of the first
   std::string units;          ///< "mm", "inch" and so on; empty when nobody says
   std::size_t leftOut = 0;    ///< how many pieces without length the file held beside these
+  bool hadHeights = false;    ///< further coordinates stood beside x and y and were dropped
 };
 
 /// Takes out the pieces that end where they start without a turn; they say nothing of the contour,

@@ -98,10 +98,11 @@ TEST(ParseWkt, NamesLineColumnAndText) {
   EXPECT_EQ(Complaint("LINESTRING (0 0, 1e200 1)"),
             "p.wkt:1:18: '1e200' is not a finite number of usable size");
   EXPECT_EQ(Complaint("LINESTRING (0 0, 1 1"), "p.wkt:1:21: the text stops early");
-  EXPECT_EQ(Complaint("LINESTRING (0 0 0, 1 1 1)"),
-            "p.wkt:1:17: '0' follows x and y; a contour has no further coordinates");
-  EXPECT_EQ(Complaint("LINESTRING Z (0 0 0, 1 1 1)"),
-            "p.wkt:1:12: 'Z' stands where a '(' should be");
+  EXPECT_EQ(Complaint("LINESTRING (0 0 0 0 7, 1 1 1 1 7)"),
+            "p.wkt:1:21: '7' is more than the four coordinates that a point may have");
+  EXPECT_EQ(Complaint("LINESTRING (0 0 z, 1 1 1)"), "p.wkt:1:17: 'z' is not a number");
+  EXPECT_EQ(Complaint("LINESTRING Q (0 0 0, 1 1 1)"),
+            "p.wkt:1:12: 'Q' stands where a '(' should be");
   EXPECT_EQ(Complaint("LINESTRING EMPTY"), "p.wkt:1:12: 'EMPTY' stands where a '(' should be");
   EXPECT_EQ(Complaint("POINT (0 0)"), "p.wkt:1:1: 'POINT' is no curve that holds a contour");
   EXPECT_EQ(Complaint("LINESTRING (0 0, 1 1) LINESTRING"),
@@ -116,6 +117,25 @@ TEST(ParseWkt, NamesLineColumnAndText) {
             "them");
   EXPECT_EQ(Complaint("COMPOUNDCURVE (COMPOUNDCURVE ((0 0, 1 1)))"),
             "p.wkt:1:16: 'COMPOUNDCURVE' cannot be part of a compound curve");
+}
+
+TEST(ParseWkt, DropsHeightsAndMeasuresAndSaysSo) {
+  ContourFile const plane = ParseWkt("LINESTRING (1 2, 3 4, 5 7)", "p.wkt");
+  EXPECT_FALSE(plane.hadHeights);
+  for (char const* text :
+       {"LINESTRING Z (1 2 9, 3 4 9, 5 7 9)", "LINESTRING M (1 2 9, 3 4 9, 5 7 9)",
+        "LINESTRING ZM (1 2 9 8, 3 4 9 8, 5 7 9 8)", "linestringz(1 2 9,3 4 9,5 7 9)",
+        "LINESTRING (1 2 9, 3 4 9, 5 7 9)", "MULTILINESTRING Z ((1 2 9, 3 4 9), (3 4 9, 5 7 9))",
+        "COMPOUNDCURVE Z ((1 2 9, 3 4 9), LINESTRING Z (3 4 9, 5 7 9))"}) {
+    ContourFile const contour = ParseWkt(text, "p.wkt");
+    EXPECT_TRUE(contour.hadHeights) << text;
+    ASSERT_EQ(contour.pieces.size(), 2u) << text;
+    EXPECT_EQ(contour.pieces[1].start.y, plane.pieces[1].start.y) << text;
+    EXPECT_EQ(contour.pieces[1].end.x, plane.pieces[1].end.x) << text;
+  }
+  ContourFile const arc = ParseWkt("CIRCULARSTRING Z (0 0 1, 1 1 1, 2 0 1)", "p.wkt");
+  ASSERT_EQ(arc.pieces.size(), 1u);
+  EXPECT_EQ(arc.pieces[0].radius, 1.0);
 }
 
 }  // namespace

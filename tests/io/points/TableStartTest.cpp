@@ -19,12 +19,15 @@ TEST(FindTable, BeginsAtTheHeaderOfThePoints) {
   EXPECT_EQ(FindTable("Profile 7\n\nOperator: A. B.\nX;Z\n1;2\n3;4\n").first, 3u);
   EXPECT_EQ(FindTable("Profile 7 of 9\n1 2\n3 4\n").first, 1u);
   EXPECT_EQ(FindTable("Anzahl;2\nX;Z\n1;2\n3;4\n").first, 1u);
+  EXPECT_EQ(FindTable("Profile 7\n1 2\n3 4\n").first, 1u);
 }
 
 TEST(FindTable, DataGoneWrongIsNoPreamble) {
   EXPECT_EQ(FindTable("1 2 3\n1 2\n3 4\n").first, 0u);
   EXPECT_EQ(FindTable("3mm,4\n1,2\n3,4\n").first, 0u);
   EXPECT_EQ(FindTable("abc,4\n1,2\n3,4\n").first, 0u);
+  EXPECT_EQ(FindTable("nan 4\n1 2\n3 4\n").first, 0u);
+  EXPECT_EQ(FindTable("1o0 4\n1 2\n3 4\n").first, 0u);
   EXPECT_EQ(FindTable("x,y\na,b\n1,2\n3,4\n").first, 1u) << "the nearer of two headers counts";
   EXPECT_EQ(FindTable("").first, 0u);
 }
