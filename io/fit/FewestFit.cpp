@@ -105,7 +105,7 @@ FitReport ReportClosed(PointFile file, std::string toleranceSource, Closure cons
 void RefuseStart(PointFile const& file, FitChoice const& choice) {
   if (!choice.start) return;
   throw Failure(FailureKind::BadArgument, {file.path},
-                "--start is not for --strategy fewest, which finds the seam itself");
+                "a start is not for the fewest pieces, which find the seam themselves");
 }
 
 }  // namespace

@@ -155,7 +155,7 @@ TEST(FitFewest, TakesNoStart) {
   FitChoice choice = Fewest(0.01);
   choice.start = 3;
   ExpectNoFit(Rectangle(), choice, FailureKind::BadArgument,
-              "--start is not for --strategy fewest, which finds the seam itself");
+              "a start is not for the fewest pieces, which find the seam themselves");
 }
 
 TEST(FitFewest, ReportsTellTheBound) {
