@@ -107,6 +107,8 @@ def _draw_points(ax: Any, contour: Contour, points: npt.NDArray[np.float64],
 def _draw_band(ax: Any, contour: Contour, places: npt.NDArray[np.float64],
                width: npt.NDArray[np.float64], times: str) -> None:
     """Both edges of the tolerance, at the feet of the points."""
+    if contour.is_closed:
+        places, width = np.vstack((places, places[:1])), np.append(width, width[:1])
     step = np.gradient(places, axis=0) if len(places) > 1 else np.array([[1.0, 0.0]])
     length = np.hypot(*step.T)[:, None]
     normal = np.column_stack((-step[:, 1], step[:, 0])) / np.where(length > 0, length, 1.0)
