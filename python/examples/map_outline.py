@@ -34,7 +34,7 @@ def main(folder="."):
         print(f"tolerance {tolerance} m: {len(contour)} pieces, {abs(contour.area) / 1e4:.3f} ha, "
               f"{len(contour.to_wkt())} letters of WKT")
         near = contour.shifted(-ORIGIN[0], -ORIGIN[1])
-        vorn.plot(near, points=points - ORIGIN, tol=tolerance, magnify=1, ax=ax)
+        vorn.plot(near, points=points[::9] - ORIGIN, tol=tolerance, magnify=1, ax=ax)
         ax.set_title(f"within {tolerance} m: {len(contour)} pieces for {len(points)} points")
     figure.tight_layout()
     figure.savefig(pathlib.Path(folder, "map_outline.png"), dpi=100)

@@ -13,12 +13,11 @@ namespace {
 using IO::FitChoice;
 
 IO::Strategy StrategyFrom(py::handle given) {
-  using IO::Strategy;
-  return Chosen<Strategy>({{"mixed", Strategy::Mixed},
-                           {"cells", Strategy::Cells},
-                           {"arc", Strategy::Arc},
-                           {"fewest", Strategy::Fewest}},
-                          "strategy", given);
+  return Chosen<IO::Strategy>({{"fewest", IO::Strategy::Fewest},
+                               {"mixed", IO::Strategy::Mixed},
+                               {"cells", IO::Strategy::Cells},
+                               {"arc", IO::Strategy::Arc}},
+                              "strategy", given);
 }
 
 IO::ClosedChoice ClosedFrom(py::handle given) {
@@ -31,11 +30,34 @@ IO::ClosedChoice ClosedFrom(py::handle given) {
                                   "closed", given);
 }
 
+FewestPieces::Effort EffortFrom(py::handle given) {
+  return Chosen<FewestPieces::Effort>({{"quick", FewestPieces::Effort::Quick},
+                                       {"wide", FewestPieces::Effort::Wide},
+                                       {"full", FewestPieces::Effort::Full}},
+                                      "effort", given);
+}
+
+/// Takes a number or a truth value into a member of the options of the fewest pieces.
+template <typename Value>
+auto Into(Value FewestPieces::Options::*member) {
+  return [member](py::handle given, FitChoice* choice) {
+    choice->fewest.*member = given.cast<Value>();
+  };
+}
+
 Takers<FitChoice> const& FitTakers() {
+  using Options = FewestPieces::Options;
   static Takers<FitChoice> const takers = {
       {"strategy", [](py::handle g, FitChoice* c) { c->strategy = StrategyFrom(g); }},
       {"closed", [](py::handle g, FitChoice* c) { c->closed = ClosedFrom(g); }},
       {"start", [](py::handle g, FitChoice* c) { c->start = g.cast<std::size_t>(); }},
+      {"effort", [](py::handle g, FitChoice* c) { c->fewest.effort = EffortFrom(g); }},
+      {"centre", Into(&Options::centre)},
+      {"segments_only", Into(&Options::segmentsOnly)},
+      {"largest_step", Into(&Options::largestStep)},
+      {"smallest_radius", Into(&Options::smallestRadius)},
+      {"largest_radius", Into(&Options::largestRadius)},
+      {"farthest_between_points", Into(&Options::farthestBetweenPoints)},
   };
   return takers;
 }

@@ -43,7 +43,7 @@ def test_closed_can_be_demanded(corner, closed):
     assert abs(contour.area) == pytest.approx(4.5)
 
 
-@pytest.mark.parametrize("strategy", ["mixed", "cells"])
+@pytest.mark.parametrize("strategy", ["fewest", "mixed", "cells"])
 def test_every_strategy_keeps_the_tolerance(examples, strategy):
     points = vorn.read_points(examples / "gear_tooth.csv")
     contour = vorn.fit(points, strategy=strategy)
@@ -52,6 +52,47 @@ def test_every_strategy_keeps_the_tolerance(examples, strategy):
     relative = contour.deviations(points) / points[:, 2]
     assert relative.max() <= 1 + 1e-6
     assert relative.max() <= contour.max_deviation <= 1 + 1e-6
+
+
+def test_the_fewest_pieces_are_proven(corner):
+    contour = vorn.fit(corner, tol=0.01, strategy="fewest")
+    assert len(contour) == contour.fewest_possible == 2
+    assert vorn.fit(corner, tol=0.01, strategy="mixed").fewest_possible is None
+
+
+def test_the_fewest_pieces_need_no_spacing(corner):
+    dense = np.repeat(corner, 3, axis=0) + np.tile([(0, 0), (0.001, 0), (0, 0.001)], (7, 1))
+    assert len(vorn.fit(dense, tol=0.01, strategy="fewest")) == 2
+    with pytest.raises(vorn.PointsTooCloseError):
+        vorn.fit(dense, tol=0.01, strategy="mixed")
+
+
+def test_a_closed_contour_of_the_fewest_pieces(circle):
+    contour = vorn.fit(circle, tol=0.01, strategy="fewest")
+    assert contour.is_closed and contour.start == contour.end
+    assert len(contour) == 2 and contour.verdict == "within tolerance"
+
+
+def test_the_options_of_the_fewest_pieces():
+    angles = np.linspace(0, 2, 60)
+    bend = np.column_stack((10 * np.cos(angles), 10 * np.sin(angles)))
+    assert len(vorn.fit(bend, tol=0.01, strategy="fewest")) == 1
+    straight = vorn.fit(bend, tol=0.01, strategy="fewest", segments_only=True)
+    assert len(straight) > 5 and not straight.as_arrays()["is_arc"].any()
+    for options in ({"largest_radius": 9.0}, {"smallest_radius": 11.0}):
+        contour = vorn.fit(bend, tol=0.01, strategy="fewest", **options)
+        assert all(options.get("smallest_radius", 0) <= piece.radius
+                   <= options.get("largest_radius", np.inf)
+                   for piece in contour if isinstance(piece, vorn.Arc))
+    for effort in ("quick", "wide", "full"):
+        assert len(vorn.fit(bend, tol=0.01, strategy="fewest", effort=effort)) == 1
+    for wrong in ({"largest_step": -1.0}, {"smallest_radius": -1.0}):
+        with pytest.raises(vorn.ContourError):
+            vorn.fit(bend, tol=0.01, strategy="fewest", **wrong)
+    with pytest.raises(ValueError):
+        vorn.fit(bend, tol=0.01, strategy="fewest", effort="lazy")
+    with pytest.raises(TypeError):
+        vorn.fit(bend, tol=0.01, strategy="fewest", largest_step="wide")
 
 
 def test_the_strategy_arc_is_one_arc():

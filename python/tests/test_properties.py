@@ -10,7 +10,7 @@ st = hypothesis.strategies
 # The same examples in every run.
 settings = hypothesis.settings(deadline=None, derandomize=True, max_examples=40, print_blob=True)
 
-STRATEGIES = ["mixed"]
+STRATEGIES = ["fewest", "mixed"]
 TOL = 2.0 ** -7
 
 

@@ -59,6 +59,8 @@ class Contour(Sequence[Piece]):
     units : str
         "mm", "inch" and so on, for files; may be empty.
 
+    Examples
+    --------
     >>> import vorn
     >>> square = vorn.Contour.starting_at((0, 0)).append_line((2, 0)).append_line((2, 1))
     >>> square.append_arc((0, 1), center=(1, 1), ccw=True).append_line((0, 0))
@@ -259,6 +261,8 @@ class Contour(Sequence[Piece]):
         ----------
         points : (n, 2) or (n, 3) array-like
 
+        Examples
+        --------
         >>> line = Contour.starting_at((0, 0)).append_line((10, 0))
         >>> line.nearest([(1, 2), (13, 4)]).places
         array([[ 1.,  0.],

@@ -32,15 +32,23 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
         How far the contour may pass from the points, in their unit; goes before the tolerances that
         the points bring.
     strategy : str, optional
-        "mixed": lines and arcs compared run by run. "cells": lines first, arcs between them.
-        "arc": one arc for all points. If not said, what the program ``contour fit`` uses.
+        "fewest": as few pieces as the tolerances allow, at any spacing of the points. "mixed":
+        lines and arcs compared run by run. "cells": lines first, arcs between them. "arc": one arc
+        for all points. If not said, what the program ``contour fit`` uses.
     closed : "auto", bool, "yes" or "no"
         Whether the contour runs back to its start; "auto" judges by the ends of the points.
     progress : callable, optional
         Called with the percentage that is done, never falling. A tqdm bar does as well, and so
         does ``tqdm.tqdm`` itself. What it raises comes out of the fit.
     start : int, optional
-        Where a closed contour is cut open, as a position in the points.
+        Where a closed contour is cut open, as a position in the points; not for "fewest".
+    effort : "quick", "wide" or "full", optional
+        How hard "fewest" looks for fewer pieces.
+    centre, segments_only, largest_step, smallest_radius, largest_radius, farthest_between_points
+        For "fewest": whether deviations are brought down (True), whether arcs are left out (False),
+        the largest angle between neighbouring points on an arc (pi / 3 radians), the limits of
+        radii (0, inf), and how far a piece may leave the straight path between neighbouring points
+        (inf).
 
     Returns
     -------
