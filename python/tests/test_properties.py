@@ -66,6 +66,8 @@ def test_scaling_by_a_power_of_two_scales_the_contour(points, power):
     scale = 2.0 ** power
     contour = vorn.fit(points, tol=TOL, strategy="mixed", closed=False)
     scaled = vorn.fit(points * scale, tol=TOL * scale, strategy="mixed", closed=False)
+    assert scaled.deviations(points * scale).max() <= TOL * scale * (1 + 1e-6)
+    # Thresholds are absolute, so rounding may decide otherwise about the reach of a piece.
     hypothesis.assume(len(scaled) == len(contour))
     for a, b in zip(contour, scaled):
         assert type(a) is type(b) and a.points == b.points
