@@ -88,9 +88,8 @@ class Reader {
   }
 
   void TakeGeometry(std::string const& word) {
-    if (word == "multicurve" || word == "multilinestring") {
-      TakeMembers();
-    } else if (word == "curvepolygon" || word == "polygon") {
+    if (word == "multicurve" || word == "multilinestring" || word == "curvepolygon" ||
+        word == "polygon") {
       TakeMembers();
     } else if (word == "multipolygon") {
       TakePolygons();
@@ -105,7 +104,7 @@ class Reader {
     for (std::string_view const ending : {"zm", "z", "m"}) {
       // "linestringm", but not a word that ends so by itself.
       if (word.ends_with(ending) && word.size() > ending.size()) {
-        std::string const base = word.substr(0, word.size() - ending.size());
+        std::string base = word.substr(0, word.size() - ending.size());
         if (base.ends_with("string") || base.ends_with("curve") || base.ends_with("polygon")) {
           return base;
         }
