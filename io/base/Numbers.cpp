@@ -61,6 +61,14 @@ std::string FormatFixed(double value, int decimals) {
   return WithoutMinusOnZero(buffer.data());
 }
 
+std::string FormatRelative(double value) {
+  constexpr int kFewest = 4;
+  constexpr int kAll = 17;
+  int digits = kFewest;
+  while (digits < kAll && value != 1.0 && FormatShort(value, digits) == "1") ++digits;
+  return FormatShort(value, digits);
+}
+
 std::string FormatExact(double value) {
   std::array<char, 64> buffer{};
   std::to_chars_result const result =

@@ -21,13 +21,20 @@ class Labels {
 
   /// Something is drawn here.
   void Take(Pixel const& at);
+  void TakeRing(Pixel const& at, double radius);
   void TakePiece(Piece const& piece);
 
   /// The text element beside the piece; nothing when there is no room.
-  std::string Add(Piece const& piece, std::string const& text);
+  std::string AddBeside(Piece const& piece, std::string const& text);
+
+  /// The same, or farther away with a thin line to the middle of the piece.
+  std::string AddAnywhere(Piece const& piece, std::string const& text);
 
  private:
+  std::string Write(Piece const& piece, Rect const& rect, std::string const& text);
+  std::string AddWithLeader(Piece const& piece, Anchor const& anchor, std::string const& text);
   bool IsFree(Rect const& rect) const;
+  bool IsLeaderFree(Pixel const& from, Pixel const& to) const;
   /// Whether another piece runs between the anchor and a label this far away.
   bool IsCutOff(Anchor const& anchor, double side, double distance) const;
 
@@ -35,6 +42,7 @@ class Labels {
   double band_;
   std::vector<Rect> pieces_;
   std::vector<Rect> taken_;
+  std::vector<Rect> labels_;
 };
 
 /// "3: R 12.5" for an arc, "4: 20.1" for a line: the number and the size.

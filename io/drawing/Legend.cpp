@@ -1,8 +1,9 @@
 #include "io/drawing/Legend.h"
 
 #include "io/drawing/Style.h"
-#include "io/drawing/SvgContour.h"
 #include "io/drawing/SvgElements.h"
+#include "io/drawing/SvgEnds.h"
+#include "io/drawing/SvgPieces.h"
 #include "vorn/io/Numbers.h"
 
 namespace Vorn::IO::Svg {
@@ -49,15 +50,19 @@ std::string Times(Scene const& scene) {
   return scene.magnify == 1.0 ? "" : " \xC3\x97" + FormatShort(scene.magnify);
 }
 
+bool AreLabelsSized(Scene const& scene) { return scene.drawing.pieces.size() <= kMostSizedLabels; }
+
 std::string const kOutline = "stroke=\"" + kTextColor + "\" stroke-width=\"1\"";
 
 void AddContourEntries(Scene const& scene, Legend* legend) {
   std::size_t const arcs = scene.drawing.ArcCount();
   if (arcs < scene.drawing.pieces.size()) {
-    legend->AddStroke("stroke=\"" + kLineColor + "\"", 2.0, "line: length");
+    legend->AddStroke("stroke=\"" + kLineColor + "\"", 2.0,
+                      AreLabelsSized(scene) ? "line: length" : "line");
   }
   if (arcs > 0) {
-    legend->AddStroke("stroke=\"" + kArcColor + "\" " + kArcDashes, 2.0, "arc: radius R");
+    legend->AddStroke("stroke=\"" + kArcColor + "\" " + kArcDashes, 2.0,
+                      AreLabelsSized(scene) ? "arc: radius R" : "arc");
   }
   if (scene.drawing.pieces.size() > 1) {
     legend->AddCircle(3.4, "fill=\"white\" " + kOutline, "joint");

@@ -20,12 +20,13 @@ inline std::string const kBandEdgeColor = "#6dbfa6";
 inline std::string const kStartColor = "#009e73";
 inline std::string const kGoodTextColor = "#00704f";
 inline std::string const kWorstColor = "#b5478b";
-inline std::string const kOutsideColor = "#000000";
+inline std::string const kOutsideColor = "#c8102e";
 inline std::string const kGridColor = "#e3e6e9";
 inline std::string const kFrameColor = "#868e96";
 inline std::string const kTextColor = "#212529";
 
 inline constexpr double kContourWidth = 1.7;
+inline constexpr double kWorstRadius = 7.0;
 inline std::string const kArcDashes = "stroke-dasharray=\"9 2.2\"";
 
 inline std::string const& ColorOf(Piece const& piece) {

@@ -61,7 +61,7 @@ std::string Judgement(Drawing const& drawing) {
       drawing.verdict ? Describe(*drawing.verdict) + ": largest deviation " : "largest deviation ";
   text += FormatShort(worst.distance, 4);
   if (!drawing.units.empty()) text += " " + drawing.units;
-  if (drawing.HasTolerances()) text += ", " + FormatShort(worst.relative, 4) + " of the tolerance,";
+  if (drawing.HasTolerances()) text += ", " + FormatRelative(worst.relative) + " of the tolerance,";
   return text + " at point " + std::to_string(index);
 }
 

@@ -174,21 +174,18 @@ std::string WithUnits(Scene const& scene, std::string const& text) {
 }
 
 std::string Worst(Scene const& scene, Chart const& chart) {
-  std::size_t const point = scene.drawing.Worst();
-  Pixel const at = chart.PlaceOf(scene, point);
-  bool const isOnRight = at.x > chart.Frame().left + 0.8 * chart.Frame().width;
-  PointDeviation const& worst = scene.drawing.deviations[point];
-  std::string const value = chart.IsRelative() ? FormatShort(worst.relative, 4) + " of tolerance"
-                                               : WithUnits(scene, FormatShort(worst.distance, 4));
-  // Towards zero there is room, while the line of the limit runs through the mark itself.
-  double const drop = worst.isLeft ? 16.0 : -8.0;
   return CircleElement(
-             at, 6.0,
-             "class=\"worst\" fill=\"none\" stroke=\"" + kWorstColor + "\" stroke-width=\"1.6\"") +
-         Text({at.x + (isOnRight ? -6.0 : 6.0), at.y + drop},
-              std::string("font-size=\"11\" class=\"halo\" fill=\"") + kTextColor +
-                  "\" text-anchor=\"" + (isOnRight ? "end" : "start") + "\"",
-              value + " at point " + std::to_string(point));
+      chart.PlaceOf(scene, scene.drawing.Worst()), 6.0,
+      "class=\"worst\" fill=\"none\" stroke=\"" + kWorstColor + "\" stroke-width=\"1.6\"");
+}
+
+/// "largest 0.0079 mm at point 84", beside the heading: inside the diagram it would hide points.
+std::string LargestText(Scene const& scene, Chart const& chart) {
+  std::size_t const point = scene.drawing.Worst();
+  PointDeviation const& worst = scene.drawing.deviations[point];
+  std::string const value = chart.IsRelative() ? FormatRelative(worst.relative)
+                                               : WithUnits(scene, FormatShort(worst.distance, 4));
+  return ": largest " + value + " at point " + std::to_string(point);
 }
 
 std::string Heading(Scene const& scene, Chart const& chart) {
@@ -197,7 +194,7 @@ std::string Heading(Scene const& scene, Chart const& chart) {
   std::string const title =
       chart.IsRelative() ? "Deviation as a multiple of the point's tolerance" : "Deviation" + units;
   return Text({frame.left, frame.top - kStripHeight - 7.0}, "font-size=\"12\" font-weight=\"bold\"",
-              title) +
+              title + LargestText(scene, chart)) +
          Text({frame.Right(), frame.top - kStripHeight - 7.0},
               "font-size=\"11\" text-anchor=\"end\"",
               "positive: to the left of the direction of travel; strip: pieces by kind") +

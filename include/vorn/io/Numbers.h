@@ -24,6 +24,10 @@ VORN_IO_EXPORT std::string FormatShort(double value, int digits = 6);
 /// Always `decimals` digits after the point; zero never carries a minus sign.
 VORN_IO_EXPORT std::string FormatFixed(double value, int decimals);
 
+/// A multiple of a tolerance, for people: four significant digits, and as many more as it takes not
+/// to read as 1 when it is less or more.
+VORN_IO_EXPORT std::string FormatRelative(double value);
+
 /// The fewest digits that read back as the same double.
 VORN_IO_EXPORT std::string FormatExact(double value);
 

@@ -38,6 +38,17 @@ TEST(ParseNumber, LeavesJudgingNonFiniteValuesToTheCaller) {
   EXPECT_TRUE(std::isinf(ParseNumber("1e999").value()));
 }
 
+TEST(FormatRelative, NeverReadsAsOneBesideIt) {
+  EXPECT_EQ(FormatRelative(0.12345), "0.1235");
+  EXPECT_EQ(FormatRelative(1.0), "1");
+  EXPECT_EQ(FormatRelative(0.99996), "0.99996");
+  EXPECT_EQ(FormatRelative(1.00004), "1.00004");
+  EXPECT_EQ(FormatRelative(0.9999999999), "0.9999999999");
+  EXPECT_EQ(FormatRelative(std::nextafter(1.0, 2.0)), "1.0000000000000002");
+  EXPECT_EQ(FormatRelative(0.0), "0");
+  EXPECT_EQ(FormatRelative(1575.4), "1575");
+}
+
 TEST(FormatExact, ReadsBackAsTheSameBits) {
   constexpr std::uint64_t kSeed = 7;
   SCOPED_TRACE(kSeed);

@@ -10,10 +10,11 @@
 #include "io/drawing/Band.h"
 #include "io/drawing/Decimation.h"
 #include "io/drawing/Feet.h"
+#include "io/drawing/Labels.h"
 #include "io/drawing/Layout.h"
 #include "io/drawing/Style.h"
-#include "io/drawing/SvgContour.h"
 #include "io/drawing/SvgElements.h"
+#include "io/drawing/SvgPaths.h"
 #include "vorn/io/Failure.h"
 
 namespace Vorn::IO::Svg {
@@ -283,6 +284,61 @@ TEST(ToSvg, PointsBeyondTheirToleranceAreCrosses) {
   std::string const svg = ToSvg(drawing);
   EXPECT_EQ(Occurrences(svg, "class=\"outside\""), 2u) << "in the contour and in the diagram";
   EXPECT_NE(svg.find("OUTSIDE TOLERANCE"), std::string::npos);
+}
+
+/// A comb of so many teeth: short lines side by side.
+std::vector<Piece> Comb(int teeth) {
+  std::vector<Piece> pieces;
+  for (int i = 0; i < teeth; ++i) {
+    double const x = 0.1 * i;
+    pieces.push_back(MakeLine({x, 0.0}, {x, 1.0}));
+    pieces.push_back(MakeLine({x, 1.0}, {x + 0.1, 0.0}));
+  }
+  return pieces;
+}
+
+TEST(ToSvg, OutsideIsRed) {
+  Drawing const drawing = MakeDrawing({{1, 0.5, 0.02}, {9, 0, 0.02}}, LineAndQuarter());
+  std::string const svg = ToSvg(drawing);
+  EXPECT_NE(svg.find("class=\"outside\" fill=\"none\" stroke=\"#c8102e\""), std::string::npos);
+  EXPECT_NE(svg.find("fill=\"#c8102e\" font-weight=\"bold\">OUTSIDE TOLERANCE"), std::string::npos);
+}
+
+TEST(ToSvg, DeviationBesideTheToleranceDoesNotReadAsAllOfIt) {
+  std::string const svg = ToSvg(MakeDrawing({{1, 0.199992, 0.2}, {9, 0, 0.2}}, LineAndQuarter()));
+  EXPECT_NE(svg.find("0.99996 of the tolerance"), std::string::npos) << svg.substr(0, 2000);
+}
+
+TEST(ToSvg, AxesTellTheirUnits) {
+  Drawing drawing = MakeDrawing({}, LineAndQuarter());
+  EXPECT_NE(ToSvg(drawing).find(">x</text>"), std::string::npos);
+  drawing.units = "mm";
+  EXPECT_NE(ToSvg(drawing).find(">x [mm]</text>"), std::string::npos);
+  EXPECT_NE(ToSvg(drawing).find(">y [mm]</text>"), std::string::npos);
+}
+
+TEST(ToSvg, LegendPromisesSizesOnlyWhereTheyAreWritten) {
+  std::string const few = ToSvg(MakeDrawing({}, Comb(20)));
+  EXPECT_NE(few.find("line: length"), std::string::npos);
+  std::string const many = ToSvg(MakeDrawing({}, Comb(21)));
+  EXPECT_EQ(many.find("line: length"), std::string::npos);
+  EXPECT_EQ(many.find(">42: 1"), std::string::npos);
+}
+
+TEST(Labels, StandAsideWithALeaderWhereThereIsNoRoomBeside) {
+  View const view({-50, 50, -50, 50}, 0.0, 0.0, 400.0, 400.0, 400.0);
+  Piece const line = MakeLine({-10, 0}, {10, 0});
+  Labels labels(view, 0.0);
+  labels.TakePiece(line);
+  EXPECT_EQ(labels.AddBeside(line, "1: 20").find("<line"), std::string::npos);
+  // Now everything near is taken.
+  for (int x = -150; x <= 150; x += 3) {
+    for (int y = -55; y <= 55; y += 3) labels.Take({200.0 + x, 200.0 + y});
+  }
+  EXPECT_EQ(labels.AddBeside(line, "1: 20"), "");
+  std::string const aside = labels.AddAnywhere(line, "1: 20");
+  EXPECT_EQ(Occurrences(aside, "class=\"leader\""), 1u) << aside;
+  EXPECT_EQ(Occurrences(aside, "<text"), 1u);
 }
 
 TEST(ToSvg, WithoutTolerancesThereIsNoVerdict) {
