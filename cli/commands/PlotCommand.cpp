@@ -11,6 +11,7 @@
 #include "cli/commands/ContourInput.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
+#include "cli/commands/ReportFields.h"
 #include "vorn/io/Drawing.h"
 #include "vorn/io/Formats.h"
 #include "vorn/io/Messages.h"
@@ -60,6 +61,8 @@ struct Options {
   PointsInput points;
   std::string contour;
   std::vector<std::string> outputs;
+  std::vector<std::string> fields;
+  ReportHead head;  ///< of the fields
   std::optional<Format> to;
   std::optional<int> outline;
   std::optional<double> magnify;
@@ -134,7 +137,9 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
   if (options.points.path.empty()) {
     ContourFile contour = ReadDrawnContour(options, console);
     if (!options.points.units.empty()) contour.units = Printable(options.points.units);
-    return DrawingOf(contour);
+    Drawing drawing = DrawingOf(contour);
+    drawing.head = options.head;
+    return drawing;
   }
   PointFile file = ReadPointsInput(options.points, console);
   if (IsToleranceStated(options.points.tolerance, file)) {
@@ -149,6 +154,7 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
   drawing.facts = {DescribeTolerance(drawing)};
   if (!options.contour.empty()) drawing.facts.push_back("contour " + NameOfFile(options.contour));
   drawing.magnify = options.magnify;
+  drawing.head = options.head;
   return drawing;
 }
 
@@ -225,6 +231,7 @@ void AddOptions(Command& command, Options* options) {
       "Write the outputs as this");
   AddOutline(command, &options->outline);
   AddMagnify(command, &options->magnify);
+  AddFieldOption(command, &options->fields);
   Option const dpi = AddPositiveNumber(command, "--dpi", &options->dpi, "N",
                                        "PNG: pixels to the inch on A4; 150 if not said");
   AddWholeNumber(command, "--width", &options->width, 1, kMostPixels, "N", "PNG: width in pixels")
@@ -243,6 +250,7 @@ void AddPlotCommand(CommandLine& program, Action* action) {
     if (options->outputs.empty()) {
       throw Failure(FailureKind::BadArgument, "--output is required, or --to");
     }
+    options->head = HeadOf(options->fields);
     TellContourFromPoints(options.get());
     RefuseSharedInput(*options);
     RefuseSharedFiles(options->Read(), options->Written());

@@ -68,6 +68,7 @@ Drawing DrawingOf(FitReport const& report) {
   drawing.pieces = report.pieces;
   drawing.deviations = report.remeasured.points;
   drawing.verdict = report.verdict;
+  drawing.head = report.head;
   drawing.facts = {DescribeTolerance(drawing), "strategy " + NameOf(report.strategy)};
   if (report.fit.fewestPossible) drawing.facts.push_back(DescribeBound(report));
   if (report.closure.isClosed && report.Gap() != 0.0) {

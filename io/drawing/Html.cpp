@@ -8,6 +8,7 @@
 #include "io/drawing/Feet.h"
 #include "io/drawing/Layout.h"
 #include "io/drawing/SvgElements.h"
+#include "io/measure/MeasureJson.h"
 #include "vorn/io/Drawing.h"
 #include "vorn/io/Numbers.h"
 
@@ -50,11 +51,13 @@ Json PointsJson(Drawing const& drawing) {
   return {{"x", std::move(x)}, {"y", std::move(y)}, {"w", TolerancesJson(drawing)}};
 }
 
-Json PieceJson(Piece const& piece) {
+Json PieceJson(Piece const& piece, PieceMeasure const& measure) {
   Json json = {{"kind", piece.IsArc() ? "arc" : "line"},
                {"start", Place(piece.start)},
                {"end", Place(piece.end)},
-               {"length", piece.length}};
+               {"length", piece.length},
+               {"measured", LeastSquaresJson(measure)},
+               {"turn", OrNull(measure.turn)}};
   if (!piece.IsArc()) return json;
   json["center"] = Place(piece.center);
   json["radius"] = piece.radius;
@@ -62,6 +65,36 @@ Json PieceJson(Piece const& piece) {
   json["startAngle"] = piece.startAngle;
   json["sweep"] = piece.sweep;
   return json;
+}
+
+Json PiecesJson(Drawing const& drawing) {
+  std::vector<WPoint> const none;
+  std::vector<PieceMeasure> const measures =
+      MeasurePieces(drawing.IsMeasured() ? drawing.points : none, drawing.deviations,
+                    drawing.pieces, drawing.IsClosed());
+  Json pieces = Json::array();
+  for (std::size_t i = 0; i < drawing.pieces.size(); ++i) {
+    pieces.push_back(PieceJson(drawing.pieces[i], measures[i]));
+  }
+  return pieces;
+}
+
+Json SummaryJson(Drawing const& drawing) {
+  DeviationSummary const summary =
+      Summarise(drawing.points, drawing.deviations, drawing.HasTolerances());
+  return {{"mean", summary.mean},
+          {"rootMeanSquare", summary.rootMeanSquare},
+          {"outside", summary.outside},
+          {"histogram", HistogramJson(summary)}};
+}
+
+/// Pairs, because a browser would put names that are numbers first.
+Json HeadJson(Drawing const& drawing) {
+  Json fields = Json::array();
+  for (ReportField const& field : drawing.head.fields) {
+    fields.push_back(Json::array({field.name, field.value}));
+  }
+  return fields;
 }
 
 Json DeviationsJson(Drawing const& drawing, std::vector<Foot> const& feet) {
@@ -114,17 +147,20 @@ Json DataJson(Drawing const& drawing) {
     if (!fact.empty()) facts.push_back(fact);
   }
   Json json = {{"title", drawing.title}, {"facts", facts}, {"units", drawing.units}};
+  json["fields"] = HeadJson(drawing);
+  json["program"] = drawing.head.program;
   json["points"] = PointsJson(drawing);
   json["pieces"] = Json::array();
   json["verdict"] = VerdictJson(drawing);
   if (!drawing.HasContour()) return json;
-  for (Piece const& piece : drawing.pieces) json["pieces"].push_back(PieceJson(piece));
+  json["pieces"] = PiecesJson(drawing);
   json["isClosed"] = drawing.IsClosed();
   if (!drawing.IsMeasured()) return json;
   std::vector<Foot> const feet = FeetOf(drawing);
   json["deviations"] = DeviationsJson(drawing, feet);
   json["band"] = BandJson(drawing, feet);
   json["worst"] = drawing.Worst();
+  json["summary"] = SummaryJson(drawing);
   json["magnify"] = MagnifyOnScreen(drawing);
   return json;
 }

@@ -10,6 +10,7 @@
 #include "vorn/io/Export.h"
 #include "vorn/io/FitReport.h"
 #include "vorn/io/Pieces.h"
+#include "vorn/io/ReportHead.h"
 
 namespace Vorn::IO {
 
@@ -27,6 +28,7 @@ struct VORN_IO_EXPORT Drawing {
   /// One for each point when there are pieces, else none; `relative` counts only where there is a
   /// tolerance.
   std::vector<PointDeviation> deviations;
+  ReportHead head;                 ///< what the user puts at the head
   std::optional<Verdict> verdict;  ///< nothing: there was nothing to judge
   /// How many times larger than true deviations and tolerances are drawn. Nothing: a round number
   /// that makes the largest tolerance readable.

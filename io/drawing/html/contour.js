@@ -6,7 +6,7 @@ import {bandPaths} from './band.js';
 import {arrow, ring, square} from './marks.js';
 import {paintPoints} from './points.js';
 import {FEW_POINTS, Occupancy} from './scene.js';
-import {Surface} from './surface.js';
+import {PAPER_WIDTH, Surface} from './surface.js';
 
 /** Pixels of a piece with its number beside it. */
 const LEAST_LABEL_ROOM = 34;
@@ -17,8 +17,8 @@ export class ContourDrawing {
     this.state = state;
     this.view = new View();
     this.isFresh = true;
-    const paperHeight = scene.isMeasured ? 325 : 529;
-    this.surface = new Surface(canvas, paperHeight, (...page) => this.paint(...page));
+    const paper = [PAPER_WIDTH, scene.isMeasured && !scene.isTall ? 325 : 529];
+    this.surface = new Surface(canvas, paper, (...page) => this.paint(...page));
   }
 
   showAll() {
@@ -73,7 +73,7 @@ export class ContourDrawing {
     // So many points would hide the contour.
     const areMany = this.scene.count > FEW_POINTS;
     if (!areMany) this.paintPieces();
-    paintPoints(this);
+    const visible = paintPoints(this);
     if (areMany) this.paintPieces();
     this.paintJoints();
     this.paintEnds();
@@ -81,6 +81,16 @@ export class ContourDrawing {
     if (this.scene.hasContour) this.paintNumbers();
     this.paintHovered();
     this.paintAxisLabels();
+    this.onPainted?.(visible.length > 0 || this.isPieceVisible());
+  }
+
+  /** Whether any piece runs through the canvas. */
+  isPieceVisible() {
+    return this.scene.pieces.some((piece) => {
+      const tracer = new Tracer(this.view, {moveTo() {}, lineTo() {}}, 0);
+      tracer.trace(piece);
+      return tracer.hasDrawn;
+    });
   }
 
   paintGrid() {
@@ -115,13 +125,17 @@ export class ContourDrawing {
     context.textAlign = 'center';
     for (const {value, label} of this.columns) {
       const x = view.px(value);
-      if (x > 50 && x < view.width - 20) halo(label, x, view.height - 6);
+      if (x > 50 && x < view.width - 80) halo(label, x, view.height - 6);
     }
     context.textAlign = 'left';
     for (const {value, label} of this.rows) {
       const y = view.py(value);
-      if (y > 14 && y < view.height - 22) halo(label, 6, y + 4);
+      if (y > 30 && y < view.height - 22) halo(label, 6, y + 4);
     }
+    const units = this.scene.units ? ` [${this.scene.units}]` : '';
+    halo(`y${units}`, 6, 16);
+    context.textAlign = 'right';
+    halo(`x${units}`, view.width - 8, view.height - 6);
   }
 
   paintBand() {

@@ -2,11 +2,14 @@
 
 import {ticksBetween} from './numbers.js';
 import {FEW_POINTS, Occupancy} from './scene.js';
-import {Surface} from './surface.js';
+import {PAPER_WIDTH, Surface} from './surface.js';
 import {cross, ring} from './marks.js';
 
 const PLOT = {left: 72, right: 16, top: 26, bottom: 36};
 const STRIP = 14;
+
+/** Width of the histogram beside the diagram with the gap between them, on paper in pixels. */
+const HISTOGRAM_ON_PAPER = 235;
 
 export class Diagram {
   constructor(canvas, scene, state) {
@@ -17,7 +20,8 @@ export class Diagram {
     this.alongs = Float64Array.from({length: scene.count}, (_, i) => scene.along(i));
     [this.from, this.to] = [0, scene.length];
     this.setRelative(this.isRelative);
-    this.surface = new Surface(canvas, 174, (...page) => this.paint(...page));
+    this.surface = new Surface(canvas, [PAPER_WIDTH - HISTOGRAM_ON_PAPER, 174],
+                               (...page) => this.paint(...page));
   }
 
   setRelative(isRelative) {

@@ -91,6 +91,8 @@ export class Tracer {
     /** Length in pixels from the start of the stretch to the first place drawn. */
     this.skipped = 0;
     this.isStarted = false;
+    /** Whether any of the stretches so far is near the canvas. */
+    this.hasDrawn = false;
   }
 
   trace(piece, from = 0, to = piece.length) {
@@ -157,6 +159,7 @@ export class Tracer {
     }
     if (!this.isStarted) this.skipped += from * length * view.scale;
     this.isStarted = true;
+    this.hasDrawn = true;
     const startX = ax + from * dx, startY = ay + from * dy;
     const isJoined = Math.abs(startX - this.penX) < 1e-3 && Math.abs(startY - this.penY) < 1e-3;
     if (!isJoined) this.path.moveTo(startX, startY);

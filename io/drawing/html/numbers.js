@@ -5,6 +5,35 @@ export function short(value, digits = 6) {
   return value === null || value === undefined ? '' : String(Number(value.toPrecision(digits)));
 }
 
+/** Always `decimals` digits after the point; zero never carries a minus sign. */
+export function fixed(value, decimals) {
+  if (!(Math.abs(value) < 1e9)) return short(value, 9);
+  return value.toFixed(decimals).replace(/^-(0\.?0*)$/, '$1');
+}
+
+/** Digits after the point that tell a hundredth of a length. */
+export function decimalsFor(length) {
+  return Math.min(9, Math.max(0, 2 - Math.floor(Math.log10(length)))) || 0;
+}
+
+const FEWEST_OF_RELATIVE = 4;
+const MOST_OF_RELATIVE = 12;
+
+/** Digits after the point so that none of the multiples of a tolerance reads as 1 but 1 itself. */
+export function decimalsOfRelatives(values) {
+  let decimals = FEWEST_OF_RELATIVE;
+  const isMisread = (value) => value !== 1 && Number(value.toFixed(decimals)) === 1;
+  while (decimals < MOST_OF_RELATIVE && values.some(isMisread)) ++decimals;
+  return decimals;
+}
+
+/** A multiple of a tolerance: four digits, or as many more as tell it from 1. */
+export function relativeText(value) {
+  let digits = FEWEST_OF_RELATIVE;
+  while (digits < 17 && value !== 1 && short(value, digits) === '1') ++digits;
+  return short(value, digits);
+}
+
 /** 1, 2 or 5 times a power of ten, not below `least`. */
 export function niceStep(least) {
   const power = 10 ** Math.floor(Math.log10(least));

@@ -26,7 +26,10 @@ export function dotSize({scene, view}, visible) {
   return Math.min(6, Math.max(2.4, 0.65 * (gaps[gaps.length >> 1] ?? 10)));
 }
 
-/** Draws the points of a contour drawing: dots on lines, squares on arcs, crosses outside. */
+/**
+ * Draws the points of a contour drawing: dots on lines, squares on arcs, crosses outside.
+ * @return those that are on the canvas and not hidden
+ */
 export function paintPoints(drawing) {
   const {context, scene, colors} = drawing;
   const visible = visiblePoints(drawing);
@@ -52,6 +55,7 @@ export function paintPoints(drawing) {
   }
   context.fill();
   paintCrosses(drawing, outside);
+  return visible;
 }
 
 function paintCrosses(drawing, points) {

@@ -1,12 +1,14 @@
 // Puts the page together.
 
-import {short} from './numbers.js';
+import {relativeText, short} from './numbers.js';
+import {sweepText} from './columns.js';
 import {Scene} from './scene.js';
 import {listenToGestures} from './surface.js';
 import {ContourDrawing} from './contour.js';
 import {Diagram} from './diagram.js';
 import {fillLegend} from './legend.js';
 import {PieceTable, element} from './table.js';
+import {fillHistogram} from './histogram.js';
 
 const scene = new Scene(JSON.parse(document.getElementById('data').textContent));
 const state = {hovered: -1, hoveredPiece: -1, chosen: -1};
@@ -26,6 +28,15 @@ function redraw() {
 
 // Summary
 
+function fillHead() {
+  for (const [name, value] of scene.fields) {
+    const entry = element('div');
+    entry.append(element('dt', name), element('dd', value));
+    byId('fields').append(entry);
+  }
+  if (scene.program) byId('program').textContent = `Made by ${scene.program}.`;
+}
+
 function fillSummary() {
   byId('facts').textContent = scene.facts.join(', ');
   const verdict = byId('verdict');
@@ -38,19 +49,19 @@ function fillSummary() {
   if (scene.hasContour) {
     const arcs = scene.pieces.filter((piece) => piece.kind === 'arc').length;
     entries.push(
-        ['pieces', String(scene.pieces.length)],
-        ['lines', String(scene.pieces.length - arcs)],
-        ['arcs', String(arcs)],
+        ['lines, arcs', `${scene.pieces.length - arcs}, ${arcs}`],
         ['length', short(scene.length) + units]);
   }
   if (scene.isMeasured) {
     const worst = scene.worst;
     entries.push(
-        ['largest deviation', short(Math.abs(scene.deviation(worst)), 4) + units],
-        ['at point', String(worst)]);
+        [`largest, at point ${worst}`, short(Math.abs(scene.deviation(worst)), 4) + units]);
     if (scene.hasTolerances) {
-      entries.push(['of its tolerance', short(Math.abs(scene.relative(worst)), 4)]);
+      entries.push(['of its tolerance', relativeText(Math.abs(scene.relative(worst)))],
+                   ['outside', `${scene.summary.outside} of ${scene.count}`]);
     }
+    entries.push(['root mean square', short(scene.summary.rootMeanSquare, 4) + units],
+                 ['mean', short(scene.summary.mean, 3) + units]);
   }
   for (const [name, value] of entries) {
     const entry = element('div');
@@ -68,7 +79,7 @@ function describePoint(i) {
     const deviation = scene.deviation(i);
     const side = deviation > 0 ? 'left' : 'right';
     rows.push(['deviation', short(Math.abs(deviation), 5) + units + (deviation ? ` ${side}` : '')]);
-    if (scene.hasTolerances) rows.push(['of tolerance', short(Math.abs(scene.relative(i)), 5)]);
+    if (scene.hasTolerances) rows.push(['of tolerance', relativeText(Math.abs(scene.relative(i)))]);
     const number = scene.pieceOf(i) + 1;
     rows.push(['piece', `${number} (${scene.pieces[number - 1].kind})`]);
   }
@@ -79,8 +90,11 @@ function describePiece(index) {
   const piece = scene.pieces[index];
   const rows = [['length', short(piece.length) + units]];
   if (piece.kind === 'arc') {
-    rows.push(['radius', short(piece.radius) + units], ['sweep', table.sweep(piece)]);
+    rows.push(['fitted radius', short(piece.radius) + units], ['sweep', sweepText(piece)]);
   }
+  const {measured} = piece;
+  if (measured?.radius) rows.push(['measured radius', short(measured.radius) + units]);
+  if (measured) rows.push(['form error', short(measured.formError, 4) + units]);
   if (scene.isMeasured) rows.push(['points', String(piece.points)]);
   return rows;
 }
@@ -194,6 +208,11 @@ function zoomMiddle(factor) {
 byId('zoom-in').addEventListener('click', () => zoomMiddle(1.5));
 byId('zoom-out').addEventListener('click', () => zoomMiddle(1 / 1.5));
 byId('reset').addEventListener('click', showAll);
+byId('back').addEventListener('click', showAll);
+contour.onPainted = (isAnything) => { byId('empty').hidden = isAnything; };
+byId('all-columns').addEventListener('change', (event) => {
+  byId('main').classList.toggle('all', event.target.checked);
+});
 
 function setUpMagnify() {
   const steps = scene.magnifications();
@@ -228,15 +247,19 @@ function setUpDiagram() {
   title();
 }
 
+fillHead();
 fillSummary();
+byId('main').classList.toggle('tall', scene.isTall);
 if (scene.isMeasured) {
+  fillHistogram(byId('histogram'), scene);
   setUpMagnify();
   setUpDiagram();
 } else {
   byId('magnify-control').hidden = true;
   byId('diagram-part').hidden = true;
   byId('pieces').hidden = !scene.hasContour;
-  byId('contour').classList.add('alone');
+  byId('note').hidden = true;
+  byId('main').classList.toggle('lone', !scene.hasContour);
   fillLegend(byId('legend'), scene);
 }
 

@@ -56,6 +56,17 @@ export class Scene {
     return Array.isArray(w) ? w.reduce((a, b) => Math.max(a, b), 0) : w ?? 0;
   }
 
+  get smallestTolerance() {
+    const w = this.points.w;
+    return Array.isArray(w) ? w.reduce((a, b) => Math.min(a, b), Infinity) : w ?? 0;
+  }
+
+  /** Whether the part is much higher than it is wide. */
+  get isTall() {
+    const box = this.box();
+    return box[3] - box[1] > 1.3 * (box[2] - box[0]);
+  }
+
   deviation(i) { return this.deviations.signed[i]; }
   relative(i) { return this.hasTolerances ? this.deviation(i) / this.tolerance(i) : null; }
   isOutside(i) {

@@ -3,13 +3,13 @@
 import {readColors, isPrinting} from './numbers.js';
 
 /** What is between the margins of A4 across, in pixels. */
-const PAPER_WIDTH = 1032;
+export const PAPER_WIDTH = 1032;
 
 export class Surface {
-  /** @param paperHeight height on paper in pixels, as the style sheet has it in millimetres */
-  constructor(canvas, paperHeight, paint) {
+  /** @param paper width and height on paper in pixels, as the style sheet has them */
+  constructor(canvas, paper, paint) {
     this.canvas = canvas;
-    this.paperHeight = paperHeight;
+    this.paper = paper;
     this.paint = paint;
     this.isScheduled = false;
     this.resolution = 0;
@@ -28,8 +28,8 @@ export class Surface {
   /** Draws at once; on paper in its size and with more pixels. */
   draw() {
     const canvas = this.canvas;
-    this.width = isPrinting() ? PAPER_WIDTH : canvas.clientWidth;
-    this.height = isPrinting() ? this.paperHeight : canvas.clientHeight;
+    this.width = isPrinting() ? this.paper[0] : canvas.clientWidth;
+    this.height = isPrinting() ? this.paper[1] : canvas.clientHeight;
     const resolution = isPrinting() ? 3 : devicePixelRatio || 1;
     const width = Math.max(1, Math.round(this.width * resolution));
     const height = Math.max(1, Math.round(this.height * resolution));

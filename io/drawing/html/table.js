@@ -1,6 +1,6 @@
 // The table of the pieces beside the drawing.
 
-import {short} from './numbers.js';
+import {columnsOf, worstOf} from './columns.js';
 import {LARGEST_RELATIVE} from './scene.js';
 
 export class PieceTable {
@@ -9,9 +9,11 @@ export class PieceTable {
     this.scene = scene;
     this.actions = actions;
     this.body = document.getElementById('rows');
-    const heads = ['no', 'kind', 'length', 'radius', 'sweep'];
-    if (scene.isMeasured) heads.push('points', scene.hasTolerances ? 'of tolerance' : 'deviation');
-    for (const head of heads) document.getElementById('columns').append(element('th', head));
+    this.columns = columnsOf(scene);
+    const heads = [{head: 'no', isMain: true}, {head: 'kind', isMain: true}, ...this.columns];
+    for (const {head, isMain} of heads) {
+      document.getElementById('columns').append(this.sorted(element('th', head), isMain));
+    }
     this.body.append(...scene.pieces.map((piece, i) => this.row(piece, i)));
     this.listen();
   }
@@ -27,33 +29,28 @@ export class PieceTable {
                              : '<line x1="0" y1="4" x2="22" y2="4" stroke="var(--line)" ' +
                                'stroke-width="2.5"/>', 22, 8),
                 isArc ? 'arc' : 'line');
-    row.append(element('td', String(i + 1)), kind, element('td', short(piece.length)),
-               element('td', isArc ? short(piece.radius) : ''),
-               element('td', isArc ? this.sweep(piece) : ''));
-    if (this.scene.isMeasured) {
-      row.append(element('td', String(piece.points)), this.worstCell(piece));
+    row.append(element('td', String(i + 1)), kind);
+    for (const column of this.columns) {
+      const cell = element('td', column.text(piece));
+      if (column.isWorst && this.scene.hasTolerances) this.addBar(cell, worstOf(this.scene, piece));
+      row.append(this.sorted(cell, column.isMain));
     }
     return row;
   }
 
-  /** Degrees, without a sign as everywhere, and an arrow for the direction. */
-  sweep(piece) {
-    return `${short(piece.sweep * 180 / Math.PI, 5)}\u00b0 ${piece.ccw ? '\u21ba' : '\u21bb'}`;
+  /** Cells of the columns that are not among the few have a class. */
+  sorted(cell, isMain) {
+    cell.classList.toggle('more', !isMain);
+    return cell;
   }
 
-  worstCell(piece) {
-    const {scene} = this;
-    if (piece.worst < 0) return element('td', '');
-    const value = Math.abs(scene.hasTolerances ? scene.relative(piece.worst)
-                                               : scene.deviation(piece.worst));
-    const cell = element('td', short(value, 4));
-    if (!scene.hasTolerances) return cell;
-    cell.className = 'share';
+  addBar(cell, value) {
+    if (value === null) return;
+    cell.classList.add('share');
     const bar = element('i');
     bar.style.width = `${Math.min(100, 100 * value)}%`;
     bar.classList.toggle('outside', !(value <= LARGEST_RELATIVE));
     cell.append(bar);
-    return cell;
   }
 
   listen() {
