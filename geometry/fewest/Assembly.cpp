@@ -197,7 +197,9 @@ std::vector<BuiltPiece> BuildPieces(Path const& path, Chain const& chain) {
       end = {joint.x, joint.y};
     }
     BuiltPiece built = BuildSegment(start, end);
-    if (MeasurePiece(path, built, piece.first, piece.end).value > 1.0) {
+    // Of a line rounding may leave an arc far flatter than what is asked for.
+    bool const isFlat = 4.0 * std::fabs(piece.circle.a) * path.limits.largestRadius < 1.0;
+    if (!isFlat && MeasurePiece(path, built, piece.first, piece.end).value > 1.0) {
       built = BuildAlong(piece.circle, start, end);
     }
     pieces.push_back(built);

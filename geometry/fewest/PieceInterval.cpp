@@ -49,6 +49,8 @@ Interval PieceSearch::FindInterval(Opening const& from, Gate const& to, Circle c
   Ends const ends{&from, &end, first, to.split};
   RunFit const inner = Fit({ToLocal(known), 0.0, false}, false, ends);
   if (!inner.isFound || inner.ratio > 1.0) return {};
+  bool const isBent = std::fabs(inner.circle.a) >= kStepShare * Flattest();
+  if (Flattest() > 0.0 && isBent && !KeepBent(inner.circle)) return {};
   normalisation_ = programme_.conditionCount;
   if (!programme_.Add({FormRow(inner.circle), Condition::Kind::Equality, 1.0})) return {};
   Extreme const low = FindExtreme(ends, inner, true);

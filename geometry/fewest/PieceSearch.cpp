@@ -20,6 +20,12 @@ constexpr double kUnlimited = 1e300;
 /// those that pass within 1.6 of the origin, and local coordinates are of the order of 1.
 constexpr double kBoxPerCurvature = 8.0;
 
+/// Share of a tolerance that is left to the rounding of what is measured.
+constexpr double kRoundingRoom = 1e-6;
+
+/// Linearisations after which the search for an arc of the largest radius ends.
+constexpr int kMostBendings = 4;
+
 /// Runs up to this length are searched from several starts.
 constexpr std::int32_t kShortRun = 4;
 
@@ -54,12 +60,31 @@ void PieceSearch::MoveTo(std::int32_t first, std::int32_t last) {
 }
 
 void PieceSearch::Cover(std::int32_t first, std::int32_t last) {
-  if (first < columnsFirst_ || first > columnsFirst_ + columns_.Size()) MoveTo(first, last);
-  for (std::int32_t i = columnsFirst_ + columns_.Size(); i < last; ++i) {
+  std::int32_t const rows = RowsPerPoint();
+  auto const covered = [&] { return columnsFirst_ + (columns_.Size() + rows - 1) / rows; };
+  if (first < columnsFirst_ || first > covered()) MoveTo(first, last);
+  for (std::int32_t i = covered(); i < last; ++i) {
+    if (rows > 1 && i > columnsFirst_) columns_.Append(MiddleOf(path_.At(i - 1), path_.At(i)));
     Sample sample = frame_.ToLocal(path_.At(i));
     sample.w *= share_;
     columns_.Append(sample);
   }
+}
+
+/// A piece that passes the middle of the way between neighbours this near stays near all of the
+/// way.
+Sample PieceSearch::MiddleOf(WPoint const& p, WPoint const& q) const {
+  double const room = path_.limits.farthestBetweenPoints + share_ * std::max(p.w, q.w);
+  return frame_.ToLocal(WPoint{0.5 * (p.x + q.x), 0.5 * (p.y + q.y), room * (1.0 - kRoundingRoom)});
+}
+
+void PieceSearch::UseRows(std::int32_t first, std::int32_t last) {
+  Cover(first, last);
+  std::int32_t const rows = RowsPerPoint();
+  programme_.columns = &columns_;
+  programme_.first = rows * (first - columnsFirst_);
+  programme_.last = rows * (last - 1 - columnsFirst_) + 1;
+  programme_.conditionCount = 0;
 }
 
 void PieceSearch::AddOpening(Opening const& opening) {
@@ -98,17 +123,49 @@ void PieceSearch::LimitCurvature(Opening const& from, std::int32_t end) {
 
 void PieceSearch::BeginProgramme(Opening const& from, std::int32_t end) {
   std::int32_t const first = from.First();
-  Cover(first, end);
-  programme_.columns = &columns_;
-  programme_.first = first - columnsFirst_;
-  programme_.last = end - columnsFirst_;
-  programme_.conditionCount = 0;
+  UseRows(first, end);
   programme_.box = kDefaultBox;
   LimitCurvature(from, end);
   AddOpening(from);
 }
 
 RunFit PieceSearch::Fit(RunFit const& start, bool isTest, Ends const& ends) {
+  RunFit const fit = FitAnyRadius(start, isTest, ends);
+  if (!fit.isFound || path_.limits.segmentsOnly || !(std::fabs(fit.circle.a) < Flattest())) {
+    return fit;
+  }
+  int const conditions = programme_.conditionCount;
+  RunFit const any{fit.circle, 0.0, false};
+  if (programme_.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0})) {
+    RunFit const straight = FitAnyRadius(any, isTest, ends);
+    if (straight.isFound && straight.ratio <= 1.0) return straight;
+  }
+  RunFit bent = any;
+  for (int round = 0; round < kMostBendings; ++round) {
+    programme_.conditionCount = conditions;
+    if (!KeepBent(bent.circle)) return {};
+    bent = FitAnyRadius({bent.circle, 0.0, false}, isTest, ends);
+    if (!bent.isFound || bent.ratio > 1.0) return bent;
+    if (std::fabs(bent.circle.a) >= kStepShare * Flattest()) return bent;
+  }
+  return {};
+}
+
+double PieceSearch::Flattest() const {
+  // A circle has |a| = 1 / (2 r).
+  return 0.5 / (path_.limits.largestRadius * frame_.scale) / kStepShare;
+}
+
+bool PieceSearch::KeepBent(Circle const& circle) {
+  // |a| of the normalised circle v is |a of v| / Form(circle, v), but for a square of the change.
+  Row const form = FormRow(circle);
+  double const least = Flattest();
+  double const sign = circle.a > 0.0 ? -1.0 : 1.0;
+  Row const row{least * form.a + sign, least * form.bx, least * form.by, least * form.d};
+  return programme_.Add({row, Condition::Kind::HalfSpace, 0.0});
+}
+
+RunFit PieceSearch::FitAnyRadius(RunFit const& start, bool isTest, Ends const& ends) {
   Simplex simplex(slack_);
   RunFit at = start;
   RunFit fit;
@@ -219,11 +276,7 @@ RunFit PieceSearch::FindBest(Opening const& from, Opening const& to, RunFit cons
 }
 
 RunFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
-  Cover(first, last);
-  programme_.columns = &columns_;
-  programme_.first = first - columnsFirst_;
-  programme_.last = last - columnsFirst_;
-  programme_.conditionCount = 0;
+  UseRows(first, last);
   Simplex simplex(slack_);
   Basis basis;
   RunFit fit = FitRun(programme_,

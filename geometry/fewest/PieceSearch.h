@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cmath>
 #include <cstdint>
 
 #include "geometry/fewest/Columns.h"
@@ -67,6 +68,12 @@ class PieceSearch {
 
  private:
   void Cover(std::int32_t first, std::int32_t last);
+  /// Two where pieces have to stay near the path between points: its middle has a row of its own.
+  std::int32_t RowsPerPoint() const {
+    return std::isfinite(path_.limits.farthestBetweenPoints) ? 2 : 1;
+  }
+  Sample MiddleOf(WPoint const& p, WPoint const& q) const;
+  void UseRows(std::int32_t first, std::int32_t last);
   void BeginProgramme(Opening const& from, std::int32_t end);
   void AddOpening(Opening const& opening);
   void LimitCurvature(Opening const& from, std::int32_t end);
@@ -77,7 +84,15 @@ class PieceSearch {
   };
   Extreme FindExtreme(Ends const& ends, RunFit const& inner, bool isLow);
 
+  /// A piece whose radius would be above the largest is straight or, where no line is within the
+  /// rows, an arc of the largest radius.
   RunFit Fit(RunFit const& start, bool isTest, Ends const& ends);
+  /// The least |a| of an arc in local coordinates; 0 where radii have no upper limit.
+  double Flattest() const;
+  /// Asks for arcs near a circle, bent to its side, that are not flatter than that; false when
+  /// there is no room.
+  bool KeepBent(Circle const& circle);
+  RunFit FitAnyRadius(RunFit const& start, bool isTest, Ends const& ends);
   PieceRules Rules() { return {path_, frame_, share_, &programme_}; }
   Reach FindFirstReach(Opening const& from);
   void Grow(Opening const& from, std::int32_t expected, Reach* reach);

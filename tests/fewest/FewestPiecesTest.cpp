@@ -234,28 +234,66 @@ TEST(FewestPiecesOptions, StepsAreNoLargerThanAsked) {
   EXPECT_GT(PieceCount(result), 1);
 }
 
+double LargestRadius(FewestResult const& result) {
+  double largest = 0.0;
+  for (auto const& elem : result.contour) {
+    if (elem.type == GeometryUtils::ElemType::Arc) largest = std::fmax(largest, elem.radius);
+  }
+  return largest;
+}
+
 TEST(FewestPiecesOptions, WhatIsFlatterThanTheLargestRadiusComesAsSegments) {
   RandomGeometry random(6202);
   Scan const scan = SampleWithNormalNoise(&random, {{40.0, 0.0005}, {20.0, 0.1}}, 600, 0.01, 0.4);
-  FewestOptions options;
-  options.largestRadius = 100.0;
-  FewestResult const result = FitKept(scan, options);
-  for (auto const& elem : result.contour) {
-    if (elem.type != GeometryUtils::ElemType::Arc) continue;
-    EXPECT_LE(elem.radius, 100.0);
+  for (double const largest : {30.0, 100.0, 1000.0}) {
+    FewestOptions options;
+    options.largestRadius = largest;
+    FewestResult const result = FitKept(scan, options);
+    EXPECT_LE(LargestRadius(result), largest * (1.0 + 1e-9));
+    // Chords of the flat arc leave it by 0.02 at most when they are 17.9 long: three of them.
+    EXPECT_LE(PieceCount(result), 4);
+    EXPECT_GT(PieceCount(result), PieceCount(FitKept(scan)));
   }
-  EXPECT_GT(PieceCount(result), PieceCount(FitKept(scan)));
+}
+
+TEST(FewestPiecesOptions, ARadiusAtTheLargestIsKept) {
+  Scan const scan = MakeNoisyArc(6206, 500, 0.45);
+  double const radius = LargestRadius(FitKept(scan));
+  FewestOptions options;
+  options.largestRadius = 1.01 * radius;
+  EXPECT_EQ(PieceCount(FitKept(scan, options)), 1);
+}
+
+/// How far a result leaves the middle of the way between neighbours that one arc covers.
+double LargestBulge(Scan const& scan, FewestResult const& result) {
+  double largest = 0.0;
+  for (std::size_t k = 0; k < result.ranges.size(); ++k) {
+    auto const& elem = result.contour[k + 1];
+    if (elem.type != GeometryUtils::ElemType::Arc) continue;
+    for (std::int32_t i = result.ranges[k].first; i < result.ranges[k].last; ++i) {
+      WPoint const& p = scan[static_cast<std::size_t>(i)];
+      WPoint const& q = scan[static_cast<std::size_t>(i) + 1];
+      double const x = 0.5 * (p.x + q.x) - elem.center.x;
+      double const y = 0.5 * (p.y + q.y) - elem.center.y;
+      largest = std::fmax(largest, std::fabs(std::hypot(x, y) - elem.radius));
+    }
+  }
+  return largest;
 }
 
 TEST(FewestPiecesOptions, PiecesStayNearThePathWhereAsked) {
-  Scan const scan = MakeRepeatedCircle(6205, 0.75, 10.0, 10, 0.05, 0.0);
-  FewestOptions options;
   // Neighbours are 30 degrees apart: the arc bulges 0.34.
-  options.farthestBetweenPoints = 0.1;
-  FewestResult const result = FitKept(scan, options);
-  EXPECT_GT(PieceCount(result), 1);
-  options.farthestBetweenPoints = 0.35;
-  EXPECT_EQ(PieceCount(FitKept(scan, options)), 1);
+  Scan const scan = MakeRepeatedCircle(6205, 0.75, 10.0, 10, 0.05, 0.0);
+  for (double const farthest : {0.0, 0.1, 0.3, 0.35}) {
+    SCOPED_TRACE(testing::Message() << "at most " << farthest);
+    FewestOptions options;
+    options.farthestBetweenPoints = farthest;
+    FewestResult const result = FitKept(scan, options);
+    EXPECT_LE(LargestBulge(scan, result), farthest + 0.05);
+    // Two points a segment do in any case.
+    EXPECT_LE(PieceCount(result), farthest < 0.29 ? 5 : 1);
+    EXPECT_GE(PieceCount(result), farthest < 0.29 ? 2 : 1);
+  }
 }
 
 TEST(FewestPiecesOptions, CentringBringsDeviationsDown) {
