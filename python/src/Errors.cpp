@@ -58,7 +58,9 @@ void RequireSuccess(bool succeeded, char const* operation) {
 }
 
 void RegisterErrors() {
-  py::register_exception_translator([](std::exception_ptr thrown) {
+  // By value, because that is the type of a translator.
+  // NOLINTNEXTLINE(performance-unnecessary-value-param)
+  py::register_local_exception_translator([](std::exception_ptr thrown) {
     try {
       if (thrown) std::rethrow_exception(thrown);
     } catch (IO::Failure const& failure) {

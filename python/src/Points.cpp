@@ -29,7 +29,7 @@ py::array ViewOf(std::vector<WPoint>* points, Columns const& columns) {
     shape.push_back(columns.count);
     strides.push_back(sizeof(double));
   }
-  return py::array(py::dtype::of<double>(), shape, strides, data, py::none());
+  return {py::dtype::of<double>(), shape, strides, data, py::none()};
 }
 
 /// NumPy converts and walks the strides; it refuses what does not become a number, and shapes that

@@ -14,7 +14,7 @@ namespace {
 
 /// (n, 3), or (n, 2) for points without tolerances.
 py::array_t<double> ArrayOf(IO::PointFile const& file, bool withTolerances) {
-  py::ssize_t const count = static_cast<py::ssize_t>(file.points.size());
+  auto const count = static_cast<py::ssize_t>(file.points.size());
   py::array_t<double> array({count, withTolerances ? py::ssize_t{3} : py::ssize_t{2}});
   auto out = array.mutable_unchecked<2>();
   for (py::ssize_t i = 0; i < count; ++i) {

@@ -20,7 +20,7 @@ constexpr double kNone = std::numeric_limits<double>::quiet_NaN();
 /// Rows of `width` numbers; a single row is one.
 struct Rows {
   Rows(Numbers const& numbers, py::ssize_t width, char const* name)
-      : data(numbers.data()), count(0), step(width) {
+      : data(numbers.data()), step(width) {
     py::ssize_t const last = numbers.ndim() > 0 ? numbers.shape(numbers.ndim() - 1) : 0;
     if (numbers.ndim() < 1 || numbers.ndim() > 2 || last != width) {
       throw py::value_error(std::string(name) + " must have rows of " + std::to_string(width) +
@@ -39,7 +39,7 @@ struct Rows {
   double const* operator[](py::ssize_t i) const { return data + i * step; }
 
   double const* data;
-  py::ssize_t count;
+  py::ssize_t count = 0;
   py::ssize_t step;
 };
 

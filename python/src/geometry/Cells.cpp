@@ -21,7 +21,11 @@ Places PermissibleRect(Triple const& a, Triple const& b) {
   double rect[8] = {};
   RequireSuccess(GeometryUtils::GetPermissibleRect(WPointOf(a), WPointOf(b), rect),
                  "get_permissible_rect");
-  return {{rect[0], rect[1]}, {rect[2], rect[3]}, {rect[4], rect[5]}, {rect[6], rect[7]}};
+  Places places;
+  for (double const* corner = rect; corner != rect + 8; corner += 2) {
+    places.emplace_back(corner[0], corner[1]);
+  }
+  return places;
 }
 
 std::pair<Places, bool> LinePolygon(Triple const& a, Triple const& b,

@@ -81,9 +81,21 @@ Numbers Reorth(int dimension, Numbers const& elements, int terms) {
   return result;
 }
 
+void BindReorth(py::module_& module) {
+  module.def("reorth_elements", &Reorth, py::arg("dimension"), py::arg("elements"),
+             py::arg("terms"), R"(
+The nine elements of a matrix pulled back to a rotation, as an array (3, 3). Raises ContourError for
+another dimension than 3.
+
+>>> reorth_elements(3, [[1, 0, 0], [0, 1, 0], [0, 0, 1]], 4)[0]
+array([1., 0., 0.])
+)");
+}
+
 }  // namespace
 
 void BindMatrix(py::module_& module) {
+  BindReorth(module);
   py::class_<Matrix>(module, "Matrix", R"(
 A 3x3 rotation matrix; angles are radians, and the elementary rotations turn the frame, not the
 point.
@@ -119,14 +131,6 @@ point.
           "__matmul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
           "The product of two matrices.")
       .def(py::pickle(&ToArray, &FromArray));
-  module.def("reorth_elements", &Reorth, py::arg("dimension"), py::arg("elements"),
-             py::arg("terms"), R"(
-The nine elements of a matrix pulled back to a rotation, as an array (3, 3). Raises ContourError for
-another dimension than 3.
-
->>> reorth_elements(3, [[1, 0, 0], [0, 1, 0], [0, 0, 1]], 4)[0]
-array([1., 0., 0.])
-)");
 }
 
 }  // namespace Vorn::Python

@@ -47,9 +47,27 @@ Place LinesIntersection(double k1, double m1, double k2, double m2) {
   return at;
 }
 
+void BindRounding(py::module_& module) {
+  module.def("get_outside_max", py::vectorize(&MathUtils::GetOutsideMax), py::arg("value"), R"(
+The smallest whole number that is not below the value, for numbers or arrays; -2147483648 where that
+does not fit 32 bits.
+
+>>> int(get_outside_max(1.2))
+2
+)");
+  module.def("get_outside_min", py::vectorize(&MathUtils::GetOutsideMin), py::arg("value"), R"(
+The largest whole number that is not above the value, for numbers or arrays; -2147483648 where that
+does not fit 32 bits.
+
+>>> int(get_outside_min(-1.2))
+-2
+)");
+}
+
 }  // namespace
 
 void BindNumeric(py::module_& module) {
+  BindRounding(module);
   module.def("linear_equation_system_solve", &Solve, py::arg("matrix"), py::arg("rhs"), R"(
 Solves matrix (n, n) times solution = rhs (n,) by elimination with row pivoting.
 
@@ -66,20 +84,6 @@ and q2. All are (x, y, z). Raises ContourError where an end has none.
 
 >>> calc_normalized_3d_vectors((0, 0, 0), (1, 0, 0), (0, 1, 0), (1, 1, 0))
 ([0.0, 1.0, 0.0], [1.0, 1.0, 0.0])
-)");
-  module.def("get_outside_max", py::vectorize(&MathUtils::GetOutsideMax), py::arg("value"), R"(
-The smallest whole number that is not below the value, for numbers or arrays; -2147483648 where that
-does not fit 32 bits.
-
->>> int(get_outside_max(1.2))
-2
-)");
-  module.def("get_outside_min", py::vectorize(&MathUtils::GetOutsideMin), py::arg("value"), R"(
-The largest whole number that is not above the value, for numbers or arrays; -2147483648 where that
-does not fit 32 bits.
-
->>> int(get_outside_min(-1.2))
--2
 )");
   module.def("get_lines_intersection", &LinesIntersection, py::arg("k1"), py::arg("m1"),
              py::arg("k2"), py::arg("m2"), R"(
