@@ -23,7 +23,7 @@ Matrix FromArray(Numbers const& elements) {
   if (elements.size() != kElements) throw py::value_error("a matrix has nine elements");
   Mtrx values = {};
   std::copy_n(elements.data(), kElements, values.m);
-  return Matrix(values);
+  return {values};
 }
 
 /// A matrix is its nine doubles, which no member gives out.
