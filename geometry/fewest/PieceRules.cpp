@@ -34,16 +34,24 @@ constexpr double kLeastSlope = 1e-3;
 /// How many points at either end of a piece may lie beyond its joint.
 constexpr std::int32_t kPointsNearJoint = 4;
 
+double SquaredGradient(Circle const& circle, Place const& place) {
+  Place const gradient = GradientAt(circle, place);
+  return gradient.x * gradient.x + gradient.y * gradient.y;
+}
+
 }  // namespace
 
 PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& ends) const {
   double worst = 0.0;
   double length = 0.0;
   Condition broken;
+  Sample p = frame_.ToLocal(path_.At(ends.first));
+  double here2 = SquaredGradient(circle, PlaceOf(p));
   for (std::int32_t i = ends.first + 1; i < ends.end; ++i) {
-    Sample const p = frame_.ToLocal(path_.At(i - 1));
     Sample const q = frame_.ToLocal(path_.At(i));
-    Row const row = AdvanceRow(PlaceOf(p), q.x - p.x, q.y - p.y);
+    double const dx = q.x - p.x;
+    double const dy = q.y - p.y;
+    Row const row = AdvanceRow(PlaceOf(p), dx, dy);
     double const room = kNoiseStep * (p.w + q.w);
     double const advance = Apply(row, circle);
     length += advance;
@@ -52,9 +60,12 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
       worst = excess;
       broken = {Negated(row), Condition::Kind::HalfSpace, room};
     }
-    double const gap2 = (q.x - p.x) * (q.x - p.x) + (q.y - p.y) * (q.y - p.y);
-    Check const step = AddBrokenStep(circle, gap2, p, PlaceOf(q));
-    if (step != Check::Holds) return step;
+    double const gap2 = dx * dx + dy * dy;
+    double const there2 = SquaredGradient(circle, PlaceOf(q));
+    double const near2 = std::min(here2, there2);
+    if (IsLargeStep(circle, gap2, near2, p.w)) return AddStep(gap2, near2);
+    p = q;
+    here2 = there2;
   }
   // An advance is the radius times the sine of a step, so this is the turn or less.
   if (2.0 * std::fabs(circle.a) * length > kTurnToCount && IsFullTurn(circle, ends)) {
@@ -64,19 +75,16 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
   return programme_->Add(broken) ? Check::Added : Check::Hopeless;
 }
 
-PieceRules::Check PieceRules::AddBrokenStep(Circle const& circle, double gap2, Sample const& p,
-                                            Place const& q) const {
+/// The feet of two points on a circle are as far apart as the points, divided by the distance of
+/// the nearer one from the centre in radii; `near2` is the square of that distance. Points nearer
+/// than their tolerance make no step.
+bool PieceRules::IsLargeStep(Circle const& circle, double gap2, double near2, double w) const {
   double const limit = kStepShare * path_.limits.sineOfHalfStep;
-  // The feet of two points on the circle are as far apart as the points, divided by the distance of
-  // the nearer one from the centre in radii.
-  Place const here = GradientAt(circle, PlaceOf(p));
-  Place const there = GradientAt(circle, q);
-  double const near2 =
-      std::min(here.x * here.x + here.y * here.y, there.x * there.x + there.y * there.y);
-  if (circle.a * circle.a * gap2 <= limit * limit * near2 || gap2 <= p.w * p.w) {
-    return Check::Holds;
-  }
-  double const most = limit * std::sqrt(near2 / gap2);
+  return !(circle.a * circle.a * gap2 <= limit * limit * near2 || gap2 <= w * w);
+}
+
+PieceRules::Check PieceRules::AddStep(double gap2, double near2) const {
+  double const most = kStepShare * path_.limits.sineOfHalfStep * std::sqrt(near2 / gap2);
   if (!(most > 0.0)) return Check::Hopeless;
   Condition const condition{{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Slab, most};
   return programme_->Add(condition) ? Check::Added : Check::Hopeless;
@@ -111,8 +119,8 @@ PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const
   double const room = share_ * sample.w;
   double const gap2 = dx * dx + dy * dy;
   if (point == (sense > 0.0 ? gate.split : gate.split - 1)) {
-    Check const step = AddBrokenStep(circle, gap2, sample, p);
-    if (step != Check::Holds) return step;
+    double const near2 = SquaredGradient(circle, p);
+    if (IsLargeStep(circle, gap2, near2, sample.w)) return AddStep(gap2, near2);
   }
   // From a quarter turn on the direction at the point says nothing about its order.
   if (2.0 * circle.a * circle.a * gap2 > 1.0) return Check::Holds;
@@ -150,8 +158,9 @@ PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const
 }
 
 PieceRules::Check PieceRules::AddBroken(Circle const& circle, Ends const& ends) const {
+  if (ends.first >= ends.end) return Check::Holds;
   Check const order = AddBrokenOrder(circle, ends);
-  if (order != Check::Holds || ends.first >= ends.end) return order;
+  if (order != Check::Holds) return order;
   if (!ends.from->isFree) {
     std::int32_t const last =
         std::min(ends.end, ends.first + kPointsNearJoint * StrideFrom(path_, ends.first));

@@ -43,7 +43,8 @@ class PieceRules {
 
  private:
   Check AddBrokenOrder(Circle const& circle, Ends const& ends) const;
-  Check AddBrokenStep(Circle const& circle, double gap2, Sample const& p, Place const& q) const;
+  bool IsLargeStep(Circle const& circle, double gap2, double near2, double w) const;
+  Check AddStep(double gap2, double near2) const;
   bool IsFullTurn(Circle const& circle, Ends const& ends) const;
   Check AddBrokenJoint(Circle const& circle, Opening const& opening, std::int32_t point) const;
 
