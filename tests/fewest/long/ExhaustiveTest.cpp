@@ -34,6 +34,16 @@ void ExpectNoFewer(Scan const& scan) {
                                   << PieceCount(result);
 }
 
+TEST(FewestPiecesExhaustively, NoChainOnTheGridHasFewerPiecesOnNoisyProfiles) {
+  RandomGeometry random(8101);
+  for (int round = 0; round < 30; ++round) {
+    SCOPED_TRACE(testing::Message() << "seed 8101, round " << round);
+    auto const pieces = RandomPieces(&random);
+    double const noise = random.Uniform(0.3, 1.0);
+    ExpectNoFewer(SampleWithNormalNoise(&random, pieces, random.Integer(12, 60), 0.1, noise));
+  }
+}
+
 TEST(FewestPiecesExhaustively, NoChainOnTheGridHasFewerPiecesOnFreeForms) {
   for (double const w : {0.02, 0.01, 0.005}) {
     SCOPED_TRACE(testing::Message() << "w " << w);
