@@ -52,7 +52,7 @@ Many files: each is fitted by itself, several at once, and has a line with its p
 largest deviation, time and result. Those that fail do not stop the others; their whole messages go
 to standard error. Lines come in the order of the files, and the same files give the same bytes
 whatever --jobs is (--no-time leaves out what differs from run to run). The exit code is the worst
-of all files, in the order 70, 3, 2, 4, 5, 1, 0.
+of all files, in the order 70, 3, 2, 4, 5, 1, 0. With --summary one table tells of all files.
 
 Exit codes:
   0   every point is within its tolerance

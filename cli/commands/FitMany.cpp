@@ -17,6 +17,7 @@
 #include "cli/base/Advice.h"
 #include "cli/commands/Outputs.h"
 #include "cli/texts/Relative.h"
+#include "vorn/io/FitSummary.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -28,6 +29,8 @@ namespace fs = std::filesystem;
 
 constexpr char const* kStandardStream = "-";
 constexpr int kTimeDecimals = 3;
+constexpr char const* kCsvEnding = ".csv";
+constexpr char const* kHtmlEnding = ".html";
 
 /// How one file ended.
 struct Outcome {
@@ -41,6 +44,7 @@ struct Outcome {
   double deviation = 0.0;  ///< relative
   double seconds = 0.0;
   std::vector<FittedFile> files;  ///< to write
+  SummaryRow row;                 ///< only for a summary
 };
 
 /// Grows from what a file says about itself to what is wrong around it.
@@ -86,6 +90,7 @@ Outcome FitFile(FitMany const& many, std::string const& path) {
     }
   }
   Verdict const verdict = VerdictOf(report, outcome.files);
+  if (!many.summary.empty()) outcome.row = SummaryRowOf(report, verdict);
   outcome.code = ExitCodeOf(verdict);
   outcome.verdict = Describe(verdict);
   if (verdict != Verdict::WithinTolerance) outcome.message = Complaint(report, outcome.files);
@@ -136,6 +141,7 @@ class Listing {
     } else {
       Print(outcome.path, {"-", "-", "-", "-"}, outcome.verdict);
     }
+    if (!many_.summary.empty()) rows_.push_back(RowOf(outcome));
     if (!outcome.message.empty()) console_.err << "contour: " << outcome.message << '\n';
     ++counts_[outcome.isFitted ? outcome.verdict : "failed"];
     if (Severity(outcome.code) > Severity(worst_)) worst_ = outcome.code;
@@ -158,11 +164,28 @@ class Listing {
       text += "; " + FormatFixed(taken.count(), kTimeDecimals) + " s";
     }
     console_.out << text << '\n';
+    if (!many_.summary.empty()) WriteSummary();
     return worst_;
   }
 
  private:
   static constexpr char const* kName = "file";
+
+  static SummaryRow RowOf(Outcome const& outcome) {
+    if (outcome.isFitted) return outcome.row;
+    SummaryRow row;
+    row.path = outcome.path;
+    row.result = outcome.verdict;
+    return row;
+  }
+
+  void WriteSummary() {
+    bool const isCsv = fs::path(many_.summary).extension() == kCsvEnding;
+    Outputs outputs;
+    outputs.Add(many_.summary, isCsv ? SummaryCsv(rows_) : SummaryHtml(rows_, many_.head));
+    outputs.Write(console_);
+    console_.out << "wrote " << Printable(many_.summary) << '\n';
+  }
 
   void Print(std::string const& name, std::array<std::string, 4> const& numbers,
              std::string const& result) const {
@@ -184,6 +207,7 @@ class Listing {
   std::size_t pieces_ = 0;
   double deviation_ = 0.0;
   std::string largest_;
+  std::vector<SummaryRow> rows_;
   std::map<std::string, std::size_t> counts_;
   ExitCode worst_ = ExitCode::Ok;
   std::chrono::steady_clock::time_point begin_ = std::chrono::steady_clock::now();
@@ -204,6 +228,20 @@ std::string WholePath(std::string const& path) {
   return fs::weakly_canonical(fs::absolute(path, error), error).string();
 }
 
+/// The summary has one of two endings and is none of the inputs.
+void RefuseSummary(FitMany const& many, std::map<std::string, std::string> const& inputs) {
+  if (many.summary.empty()) return;
+  std::string const ending = fs::path(many.summary).extension().string();
+  if (ending != kCsvEnding && ending != kHtmlEnding) {
+    throw Failure(FailureKind::BadArgument,
+                  "--summary " + many.summary + ": the name must end in .csv or .html");
+  }
+  if (inputs.count(WholePath(many.summary)) > 0) {
+    throw Failure(FailureKind::BadArgument,
+                  "the summary would be written over the input " + many.summary);
+  }
+}
+
 }  // namespace
 
 std::string OutputOf(FitMany const& many, std::string const& path, Format format) {
@@ -219,6 +257,7 @@ void RefuseCollisions(FitMany const& many) {
     }
     inputs.emplace(WholePath(path), path);
   }
+  RefuseSummary(many, inputs);
   if (many.outFolder.empty()) return;
   std::map<std::string, std::string> outputs;
   for (std::string const& path : many.paths) {
@@ -241,6 +280,7 @@ void RefuseCollisions(FitMany const& many) {
 }
 
 ExitCode RunFitMany(FitMany const& many, Console const& console) {
+  if (!many.summary.empty()) RequireWritable({{"--summary", many.summary}});
   if (!many.outFolder.empty()) MakeFolder(many.outFolder);
   int const jobs = many.jobs.value_or(tbb::info::default_concurrency());
   // With more jobs than processors the arena alone would not get its threads.

@@ -62,6 +62,9 @@ void AddManyOptions(Command& command, FitOptions* options) {
   command.AddText("--out-dir", &options->outFolder, "FOLDER",
                   "Fit one or many files and write the contours into this folder, named after the "
                   "inputs; it is made if need be");
+  command.AddText("--summary", &options->summary, "FILE",
+                  "Write a table with a row for each file, the worst first, and totals: .csv, or "
+                  ".html with a small picture of each contour");
   AddWholeNumber(command, "-j,--jobs", &options->jobs, 1, kMostJobs, "N",
                  "Fit so many files at once; as many as there are processors if not said");
   command.AddFlag("--no-time", &options->hideTime,
@@ -165,6 +168,8 @@ FitMany ManyOf(FitOptions const& options) {
   FitMany many;
   many.paths = options.paths;
   many.outFolder = options.outFolder;
+  many.summary = options.summary;
+  many.head = options.head;
   many.formats = options.formats.empty() ? std::vector{Format::Json} : options.formats;
   many.jobs = options.jobs;
   many.showTime = !options.hideTime;

@@ -33,6 +33,7 @@ struct FitOptions {
   std::vector<std::string> outputs;
   std::vector<Format> formats;
   std::string outFolder;
+  std::string summary;
   std::optional<int> jobs;
   bool hideTime = false;
   WriteOptions write;
@@ -44,7 +45,7 @@ struct FitOptions {
   ReportHead head;  ///< of the fields
 
   /// Whether files are fitted side by side, a line for each.
-  bool AreMany() const { return paths.size() > 1 || !outFolder.empty(); }
+  bool AreMany() const { return paths.size() > 1 || !outFolder.empty() || !summary.empty(); }
 
   /// How the points are to be fitted.
   FitChoice Choice() const;

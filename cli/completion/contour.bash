@@ -35,6 +35,7 @@ _contour_endings() {
     *:--table | *:--dropped | intersect:-o | intersect:--output) echo csv ;;
     simplify:*) echo csv ;;
     plot:-o | plot:--output) echo svg png html ;;
+    *:--summary) echo csv html ;;
     *:--header | *:--footer) echo nc gcode txt ;;
     fit:-o | fit:--output | convert:-o | convert:--output)
       echo json csv dxf nc gcode wkt svg png html

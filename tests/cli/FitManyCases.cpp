@@ -3,6 +3,7 @@
 #include <cmath>
 #include <map>
 #include <nlohmann/json.hpp>
+#include <sstream>
 #include <string>
 
 #include "cli/ProgramFixture.h"
@@ -42,6 +43,65 @@ class ManyFiles : public Program {
     return contents;
   }
 };
+
+/// A good file, one that cannot be read, with signs of CSV in its name, and a long one.
+class Summaries : public Program {
+ protected:
+  void WriteInputs() const {
+    Write("good.csv", Corner());
+    Write("bad, \"one\".csv", "x,y\n1,2\n3,four\n");
+    Write("wave.csv", Wave(400, 3.0));
+  }
+};
+
+TEST_F(Summaries, AsCsvHaveARowForEachFileWorstFirstAndTotals) {
+  WriteInputs();
+  Ended const ended = Run("fit good.csv bad*.csv wave.csv -t 0.02 --summary all.csv");
+  EXPECT_EQ(ended.code, 3) << ended.err;
+  std::istringstream lines(Contents(folder_ / "all.csv"));
+  std::vector<std::string> rows;
+  for (std::string line; std::getline(lines, line);) rows.push_back(line);
+  ASSERT_EQ(rows.size(), 5u);
+  EXPECT_EQ(rows[0], "file,result,points,lines,arcs,largest_deviation,outside,root_mean_square");
+  EXPECT_EQ(rows[1].rfind("\"bad, \"\"one\"\".csv\",failed: ", 0), 0u) << rows[1];
+  EXPECT_EQ(rows[2].rfind("wave.csv,within tolerance,400,", 0), 0u) << rows[2];
+  EXPECT_EQ(rows[3].rfind("good.csv,within tolerance,21,2,0,", 0), 0u) << rows[3];
+  EXPECT_EQ(rows[4].rfind("total,2 of 3 files within tolerance,421,", 0), 0u) << rows[4];
+}
+
+TEST_F(Summaries, AsPagesHaveAPictureOfEachContourAndTheFields) {
+  WriteInputs();
+  Ended const ended =
+      Run("fit good.csv bad*.csv wave.csv -t 0.02 --summary all.html --field 'part=<Cam>'");
+  EXPECT_EQ(ended.code, 3) << ended.err;
+  std::string const page = Contents(folder_ / "all.html");
+  std::size_t pictures = 0;
+  for (std::size_t at = 0; (at = page.find("<svg ", at)) != std::string::npos; ++at) ++pictures;
+  EXPECT_EQ(pictures, 2u);
+  EXPECT_NE(page.find("part <b>&lt;Cam&gt;</b>"), std::string::npos);
+  EXPECT_LT(page.find("failed: "), page.find("wave.csv"));
+  EXPECT_LT(page.find("wave.csv"), page.find("good.csv"));
+  EXPECT_NE(page.find("2 of 3 files within tolerance"), std::string::npos);
+  EXPECT_EQ(page.find("{{"), std::string::npos);
+  EXPECT_EQ(page.find("://"), std::string::npos) << "no network";
+}
+
+TEST_F(Summaries, AreTheSameForAnyNumberOfJobs) {
+  WriteInputs();
+  Run("fit good.csv wave.csv -t 0.02 -j 1 --summary one.html");
+  Run("fit good.csv wave.csv -t 0.02 -j 4 --summary four.html");
+  EXPECT_EQ(Contents(folder_ / "one.html"), Contents(folder_ / "four.html"));
+}
+
+TEST_F(Summaries, HaveOneOfTwoEndingsAndOverwriteNoInput) {
+  WriteInputs();
+  ExpectRefusal("fit good.csv wave.csv -t 0.02 --summary all.txt", 2,
+                "--summary all.txt: the name must end in .csv or .html");
+  ExpectRefusal("fit good.csv wave.csv -t 0.02 --summary wave.csv", 2,
+                "the summary would be written over the input wave.csv");
+  ExpectRefusal("fit good.csv wave.csv -t 0.02 --summary none/all.csv", 3,
+                "none/all.csv: cannot be written: No such file or directory");
+}
 
 TEST_F(ManyFiles, GiveTheSameBytesForAnyNumberOfJobs) {
   WriteInputs();
