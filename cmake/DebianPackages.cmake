@@ -112,8 +112,8 @@ set(CPACK_DEBIAN_IO_RUNTIME_PACKAGE_DEPENDS "${library_package} (>= ${debian_ver
 set(CPACK_COMPONENT_IO_RUNTIME_DESCRIPTION
     "files, measures and drawings of contours, shared library
 Reads measured points, fits contours of straight segments and circular
-arcs to them, reads and writes contours as JSON, CSV, DXF, G-code and
-WKT, measures deviations, areas and intersections, and draws SVG, PNG
+arcs to them, reads and writes contours as JSON, CSV, DXF, G-code, WKT,
+GeoJSON and SVG, measures deviations, areas and intersections, and draws SVG, PNG
 and HTML.
 .
 This package holds the shared library.")
@@ -126,8 +126,8 @@ set(CPACK_DEBIAN_IO_DEVELOPMENT_PACKAGE_DEPENDS
 set(CPACK_COMPONENT_IO_DEVELOPMENT_DESCRIPTION
     "files, measures and drawings of contours, development files
 Reads measured points, fits contours of straight segments and circular
-arcs to them, reads and writes contours as JSON, CSV, DXF, G-code and
-WKT, measures deviations, areas and intersections, and draws SVG, PNG
+arcs to them, reads and writes contours as JSON, CSV, DXF, G-code, WKT,
+GeoJSON and SVG, measures deviations, areas and intersections, and draws SVG, PNG
 and HTML.
 .
 This package holds the headers, the part of the CMake package and the

@@ -15,6 +15,10 @@ char const* AdviceFor(Remedy help) {
       return "; give --tolerance T, --tolerance-column NAME or --tolerance-per-point CAP";
     case Remedy::CloseContour:
       return "; --closed yes closes it";
+    case Remedy::FlattenCurves:
+      return "; --flatten T takes chords of arcs and curves";
+    case Remedy::GiveChords:
+      return "; --chords T says how far chords may be from them";
     case Remedy::None:
       break;
   }

@@ -24,7 +24,7 @@ constexpr char const* kText = "Measure closed contours: area, sense, perimeter, 
 
 constexpr char const* kFooter =
     R"(
-Contours are read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
+Contours are read from JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG, told by the name, by --from or
 by the content. With --points the files hold measured points instead, and the contour is the
 polygon through them, closed from the last point to the first.
 
@@ -56,6 +56,7 @@ struct Options {
   ColumnChoice columns;
   std::string units;
   std::optional<int> outline;
+  std::optional<double> flattening;
   bool doClose = false;
   bool asJson = false;
 };
@@ -85,7 +86,8 @@ std::vector<ContourFile> ReadClosed(Options const& options, std::string const& p
     return {PolygonThrough(
         ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns))};
   }
-  std::vector<ContourFile> outlines = ReadOutlines({path, options.from, options.outline}, console);
+  std::vector<ContourFile> outlines =
+      ReadOutlines({path, options.from, options.outline, options.flattening}, console);
   for (ContourFile& outline : outlines) {
     if (options.doClose) {
       outline = Closed(std::move(outline));
@@ -123,7 +125,7 @@ void AddOptions(Command& command, Options* options) {
       .AddTexts("CONTOUR", &options->paths, "FILE", "Files with contours; - is the standard input")
       .Require();
   Option const from = AddWord(
-      command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contours as this");
   Option const points = command
@@ -134,6 +136,7 @@ void AddOptions(Command& command, Options* options) {
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
   AddOutline(command, &options->outline);
+  AddFlatten(command, &options->flattening);
   command.AddFlag("--close", &options->doClose,
                   "Close an open contour with a line from its end to its start");
   command.AddFlag("--json", &options->asJson, "Write the measures as JSON, with every digit");

@@ -30,7 +30,7 @@ constexpr char const* kText =
 
 constexpr char const* kFooter =
     R"(
-The contour is read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
+The contour is read from JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG, told by the ending of the name, by --from or
 by the content. Every point is measured against every piece as drawn, clipped at its ends. A
 relative deviation counts as within tolerance up to 1 + 1e-6, for rounding. Without any tolerance
 deviations are lengths, and none is judged.
@@ -91,8 +91,9 @@ std::string TextFor(Options const& options, CheckReport const& report) {
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  PointFile file = ReadPointsInput(options.points, console);
-  ContourFile contour = ReadContourInput({options.contour, options.from, options.outline}, console);
+  PointFile file = ReadAllPointsInput(options.points, console);
+  ContourFile contour = ReadContourInput(
+      {options.contour, options.from, options.outline, options.points.flattening}, console);
   std::string source;
   if (IsToleranceStated(options.points.tolerance, file)) {
     bool const isClosed = FindClosure(file.points, options.closed).isClosed;
@@ -118,7 +119,7 @@ void AddOptions(Command& command, Options* options) {
       .Require();
   AddClosedChoice(command, &options->closed);
   AddWord(
-      command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contour as this");
   AddOutline(command, &options->outline);

@@ -21,7 +21,8 @@ ContourFile Chosen(std::vector<ContourFile> const& outlines, int number) {
 
 /// Says on the standard error what was left out.
 ContourFile Read(ContourInput const& input, Console const& console) {
-  ContourFile contour = ReadContour(input.path, console.in, input.from);
+  ContourFile contour =
+      ReadContour(input.path, console.in, ReadOptions{input.from, input.flattening});
   if (contour.leftOut > 0) {
     console.err << "contour: " << contour.path << ": left out " << Counted(contour.leftOut, "piece")
                 << " without length\n";
@@ -38,6 +39,12 @@ void AddOutline(Command& command, std::optional<int>* outline, std::string const
   constexpr int kMost = 1000000;
   AddWholeNumber(command, name, outline, 1, kMost, "N",
                  "Take only this one of the outlines in a file, counted from 1");
+}
+
+void AddFlatten(Command& command, std::optional<double>* flattening) {
+  AddPositiveNumber(command, "--flatten", flattening, "T",
+                    "Take splines, ellipses and curves of DXF and SVG as chords no further than T "
+                    "from them");
 }
 
 std::vector<ContourFile> ReadOutlines(ContourInput const& input, Console const& console) {

@@ -15,12 +15,16 @@ namespace Vorn::Cli {
 struct ContourInput {
   std::string path;
   std::optional<Format> from;
-  std::optional<int> outline;  ///< counted from 1; nothing: all there are
+  std::optional<int> outline;        ///< counted from 1; nothing: all there are
+  std::optional<double> flattening;  ///< for curves that are no arcs; nothing: these are refused
 };
 
 /// Adds --outline, or the option of another name for the outlines of another file.
 void AddOutline(Command& command, std::optional<int>* outline,
                 std::string const& name = "--outline");
+
+/// Adds --flatten.
+void AddFlatten(Command& command, std::optional<double>* flattening);
 
 /// The outlines in the file, each chained from its pieces (see OutlinesOf), or the one asked for.
 /// @throws Failure as ReadContour does, or (FailureKind::BadArgument) when there are not so many.

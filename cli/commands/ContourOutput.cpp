@@ -69,7 +69,19 @@ void AddGCodeOptions(Command& command, GCodeOptions* options) {
 
 void AddWriteOptions(Command& command, WriteOptions* options) {
   command.AddFlag("--dxf-entities", &options->dxfEntities,
-                  "DXF: a LINE or an ARC for each piece in place of one POLYLINE");
+                  "DXF: a LINE or an ARC for each piece in place of one polyline");
+  AddChoice<DxfVersion>(command, "--dxf-version", &options->dxfVersion,
+                        {{"r12", DxfVersion::R12}, {"r2000", DxfVersion::R2000}},
+                        "DXF: r12 (default), which every program reads; r2000 with LWPOLYLINE, "
+                        "units ($INSUNITS) and a layer for holes");
+  command.AddFlag(
+      "--svg-plain", &options->svgPlain,
+      "SVG: the contour itself in its true size, lines and arcs for a cutter, in place of "
+      "a drawing");
+  AddPositiveNumber(
+      command, "--chords", &options->chords, "T",
+      "GeoJSON, which has no arcs: how far their chords may be from them; if not said, "
+      "a part of the tolerance");
   AddGCodeOptions(command, &options->gcode);
 }
 

@@ -20,24 +20,31 @@ namespace Vorn::Cli {
 namespace {
 
 constexpr char const* kText =
-    "Write a contour in another format: JSON, CSV, DXF, G-code or WKT, or draw it as SVG, PNG or\n"
-    "HTML.";
+    "Write a contour in another format: JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG, or draw it as "
+    "SVG,\n"
+    "PNG or HTML.";
 
 constexpr char const* kFooter =
     R"(
-The ending of a file tells its format: .json, .csv, .dxf, .nc or .gcode, .wkt, and for drawings
-.svg, .png, .html. For - and other names --from and --to say it; without --from the content tells.
+The ending of a file tells its format: .json, .csv, .dxf, .nc or .gcode, .wkt, .geojson, .svg (read:
+its shapes; written: a drawing, or with --svg-plain the contour), and for drawings .png, .html. For - and other names --from and --to say it; without --from the content tells.
 
 What a format keeps:
   json   everything: doubles to the last bit, gaps, units, closed or not
   csv    the same, but for what follows from ends, centre and radius
   dxf    R12; one POLYLINE with bulges, or with --dxf-entities LINE and ARC; units in a comment.
-         Arcs read back to 2e-15 of the largest coordinate or radius
+         Arcs read back to 2e-15 of the largest coordinate or radius. --dxf-version r2000 writes
+         LWPOLYLINE, $INSUNITS, and outlines that are holes on a layer CONTOUR_HOLES
   gcode  rounded; mm or inch. G1, G2 and G3 with incremental I and J or with R, G0 over gaps, M2
          or M30 at the end. Arcs are worked out from the rounded numbers, so that the radii at both
          ends agree within 0.002 mm
   wkt    LINESTRING, CIRCULARSTRING or COMPOUNDCURVE, a MULTICURVE over gaps; no units
-Drawings show the pieces, their joints and their order; they cannot be read back. With measured
+  geojson  a Polygon with holes for closed outlines, a LineString for others; arcs as chords no
+         further than --chords from them; coordinates are those of the contour, not of the globe
+  svg    with --svg-plain a path of lines and true arcs for each outline, in mm or inch
+Read are, beside these, polylines and shapes of SVG with their transforms, every ring of polygons,
+and, where --flatten says how far chords may be from them, SPLINE and ELLIPSE of DXF and curves of
+SVG. Drawings show the pieces, their joints and their order; they cannot be read back. With measured
 points 'contour plot' draws the deviations as well.
 DXF, G-code and WKT hold arcs of more than 315 degrees as two halves. Where pieces do not meet, the
 gap is kept and reported. Pieces that meet are chained, whatever their order in the file (see
@@ -63,6 +70,9 @@ Examples:
   contour convert part.nc -o part.svg
 )";
 
+/// Chords of GeoJSON take this part of what the contour may be left by, if nobody says.
+constexpr double kChordsInTolerance = 0.5;
+
 struct Options {
   std::string input;
   std::vector<std::string> outputs;
@@ -71,6 +81,7 @@ struct Options {
   std::string units;
   std::optional<double> tolerance;
   std::optional<int> outline;
+  std::optional<double> flattening;
   WriteOptions write;
 
   std::vector<NamedFile> Written() const {
@@ -107,7 +118,8 @@ struct Converted {
 
 Converted ConvertTo(Options const& options, ContourFile const& contour, std::string const& path) {
   Format const format = FormatFor(options, path);
-  if (!HoldsContour(format)) return {path, format, Drawn(DrawingOf(contour), format), {}};
+  if (!HoldsContour(format, options.write))
+    return {path, format, Drawn(DrawingOf(contour), format), {}};
   Converted file = {path, format, ToText(contour, format, options.write), {}};
   file.departure = DepartureOf(contour.pieces, ParseContour(file.text, path, format).pieces);
   return file;
@@ -143,7 +155,8 @@ void PrintSummary(Options const& options, ContourFile const& contour,
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile contour = ReadContourInput({options.input, options.from, options.outline}, console);
+  ContourFile contour =
+      ReadContourInput({options.input, options.from, options.outline, options.flattening}, console);
   if (!options.units.empty()) contour.units = Printable(options.units);
   Outputs outputs;
   std::vector<Converted> files;
@@ -175,13 +188,15 @@ void AddOptions(Command& command, Options* options) {
       "-o,--output", &options->outputs, "FILE",
       "Write the contour to this file; may be given several times; - is the standard "
       "output, which --to without -o means as well");
-  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt"}, &options->from,
-            "Read the input as this");
-  AddFormat(command, "--to", {"json", "csv", "dxf", "gcode", "wkt", "svg", "png", "html"},
-            &options->to, "Write the outputs as this");
+  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
+            &options->from, "Read the input as this");
+  AddFormat(command, "--to",
+            {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg", "png", "html"}, &options->to,
+            "Write the outputs as this");
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
   AddOutline(command, &options->outline);
+  AddFlatten(command, &options->flattening);
   AddPositiveNumber(command, "-t,--tolerance", &options->tolerance, "T",
                     "How far a file may leave the contour; G-code gets the digits for it");
   AddWriteOptions(command, &options->write);
@@ -202,6 +217,9 @@ void AddConvertCommand(CommandLine& program, Action* action) {
     RefuseSharedFiles({{"CONTOUR", options->input}}, options->Written());
     for (std::string const& path : options->outputs) FormatFor(*options, path);
     options->write.gcode.tolerance = options->tolerance;
+    if (!options->write.chords && options->tolerance) {
+      options->write.chords = kChordsInTolerance * *options->tolerance;
+    }
     *action = [options](Console const& console) { return Run(*options, console); };
   });
 }

@@ -10,12 +10,14 @@
 #include "cli/commands/FitHelp.h"
 #include "cli/commands/FitMany.h"
 #include "cli/commands/FitOptions.h"
+#include "cli/commands/FitOutlines.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/terminal/Progress.h"
 #include "cli/texts/FitTable.h"
 #include "vorn/io/FitContour.h"
 #include "vorn/io/FitReport.h"
+#include "vorn/io/JoinedFit.h"
 #include "vorn/io/Messages.h"
 
 namespace Vorn::Cli {
@@ -52,8 +54,7 @@ void WriteResults(FitOptions const& options, FitReport const& report,
   if (!isOutTaken) PrintResults(options, report, files, console);
 }
 
-FitReport FitWithProgress(FitOptions const& options, Console const& console) {
-  PointFile file = ReadPointsInput(options.points, console);
+FitReport FitWithProgress(FitOptions const& options, PointFile file) {
   ProgressBar progress(stderr, file.points.size(), options.isQuiet);
   FitReport report = FitContour(std::move(file), options.Choice(), &progress);
   report.head = options.head;
@@ -64,9 +65,12 @@ FitReport FitWithProgress(FitOptions const& options, Console const& console) {
 FitReport FitOneOfMany(FitOptions const& options, std::string const& path, Console const& console) {
   PointsInput input = options.points;
   input.path = path;
-  FitReport report = FitContour(ReadPointsInput(input, console), options.Choice(), nullptr);
-  report.head = options.head;
-  return report;
+  std::vector<FitReport> reports;
+  for (PointFile& outline : ReadPointOutlinesInput(input, console)) {
+    reports.push_back(FitContour(std::move(outline), options.Choice(), nullptr));
+    reports.back().head = options.head;
+  }
+  return reports.size() == 1 ? std::move(reports.front()) : Joined(reports);
 }
 
 ExitCode RunMany(FitOptions const& options, Console const& console) {
@@ -78,7 +82,9 @@ ExitCode RunMany(FitOptions const& options, Console const& console) {
 
 ExitCode Run(FitOptions const& options, Console const& console) {
   RequireWritable(options.Written());
-  FitReport report = FitWithProgress(options, console);
+  std::vector<PointFile> outlines = ReadPointOutlinesInput(options.points, console);
+  if (outlines.size() > 1) return RunFitOutlines(options, std::move(outlines), console);
+  FitReport report = FitWithProgress(options, std::move(outlines.front()));
   std::vector<FittedFile> const files = FilesOf(options, report);
   Verdict const verdict = VerdictOf(report, files);
   std::string const complaint = verdict == Verdict::WithinTolerance ? "" : Complaint(report, files);

@@ -3,6 +3,7 @@
 #include "cli/texts/Relative.h"
 #include "vorn/io/Drawing.h"
 #include "vorn/io/FitReport.h"
+#include "vorn/io/JoinedFit.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -15,6 +16,9 @@ ContourFile ContourOf(FitReport const& report) {
 }
 
 std::string TextOf(FitReport const& report, Format format, WriteOptions const& options) {
+  if (HoldsContour(format, options) && format != Format::Json) {
+    return ToTextFor(report.file.points, ContourOf(report), format, options);
+  }
   switch (format) {
     case Format::Json:
       return ToJson(report);
@@ -22,10 +26,8 @@ std::string TextOf(FitReport const& report, Format format, WriteOptions const& o
       return ToSvg(DrawingOf(report));
     case Format::Html:
       return ToHtml(DrawingOf(report));
-    case Format::Png:
-      return ToPng(DrawingOf(report), {});
     default:
-      return ToTextFor(report.file.points, ContourOf(report), format, options);
+      return ToPng(DrawingOf(report), {});
   }
 }
 
@@ -51,7 +53,15 @@ std::string FileComplaint(FitReport const& report, FittedFile const& file) {
 FittedFile RenderFit(FitReport const& report, std::string const& path, Format format,
                      WriteOptions const& options) {
   FittedFile file = {path, format, TextOf(report, format, options), {}};
-  if (HoldsContour(format)) file.measure = MeasureText(file.text, format, report.file.points);
+  if (HoldsContour(format, options))
+    file.measure = MeasureText(file.text, format, report.file.points);
+  return file;
+}
+
+FittedFile RenderFit(std::vector<FitReport> const& outlines, std::string const& path, Format format,
+                     WriteOptions const& options) {
+  FittedFile file = RenderFit(Joined(outlines), path, format, options);
+  if (file.measure) file.measure = MeasureText(file.text, format, outlines);
   return file;
 }
 

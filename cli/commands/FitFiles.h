@@ -23,6 +23,10 @@ struct FittedFile {
 FittedFile RenderFit(FitReport const& report, std::string const& path, Format format,
                      WriteOptions const& options);
 
+/// The text of the file with several outlines, each measured by itself as it stands there.
+FittedFile RenderFit(std::vector<FitReport> const& outlines, std::string const& path, Format format,
+                     WriteOptions const& options);
+
 /// The file that leaves the tolerances furthest: the first that cannot be read back, else the one
 /// of the largest deviation. Null when none was measured.
 FittedFile const* WorstOf(std::vector<FittedFile> const& files);

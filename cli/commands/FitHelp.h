@@ -36,7 +36,7 @@ counts. Up to 1 + 1e-6 counts as within, for the rounding of the measurement. Po
 from 0. The strategy arc reports its deviation as a length, and no point.
 
 Outputs: the ending of a file tells its format: .json (the contour with deviations and all),
-.csv, .dxf, .nc or .gcode, .wkt (the contour; see 'contour convert --help' for what each keeps),
+.csv, .dxf, .nc or .gcode, .wkt, .geojson (the contour; see 'contour convert --help' for what each keeps),
 .svg, .png, .html (drawings). --to tells it for - and for other endings. Numbers are written so
 that they read back as the same doubles, but for G-code, which is rounded. Every file that holds
 the contour is read back and measured before the word "within" is said. With -o - the table is
@@ -74,6 +74,7 @@ Examples:
   contour fit - -t 0.02 -o - --to dxf < part.csv > part.dxf
   contour fit part.csv --tolerance-per-point 0.05 --strategy cells -o part.json
   contour fit part.csv -t 0.02 -o part.html --field part=Cam --field date=2026-11-30
+  contour fit plate.dxf -t 0.02 --flatten 0.005 -o plate.json --dxf-version r2000 -o fitted.dxf
   contour fit outline.csv -t 0.01 --closed yes --start 120
   contour fit scan.csv -t 0.01 --strategy fewest --largest-step 30 -o scan.dxf
   contour fit scans/*.csv -t 0.02 --out-dir fitted --to json,dxf -j 8

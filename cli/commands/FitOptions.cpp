@@ -43,10 +43,11 @@ std::optional<std::vector<Format>> ParseFormats(std::string const& text) {
 
 void AddFormats(Command& command, FitOptions* options) {
   auto const complaint = [](std::string const& text) -> std::string {
-    return ParseFormats(text) ? ""
-                              : Quoted(text) +
-                                    " names none of json, csv, dxf, gcode, wkt, svg, png, html, or "
-                                    "one of them twice";
+    return ParseFormats(text)
+               ? ""
+               : Quoted(text) +
+                     " names none of json, csv, dxf, gcode, wkt, geojson, svg, png, html, or "
+                     "one of them twice";
   };
   auto const take = [options](std::string const& text) {
     options->formats = ParseFormats(text).value();
@@ -54,6 +55,7 @@ void AddFormats(Command& command, FitOptions* options) {
   command.AddChecked(
       "--to", complaint, take, "NAME[,NAME]...",
       "The format of outputs whose name does not tell, such as -: json, csv, dxf, gcode, wkt, "
+      "geojson, "
       "svg, png, html; with --out-dir the formats to write, separated by commas; json if not said");
 }
 
@@ -120,6 +122,7 @@ void AddFitOptions(Command& command, FitOptions* options) {
                 "CSV files with the measured points, each a contour; - is the standard input")
       .Require();
   AddPointsOptions(command, &options->points);
+  AddPointsOutline(command, &options->points);
   AddChoice<Strategy>(
       command, "--strategy", &options->strategy,
       {{"mixed", Strategy::Mixed},

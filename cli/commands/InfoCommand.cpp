@@ -67,6 +67,7 @@ void AddInfoCommand(CommandLine& program, Action* action) {
   Command command = program.AddCommand("info", kText);
   auto const options = std::make_shared<Options>();
   AddPointsInput(command, &options->points);
+  AddPointsOutline(command, &options->points);
   AddClosedChoice(command, &options->closed);
   command.AddFlag("--json", &options->asJson, "Write the facts as JSON, long lists whole");
   command.SetFooter(std::string(kPointsFileText) + kFooter);

@@ -21,7 +21,7 @@ constexpr char const* kText =
 
 constexpr char const* kFooter =
     R"(
-Contours are read from JSON, CSV, DXF, G-code or WKT, told by the ending of the name, by --from or
+Contours are read from JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG, told by the name, by --from or
 by the content. Gaps between pieces are not bridged. Of a file with several outlines all are taken
 together, or that of --outline from A and that of --outline-b from B.
 
@@ -54,6 +54,7 @@ struct Options {
   std::optional<Format> from;
   std::optional<int> outline;   ///< of the first file
   std::optional<int> outlineB;  ///< of the second file
+  std::optional<double> flattening;
   std::string output;
   bool asJson = false;
   bool failIfAny = false;
@@ -72,10 +73,12 @@ struct Options {
 
 ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
-  ContourFile const a = ReadContourInput({options.a, options.from, options.outline}, console);
+  ContourFile const a =
+      ReadContourInput({options.a, options.from, options.outline, options.flattening}, console);
   std::optional<ContourFile> other;
   if (!options.b.empty())
-    other = ReadContourInput({options.b, options.from, options.outlineB}, console);
+    other =
+        ReadContourInput({options.b, options.from, options.outlineB, options.flattening}, console);
   ContourFile const* const b = other ? &*other : nullptr;
   std::vector<Intersection> const found =
       b == nullptr ? SelfIntersectionsOf(a) : IntersectionsOf(a, *b);
@@ -94,11 +97,12 @@ void AddOptions(Command& command, Options* options) {
   command.AddText("B", &options->b, "FILE",
                   "File with another contour; without it, A meets itself");
   AddWord(
-      command, "--from", {"json", "csv", "dxf", "gcode", "wkt"},
+      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contours as this");
   AddOutline(command, &options->outline);
   AddOutline(command, &options->outlineB, "--outline-b");
+  AddFlatten(command, &options->flattening);
   command.AddText("-o,--output", &options->output, "FILE",
                   "Write the points to this CSV file; - is the standard output");
   command.AddFlag("--json", &options->asJson, "Write the points as JSON, with every digit");

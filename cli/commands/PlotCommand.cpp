@@ -31,11 +31,12 @@ constexpr char const* kFooter =
     R"(
 The ending of a file tells its format: .svg, .png, .html. For - and other names --to says it.
 
-With CONTOUR (JSON, CSV, DXF, G-code or WKT) the drawing shows its lines and arcs with their joints
+With CONTOUR (JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG) the drawing shows its lines and arcs with their joints
 true to scale, and each point moved away from the contour until it is K times as far from it as it
 is; the tolerance is drawn K times as wide. Below are the deviations along the contour, positive to
 the left of the direction of travel. Without CONTOUR the drawing shows the points and their order.
-A single file called .json, .dxf, .nc, .gcode or .wkt is a contour, which is drawn by itself.
+A single file called .json, .dxf, .nc, .gcode, .wkt, .geojson or .svg is a contour, which is drawn by
+itself.
 
 A tolerance is drawn when one of the three options or the file states it, as for 'contour fit', and
 only then is the contour judged. Points that fall on the same place of the page are drawn once.
@@ -107,7 +108,7 @@ Format FormatFor(Options const& options, std::string const& path) {
 void TellContourFromPoints(Options* options) {
   if (!options->contour.empty()) return;
   std::optional<Format> const format = FormatOf(options->points.path);
-  if (!format || !HoldsContour(*format) || *format == Format::Csv) return;
+  if (!format || !IsReadAsContour(*format) || *format == Format::Csv) return;
   if (options->IsAboutPoints()) {
     throw Failure(FailureKind::BadArgument,
                   options->points.path +
@@ -128,7 +129,8 @@ std::string NameOfFile(std::string const& path) {
 }
 
 ContourFile ReadDrawnContour(Options const& options, Console const& console) {
-  ContourFile contour = ReadContourInput({options.contour, {}, options.outline}, console);
+  ContourFile contour =
+      ReadContourInput({options.contour, {}, options.outline, options.points.flattening}, console);
   ReportGaps(contour, console);
   return contour;
 }
@@ -141,7 +143,7 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
     drawing.head = options.head;
     return drawing;
   }
-  PointFile file = ReadPointsInput(options.points, console);
+  PointFile file = ReadAllPointsInput(options.points, console);
   if (IsToleranceStated(options.points.tolerance, file)) {
     bool const isClosed = FindClosure(file.points, ClosedChoice::Auto).isClosed;
     AssignTolerances(options.points.tolerance, &file, isClosed);

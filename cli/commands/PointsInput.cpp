@@ -1,6 +1,11 @@
 #include "cli/commands/PointsInput.h"
 
+#include <utility>
+
 #include "cli/commands/CommonOptions.h"
+#include "cli/commands/ContourInput.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Files.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -13,6 +18,11 @@ in English, German and French, with units in them. Where it does not tell, --col
 ahead of the table is skipped. Fields are separated by a comma, a semicolon, a
 tab or blanks; decimal commas are read where the separator is none. What follows # or // is a
 comment; "# tolerance T" and "# units mm" are read.
+
+Points are taken from drawings and tool paths as well: the vertices of polylines and lines in DXF
+(.dxf), G-code (.nc, .gcode), WKT (.wkt), GeoJSON (.geojson, .json) and SVG (.svg). Lines are chained
+by their ends; several outlines are several contours. Arcs and curves are refused unless --flatten
+says how far chords may be from them. SVG is turned up, and true to a page in mm, cm or in.
 )";
 
 Option AddColumns(Command& command, ColumnChoice* columns) {
@@ -51,6 +61,20 @@ void AddPointsOptions(Command& command, PointsInput* input) {
   AddColumns(command, &input->columns);
   command.AddText("--units", &input->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
+  AddWord(
+      command, "--points-from", {"csv", "dxf", "gcode", "wkt", "geojson", "svg", "json"},
+      [input](std::string const& word) { input->from = FormatNamed(word); },
+      "Read the points from this: csv is a table; if not said, the ending of the file tells, or "
+      "its "
+      "content");
+  AddPositiveNumber(
+      command, "--flatten", &input->flattening, "T",
+      "Take points from arcs and curves as well: the ends of chords no further than T "
+      "from them");
+}
+
+void AddPointsOutline(Command& command, PointsInput* input) {
+  AddOutline(command, &input->outline);
 }
 
 void AddClosedChoice(Command& command, ClosedChoice* choice) {
@@ -61,10 +85,45 @@ void AddClosedChoice(Command& command, ClosedChoice* choice) {
       "'contour fit' does");
 }
 
+PointReading ReadingOf(PointsInput const& input) {
+  return {ColumnFor(input.tolerance), input.columns, input.from, input.flattening};
+}
+
+std::vector<PointFile> ChosenOutlines(PointsInput const& input, std::vector<PointFile> outlines) {
+  if (input.outline) {
+    auto const index = static_cast<std::size_t>(*input.outline) - 1;
+    if (index >= outlines.size()) {
+      throw Failure(FailureKind::BadArgument, {InputName(input.path)},
+                    "there is no outline " + std::to_string(*input.outline) + ", the file has " +
+                        Counted(outlines.size(), "outline"));
+    }
+    outlines = {std::move(outlines[index])};
+  }
+  if (!input.units.empty()) {
+    for (PointFile& outline : outlines) outline.units = Printable(input.units);
+  }
+  return outlines;
+}
+
+std::vector<PointFile> ReadPointOutlinesInput(PointsInput const& input, Console const& console) {
+  return ChosenOutlines(input, ReadPointOutlines(input.path, console.in, ReadingOf(input)));
+}
+
+void RequireOneOutline(PointsInput const& input, std::size_t count) {
+  if (count < 2) return;
+  throw Failure(FailureKind::BadArgument, {InputName(input.path)},
+                "holds " + Counted(count, "outline") + ": --outline N takes one of them");
+}
+
 PointFile ReadPointsInput(PointsInput const& input, Console const& console) {
-  PointFile file = ReadPoints(input.path, console.in, ColumnFor(input.tolerance), input.columns);
-  if (!input.units.empty()) file.units = Printable(input.units);
-  return file;
+  std::vector<PointFile> outlines = ReadPointOutlinesInput(input, console);
+  RequireOneOutline(input, outlines.size());
+  return std::move(outlines.front());
+}
+
+PointFile ReadAllPointsInput(PointsInput const& input, Console const& console) {
+  std::vector<PointFile> outlines = ReadPointOutlinesInput(input, console);
+  return outlines.size() == 1 ? std::move(outlines.front()) : Joined(outlines);
 }
 
 }  // namespace Vorn::Cli

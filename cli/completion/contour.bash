@@ -18,11 +18,13 @@ _contour_words() {
     *:--closed) echo auto yes no ;;
     *:--units) echo mm inch ;;
     *:--end) echo m2 m30 none ;;
+    *:--dxf-version) echo r12 r2000 ;;
     *:--plane) echo xy xz ;;
     plot:--to) echo svg png html ;;
     plot:--magnify) echo auto ;;
-    fit:--to | convert:--to) echo json csv dxf gcode wkt svg png html ;;
-    *:--from) echo json csv dxf gcode wkt ;;
+    fit:--to | convert:--to) echo json csv dxf gcode wkt geojson svg png html ;;
+    *:--from) echo json csv dxf gcode wkt geojson svg ;;
+    *:--points-from) echo csv dxf gcode wkt geojson svg json ;;
     *) return 1 ;;
   esac
 }
@@ -33,23 +35,23 @@ _contour_endings() {
     *:--json) echo json ;;
     *:--svg) echo svg ;;
     *:--table | *:--dropped | intersect:-o | intersect:--output) echo csv ;;
-    simplify:*) echo csv ;;
+    simplify:-o | simplify:--output) echo csv ;;
     plot:-o | plot:--output) echo svg png html ;;
     *:--summary) echo csv html ;;
     *:--header | *:--footer) echo nc gcode txt ;;
     fit:-o | fit:--output | convert:-o | convert:--output)
-      echo json csv dxf nc gcode wkt svg png html
+      echo json csv dxf nc gcode wkt geojson svg png html
       ;;
-    convert:*) echo json csv dxf nc gcode wkt ;;
-    fit:* | info:*) echo csv txt ;;
-    *) echo csv txt json dxf nc gcode wkt ;;
+    convert:*) echo json csv dxf nc gcode wkt geojson svg ;;
+    *) echo csv txt json dxf nc gcode wkt geojson svg ;;
   esac
 }
 
 # Options whose value is neither a word nor a file.
 _contour_takes_number() {
   case $1 in
-    -t | --tolerance | --tolerance-column | --tolerance-per-point | --columns | --start | --outline | --outline-b | \
+    -t | --tolerance | --tolerance-column | --tolerance-per-point | --columns | --start | --outline | --outline-b | --flatten | --chords | \
+      --spacing | --outliers | \
       --digits | --field | --feed | --gcode-decimals | --safe-height | --cut-height | --plunge-feed | --largest-step | \
       --min-radius | --max-radius | --between | -j | --jobs | --dpi | --width | --magnify) return 0 ;;
     *) return 1 ;;

@@ -1,9 +1,7 @@
 #include "io/formats/Dxf.h"
 
-#include <cmath>
-#include <numbers>
-
 #include "io/formats/DxfEntities.h"
+#include "io/formats/DxfWriter.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Numbers.h"
@@ -12,45 +10,11 @@ namespace Vorn::IO {
 
 namespace {
 
-constexpr double kDegrees = 180.0 / std::numbers::pi;
+using Dxf::Writer;
 
-constexpr char const* kContourLayer = "CONTOUR";
-constexpr char const* kLineLayer = "CONTOUR_LINES";
-constexpr char const* kArcLayer = "CONTOUR_ARCS";
-
-/// The text of a file, group by group.
-class Writer {
- public:
-  void Group(int code, std::string const& value) {
-    text_ += std::to_string(code) + "\n" + value + "\n";
-  }
-
-  void Number(int code, double value) { Group(code, FormatPlain(value)); }
-
-  /// x and y under `code` and `code` + 10, and a z of 0.
-  void At(int code, XY const& point) {
-    Number(code, point.x);
-    Number(code + 10, point.y);
-    Number(code + 20, 0.0);
-  }
-
-  void Begin(std::string const& section) {
-    Group(0, "SECTION");
-    Group(2, section);
-  }
-
-  void End() { Group(0, "ENDSEC"); }
-
-  void Entity(std::string const& type, std::string const& layer) {
-    Group(0, type);
-    Group(8, layer);
-  }
-
-  std::string const& Text() const { return text_; }
-
- private:
-  std::string text_;
-};
+using Dxf::kArcLayer;
+using Dxf::kContourLayer;
+using Dxf::kLineLayer;
 
 void WriteHeader(ContourFile const& contour, Writer* dxf) {
   if (!contour.units.empty()) dxf->Group(999, "units " + OneLine(contour.units));
@@ -88,19 +52,16 @@ void WriteLayer(std::string const& name, int color, Writer* dxf) {
 }
 
 void WriteTables(DxfStyle style, Writer* dxf) {
-  constexpr int kBlackOrWhite = 7;
-  constexpr int kBlue = 5;
-  constexpr int kRed = 1;
   dxf->Begin("TABLES");
   WriteLineType(dxf);
   dxf->Group(0, "TABLE");
   dxf->Group(2, "LAYER");
   dxf->Group(70, style == DxfStyle::Polyline ? "1" : "2");
   if (style == DxfStyle::Polyline) {
-    WriteLayer(kContourLayer, kBlackOrWhite, dxf);
+    WriteLayer(kContourLayer, Dxf::kBlackOrWhite, dxf);
   } else {
-    WriteLayer(kLineLayer, kBlue, dxf);
-    WriteLayer(kArcLayer, kRed, dxf);
+    WriteLayer(kLineLayer, Dxf::kBlue, dxf);
+    WriteLayer(kArcLayer, Dxf::kRed, dxf);
   }
   dxf->Group(0, "ENDTAB");
   dxf->End();
@@ -123,25 +84,16 @@ void WritePolyline(std::vector<Piece> const& run, bool isClosed, Writer* dxf) {
 }
 
 void WritePolylines(ContourFile const& contour, Writer* dxf) {
-  std::vector<Piece> const pieces = WithoutWideArcs(contour.pieces);
-  auto const runs = ConnectedRuns(pieces, JointTolerance(pieces));
-  bool const isLoop = contour.isClosed && runs.size() == 1 && ReturnsToStart(pieces);
-  for (std::vector<Piece> const& run : runs) WritePolyline(run, isLoop, dxf);
-}
-
-/// In [0, 360).
-double Degrees(double angle) {
-  double const degrees = angle * kDegrees;
-  return degrees < 0.0 ? degrees + 360.0 : degrees;
+  ContourFile divided = contour;
+  divided.pieces = WithoutWideArcs(contour.pieces);
+  for (ContourFile const& run : RunsOf(divided)) WritePolyline(run.pieces, run.isClosed, dxf);
 }
 
 /// Arcs run counter-clockwise from the first angle to the second.
 void WriteArc(Piece const& arc, Writer* dxf) {
   dxf->Entity("ARC", kArcLayer);
-  dxf->At(10, arc.center);
-  dxf->Number(40, arc.radius);
-  dxf->Number(50, Degrees(arc.counterClockwise ? arc.startAngle : arc.endAngle));
-  dxf->Number(51, Degrees(arc.counterClockwise ? arc.endAngle : arc.startAngle));
+  dxf->Circle(arc);
+  dxf->Angles(arc);
 }
 
 void WriteLine(Piece const& line, Writer* dxf) {
@@ -152,9 +104,7 @@ void WriteLine(Piece const& line, Writer* dxf) {
 
 void WriteEntities(ContourFile const& contour, Writer* dxf) {
   for (Piece const& piece : WithoutWideArcs(contour.pieces)) {
-    // Two equal angles would be read as a full circle.
-    bool const isArc = piece.IsArc() && Degrees(piece.startAngle) != Degrees(piece.endAngle);
-    isArc ? WriteArc(piece, dxf) : WriteLine(piece, dxf);
+    Dxf::IsWrittenAsArc(piece) ? WriteArc(piece, dxf) : WriteLine(piece, dxf);
   }
 }
 

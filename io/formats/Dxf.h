@@ -20,6 +20,11 @@ enum class DxfStyle {
 /// than 315 degrees are written in two halves.
 std::string ToDxf(ContourFile const& contour, DxfStyle style = DxfStyle::Polyline);
 
+/// The contour as DXF 2000 (AC1015): an LWPOLYLINE with bulges for each outline, closed where its
+/// ends meet, or LINE and ARC. Units stand in $INSUNITS, and in a comment as in R12. Outlines that
+/// lie in an odd number of others are on a layer of holes.
+std::string ToDxf2000(ContourFile const& contour, DxfStyle style = DxfStyle::Polyline);
+
 /// Reads LINE, ARC, CIRCLE, LWPOLYLINE and POLYLINE in the order of the file, of R12 or later. An
 /// entity that ends where the one before ends is turned round; arcs have no sense of their own and
 /// are turned to the nearer end. A circle becomes two halves. Texts, points, dimensions, viewports,

@@ -21,7 +21,9 @@ constexpr double kHighestDegree = 25.0;
 std::vector<Piece> Chords(Entity const& entity, std::vector<BezierCurve> const& curves,
                           Flattening* flattening) {
   std::vector<Piece> chords;
-  if (auto const fault = AppendChords(curves, flattening, &chords)) entity.Refuse(*fault);
+  if (auto const fault = AppendChords(curves, flattening, &chords)) {
+    entity.Refuse(*fault, flattening->Help());
+  }
   return chords;
 }
 

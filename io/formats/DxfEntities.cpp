@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "io/base/Words.h"
+#include "io/formats/DxfUnits.h"
 #include "io/formats/Text.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
@@ -58,18 +59,6 @@ class Groups {
   Lines lines_;
   std::string path_;
 };
-
-std::string UnitsNamed(std::string_view number) {
-  struct Known {
-    std::string_view number;
-    char const* name;
-  };
-  constexpr Known kKnown[] = {{"1", "inch"}, {"2", "ft"}, {"4", "mm"}, {"5", "cm"}, {"6", "m"}};
-  for (Known const& known : kKnown) {
-    if (known.number == number) return known.name;
-  }
-  return {};
-}
 
 class Reader {
  public:
@@ -168,7 +157,10 @@ int Entity::FlagsOr(int code, int otherwise) const {
   return static_cast<int>(value);
 }
 
-void Entity::Refuse(std::string const& message) const { Refuse(line_, message); }
+void Entity::Refuse(std::string const& message, Remedy help) const {
+  throw Failure(FailureKind::File, {path_, line_},
+                "entity " + std::to_string(number_) + " (" + type_ + "): " + message, help);
+}
 
 void Entity::Refuse(std::size_t line, std::string const& message) const {
   RefuseLine(path_, line, "entity " + std::to_string(number_) + " (" + type_ + "): " + message);

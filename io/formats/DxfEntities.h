@@ -6,6 +6,8 @@
 #include <utility>
 #include <vector>
 
+#include "vorn/io/Failure.h"
+
 namespace Vorn::IO::Dxf {
 
 /// A code, its value and the line of the file on which the code stands.
@@ -32,7 +34,7 @@ class Entity {
   double NumberOf(Group const& group) const;
   int FlagsOr(int code, int otherwise) const;
 
-  [[noreturn]] void Refuse(std::string const& message) const;
+  [[noreturn]] void Refuse(std::string const& message, Remedy help = Remedy::None) const;
   [[noreturn]] void Refuse(std::size_t line, std::string const& message) const;
 
  private:

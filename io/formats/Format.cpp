@@ -5,7 +5,9 @@
 #include "io/formats/CsvPieces.h"
 #include "io/formats/Dxf.h"
 #include "io/formats/GCode.h"
+#include "io/formats/GeoJson.h"
 #include "io/formats/JsonPieces.h"
+#include "io/formats/Svg.h"
 #include "io/formats/Text.h"
 #include "io/formats/Wkt.h"
 #include "vorn/io/Failure.h"
@@ -106,9 +108,18 @@ std::optional<Format> FormatOfContent(std::string_view text) {
 
 bool HoldsContour(Format format) { return format != Format::Svg && IsReadAsContour(format); }
 
+bool HoldsContour(Format format, WriteOptions const& options) {
+  return HoldsContour(format) || (format == Format::Svg && options.svgPlain);
+}
+
 bool IsReadAsContour(Format format) { return format != Format::Html && format != Format::Png; }
 
 namespace {
+
+std::string AsDxf(ContourFile const& contour, WriteOptions const& options) {
+  DxfStyle const style = options.dxfEntities ? DxfStyle::Entities : DxfStyle::Polyline;
+  return options.dxfVersion == DxfVersion::R12 ? ToDxf(contour, style) : ToDxf2000(contour, style);
+}
 
 std::string Written(ContourFile const& contour, Format format, WriteOptions const& options) {
   switch (format) {
@@ -117,11 +128,16 @@ std::string Written(ContourFile const& contour, Format format, WriteOptions cons
     case Format::Csv:
       return ToCsv(contour);
     case Format::Dxf:
-      return ToDxf(contour, options.dxfEntities ? DxfStyle::Entities : DxfStyle::Polyline);
+      return AsDxf(contour, options);
     case Format::GCode:
       return ToGCode(contour, options.gcode);
     case Format::Wkt:
       return ToWkt(contour);
+    case Format::GeoJson:
+      return ToGeoJson(contour, options.chords);
+    case Format::Svg:
+      if (options.svgPlain) return ToPlainSvg(contour);
+      [[fallthrough]];
     default:
       throw Failure(FailureKind::BadArgument, NameOf(format) + " holds no contour");
   }

@@ -97,8 +97,9 @@ class Taker {
   void TakeArc(Piece const& arc, std::string const& path, std::vector<XY>* places) {
     std::size_t const before = places->size();
     if (!flattening_.tolerance) {
-      RefuseFile(path, "an arc from " + PlaceText(arc.start) + " to " + PlaceText(arc.end) +
-                           ": --flatten T takes chords of arcs and curves");
+      throw Failure(FailureKind::File, {path},
+                    "an arc from " + PlaceText(arc.start) + " to " + PlaceText(arc.end),
+                    Remedy::FlattenCurves);
     }
     if (!AppendChords(arc, *flattening_.tolerance, flattening_.chordsLeft, places)) {
       RefuseFile(path, "arcs flattened so finely have more than " + std::to_string(kMostChords) +
@@ -134,6 +135,17 @@ std::vector<PointFile> ParsePointOutlines(std::string_view text, std::string con
   ContourFile const contour =
       ParseContour(text, InputName(path), ReadOptions{reading.format, reading.flattening});
   return Taker(contour, reading).Take();
+}
+
+PointFile Joined(std::vector<PointFile> const& outlines) {
+  PointFile file = outlines.front();
+  file.path = file.path.substr(0, file.path.size() - OutlineSuffix(file.outline).size());
+  file.outline = 0;
+  for (std::size_t i = 1; i < outlines.size(); ++i) {
+    std::vector<WPoint> const& points = outlines[i].points;
+    file.points.insert(file.points.end(), points.begin(), points.end());
+  }
+  return file;
 }
 
 std::vector<PointFile> ReadPointOutlines(std::string const& path, std::istream& in,

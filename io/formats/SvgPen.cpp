@@ -127,7 +127,7 @@ void SvgPen::EllipseTo(SvgArc const& arc, XY const& to) {
 void SvgPen::AddChords(std::vector<BezierCurve> const& curves) {
   std::vector<Piece> chords;
   if (auto const fault = AppendChords(curves, &outcome_.flattening, &chords)) {
-    element_.Refuse(*fault);
+    element_.Refuse(*fault, outcome_.flattening.Help());
   }
   for (Piece const& chord : chords) Add(chord);
 }

@@ -56,15 +56,15 @@ std::string CurveOf(std::vector<Piece> const& run, XY const& end) {
 }  // namespace
 
 std::string ToWkt(ContourFile const& contour) {
-  std::vector<Piece> const pieces = WithoutWideArcs(contour.pieces);
-  auto const runs = ConnectedRuns(pieces, JointTolerance(pieces));
-  // The ends of a closed curve must be the same to the last digit.
-  bool const isLoop = contour.isClosed && ReturnsToStart(pieces);
-  XY const end = isLoop ? pieces.front().start : pieces.back().end;
+  ContourFile divided = contour;
+  divided.pieces = WithoutWideArcs(contour.pieces);
+  std::vector<ContourFile> const runs = RunsOf(divided);
   std::string text;
-  for (std::vector<Piece> const& run : runs) {
+  for (ContourFile const& run : runs) {
     if (!text.empty()) text += ", ";
-    text += CurveOf(run, &run == &runs.back() ? end : run.back().end);
+    // The ends of a closed curve must be the same to the last digit.
+    XY const end = run.isClosed ? run.pieces.front().start : run.pieces.back().end;
+    text += CurveOf(run.pieces, end);
   }
   return (runs.size() == 1 ? text : "MULTICURVE (" + text + ")") + "\n";
 }

@@ -110,8 +110,8 @@ std::optional<std::string_view> XmlElement::operator[](std::string_view attribut
   return {};
 }
 
-void XmlElement::Refuse(std::string const& message) const {
-  throw Failure(FailureKind::File, place, std::string(tag) + ": " + message);
+void XmlElement::Refuse(std::string const& message, Remedy help) const {
+  throw Failure(FailureKind::File, place, std::string(tag) + ": " + message, help);
 }
 
 void WalkXml(std::string_view text, std::string const& path, XmlVisitor* visitor) {

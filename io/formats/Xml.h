@@ -21,7 +21,7 @@ struct XmlElement {
   std::optional<std::string_view> operator[](std::string_view attribute) const;
 
   /// Ends the reading with a message about this element.
-  [[noreturn]] void Refuse(std::string const& message) const;
+  [[noreturn]] void Refuse(std::string const& message, Remedy help = Remedy::None) const;
 };
 
 /// Gets the elements of a document in its order.

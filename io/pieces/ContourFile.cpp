@@ -35,6 +35,16 @@ bool ReturnsToStart(std::vector<Piece> const& pieces) {
   return Distance(pieces.back().end, pieces.front().start) <= JointTolerance(pieces);
 }
 
+std::vector<ContourFile> RunsOf(ContourFile const& contour) {
+  auto const runs = ConnectedRuns(contour.pieces, JointTolerance(contour.pieces));
+  std::vector<ContourFile> result;
+  for (std::vector<Piece> const& run : runs) {
+    bool const isClosed = (contour.isClosed || runs.size() > 1) && ReturnsToStart(run);
+    result.push_back({contour.path, run, isClosed, contour.units, 0});
+  }
+  return result;
+}
+
 std::vector<Gap> FindGaps(ContourFile const& contour) {
   std::vector<Gap> gaps;
   std::vector<Piece> const& pieces = contour.pieces;

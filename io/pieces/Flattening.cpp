@@ -118,7 +118,7 @@ std::vector<BezierCurve> CurvesOf(EllipseArc const& arc) {
 std::optional<std::string> AppendChords(std::vector<BezierCurve> const& curves,
                                         Flattening* flattening, std::vector<Piece>* pieces) {
   if (!flattening->tolerance) {
-    return "a curve that is no arc of a circle: --flatten T takes chords of it";
+    return "a curve that is no arc of a circle";
   }
   for (BezierCurve const& curve : curves) {
     std::vector<XY> points = {curve.front().at};

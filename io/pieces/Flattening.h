@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "vorn/io/Failure.h"
 #include "vorn/io/Pieces.h"
 
 /// Curves as chains of chords.
@@ -58,6 +59,9 @@ std::vector<BezierCurve> CurvesOf(EllipseArc const& arc);
 struct Flattening {
   std::optional<double> tolerance;       ///< nothing: curves are refused
   std::size_t chordsLeft = kMostChords;  ///< of all curves together
+
+  /// What helps where a curve was refused.
+  Remedy Help() const { return tolerance ? Remedy::None : Remedy::FlattenCurves; }
 };
 
 /// Appends the chords of curves that follow each other.

@@ -3,32 +3,12 @@
 #include <algorithm>
 
 #include "io/pieces/Chains.h"
+#include "io/pieces/Nesting.h"
 #include "io/pieces/Shapes.h"
 
 namespace Vorn::IO {
 
 namespace {
-
-/// Whether a ray from the place to the right crosses the stretch from a to b.
-bool IsCrossed(XY const& a, XY const& b, XY const& place) {
-  if ((a.y > place.y) == (b.y > place.y)) return false;
-  return a.x + (place.y - a.y) / (b.y - a.y) * (b.x - a.x) > place.x;
-}
-
-bool Encloses(ContourFile const& outline, XY const& place) {
-  constexpr int kPartsOfArc = 64;
-  bool isInside = false;
-  for (Piece const& piece : outline.pieces) {
-    int const parts = piece.IsArc() ? kPartsOfArc : 1;
-    XY from = piece.start;
-    for (int i = 1; i <= parts; ++i) {
-      XY const to = i == parts ? piece.end : PointOnArc(piece, piece.sweep * i / parts);
-      if (IsCrossed(from, to, place)) isInside = !isInside;
-      from = to;
-    }
-  }
-  return isInside;
-}
 
 ContourFile OutlineOf(LinkChain const& chain, ContourFile const& contour) {
   ContourFile outline = {contour.path,      {}, false, contour.units, contour.leftOut,
@@ -83,14 +63,9 @@ ContourFile Chained(ContourFile const& contour) {
 }
 
 std::vector<std::size_t> DepthsOf(std::vector<ContourFile> const& outlines) {
-  std::vector<std::size_t> depths(outlines.size());
-  for (std::size_t i = 0; i < outlines.size(); ++i) {
-    if (!outlines[i].isClosed) continue;
-    for (std::size_t k = 0; k < outlines.size(); ++k) {
-      bool const isAround =
-          k != i && outlines[k].isClosed && Encloses(outlines[k], outlines[i].pieces.front().start);
-      if (isAround) ++depths[i];
-    }
+  std::vector<std::size_t> depths;
+  for (std::vector<std::size_t> const& around : ContainersOf(outlines)) {
+    depths.push_back(around.size());
   }
   return depths;
 }

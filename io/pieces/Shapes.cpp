@@ -138,6 +138,24 @@ std::vector<Piece> WithoutWideArcs(std::vector<Piece> const& pieces) {
   return result;
 }
 
+std::vector<Piece> WithoutArcsBeyond(double widest, std::vector<Piece> const& pieces) {
+  std::vector<Piece> result;
+  for (Piece const& piece : pieces) {
+    double const count = piece.IsArc() ? std::max(1.0, std::ceil(piece.sweep / widest)) : 1.0;
+    XY from = piece.start;
+    for (double part = 1.0; part < count; part += 1.0) {
+      XY const to = PointOnArc(piece, piece.sweep * part / count);
+      result.push_back(MakeArc(from, to, piece.center, piece.radius, piece.counterClockwise));
+      from = to;
+    }
+    result.push_back(piece);
+    if (count > 1.0) {
+      result.back() = MakeArc(from, piece.end, piece.center, piece.radius, piece.counterClockwise);
+    }
+  }
+  return result;
+}
+
 std::vector<std::vector<Piece>> ConnectedRuns(std::vector<Piece> const& pieces, double tolerance) {
   std::vector<std::vector<Piece>> runs;
   for (Piece const& piece : pieces) {

@@ -37,6 +37,9 @@ std::vector<Piece> WithoutWideArcs(std::vector<Piece> const& pieces);
 /// The pieces cut into stretches without a gap wider than `tolerance`.
 std::vector<std::vector<Piece>> ConnectedRuns(std::vector<Piece> const& pieces, double tolerance);
 
+/// The pieces with every arc beyond `widest` radians in equal parts that are not.
+std::vector<Piece> WithoutArcsBeyond(double widest, std::vector<Piece> const& pieces);
+
 /// What is wrong with the arc, as far as a reader can tell: "the start is 0.3 off the circle".
 /// Files with three good digits pass.
 std::optional<std::string> FaultOf(Piece const& arc);

@@ -133,7 +133,9 @@ TEST(ConvertCommand, OptionsReachTheWriters) {
     words.insert(words.begin(), {"convert", "-", "-o", "-"});
     return RunInProcess(words, ToJson(Wedge())).out;
   };
-  EXPECT_EQ(out({"--to", "dxf", "--dxf-entities"}), ToText(Wedge(), Format::Dxf, {true, {}}));
+  WriteOptions entities;
+  entities.dxfEntities = true;
+  EXPECT_EQ(out({"--to", "dxf", "--dxf-entities"}), ToText(Wedge(), Format::Dxf, entities));
   EXPECT_EQ(out({"--to", "gcode", "--gcode-decimals", "2", "--feed", "1.5"}),
             ToText(Wedge(), Format::GCode, WithFeed(1.5, 2)));
   EXPECT_TRUE(out({"--to", "gcode", "--units", "inch"}).starts_with("G20\n"));

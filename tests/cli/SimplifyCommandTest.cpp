@@ -74,6 +74,54 @@ TEST(SimplifyCommand, AsksHow) {
             ExitCode::Usage);
 }
 
+/// Points every 0.1 along x and then along y, one of them 1 away.
+std::string Scan() {
+  std::string text = "x,y\n";
+  for (int i = 0; i < 100; ++i) {
+    double const wobble = (i * 7 % 11 - 5) * 1e-4;
+    text += std::to_string(i * 0.1) + "," + std::to_string(i == 40 ? 1.0 : wobble) + "\n";
+  }
+  for (int i = 1; i < 100; ++i) {
+    double const wobble = (i * 5 % 13 - 6) * 1e-4;
+    text += std::to_string(9.9 + wobble) + "," + std::to_string(i * 0.1) + "\n";
+  }
+  return text;
+}
+
+TEST(SimplifyCommand, ListsOutliersAndMeasuresEveryPoint) {
+  RunResult const run =
+      RunInProcess({"simplify", "-", "--outliers", "20", "--spacing", "0.5", "-t", "0.02"}, Scan());
+  EXPECT_EQ(run.code, ExitCode::Ok);
+  EXPECT_NE(run.err.find("standard input: 1 outlier\n"), std::string::npos) << run.err;
+  EXPECT_NE(run.err.find("point 40 (line 42) is "), std::string::npos) << run.err;
+  EXPECT_NE(run.err.find("a fit of the rest has 2 pieces; of all 199 points of the file 1 are "
+                         "outside their tolerance, the largest deviation is "),
+            std::string::npos)
+      << run.err;
+  EXPECT_EQ(run.out.find("4.000000,1.000000"), std::string::npos);
+}
+
+TEST(SimplifyCommand, AveragesInWindows) {
+  RunResult const run =
+      RunInProcess({"simplify", "-", "--spacing", "1", "--average", "-t", "0.3"}, Scan());
+  EXPECT_EQ(run.code, ExitCode::Ok);
+  EXPECT_NE(run.err.find("stand for 199, "), std::string::npos) << run.err;
+  EXPECT_NE(run.err.find("standard deviation across the path "), std::string::npos) << run.err;
+  EXPECT_EQ(run.out.substr(0, 4), "x,y\n");
+}
+
+TEST(SimplifyCommand, ARestThatCannotBeFittedIsSaid) {
+  RunResult const run = RunInProcess({"simplify", "-", "--spacing", "0.2", "-t", "5"}, Scan());
+  EXPECT_EQ(run.code, ExitCode::Ok);
+  EXPECT_NE(run.err.find("the rest cannot be fitted: "), std::string::npos) << run.err;
+}
+
+TEST(SimplifyCommand, WritesPointsOfDrawingsAsATable) {
+  RunResult const run =
+      RunInProcess({"simplify", "-", "--spacing", "2"}, "LINESTRING (0 0, 1 0, 2 0, 3 0, 4 0)");
+  EXPECT_EQ(run.out, "x,y\n0,0\n2,0\n4,0\n") << run.err;
+}
+
 class SimplifiedSharedData : public testing::TestWithParam<char const*> {};
 
 TEST_P(SimplifiedSharedData, PassesTheSpacingRule) {

@@ -25,6 +25,10 @@ struct ContourFile {
 /// @return how many there were
 VORN_IO_EXPORT std::size_t RemovePiecesWithoutLength(std::vector<Piece>* pieces);
 
+/// The contour cut at its gaps, piece by piece as it is: each run is closed when its ends meet, if
+/// the contour is closed or there are several.
+VORN_IO_EXPORT std::vector<ContourFile> RunsOf(ContourFile const& contour);
+
 /// Two pieces that follow each other in a contour but do not meet.
 struct Gap {
   std::size_t before = 0;  ///< index of the earlier piece; the other one is the next

@@ -24,6 +24,8 @@ enum class Remedy {
   ChooseUnits,    ///< saying in which unit the coordinates are
   GiveTolerance,  ///< a tolerance, or a column with one for each point
   CloseContour,   ///< saying that the contour is closed
+  FlattenCurves,  ///< saying how far chords may be from arcs and curves that are read
+  GiveChords,     ///< saying how far chords may be from arcs that are written
 };
 
 /// Where something is wrong.

@@ -29,7 +29,9 @@ VORN_IO_EXPORT FileMeasure MeasureText(std::string_view text, Format format,
 
 /// The contour as the text of a file for these points. The digits of G-code, where they are not
 /// given, follow from the smallest tolerance, and grow until every point is within its own as the
-/// text stands, if the contour itself allows that.
+/// text stands, if the contour itself allows that. The chords of GeoJSON, where no distance is
+/// given, leave the arcs by a hundredth of the smallest tolerance, and end where they would take a
+/// point out.
 /// @throws as ToText does.
 VORN_IO_EXPORT std::string ToTextFor(std::vector<WPoint> const& points, ContourFile const& contour,
                                      Format format, WriteOptions options);

@@ -29,6 +29,11 @@ VORN_IO_EXPORT std::optional<Format> FormatOfContent(std::string_view text);
 /// Whether a contour can be read from and written to the format: all but the drawings.
 VORN_IO_EXPORT bool HoldsContour(Format format);
 
+struct WriteOptions;
+
+/// The same where a choice counts: SVG holds a contour when it is plain.
+VORN_IO_EXPORT bool HoldsContour(Format format, WriteOptions const& options);
+
 /// Whether a contour can be read from the format: those that hold one, and SVG, whose shapes are
 /// one.
 VORN_IO_EXPORT bool IsReadAsContour(Format format);
@@ -37,10 +42,16 @@ VORN_IO_EXPORT bool IsReadAsContour(Format format);
 /// or goes away.
 inline constexpr int kJsonSchemaVersion = 1;
 
+/// The version of DXF that is written.
+enum class DxfVersion { R12, R2000 };
+
 /// What the user can choose about the files.
 struct WriteOptions {
-  bool dxfEntities = false;  ///< LINE and ARC in place of one POLYLINE
-  GCodeOptions gcode;        ///< of a tool path
+  bool dxfEntities = false;                 ///< LINE and ARC in place of one polyline
+  DxfVersion dxfVersion = DxfVersion::R12;  ///< R2000: LWPOLYLINE, units and layers of holes
+  bool svgPlain = false;                    ///< SVG is the contour itself, not a drawing of it
+  std::optional<double> chords;  ///< GeoJSON: how far chords may be from arcs; needed for these
+  GCodeOptions gcode;            ///< of a tool path
 };
 
 /// The contour as the text of a file. Pieces without length are left out, see

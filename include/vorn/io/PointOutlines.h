@@ -43,6 +43,9 @@ VORN_IO_EXPORT std::vector<PointFile> ParsePointOutlines(std::string_view text,
                                                          std::string const& path,
                                                          PointReading const& reading);
 
+/// The points of outlines of one file, one after the other; there must be at least one.
+VORN_IO_EXPORT PointFile Joined(std::vector<PointFile> const& outlines);
+
 /// Whether the file is a table of points, by what is said of it, its name and its content.
 VORN_IO_EXPORT bool IsPointTable(std::string_view text, std::string const& path,
                                  std::optional<Format> format);

@@ -34,6 +34,40 @@ VORN_IO_EXPORT std::vector<std::size_t> KeepSpaced(std::vector<WPoint> const& po
 VORN_IO_EXPORT void DropCloseToFirst(std::vector<WPoint> const& points, TooClose const& tooClose,
                                      std::vector<std::size_t>* kept);
 
+/// The indices of the first point, of the next one that is at least `spacing` along the path behind
+/// the one kept before, and so on, and of the last point. Needs a point. O(n).
+VORN_IO_EXPORT std::vector<std::size_t> KeepEvery(std::vector<WPoint> const& points,
+                                                  double spacing);
+
+/// Points that stand for several.
+struct Averages {
+  std::vector<WPoint> points;     ///< the means; `w` is that of the first point of each window
+  double largestDeviation = 0.0;  ///< the largest standard deviation across the path of a window
+  double meanDeviation = 0.0;     ///< the root of the mean of their squares
+  std::size_t fewest = 0;         ///< points in the smallest window
+  std::size_t most = 0;           ///< points in the largest one
+};
+
+/// The mean of the points in each window of `window` along the path. The first and the last point
+/// of an open path stay as they are, with no window; so the path gets no shorter. Across the path
+/// means from the line of least squares through the points of the window. Needs two points. O(n).
+VORN_IO_EXPORT Averages AverageAlong(std::vector<WPoint> const& points, double window);
+
+/// A point that its neighbours do not bear out.
+struct Outlier {
+  std::size_t point = 0;    ///< its index
+  double distance = 0.0;    ///< from where its neighbours have it
+  double deviations = 0.0;  ///< the same in standard deviations of all such distances
+};
+
+/// The points further than `deviations` standard deviations from where their neighbours have them:
+/// from the parabola of least squares through four points before, four behind, or all eight, by
+/// which it is nearest; so corners are no outliers. The standard deviation follows from the median
+/// of all distances, so that outliers do not hide each other. Nothing for less than nine points,
+/// and where most points lie so exactly that they do not deviate at all. O(n).
+VORN_IO_EXPORT std::vector<Outlier> FindOutliers(std::vector<WPoint> const& points,
+                                                 double deviations);
+
 /// The indices from 0 to count - 1 that are not in the ascending list.
 VORN_IO_EXPORT std::vector<std::size_t> Others(std::vector<std::size_t> const& kept,
                                                std::size_t count);

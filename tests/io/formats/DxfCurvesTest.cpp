@@ -120,8 +120,7 @@ TEST(DxfSpline, FollowsItsWeights) {
 
 TEST(DxfSpline, IsRefusedUnlessFlattened) {
   EXPECT_EQ(Refusal([] { Read(kSpline, {}); }),
-            "p.dxf:5: entity 1 (SPLINE): a curve that is no arc of a circle: --flatten T takes "
-            "chords of it");
+            "p.dxf:5: entity 1 (SPLINE): a curve that is no arc of a circle");
 }
 
 TEST(DxfSpline, NamesWhatIsWrong) {
