@@ -74,7 +74,6 @@ Examples:
   contour fit - -t 0.02 -o - --to dxf < part.csv > part.dxf
   contour fit part.csv --tolerance-per-point 0.05 --strategy cells -o part.json
   contour fit part.csv -t 0.02 -o part.html --field part=Cam --field date=2026-11-30
-  contour fit plate.dxf -t 0.02 --flatten 0.005 -o plate.json --dxf-version r2000 -o fitted.dxf
   contour fit outline.csv -t 0.01 --closed yes --start 120
   contour fit scan.csv -t 0.01 --strategy fewest --largest-step 30 -o scan.dxf
   contour fit scans/*.csv -t 0.02 --out-dir fitted --to json,dxf -j 8

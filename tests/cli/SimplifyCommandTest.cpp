@@ -89,8 +89,7 @@ std::string Scan() {
 }
 
 TEST(SimplifyCommand, ListsOutliersAndMeasuresEveryPoint) {
-  RunResult const run =
-      RunInProcess({"simplify", "-", "--outliers", "20", "--spacing", "0.5", "-t", "0.02"}, Scan());
+  RunResult const run = RunInProcess({"simplify", "-", "--outliers", "20", "-t", "0.02"}, Scan());
   EXPECT_EQ(run.code, ExitCode::Ok);
   EXPECT_NE(run.err.find("standard input: 1 outlier\n"), std::string::npos) << run.err;
   EXPECT_NE(run.err.find("point 40 (line 42) is "), std::string::npos) << run.err;
