@@ -115,8 +115,14 @@ TEST(FitFewest, FullCircleKeepsTheOptions) {
   FitChoice flat = Fewest(0.01);
   flat.fewest.largestRadius = 2.0;
   FitReport const report = FitPoints(points, flat);
-  EXPECT_EQ(report.ArcCount(), 0u);
+  EXPECT_FALSE(report.isFullCircle);
+  EXPECT_GT(report.pieces.size(), 2u);
+  for (Piece const& piece : report.pieces) {
+    double const radius = piece.IsArc() ? piece.radius : 0.0;
+    EXPECT_LE(radius, 2.0 * (1.0 + 1e-9)) << "the circle has 3";
+  }
   EXPECT_EQ(report.Gap(), 0.0);
+  EXPECT_EQ(report.verdict, Verdict::WithinTolerance);
 }
 
 TEST(FitFewest, PointsMayBeCloserThanTheirTolerances) {
