@@ -187,6 +187,7 @@ void DropClose(Options const& options, Thinned* thinned) {
   }
   if (options.doAverage) {
     std::vector<WPoint> points;
+    points.reserve(kept.size());
     for (std::size_t const i : kept) points.push_back(thinned->points[i]);
     thinned->points = std::move(points);
   } else {
@@ -226,7 +227,7 @@ std::string DescribeRest(Options const& options, Thinned const& thinned) {
     FitReport const report = FitContour(std::move(rest), choice, nullptr);
     return begin + DescribeFit(report, thinned.file, *judged) + '\n';
   } catch (Failure const& failure) {
-    std::string const message = failure.Message();
+    std::string const& message = failure.Message();
     return begin + "the rest cannot be fitted: " + message.substr(0, message.find('\n')) + '\n';
   }
 }

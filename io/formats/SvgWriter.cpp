@@ -39,7 +39,7 @@ std::string StepOf(Piece const& piece) {
 std::string PathOf(ContourFile const& run) {
   std::string data = "M " + Written(run.pieces.front().start);
   for (Piece const& piece : WithoutArcsBeyond(kWidestArc, run.pieces)) data += " " + StepOf(piece);
-  return "<path d=\"" + data + (run.isClosed ? " Z" : "") + "\"/>\n";
+  return R"(<path d=")" + data + (run.isClosed ? " Z" : "") + "\"/>\n";
 }
 
 /// The page around the contour, with room for the width of the lines.
@@ -49,7 +49,7 @@ std::string PageOf(ContourFile const& contour, double lineWidth) {
   std::string const width = FormatPlain(extent.high.x - extent.low.x + 2.0 * lineWidth);
   std::string const height = FormatPlain(extent.high.y - extent.low.y + 2.0 * lineWidth);
   XY const corner = {extent.low.x - lineWidth, extent.high.y + lineWidth};
-  return "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"" + width + unit + "\" height=\"" +
+  return R"(<svg xmlns="http://www.w3.org/2000/svg" width=")" + width + unit + "\" height=\"" +
          height + unit + "\" viewBox=\"" + Written(corner) + " " + width + " " + height + "\">\n";
 }
 
