@@ -12,6 +12,7 @@ namespace Vorn::Cli {
 namespace {
 
 constexpr int kAngleDecimals = 3;
+constexpr double kDegreesPerRadian = 180.0 / std::numbers::pi;
 constexpr int kDeviationDigits = 2;
 constexpr char const* kNothing = "-";
 
@@ -21,7 +22,7 @@ constexpr char const* kHeading =
     "points.\n\n";
 
 std::string Degrees(double radians) {
-  return FormatFixed(radians * 180.0 / std::numbers::pi, kAngleDecimals);
+  return FormatFixed(radians * kDegreesPerRadian, kAngleDecimals);
 }
 
 template <typename Show>
@@ -32,7 +33,7 @@ std::string OrNothing(std::optional<double> const& value, Show const& show) {
 /// Radius, direction and the standard deviation of the one that is there.
 Row FittedCells(PieceMeasure const& measure, LengthFormat const& length) {
   auto const few = [](double value) { return FormatShort(value, kDeviationDigits); };
-  auto const fewDegrees = [&](double value) { return few(value * 180.0 / std::numbers::pi); };
+  auto const fewDegrees = [&](double value) { return few(value * kDegreesPerRadian); };
   if (measure.circle) {
     return {length(measure.circle->radius), kNothing,
             OrNothing(measure.circle->radiusDeviation, few)};
@@ -41,13 +42,13 @@ Row FittedCells(PieceMeasure const& measure, LengthFormat const& length) {
     return {kNothing, Degrees(measure.line->direction),
             OrNothing(measure.line->directionDeviation, fewDegrees)};
   }
-  return Row(3, kNothing);
+  return {kNothing, kNothing, kNothing};
 }
 
 Row ScatterCells(PieceMeasure const& measure, LengthFormat const& length) {
   Scatter const* const scatter = measure.ScatterOfPoints();
   auto const finer = [&](double value) { return length.Finer(value); };
-  if (scatter == nullptr) return Row(2, kNothing);
+  if (scatter == nullptr) return {kNothing, kNothing};
   return {finer(scatter->formError), OrNothing(scatter->standardDeviation, finer)};
 }
 

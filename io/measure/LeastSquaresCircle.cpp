@@ -22,6 +22,7 @@ constexpr double kParameters = 3.0;
 constexpr int kMostSteps = 100;
 constexpr double kFirstDamping = 1e-3;
 constexpr double kMostDamping = 1e12;
+constexpr double kDampingStep = 10.0;
 /// A step this small leaves an error far below the rounding of the points, which are of size 1.
 constexpr double kSettled = 1e-12;
 /// Below this a step is taken though rounding may hide that it leads down.
@@ -131,10 +132,10 @@ Descent Descend(double curvature, double normal, std::vector<XY> const& points) 
     double const size = step.lpNorm<Eigen::Infinity>();
     if (next.equations.squares < best.equations.squares || size < kNearlySettled) {
       best = next;
-      damping *= 0.1;
+      damping /= kDampingStep;
       if (size < kSettled) break;
     } else {
-      damping *= 10.0;
+      damping *= kDampingStep;
     }
   }
   return best;
