@@ -20,6 +20,7 @@ namespace Vorn::Cli {
 /// An option or an operand of a command.
 class Option {
  public:
+  /// Stands for an option that was added.
   explicit Option(CLI::Option* option) : option_(option) {}
 
   /// It must be given.
@@ -39,10 +40,13 @@ class Option {
 /// names of one; the name of an operand has none. `valueName` is what the help calls the value.
 class Command {
  public:
+  /// Stands for a command that was added.
   explicit Command(CLI::App* command) : command_(command) {}
 
+  /// An option or argument with a text.
   Option AddText(std::string const& name, std::string* value, std::string const& valueName,
                  std::string const& help);
+  /// The same, which knows whether it was given.
   Option AddText(std::string const& name, std::optional<std::string>* value,
                  std::string const& valueName, std::string const& help);
 
@@ -60,6 +64,7 @@ class Command {
                     std::function<void(std::string const&)> const& take,
                     std::string const& valueName, std::string const& help);
 
+  /// An option without a value.
   Option AddFlag(std::string const& name, bool* value, std::string const& help);
 
   /// The end of its help.
@@ -75,13 +80,19 @@ class Command {
 /// The command line of the program: one of its commands, or a question for help or the version.
 class CommandLine {
  public:
+  /// A program without commands yet.
   CommandLine(std::string const& name, std::string const& text);
+  /// Out of line, because what is owned is incomplete here.
   ~CommandLine();
+  /// Commands point to it, so it stays where it is.
   CommandLine(CommandLine const&) = delete;
   CommandLine& operator=(CommandLine const&) = delete;
 
+  /// What --version prints.
   void SetVersion(std::string const& text);
+  /// What ends the help of the program.
   void SetFooter(std::string const& text);
+  /// Adds a command; the text begins its help.
   Command AddCommand(std::string const& name, std::string const& text);
 
   /// Sets what the words say, and calls what is to be called.

@@ -63,11 +63,12 @@ Option AddNumber(Command& command, std::string const& name, std::optional<double
 }
 
 Option AddWholeNumber(Command& command, std::string const& name, std::optional<int>* value,
-                      int least, int most, std::string const& valueName, std::string const& help) {
+                      WholeNumbers const& numbers, std::string const& help) {
   auto const take = [value](std::string const& text) {
     *value = static_cast<int>(*ParseNumber(text));
   };
-  return command.AddChecked(name, WholeNumber(least, most), take, valueName, help);
+  return command.AddChecked(name, WholeNumber(numbers.least, numbers.most), take, numbers.valueName,
+                            help);
 }
 
 Option AddWord(Command& command, std::string const& name, std::vector<std::string> const& words,

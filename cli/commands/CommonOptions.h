@@ -19,9 +19,16 @@ Option AddPositiveNumber(Command& command, std::string const& name, std::optiona
 Option AddNumber(Command& command, std::string const& name, std::optional<double>* value,
                  std::string const& valueName, std::string const& help);
 
-/// An option whose value is a whole number from `least` to `most`.
+/// The whole numbers that an option takes.
+struct WholeNumbers {
+  int least = 0;
+  int most = 0;
+  std::string valueName = "N";  ///< in the help
+};
+
+/// An option whose value is one of the numbers.
 Option AddWholeNumber(Command& command, std::string const& name, std::optional<int>* value,
-                      int least, int most, std::string const& valueName, std::string const& help);
+                      WholeNumbers const& numbers, std::string const& help);
 
 /// An option whose value is one of the words; `take` is called with the one given.
 Option AddWord(Command& command, std::string const& name, std::vector<std::string> const& words,

@@ -37,7 +37,7 @@ ContourFile Read(ContourInput const& input, Console const& console) {
 
 void AddOutline(Command& command, std::optional<int>* outline, std::string const& name) {
   constexpr int kMost = 1000000;
-  AddWholeNumber(command, name, outline, 1, kMost, "N",
+  AddWholeNumber(command, name, outline, {1, kMost},
                  "Take only this one of the outlines in a file, counted from 1");
 }
 

@@ -55,7 +55,7 @@ void AddGCodeOptions(Command& command, GCodeOptions* options) {
   AddPositiveNumber(command, "--feed", &options->feed, "F",
                     "G-code: the feed in units a minute; without it there is no F word, and a "
                     "controller stops at the first cut");
-  AddWholeNumber(command, "--gcode-decimals", &options->decimals, 0, kMostDecimals, "N",
+  AddWholeNumber(command, "--gcode-decimals", &options->decimals, {0, kMostDecimals},
                  "G-code: digits after the point; if not said, 4, of inches 5, and more where the "
                  "tolerance asks for more");
   command.AddFlag("--r-words", &options->useRadiusWords, "G-code: arcs by R, not by I and J");

@@ -67,7 +67,7 @@ void AddManyOptions(Command& command, FitOptions* options) {
   command.AddText("--summary", &options->summary, "FILE",
                   "Write a table with a row for each file, the worst first, and totals: .csv, or "
                   ".html with a small picture of each contour");
-  AddWholeNumber(command, "-j,--jobs", &options->jobs, 1, kMostJobs, "N",
+  AddWholeNumber(command, "-j,--jobs", &options->jobs, {1, kMostJobs},
                  "Fit so many files at once; as many as there are processors if not said");
   command.AddFlag("--no-time", &options->hideTime,
                   "Leave the times out of the lines of many files");
@@ -138,7 +138,7 @@ void AddFitOptions(Command& command, FitOptions* options) {
       command, "--closed", &options->closed,
       {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
       "Whether the contour runs back to its start; auto (default): see below");
-  AddWholeNumber(command, "--start", &options->start, 0, std::numeric_limits<int>::max(), "INDEX",
+  AddWholeNumber(command, "--start", &options->start, {0, std::numeric_limits<int>::max(), "INDEX"},
                  "Cut a closed contour open at this point, counted from 0; without it, at its "
                  "sharpest corner");
   command.AddRepeatable(
@@ -148,7 +148,7 @@ void AddFitOptions(Command& command, FitOptions* options) {
   AddFormats(command, options);
   AddManyOptions(command, options);
   AddWriteOptions(command, &options->write);
-  AddWholeNumber(command, "--digits", &options->digits, 0, kMostDigits, "N",
+  AddWholeNumber(command, "--digits", &options->digits, {0, kMostDigits},
                  "Digits after the point of lengths in the table; files always hold every digit");
   command.AddText("--json", &options->json, "FILE", "The same as -o, always as JSON");
   command.AddText("--svg", &options->svg, "FILE", "The same as -o, always as SVG");

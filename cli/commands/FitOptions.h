@@ -60,6 +60,7 @@ struct FitOptions {
   bool WritesGCode() const;
 
  private:
+  /// The format of an output, by the ending of its name or --to.
   Format FormatFor(std::string const& path) const;
 };
 

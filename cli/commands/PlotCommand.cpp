@@ -236,7 +236,7 @@ void AddOptions(Command& command, Options* options) {
   AddFieldOption(command, &options->fields);
   Option const dpi = AddPositiveNumber(command, "--dpi", &options->dpi, "N",
                                        "PNG: pixels to the inch on A4; 150 if not said");
-  AddWholeNumber(command, "--width", &options->width, 1, kMostPixels, "N", "PNG: width in pixels")
+  AddWholeNumber(command, "--width", &options->width, {1, kMostPixels}, "PNG: width in pixels")
       .Exclude(dpi);
   command.SetFooter(std::string(kPointsFileText) + kFooter);
 }

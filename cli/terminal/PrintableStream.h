@@ -12,6 +12,7 @@ namespace Vorn::Cli {
 /// replaced before it gets there, line by line.
 class PrintableStream final : public std::ostream {
  public:
+  /// Writes to the target, which must outlive it.
   explicit PrintableStream(std::ostream& target) : std::ostream(nullptr), buffer_(target) {
     rdbuf(&buffer_);
   }

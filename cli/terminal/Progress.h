@@ -20,8 +20,10 @@ class ProgressBar final : public ExecutionState {
 
   /// @param points how many there are to fit
   ProgressBar(std::FILE* stream, std::size_t points, bool isQuiet = false);
+  /// It owns its line of the terminal.
   ProgressBar(ProgressBar const&) = delete;
   ProgressBar& operator=(ProgressBar const&) = delete;
+  /// Wipes the bar off.
   ~ProgressBar();
 
   /// Draws when the value is larger than the one shown, or a second later: the fit reports far more
@@ -31,6 +33,7 @@ class ProgressBar final : public ExecutionState {
  private:
   using Clock = std::chrono::steady_clock;
 
+  /// Draws the bar as it stands.
   void Draw(Clock::time_point now);
 
   std::FILE* stream_;

@@ -12,12 +12,14 @@ class LengthFormat {
   /// @param wanted digits after the point in place of those
   explicit LengthFormat(double smallestTolerance, std::optional<int> wanted = {});
 
+  /// The length with as many digits as the table has.
   std::string operator()(double value) const;
 
   /// The same with one digit more, for what is smaller than the tolerance.
   std::string Finer(double value) const;
 
  private:
+  /// The value with so many digits after the point.
   std::string Format(double value, int decimals) const;
 
   int decimals_ = 0;

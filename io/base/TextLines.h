@@ -8,8 +8,10 @@ namespace Vorn::IO {
 /// Walks over the lines of a text; a line ends with LF, CR LF or CR.
 class TextLines {
  public:
+  /// Before the first line of the text.
   explicit TextLines(std::string_view text) : text_(text), nextLineFeed_(text.find('\n')) {}
 
+  /// Whether every line was taken.
   bool AtEnd() const { return position_ >= text_.size(); }
 
   /// The next line without its end. Must not be called at the end.

@@ -21,9 +21,13 @@ struct Rect {
   double width = 0.0;
   double height = 0.0;
 
+  /// The right side.
   double Right() const { return left + width; }
+  /// The lower side; y grows downwards.
   double Bottom() const { return top + height; }
+  /// Whether the other one lies inside, borders included.
   bool Contains(Rect const& inner) const;
+  /// Whether both have some area in common.
   bool Overlaps(Rect const& other) const;
 };
 
@@ -34,8 +38,11 @@ struct Box {
   double yMin = 0.0;
   double yMax = 0.0;
 
+  /// From left to right, in units of the contour.
   double Width() const { return xMax - xMin; }
+  /// From bottom to top.
   double Height() const { return yMax - yMin; }
+  /// Grows so that the point is inside.
   void Include(double x, double y);
 };
 
@@ -65,9 +72,13 @@ class View {
   View(Box const& box, double left, double top, double width, double leastHeight,
        double mostHeight);
 
+  /// Where a point of the plane is on the page.
   Pixel operator()(double x, double y) const;
+  /// Pixels to a unit of the contour.
   double Scale() const { return scale_; }
+  /// The part of the page that is drawn into.
   Rect const& Frame() const { return frame_; }
+  /// The part of the plane that the frame shows.
   Box Visible() const;
 
  private:

@@ -17,13 +17,17 @@ struct Scene {
   std::vector<Pixel> feetAt;     ///< the same on the page
   std::vector<Pixel> magnified;  ///< each point as drawn: moved away from its foot
 
+  /// Whether there is a contour to draw.
   bool HasContour() const { return drawing.HasContour(); }
+  /// Whether there are points and a contour, so that deviations are drawn.
   bool IsMeasured() const { return drawing.IsMeasured(); }
   /// Whether the tolerance is wide enough on the page to be seen at all.
   bool IsBandVisible() const;
   /// Whether there is a tolerance and the point lies beyond it.
   bool IsOutside(std::size_t point) const;
+  /// Whether the point is measured from an arc.
   bool IsOnArc(std::size_t point) const;
+  /// Whether a point is beyond its tolerance.
   bool AnyOutside() const;
 };
 

@@ -29,10 +29,12 @@ inline constexpr double kContourWidth = 1.7;
 inline constexpr double kWorstRadius = 7.0;
 inline std::string const kArcDashes = "stroke-dasharray=\"9 2.2\"";
 
+/// The colour that lines or arcs are drawn in.
 inline std::string const& ColorOf(Piece const& piece) {
   return piece.IsArc() ? kArcColor : kLineColor;
 }
 
+/// The darker one for text about them.
 inline std::string const& TextColorOf(Piece const& piece) {
   return piece.IsArc() ? kArcTextColor : kLineColor;
 }

@@ -21,10 +21,13 @@ std::string Escaped(std::string_view text);
 /// One text element; `attributes` are written as they are.
 std::string Text(Pixel const& at, std::string const& attributes, std::string_view text);
 
+/// A straight line.
 std::string LineElement(Pixel const& from, Pixel const& to, std::string const& attributes);
 
+/// A full circle.
 std::string CircleElement(Pixel const& center, double radius, std::string const& attributes);
 
+/// A rectangle.
 std::string RectElement(Rect const& rect, std::string const& attributes);
 
 /// Nothing without data.

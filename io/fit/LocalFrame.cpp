@@ -4,46 +4,11 @@
 #include <cmath>
 #include <utility>
 
+#include "io/pieces/Frame.h"
+
 namespace Vorn::IO {
 
 namespace {
-
-/// The offset is a multiple of a power of ten at least this many times the size of the points.
-constexpr double kSizesToStep = 32.0;
-
-double StepFor(double size) {
-  constexpr double kBase = 10.0;
-  double step = 1.0;
-  while (step < kSizesToStep * size) step *= kBase;
-  return step;
-}
-
-struct Range {
-  double low = HUGE_VAL;
-  double high = -HUGE_VAL;
-
-  void Add(double value) {
-    low = std::min(low, value);
-    high = std::max(high, value);
-  }
-  double Size() const { return high - low; }
-};
-
-/// Whether value - offset is exact for every value of the range. It is where both are within a
-/// factor of two: then the difference is a multiple of the last place of either and not larger than
-/// the smaller of the two.
-bool IsExact(Range const& range, double offset) {
-  double const nearest = std::min(std::fabs(range.low), std::fabs(range.high));
-  double const furthest = std::max(std::fabs(range.low), std::fabs(range.high));
-  bool const isOneSided = (range.low > 0.0) == (range.high > 0.0);
-  double const size = std::fabs(offset);
-  return isOneSided && 0.5 * size <= nearest && furthest <= 2.0 * size;
-}
-
-double OffsetOf(Range const& range, double step) {
-  double const offset = std::round((range.low + range.Size() / 2.0) / step) * step;
-  return std::isfinite(offset) && IsExact(range, offset) ? offset : 0.0;
-}
 
 void Shift(XY const& by, XY* point) {
   point->x += by.x;
@@ -53,17 +18,13 @@ void Shift(XY const& by, XY* point) {
 }  // namespace
 
 XY LocalOrigin(std::vector<WPoint> const& points) {
-  Range x;
-  Range y;
+  Extent extent = {{HUGE_VAL, HUGE_VAL}, {-HUGE_VAL, -HUGE_VAL}};
   for (WPoint const& point : points) {
     if (!std::isfinite(point.x) || !std::isfinite(point.y)) return {0.0, 0.0};
-    x.Add(point.x);
-    y.Add(point.y);
+    extent.low = {std::min(extent.low.x, point.x), std::min(extent.low.y, point.y)};
+    extent.high = {std::max(extent.high.x, point.x), std::max(extent.high.y, point.y)};
   }
-  double const size = std::max(x.Size(), y.Size());
-  if (!(size > 0.0) || !std::isfinite(kSizesToStep * size)) return {0.0, 0.0};
-  double const step = StepFor(size);
-  return {OffsetOf(x, step), OffsetOf(y, step)};
+  return OriginFor(extent);
 }
 
 std::vector<WPoint> TakenOff(std::vector<WPoint> points, XY const& origin) {

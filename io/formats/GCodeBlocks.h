@@ -21,9 +21,11 @@ struct GCodeBlock {
   std::vector<GCodeWord> codes;
   std::array<std::optional<double>, 26> values;
 
+  /// The value of the word with this letter; nothing where the block has none.
   std::optional<double> const& operator[](char letter) const {
     return values[static_cast<std::size_t>(letter - 'A')];
   }
+  /// The same to be written.
   std::optional<double>& operator[](char letter) {
     return values[static_cast<std::size_t>(letter - 'A')];
   }

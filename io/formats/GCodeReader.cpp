@@ -88,53 +88,56 @@ class Machine {
     hasEnded_ = hasEnded_ || word.value == 2 || word.value == 30;
   }
 
+  /// G words are told by ten times their number, since some have a digit after the point.
   void TakeG(GCodeWord const& word) {
     int const code = static_cast<int>(std::lround(std::clamp(word.value * 10.0, -1.0, 1e4)));
+    bool const isTaken = TakeMotion(code) || TakeForBlock(code) || TakeUntilChanged(code);
+    if (!isTaken && !IsPassedOver(code)) Refuse(Quoted(word.text) + " is not supported");
+  }
+
+  /// G0 to G3: how the tool moves.
+  bool TakeMotion(int code) {
+    bool const isMotion = code == 0 || code == 10 || code == 20 || code == 30;
+    if (isMotion) motion_ = code / 10;
+    return isMotion;
+  }
+
+  /// What the other words of this block mean: a pause, coordinates of the machine, a tolerance.
+  bool TakeForBlock(int code) {
+    isDwell_ = isDwell_ || code == 40;
+    isElsewhere_ = isElsewhere_ || code == 280 || code == 300 || code == 530;
+    takesP_ = takesP_ || code == 640;
+    return code == 40 || code == 280 || code == 300 || code == 530 || code == 640;
+  }
+
+  /// What holds from here on.
+  bool TakeUntilChanged(int code) {
     switch (code) {
-      case 0:
-      case 10:
-      case 20:
-      case 30:
-        motion_ = static_cast<int>(word.value);
-        break;
-      case 40:
-        isDwell_ = true;
-        break;
       case 170:
         TakePlane(kPlaneXY);
-        break;
+        return true;
       case 180:
         TakePlane(kPlaneXZ);
-        break;
+        return true;
       case 200:
         TakeUnits("inch");
-        break;
+        return true;
       case 210:
         TakeUnits("mm");
-        break;
-      case 280:
-      case 300:
-      case 530:
-        isElsewhere_ = true;
-        break;
-      case 640:
-        takesP_ = true;
-        break;
+        return true;
       case 900:
         isIncremental_ = false;
-        break;
+        return true;
       case 910:
         isIncremental_ = true;
         PlaceAtOrigin();
-        break;
+        return true;
       case 901:
-        isCenterAbsolute_ = true;
-        break;
       case 911:
-        isCenterAbsolute_ = false;
-        break;
+        isCenterAbsolute_ = code == 901;
+        return true;
       default:
-        if (!IsPassedOver(code)) Refuse(Quoted(word.text) + " is not supported");
+        return false;
     }
   }
 

@@ -35,8 +35,11 @@ class SvgNumbers {
   [[noreturn]] void Refuse(std::string const& message);
 
  private:
+  /// Passes over white space.
   void SkipBlanks();
+  /// Passes over white space with at most one comma in it.
   void SkipComma();
+  /// Just behind the number that begins here.
   std::size_t EndOfNumber() const;
 
   XmlElement const& element_;

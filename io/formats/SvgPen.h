@@ -30,20 +30,28 @@ class SvgPen {
   SvgPen(XmlElement const& element, Affine const& map, SvgOutcome* outcome)
       : element_(element), map_(map), outcome_(*outcome) {}
 
+  /// Where the pen is.
   XY const& At() const { return at_; }
 
+  /// Goes there without drawing; Close comes back to it.
   void MoveTo(XY const& to);
+  /// Draws a straight line.
   void LineTo(XY const& to);
   /// A Bezier curve whose control points follow that where the pen stands.
   void CurveTo(std::vector<XY> const& controls);
+  /// Draws an arc of an ellipse.
   void ArcTo(SvgArc const& arc, XY const& to);
   /// Back to where the pen was moved to last.
   void Close();
 
  private:
+  /// Adds a piece unless it has no length.
   void Add(Piece const& piece);
+  /// Draws an arc whose half axes are equal.
   void CircleTo(SvgArc const& arc, XY const& to);
+  /// Draws any other arc by curves.
   void EllipseTo(SvgArc const& arc, XY const& to);
+  /// Draws chords of the curves.
   void AddChords(std::vector<BezierCurve> const& curves);
 
   XmlElement const& element_;

@@ -13,6 +13,7 @@ namespace Vorn::IO {
 /// The lines of a text, whatever the system they were written on; a byte order mark is skipped.
 class Lines {
  public:
+  /// Before the first line of the text.
   explicit Lines(std::string_view text);
 
   /// False at the end of the text.

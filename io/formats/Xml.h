@@ -27,8 +27,11 @@ struct XmlElement {
 /// Gets the elements of a document in its order.
 class XmlVisitor {
  public:
+  /// Visitors are owned by their classes.
   virtual ~XmlVisitor() = default;
+  /// An element begins; those inside follow.
   virtual void Begin(XmlElement const& element) = 0;
+  /// The element that began last and has not ended ends.
   virtual void End() = 0;
 };
 

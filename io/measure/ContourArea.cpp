@@ -9,7 +9,9 @@
 
 #include <algorithm>
 #include <cmath>
+#include <utility>
 
+#include "io/pieces/Frame.h"
 #include "vorn/io/Intersections.h"
 #include "vorn/io/Outlines.h"
 
@@ -73,17 +75,6 @@ Moments MomentsOf(std::vector<Piece> const& pieces) {
   return sum;
 }
 
-/// Seen from `origin`, so that products of coordinates do not lose what a part far from the
-/// origin of its coordinates is about.
-ContourFile SeenFrom(XY const& origin, ContourFile contour) {
-  for (Piece& piece : contour.pieces) {
-    for (XY* point : {&piece.start, &piece.end, &piece.center}) {
-      *point = {point->x - origin.x, point->y - origin.y};
-    }
-  }
-  return contour;
-}
-
 /// The middle of the box: products of coordinates seen from here stay small.
 XY MiddleOf(Extent const& extent) {
   return {0.5 * (extent.low.x + extent.high.x), 0.5 * (extent.low.y + extent.high.y)};
@@ -135,7 +126,7 @@ ContourFile Closed(ContourFile contour) {
 }
 
 double SignedAreaOf(ContourFile const& contour) {
-  return MomentsOf(SeenFrom(MiddleOf(ExtentOf(contour.pieces)), contour).pieces).area;
+  return MomentsOf(SeenFrom(MiddleOf(ExtentOf(contour.pieces)), contour.pieces)).area;
 }
 
 ContourArea MeasureArea(ContourFile contour) {
@@ -146,7 +137,8 @@ ContourArea MeasureArea(ContourFile contour) {
   result.extent = ExtentOf(result.contour.pieces);
   result.perimeter = LengthOf(result);
   XY const origin = MiddleOf(result.extent);
-  ContourFile const local = SeenFrom(origin, result.contour);
+  ContourFile local = result.contour;
+  local.pieces = SeenFrom(origin, std::move(local.pieces));
   result.crossesItself = Tally(SelfIntersectionsOf(Bridged(local))).crossings > 0;
   Moments const moments = MomentsOf(local.pieces);
   result.signedArea = moments.area;

@@ -1,6 +1,8 @@
+#include <algorithm>
 #include <nlohmann/json.hpp>
 
 #include "vorn/io/Intersections.h"
+#include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
@@ -24,6 +26,32 @@ Json PlaceJson(ContourFile const& contour, OnContour const& place) {
 Json PointJson(XY const& point) { return {{"x", point.x}, {"y", point.y}}; }
 
 }  // namespace
+
+IntersectionTally Tally(std::vector<Intersection> const& found) {
+  auto const countOf = [&found](Intersection::Kind kind) {
+    return static_cast<std::size_t>(std::count_if(
+        found.begin(), found.end(), [kind](Intersection const& one) { return one.kind == kind; }));
+  };
+  return {countOf(Intersection::Kind::Crossing), countOf(Intersection::Kind::Touching),
+          countOf(Intersection::Kind::Overlap)};
+}
+
+std::string Describe(IntersectionTally const& tally) {
+  return Counted(tally.crossings, "crossing") + ", " + std::to_string(tally.touches) +
+         " touching, " + Counted(tally.overlaps, "overlap");
+}
+
+std::string NameOf(Intersection::Kind kind) {
+  switch (kind) {
+    case Intersection::Kind::Crossing:
+      return "crossing";
+    case Intersection::Kind::Touching:
+      return "touching";
+    case Intersection::Kind::Overlap:
+      return "overlap";
+  }
+  return "unknown";
+}
 
 std::string ToJson(std::vector<Intersection> const& found, ContourFile const& a,
                    ContourFile const* b) {

@@ -7,8 +7,8 @@
 
 #include "io/measure/PieceMeetings.h"
 #include "io/pieces/BoxIndex.h"
-#include "vorn/io/Messages.h"
-#include "vorn/io/Numbers.h"
+#include "io/pieces/Frame.h"
+#include "io/pieces/Turning.h"
 
 namespace Vorn::IO {
 
@@ -22,9 +22,9 @@ constexpr double kSameDirection = 1e-7;
 
 /// A contour without its pieces of no length, and where each begins along it.
 struct Path {
-  Path(ContourFile const& contour, double joint) : tolerance(joint) {
-    for (std::size_t i = 0; i < contour.pieces.size(); ++i) {
-      Piece const& piece = contour.pieces[i];
+  Path(std::vector<Piece> const& all, double joint) : tolerance(joint) {
+    for (std::size_t i = 0; i < all.size(); ++i) {
+      Piece const& piece = all[i];
       if (piece.length > tolerance) {
         pieces.push_back(piece);
         numbers.push_back(i);
@@ -83,10 +83,8 @@ std::optional<Branches> BranchesAt(Path const& path, std::size_t piece, XY const
   return Branches{AngleOf({-came.x, -came.y}), AngleOf(goes)};
 }
 
-double TurnFrom(double from, double to) {
-  double const turn = to - from;
-  return turn - kFullTurn * std::floor(turn / kFullTurn);
-}
+/// Radians from one direction to another, counter-clockwise.
+double TurnFrom(double from, double to) { return TurnBetween(from, to, true); }
 
 bool AreSame(double a, double b) {
   double const turn = TurnFrom(a, b);
@@ -212,65 +210,66 @@ std::vector<Meeting> WithoutJoint(Path const& path, std::size_t i, std::size_t j
   return meetings;
 }
 
-}  // namespace
-
-std::vector<Intersection> IntersectionsOf(ContourFile const& a, ContourFile const& b) {
-  double const tolerance = std::max(JointTolerance(a.pieces), JointTolerance(b.pieces));
-  Path const first(a, tolerance);
-  Path const second(b, tolerance);
-  std::vector<Intersection> found;
-  if (first.pieces.empty() || second.pieces.empty()) return found;
-  BoxIndex const index(second.pieces, 2.0 * tolerance);
-  for (std::size_t i = 0; i < first.pieces.size(); ++i) {
-    index.Visit(ExtentOf({first.pieces[i]}), [&](std::size_t j) {
-      AddMeetings(first, i, second, j, MeetingsOf(first.pieces[i], second.pieces[j], tolerance),
-                  &found);
-    });
-  }
-  return Sorted(first, second, std::move(found));
+/// The box around both.
+Extent Around(Extent const& a, Extent const& b) {
+  return {{std::min(a.low.x, b.low.x), std::min(a.low.y, b.low.y)},
+          {std::max(a.high.x, b.high.x), std::max(a.high.y, b.high.y)}};
 }
 
-std::vector<Intersection> SelfIntersectionsOf(ContourFile const& contour) {
-  double const tolerance = JointTolerance(contour.pieces);
-  Path const path(contour, tolerance);
+/// Gives places found in a local frame their own in the plane.
+std::vector<Intersection> PutBack(XY const& origin, std::vector<Intersection> found) {
+  auto const shift = [&origin](XY* point) { *point = {point->x + origin.x, point->y + origin.y}; };
+  for (Intersection& one : found) {
+    shift(&one.at);
+    if (one.until) shift(&*one.until);
+  }
+  return found;
+}
+
+std::vector<Intersection> PlacesOfBoth(Path const& a, Path const& b) {
   std::vector<Intersection> found;
-  if (path.pieces.empty()) return found;
-  BoxIndex const index(path.pieces, 2.0 * tolerance);
+  BoxIndex const index(b.pieces, 2.0 * b.tolerance);
+  for (std::size_t i = 0; i < a.pieces.size(); ++i) {
+    index.Visit(ExtentOf({a.pieces[i]}), [&](std::size_t j) {
+      AddMeetings(a, i, b, j, MeetingsOf(a.pieces[i], b.pieces[j], a.tolerance), &found);
+    });
+  }
+  return Sorted(a, b, std::move(found));
+}
+
+std::vector<Intersection> PlacesOfOne(Path const& path) {
+  std::vector<Intersection> found;
+  BoxIndex const index(path.pieces, 2.0 * path.tolerance);
   for (std::size_t i = 0; i < path.pieces.size(); ++i) {
     index.Visit(ExtentOf({path.pieces[i]}), [&](std::size_t j) {
       if (j <= i) return;
-      AddMeetings(path, i, path, j,
-                  WithoutJoint(path, i, j, MeetingsOf(path.pieces[i], path.pieces[j], tolerance)),
-                  &found);
+      AddMeetings(
+          path, i, path, j,
+          WithoutJoint(path, i, j, MeetingsOf(path.pieces[i], path.pieces[j], path.tolerance)),
+          &found);
     });
   }
   return Sorted(path, path, std::move(found));
 }
 
-IntersectionTally Tally(std::vector<Intersection> const& found) {
-  auto const countOf = [&found](Intersection::Kind kind) {
-    return static_cast<std::size_t>(std::count_if(
-        found.begin(), found.end(), [kind](Intersection const& one) { return one.kind == kind; }));
-  };
-  return {countOf(Intersection::Kind::Crossing), countOf(Intersection::Kind::Touching),
-          countOf(Intersection::Kind::Overlap)};
+}  // namespace
+
+std::vector<Intersection> IntersectionsOf(ContourFile const& a, ContourFile const& b) {
+  if (a.pieces.empty() || b.pieces.empty()) return {};
+  double const tolerance = std::max(JointTolerance(a.pieces), JointTolerance(b.pieces));
+  XY const origin = OriginFor(Around(ExtentOf(a.pieces), ExtentOf(b.pieces)));
+  Path const first(SeenFrom(origin, a.pieces), tolerance);
+  Path const second(SeenFrom(origin, b.pieces), tolerance);
+  if (first.pieces.empty() || second.pieces.empty()) return {};
+  return PutBack(origin, PlacesOfBoth(first, second));
 }
 
-std::string Describe(IntersectionTally const& tally) {
-  return Counted(tally.crossings, "crossing") + ", " + std::to_string(tally.touches) +
-         " touching, " + Counted(tally.overlaps, "overlap");
-}
-
-std::string NameOf(Intersection::Kind kind) {
-  switch (kind) {
-    case Intersection::Kind::Crossing:
-      return "crossing";
-    case Intersection::Kind::Touching:
-      return "touching";
-    case Intersection::Kind::Overlap:
-      return "overlap";
-  }
-  return "unknown";
+std::vector<Intersection> SelfIntersectionsOf(ContourFile const& contour) {
+  if (contour.pieces.empty()) return {};
+  XY const origin = OriginFor(ExtentOf(contour.pieces));
+  Path const path(SeenFrom(origin, contour.pieces), JointTolerance(contour.pieces));
+  if (path.pieces.empty()) return {};
+  return PutBack(origin, PlacesOfOne(path));
 }
 
 }  // namespace Vorn::IO

@@ -185,7 +185,11 @@ std::optional<LeastSquaresCircle> FitCircle(std::vector<XY> const& points) {
   if (!normalised) return {};
   Guess const guess = GuessOf(normalised->at);
   for (XY& at : normalised->at) at = {at.x - guess.origin.x, at.y - guess.origin.y};
-  return CircleOf(Descend(guess.a, guess.normal, normalised->at), guess.origin, *normalised);
+  std::optional<LeastSquaresCircle> circle =
+      CircleOf(Descend(guess.a, guess.normal, normalised->at), guess.origin, *normalised);
+  // In units of the points it is above zero, but theirs may be the smallest double there is.
+  if (circle && !(circle->radius > 0.0)) return {};
+  return circle;
 }
 
 }  // namespace Vorn::IO

@@ -31,11 +31,13 @@ class ArrayTree {
   /// Whether there is such a node; an inner node without children stands for no item either.
   bool Has(std::size_t node) const { return node < boxes_.size(); }
 
+  /// Whether the node holds a piece and no other nodes.
   bool IsLeaf(std::size_t node) const { return node >= firstLeaf_; }
 
   /// The index of the item that the leaf stands for.
   std::size_t ItemOf(std::size_t leaf) const { return leaf - firstLeaf_; }
 
+  /// The box of the node.
   Box const& operator[](std::size_t node) const { return boxes_[node]; }
 
  private:

@@ -20,6 +20,7 @@ class BoxIndex {
   void Visit(Extent const& box, std::function<void(std::size_t)> const& visit) const;
 
  private:
+  /// Visits what lies below the node and meets the box.
   void Search(std::size_t node, Extent const& box,
               std::function<void(std::size_t)> const& visit) const;
 

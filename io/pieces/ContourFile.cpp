@@ -32,6 +32,7 @@ double JointTolerance(std::vector<Piece> const& pieces) {
 
 bool ReturnsToStart(std::vector<Piece> const& pieces) {
   if (pieces.empty()) return false;
+  if (pieces.empty()) return false;
   return Distance(pieces.back().end, pieces.front().start) <= JointTolerance(pieces);
 }
 

@@ -34,9 +34,13 @@ class PieceIndex {
     double slack = 0.0;  ///< how far distances to the pieces inside may be rounded
   };
 
+  /// The box around a piece.
   static Box BoxOf(Piece const& piece);
+  /// The box around both.
   static Box Joined(Box const& a, Box const& b);
+  /// How near a point of the box can be to (x, y).
   static double LeastDistance(Box const& box, double x, double y);
+  /// Looks for a nearer piece below the node.
   void Search(std::size_t node, double x, double y, Nearest* nearest) const;
 
   using Tree = ArrayTree<Box>;

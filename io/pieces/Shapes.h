@@ -19,6 +19,7 @@ inline constexpr double kWidestArc = 5.497787143782138;  // 315 degrees
 /// Whether the number can be a coordinate or a radius.
 bool IsUsable(double value);
 
+/// Whether both coordinates are the same numbers.
 bool AreEqual(XY const& a, XY const& b);
 
 /// The arc from `start` to `end` whose bulge is the tangent of a quarter of its sweep, positive

@@ -116,6 +116,7 @@ double MedianTolerance(std::vector<WPoint> const& points) {
 }  // namespace
 
 Closure FindClosure(std::vector<WPoint> const& points, ClosedChoice choice) {
+  if (points.empty()) return {false, false, 0.0, "there are no points"};
   WPoint const& first = points.front();
   WPoint const& last = points.back();
   Closure closure;

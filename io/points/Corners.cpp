@@ -110,6 +110,7 @@ std::vector<Corner> CornersOfRound(std::vector<WPoint> points, double reach) {
 }  // namespace
 
 std::vector<Corner> FindCorners(std::vector<WPoint> const& points, double reach, bool isClosed) {
+  if (points.empty()) return {};
   if (isClosed) return CornersOfRound(points, reach);
   std::vector<double> const places = PlacesAlong(points);
   return Merged(SharpTurns(points, places, reach), places, reach);

@@ -86,7 +86,6 @@ void CsvColumns::TakeFirstLine(Fields const& fields, CsvPlace const& place) {
   }
 }
 
-/// One column cannot hold points.
 void CsvColumns::TakeCount(Fields const& fields, CsvPlace const& place) {
   count_ = fields.size();
   if (count_ >= 2) return;
@@ -94,7 +93,6 @@ void CsvColumns::TakeCount(Fields const& fields, CsvPlace const& place) {
                  "only one column, " + Quoted(fields.front()) + "; expected x,y or x,y,w");
 }
 
-/// Takes the coordinates' columns from what the header calls them.
 void CsvColumns::ChooseByName(Fields const& fields, CsvPlace const& place) {
   std::vector<ColumnName> names;
   std::transform(fields.begin(), fields.end(), std::back_inserter(names), ReadColumnName);
@@ -110,20 +108,17 @@ void CsvColumns::ChooseByName(Fields const& fields, CsvPlace const& place) {
   y_ = columns->y;
 }
 
-/// Takes the coordinates' columns as the user named or numbered them.
 void CsvColumns::ChooseGiven(Fields const& fields, CsvPlace const& place) {
   x_ = IndexOf(choice_.x, fields, place);
   y_ = IndexOf(choice_.y, fields, place);
 }
 
-/// The column that the header calls so, in small or capital letters.
 std::optional<std::size_t> CsvColumns::FindName(std::string const& name) const {
   auto const found = std::find(names_.begin(), names_.end(), LowerCase(name));
   if (found == names_.end()) return {};
   return static_cast<std::size_t>(found - names_.begin());
 }
 
-/// A column that the user named or numbered; `fields` are those of the current line.
 std::size_t CsvColumns::IndexOf(std::string const& column, Fields const& fields,
                                 CsvPlace const& place) const {
   if (std::optional<std::size_t> const named = FindName(column)) return *named;
@@ -140,7 +135,6 @@ std::string CsvColumns::Describe() const {
   return tolerance_ ? text + ", the tolerance in " + DescribeColumn(*tolerance_) : text;
 }
 
-/// "2 (y)", the number alone without a header.
 std::string CsvColumns::DescribeColumn(std::size_t index) const {
   std::string const number = std::to_string(index + 1);
   return names_.empty() ? number : number + " (" + Printable(names_[index]) + ")";

@@ -50,11 +50,17 @@ class CsvColumns {
   std::string Describe() const;
 
  private:
+  /// Counts the columns; one alone cannot hold points.
   void TakeCount(Fields const& fields, CsvPlace const& place);
+  /// Takes the columns of the coordinates from what the header calls them.
   void ChooseByName(Fields const& fields, CsvPlace const& place);
+  /// Takes them as the user named or numbered them.
   void ChooseGiven(Fields const& fields, CsvPlace const& place);
+  /// The column that the header calls so, in small or capital letters.
   std::optional<std::size_t> FindName(std::string const& name) const;
+  /// A column that the user named or numbered; without it the line is refused.
   std::size_t IndexOf(std::string const& column, Fields const& fields, CsvPlace const& place) const;
+  /// "2 (y)", the number alone without a header.
   std::string DescribeColumn(std::size_t index) const;
 
   ToleranceColumn wanted_;

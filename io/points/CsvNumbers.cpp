@@ -4,7 +4,6 @@
 
 namespace Vorn::IO {
 
-/// Takes the decimal mark of the number in `text`, if it has one.
 void CsvNumbers::LearnMark(std::string_view text, std::size_t line) {
   std::size_t const at = text.find_first_of(".,");
   if (at == std::string_view::npos) return;
@@ -12,7 +11,6 @@ void CsvNumbers::LearnMark(std::string_view text, std::size_t line) {
   lineOfMark_ = line;
 }
 
-/// Says what is wrong with a field that holds no finite number.
 void CsvNumbers::Refuse(std::string_view name, std::string_view field,
                         CsvPlace const& place) const {
   if (field.empty()) place.RefuseAt(field, std::string(name) + " is missing");
@@ -23,7 +21,6 @@ void CsvNumbers::Refuse(std::string_view name, std::string_view field,
                             MarkOfEarlierLine(field, place.Line()));
 }
 
-/// " (line 2 has a decimal comma)" where the field has the other mark; else nothing.
 std::string CsvNumbers::MarkOfEarlierLine(std::string_view field, std::size_t line) const {
   char const otherMark = mark_ == DecimalMark::Comma ? '.' : ',';
   if (lineOfMark_ == line || field.find(otherMark) == std::string_view::npos) return "";

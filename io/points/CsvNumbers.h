@@ -27,9 +27,12 @@ class CsvNumbers {
   }
 
  private:
+  /// Takes the decimal mark of the number in the text, if it has one.
   void LearnMark(std::string_view text, std::size_t line);
+  /// Says what is wrong with a field that holds no finite number.
   [[noreturn]] void Refuse(std::string_view name, std::string_view field,
                            CsvPlace const& place) const;
+  /// " (line 2 has a decimal comma)" where the field has the other mark; else nothing.
   std::string MarkOfEarlierLine(std::string_view field, std::size_t line) const;
 
   DecimalMark mark_ = DecimalMark::Point;

@@ -17,6 +17,7 @@ TooClose RuleOfSpacing(double cap) {
 
 std::vector<std::size_t> KeepSpaced(std::vector<WPoint> const& points, TooClose const& tooClose) {
   std::vector<std::size_t> kept;
+  if (points.empty()) return kept;
   std::size_t const last = points.size() - 1;
   for (std::size_t i = 0; i < last; ++i) {
     if (kept.empty() || !tooClose(points[kept.back()], points[i])) kept.push_back(i);
