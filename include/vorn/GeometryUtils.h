@@ -406,9 +406,9 @@ class VORN_EXPORT GeometryUtils {
   ///         arc of equal angles compared with a segment before it, two arcs compared of which one
   ///         has a radius <= 0, or too few elements of non-zero length to compare any two (fewer
   ///         than two, or just two segments)
-  /// @note Deliberate: collinear overlapping segments are not a crossing; the end points of arcs
-  ///       never count; and once two arcs meet in an accepted single point, the remaining elements
-  ///       are not compared with the first of the two. O(n^2), no allocation.
+  /// @note Deliberate: collinear overlapping segments are not a crossing; end points of arcs never
+  ///       count; once two arcs meet in an accepted single point, the rest is not compared with the
+  ///       first. About O(n log n), with memory for boxes, where few elements come near others.
   static ErrorCode CheckPolySelfIntersection(std::vector<Elem> const& contour);
 
   /// Signed area of a contour that does not cross itself.
@@ -418,8 +418,8 @@ class VORN_EXPORT GeometryUtils {
   ///             closed: its trapezoids against the x axis are summed as far as it goes.
   /// @return the code of CheckPolySelfIntersection unless that is Ok; Failed for an empty contour
   ///         or an unknown type; Ok with area written otherwise
-  /// @note Each arc adds its two chords to the centre and the sector between them. O(n^2) for the
-  ///       check, O(n) for the sum.
+  /// @note Each arc adds its two chords to the centre and the sector between them. The check, then
+  ///       O(n) for the sum.
   static ErrorCode GetArea(std::vector<Elem> const& contour, double* area);
 
   /// Signed area of a flat polyline.
