@@ -16,6 +16,7 @@ namespace {
 
 PointFile JoinedPoints(std::vector<FitReport> const& reports) {
   std::vector<PointFile> files;
+  files.reserve(reports.size());
   for (FitReport const& report : reports) files.push_back(report.file);
   return Joined(files);
 }

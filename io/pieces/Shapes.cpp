@@ -141,15 +141,16 @@ std::vector<Piece> WithoutWideArcs(std::vector<Piece> const& pieces) {
 std::vector<Piece> WithoutArcsBeyond(double widest, std::vector<Piece> const& pieces) {
   std::vector<Piece> result;
   for (Piece const& piece : pieces) {
-    double const count = piece.IsArc() ? std::max(1.0, std::ceil(piece.sweep / widest)) : 1.0;
+    int const count =
+        piece.IsArc() ? std::max(1, static_cast<int>(std::ceil(piece.sweep / widest))) : 1;
     XY from = piece.start;
-    for (double part = 1.0; part < count; part += 1.0) {
+    for (int part = 1; part < count; ++part) {
       XY const to = PointOnArc(piece, piece.sweep * part / count);
       result.push_back(MakeArc(from, to, piece.center, piece.radius, piece.counterClockwise));
       from = to;
     }
     result.push_back(piece);
-    if (count > 1.0) {
+    if (count > 1) {
       result.back() = MakeArc(from, piece.end, piece.center, piece.radius, piece.counterClockwise);
     }
   }

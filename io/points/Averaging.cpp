@@ -27,7 +27,7 @@ class Cloud {
   std::size_t Count() const { return count_; }
 
   WPoint Mean() const {
-    double const n = static_cast<double>(count_);
+    auto const n = static_cast<double>(count_);
     return {origin_.x + x_ / n, origin_.y + y_ / n, origin_.w};
   }
 
@@ -47,7 +47,7 @@ class Cloud {
   };
 
   Moments Central() const {
-    double const n = static_cast<double>(count_);
+    auto const n = static_cast<double>(count_);
     return {xx_ / n - x_ / n * (x_ / n), xy_ / n - x_ / n * (y_ / n), yy_ / n - y_ / n * (y_ / n)};
   }
 
