@@ -10,19 +10,19 @@ namespace {
 
 using Numeric::kTruncatedPi;
 
-/// Adds twice the signed area of the straight pieces that start in [begin, end). False when a
+/// The sum with twice the signed area of the straight pieces that start in a run. Nothing when a
 /// vertex would lie outside the data.
-bool AddVertexRun(Data const& data, std::int64_t begin, std::int64_t end, double* sum) {
-  for (std::int64_t i = begin; i < end; i += kVertexStride) {
+std::optional<double> WithVertexRun(Data const& data, Run const& run, double sum) {
+  for (std::int64_t i = run.begin; i < run.end; i += kVertexStride) {
     std::int64_t const next = i + kVertexStride;
-    if (!data.Holds(i, next + 1)) return false;
-    *sum += data[next] * data[i + 1] - data[next + 1] * data[i];
+    if (!data.Holds(i, next + 1)) return std::nullopt;
+    sum += data[next] * data[i + 1] - data[next + 1] * data[i];
   }
-  return true;
+  return sum;
 }
 
-/// Adds the terms of the records that start at p.
-void AddRecord(Data const& data, std::int64_t p, double* sum) {
+/// The sum with the terms of the record that starts at p.
+double WithRecord(Data const& data, std::int64_t p, double sum) {
   double const x = data[p];
   double const y = data[p + 1];
   double const cx = data[p + kRecordCentre];
@@ -34,26 +34,22 @@ void AddRecord(Data const& data, std::int64_t p, double* sum) {
   double const nextY = data[p + kRecordStride + 1];
 
   double const radius2 = radius * radius;
-  *sum += (nextX - cx) * nextY + (nextX - x) * cy + (cx - x) * y + radius2 * (start - end);
-  if (!(std::fabs(start - end) >= kTruncatedPi)) return;
+  sum += (nextX - cx) * nextY + (nextX - x) * cy + (cx - x) * y + radius2 * (start - end);
+  if (!(std::fabs(start - end) >= kTruncatedPi)) return sum;
   // The shorter way round is meant, whatever the record's direction says.
   double const turn = 2.0 * radius2 * kTruncatedPi;
-  if (start > end) {
-    *sum -= turn;
-  } else {
-    *sum += turn;
-  }
+  return start > end ? sum - turn : sum + turn;
 }
 
-/// Adds the records of a run. False when a record would lie outside the data.
-bool AddRecordRun(Data const& data, std::int64_t begin, std::int64_t end, double* sum) {
+/// The sum with the records of a run. Nothing when a record would lie outside the data.
+std::optional<double> WithRecordRun(Data const& data, Run const& run, double sum) {
   // Deliberate: one double at a time, not one record: every offset of the run is taken as the
   // start of a record. Areas of such runs are compared with values computed this way.
-  for (std::int64_t p = begin; p < end; ++p) {
-    if (!data.Holds(p, p + kRecordStride + 1)) return false;
-    AddRecord(data, p, sum);
+  for (std::int64_t p = run.begin; p < run.end; ++p) {
+    if (!data.Holds(p, p + kRecordStride + 1)) return std::nullopt;
+    sum = WithRecord(data, p, sum);
   }
-  return true;
+  return sum;
 }
 
 }  // namespace
@@ -63,9 +59,10 @@ std::optional<double> SignedArea(Data const& data, std::vector<std::int32_t> con
   std::int64_t begin = 0;
   for (std::int32_t const entry : indices) {
     Run const run = RunOf(entry, begin);
-    bool const isInside = run.kind == kVertexRun ? AddVertexRun(data, run.begin, run.end, &sum)
-                                                 : AddRecordRun(data, run.begin, run.end, &sum);
-    if (!isInside) return std::nullopt;
+    std::optional<double> const grown =
+        run.kind == kVertexRun ? WithVertexRun(data, run, sum) : WithRecordRun(data, run, sum);
+    if (!grown) return std::nullopt;
+    sum = *grown;
     begin = run.end;
   }
   return 0.5 * sum;
