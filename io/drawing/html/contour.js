@@ -1,6 +1,6 @@
 // The drawing of the contour: true to scale, deviations and tolerance magnified.
 
-import {ticksBetween} from './numbers.js';
+import {gridTicks, paintAxisLabels, paintGrid} from './axes.js';
 import {placeOn, boxOf, View, Tracer} from './geometry.js';
 import {bandPaths} from './band.js';
 import {arrow, ring, square} from './marks.js';
@@ -67,7 +67,8 @@ export class ContourDrawing {
     [this.context, this.colors] = [context, colors];
     context.fillStyle = colors.paper;
     context.fillRect(0, 0, width, height);
-    this.paintGrid();
+    const ticks = gridTicks(this.view);
+    paintGrid(context, this.view, ticks, colors.grid);
     if (this.scene.hasTolerances) this.paintBand();
     if (!this.scene.hasContour) this.paintOrder();
     // So many points would hide the contour.
@@ -80,7 +81,7 @@ export class ContourDrawing {
     if (this.scene.isMeasured) this.paintWorst();
     if (this.scene.hasContour) this.paintNumbers();
     this.paintHovered();
-    this.paintAxisLabels();
+    paintAxisLabels(context, this.view, ticks, {colors, units: this.scene.units});
     this.onPainted?.(visible.length > 0 || this.isPieceVisible());
   }
 
@@ -91,51 +92,6 @@ export class ContourDrawing {
       tracer.trace(piece);
       return tracer.hasDrawn;
     });
-  }
-
-  paintGrid() {
-    const {context, view} = this;
-    this.columns = ticksBetween(view.planeX(0), view.planeX(view.width), 90 / view.scale);
-    this.rows = ticksBetween(view.planeY(view.height), view.planeY(0), 70 / view.scale);
-    context.strokeStyle = this.colors.grid;
-    context.lineWidth = 1;
-    context.beginPath();
-    for (const {value} of this.columns) {
-      context.moveTo(view.px(value), 0);
-      context.lineTo(view.px(value), view.height);
-    }
-    for (const {value} of this.rows) {
-      context.moveTo(0, view.py(value));
-      context.lineTo(view.width, view.py(value));
-    }
-    context.stroke();
-  }
-
-  paintAxisLabels() {
-    const {context, view} = this;
-    context.font = '11px system-ui, "DejaVu Sans", sans-serif';
-    const halo = (text, x, y) => {
-      context.lineWidth = 3;
-      context.strokeStyle = this.colors.paper;
-      context.lineJoin = 'round';
-      context.strokeText(text, x, y);
-      context.fillStyle = this.colors.soft;
-      context.fillText(text, x, y);
-    };
-    context.textAlign = 'center';
-    for (const {value, label} of this.columns) {
-      const x = view.px(value);
-      if (x > 50 && x < view.width - 80) halo(label, x, view.height - 6);
-    }
-    context.textAlign = 'left';
-    for (const {value, label} of this.rows) {
-      const y = view.py(value);
-      if (y > 30 && y < view.height - 22) halo(label, 6, y + 4);
-    }
-    const units = this.scene.units ? ` [${this.scene.units}]` : '';
-    halo(`y${units}`, 6, 16);
-    context.textAlign = 'right';
-    halo(`x${units}`, view.width - 8, view.height - 6);
   }
 
   paintBand() {

@@ -337,13 +337,22 @@ class Run {
       if (along <= rounding || along >= pieces_[k].Length() - rounding) return;
     }
     if (AreNeighbours(a, b) && IsAtJoint(a, b, x)) return;
-    if (!chain_.isClosed && IsWithin(0, x) && IsWithin(Count() - 1, x)) return;
+    if (IsAtBothEnds(x)) return;
     if (!PathCrossesNear(a, b, x)) {
       Complain("pieces ", a, " and ", b, " cross at (", x.x, ", ", x.y, ")");
     }
   }
 
-  /// An open path may begin and end at one place: no order of its ends is told apart there.
+  /// An open path may begin and end at one place: no order of its ends is told apart there. Where
+  /// all points are within tolerance of it, the tolerances say nothing about the path.
+  bool IsAtBothEnds(Vec x) const {
+    if (chain_.isClosed || !IsWithin(0, x) || !IsWithin(Count() - 1, x)) return false;
+    for (std::size_t i = 1; i + 1 < Count(); ++i) {
+      if (!IsWithin(i, x)) return true;
+    }
+    return false;
+  }
+
   bool IsWithin(std::size_t i, Vec x) const { return Norm(PointAt(i) - x) <= ToleranceAt(i); }
 
   /// Does an edge of one strand meet an edge of the other near x? From x on, edges count for as
