@@ -18,6 +18,7 @@
 #include "cli/commands/Outputs.h"
 #include "cli/texts/Relative.h"
 #include "vorn/io/FitSummary.h"
+#include "vorn/io/Formats.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -27,10 +28,7 @@ namespace {
 
 namespace fs = std::filesystem;
 
-constexpr char const* kStandardStream = "-";
 constexpr int kTimeDecimals = 3;
-constexpr char const* kCsvEnding = ".csv";
-constexpr char const* kHtmlEnding = ".html";
 
 /// How one file ended.
 struct Outcome {
@@ -180,7 +178,7 @@ class Listing {
   }
 
   void WriteSummary() {
-    bool const isCsv = fs::path(many_.summary).extension() == kCsvEnding;
+    bool const isCsv = FormatOf(many_.summary) == Format::Csv;
     Outputs outputs;
     outputs.Add(many_.summary, isCsv ? SummaryCsv(rows_) : SummaryHtml(rows_, many_.head));
     outputs.Write(console_);
@@ -222,62 +220,7 @@ void MakeFolder(std::string const& folder) {
   }
 }
 
-/// Paths in one form, so that two that lead to one file are the same.
-std::string WholePath(std::string const& path) {
-  std::error_code error;
-  return fs::weakly_canonical(fs::absolute(path, error), error).string();
-}
-
-/// The summary has one of two endings and is none of the inputs.
-void RefuseSummary(FitMany const& many, std::map<std::string, std::string> const& inputs) {
-  if (many.summary.empty()) return;
-  std::string const ending = fs::path(many.summary).extension().string();
-  if (ending != kCsvEnding && ending != kHtmlEnding) {
-    throw Failure(FailureKind::BadArgument,
-                  "--summary " + many.summary + ": the name must end in .csv or .html");
-  }
-  if (inputs.count(WholePath(many.summary)) > 0) {
-    throw Failure(FailureKind::BadArgument,
-                  "the summary would be written over the input " + many.summary);
-  }
-}
-
 }  // namespace
-
-std::string OutputOf(FitMany const& many, std::string const& path, Format format) {
-  std::string const name = fs::path(path).stem().string() + "." + NameOf(format);
-  return (fs::path(many.outFolder) / name).string();
-}
-
-void RefuseCollisions(FitMany const& many) {
-  std::map<std::string, std::string> inputs;
-  for (std::string const& path : many.paths) {
-    if (path == kStandardStream) {
-      throw Failure(FailureKind::BadArgument, "the standard input cannot be one of many files");
-    }
-    inputs.emplace(WholePath(path), path);
-  }
-  RefuseSummary(many, inputs);
-  if (many.outFolder.empty()) return;
-  std::map<std::string, std::string> outputs;
-  for (std::string const& path : many.paths) {
-    for (Format const format : many.formats) {
-      std::string const output = OutputOf(many, path, format);
-      std::string const whole = WholePath(output);
-      if (auto const input = inputs.find(whole); input != inputs.end()) {
-        throw Failure(FailureKind::BadArgument,
-                      "the fit of " + path + " would be written over the input " + input->second);
-      }
-      auto const [other, isNew] = outputs.emplace(whole, path);
-      if (!isNew) {
-        std::string message = "the fits of ";
-        message.append(other->second).append(" and ").append(path);
-        throw Failure(FailureKind::BadArgument,
-                      message.append(" would both be written to ").append(output));
-      }
-    }
-  }
-}
 
 ExitCode RunFitMany(FitMany const& many, Console const& console) {
   if (!many.summary.empty()) RequireWritable({{"--summary", many.summary}});

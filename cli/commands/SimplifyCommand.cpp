@@ -1,7 +1,5 @@
 #include "cli/commands/SimplifyCommand.h"
 
-#include <algorithm>
-#include <cmath>
 #include <limits>
 #include <memory>
 #include <ostream>
@@ -10,6 +8,7 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/Outputs.h"
 #include "cli/commands/PointsInput.h"
+#include "cli/texts/ThinningText.h"
 #include "vorn/io/Deviations.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/FitContour.h"
@@ -20,9 +19,6 @@
 namespace Vorn::Cli {
 
 namespace {
-
-constexpr std::size_t kMostListed = 10;
-constexpr std::size_t kMostOutliersListed = 100;
 
 constexpr char const* kText =
     "Leave measured points out so that a fit can work with the rest. What is kept stays as it is\n"
@@ -124,18 +120,6 @@ std::optional<std::vector<WPoint>> JudgedPoints(Options const& options, PointFil
   return file.points;
 }
 
-std::string Describe(std::vector<Outlier> const& outliers, PointFile const& file) {
-  std::string const begin = "contour: " + file.path + ": ";
-  std::string text = begin + Counted(outliers.size(), "outlier") + '\n';
-  for (std::size_t i = 0; i < std::min(outliers.size(), kMostOutliersListed); ++i) {
-    Outlier const& outlier = outliers[i];
-    text += begin + file.NameOf(outlier.point) + " is " + FormatShort(outlier.distance) +
-            " from its neighbours, " + FormatShort(outlier.deviations, 3) +
-            " standard deviations\n";
-  }
-  return text;
-}
-
 /// A point that its neighbours bear out within its tolerance is none, however exact the others are.
 void DropOutliers(Options const& options, Thinned* thinned) {
   std::vector<Outlier> outliers = FindOutliers(thinned->points, *options.outliers);
@@ -144,7 +128,7 @@ void DropOutliers(Options const& options, Thinned* thinned) {
       return outlier.distance <= (*judged)[outlier.point].w;
     });
   }
-  thinned->findings += Describe(outliers, thinned->file);
+  thinned->findings += OutliersText(outliers, thinned->file);
   std::vector<std::size_t> dropped;
   dropped.reserve(outliers.size());
   for (Outlier const& outlier : outliers) dropped.push_back(outlier.point);
@@ -195,23 +179,6 @@ void DropClose(Options const& options, Thinned* thinned) {
   }
 }
 
-std::string DescribeFit(FitReport const& report, PointFile const& file,
-                        std::vector<WPoint> const& points) {
-  Remeasured const all = Remeasure(points, report.pieces);
-  double squares = 0.0;
-  std::size_t outside = 0;
-  for (std::size_t i = 0; i < points.size(); ++i) {
-    squares += all.points[i].distance * all.points[i].distance;
-    if (!IsWithinTolerance(all.points[i], points[i])) ++outside;
-  }
-  return "a fit of the rest has " + Counted(report.pieces.size(), "piece") + "; of all " +
-         Counted(points.size(), "point") + " of the file " + std::to_string(outside) +
-         " are outside their tolerance, the largest deviation is " +
-         FormatShort(all.Worst().distance) + ", " + FormatShort(all.Worst().relative) +
-         " of the tolerance, at " + file.NameOf(all.worst) + ", the root mean square " +
-         FormatShort(std::sqrt(squares / static_cast<double>(points.size())));
-}
-
 /// What a fit of the rest does to every point of the file; nothing without a tolerance.
 std::string DescribeRest(Options const& options, Thinned const& thinned) {
   auto const judged = JudgedPoints(options, thinned.file);
@@ -225,37 +192,11 @@ std::string DescribeRest(Options const& options, Thinned const& thinned) {
     choice.tolerance = options.points.tolerance;
     choice.closed = options.closed;
     FitReport const report = FitContour(std::move(rest), choice, nullptr);
-    return begin + DescribeFit(report, thinned.file, *judged) + '\n';
+    return begin + FitOfRestText(report, thinned.file, *judged) + '\n';
   } catch (Failure const& failure) {
     std::string const& message = failure.Message();
     return begin + "the rest cannot be fitted: " + message.substr(0, message.find('\n')) + '\n';
   }
-}
-
-std::string LineText(PointFile const& file, std::size_t point) {
-  std::optional<std::size_t> const line = file.LineOf(point);
-  return line ? std::to_string(*line) : "";
-}
-
-std::string ListOfDropped(PointFile const& file, std::vector<std::size_t> const& dropped) {
-  std::string text = "point,line,x,y\n";
-  for (std::size_t const i : dropped) {
-    text += std::to_string(i) + "," + LineText(file, i) + "," + FormatExact(file.points[i].x) +
-            "," + FormatExact(file.points[i].y) + "\n";
-  }
-  return text;
-}
-
-std::string Message(PointFile const& file, std::vector<std::size_t> const& dropped) {
-  std::string text = "contour: " + file.path + ": dropped " + std::to_string(dropped.size()) +
-                     " of " + Counted(file.points.size(), "point");
-  for (std::size_t i = 0; i < std::min(dropped.size(), kMostListed); ++i) {
-    text += (i == 0 ? ": " : ", ") + file.NameOf(dropped[i]);
-  }
-  if (dropped.size() > kMostListed) {
-    text += " and " + std::to_string(dropped.size() - kMostListed) + " more";
-  }
-  return text + "\n";
 }
 
 std::vector<std::size_t> LinesOf(PointFile const& file, std::vector<std::size_t> const& points) {
@@ -263,19 +204,6 @@ std::vector<std::size_t> LinesOf(PointFile const& file, std::vector<std::size_t>
   lines.reserve(points.size());
   for (std::size_t const i : points) lines.push_back(file.lines[i]);
   return lines;
-}
-
-/// A table of the points, with their tolerances where the file has them.
-std::string TableOf(Thinned const& thinned) {
-  PointFile const& file = thinned.file;
-  std::string text = file.units.empty() ? "" : "# units " + file.units + "\n";
-  if (file.tolerance) text += "# tolerance " + FormatExact(*file.tolerance) + "\n";
-  text += file.hasTolerances ? "x,y,w\n" : "x,y\n";
-  for (WPoint const& point : thinned.points) {
-    text += FormatExact(point.x) + "," + FormatExact(point.y);
-    text += file.hasTolerances ? "," + FormatExact(point.w) + "\n" : "\n";
-  }
-  return text;
 }
 
 /// The only outline of the file, or the one asked for.
@@ -309,12 +237,12 @@ ExitCode Run(Options const& options, Console const& console) {
   std::vector<std::size_t> const dropped = Others(thinned.kept, file.points.size());
   bool const staysText = !file.lines.empty() && !options.doAverage;
   Outputs outputs;
-  outputs.Add(options.output,
-              staysText ? WithoutLines(text, LinesOf(file, dropped)) : TableOf(thinned));
-  if (!options.dropped.empty()) outputs.Add(options.dropped, ListOfDropped(file, dropped));
+  outputs.Add(options.output, staysText ? WithoutLines(text, LinesOf(file, dropped))
+                                        : PointTable(file, thinned.points));
+  if (!options.dropped.empty()) outputs.Add(options.dropped, DroppedList(file, dropped));
   outputs.Write(console);
   console.err << thinned.findings;
-  if (!options.doAverage) console.err << Message(file, dropped);
+  if (!options.doAverage) console.err << DroppedText(file, dropped);
   console.err << DescribeRest(options, thinned);
   return ExitCode::Ok;
 }

@@ -118,7 +118,8 @@ std::string Labels::AddAnywhere(Piece const& piece, std::string const& text) {
 
 std::string Labels::AddWithLeader(Piece const& piece, Anchor const& anchor,
                                   std::string const& text) {
-  for (double distance = kNearestLeader; distance <= kLongestLeader; distance += kLeaderStep) {
+  for (int step = 0; kNearestLeader + step * kLeaderStep <= kLongestLeader; ++step) {
+    double const distance = kNearestLeader + step * kLeaderStep;
     for (double const turn : {0.0, 0.5, -0.5, 1.0, -1.0}) {
       for (double const side : {1.0, -1.0}) {
         Anchor const turned = {anchor.at, Turned(anchor.normal, turn)};

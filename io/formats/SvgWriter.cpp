@@ -59,7 +59,7 @@ std::string ToPlainSvg(ContourFile const& contour) {
   double const lineWidth =
       PageUnit(contour) == "in" ? kLineWidth / kMillimetresPerInch : kLineWidth;
   std::string text = "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n" + PageOf(contour, lineWidth) +
-                     "<g fill=\"none\" stroke=\"black\" stroke-width=\"" + FormatPlain(lineWidth) +
+                     R"(<g fill="none" stroke="black" stroke-width=")" + FormatPlain(lineWidth) +
                      "\">\n";
   for (ContourFile const& run : RunsOf(contour)) text += PathOf(run);
   return text + "</g>\n</svg>\n";

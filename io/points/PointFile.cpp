@@ -4,7 +4,7 @@
 namespace Vorn::IO {
 
 std::string PointFile::NameOf(std::size_t index) const {
-  std::string const name = "point " + std::to_string(index);
+  std::string name = "point " + std::to_string(index);
   if (std::optional<std::size_t> const line = LineOf(index)) {
     return name + " (line " + std::to_string(*line) + ")";
   }
