@@ -196,13 +196,15 @@ std::string Filled(std::string_view page,
 }  // namespace
 
 std::string ToHtml(Drawing const& drawing) {
+  std::string script;
+  for (char const* const part : Html::kScript) script += part;
   // A file name need not be UTF-8; the page is.
   Json const title = drawing.title;
   std::string const name = Json::parse(title.dump(-1, ' ', false, Json::error_handler_t::replace));
   return Filled(Html::kPage, {{"title", Svg::Escaped(name)},
                               {"style", Html::kStyle},
                               {"data", EmbeddedJson(DataJson(drawing))},
-                              {"script", Html::kScript}});
+                              {"script", script}});
 }
 
 }  // namespace Vorn::IO

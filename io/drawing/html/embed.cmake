@@ -1,21 +1,30 @@
 # Writes the text files as one C++ header: cmake -DOUT=header -DPARTS=name=file,file;... -P this
 #
 # The page holds its scripts as one module, in the order given, so what they import and export from
-# each other by name goes.
+# each other by name goes. A part of several files is an array with a text for each: compilers need
+# not take a literal of more than 65,536 characters.
 set(header "// Made from the files in io/drawing/html.\n#pragma once\n\n")
 string(APPEND header "namespace Vorn::IO::Html {\n\n")
 foreach(part IN LISTS PARTS)
   string(REGEX MATCH "^([^=]+)=(.+)$" unused "${part}")
   set(name ${CMAKE_MATCH_1})
   string(REPLACE "," ";" files "${CMAKE_MATCH_2}")
-  set(text "")
+  list(LENGTH files count)
+  set(texts "")
   foreach(file IN LISTS files)
     file(READ "${file}" contents)
     string(REGEX REPLACE "import {[^}]*} from '[.]/[a-z]+[.]js';\n" "" contents "${contents}")
     string(REGEX REPLACE "(^|\n)export " "\\1" contents "${contents}")
-    string(APPEND text "${contents}")
+    string(APPEND texts "R\"html~(${contents})html~\"")
+    if(count GREATER 1)
+      string(APPEND texts ",\n")
+    endif()
   endforeach()
-  string(APPEND header "inline constexpr char ${name}[] = R\"html~(${text})html~\";\n\n")
+  if(count GREATER 1)
+    string(APPEND header "inline constexpr char const* ${name}[] = {${texts}};\n\n")
+  else()
+    string(APPEND header "inline constexpr char ${name}[] = ${texts};\n\n")
+  endif()
 endforeach()
 string(APPEND header "}  // namespace Vorn::IO::Html\n")
 file(WRITE "${OUT}" "${header}")
