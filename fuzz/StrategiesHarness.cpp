@@ -1,5 +1,5 @@
-// Whole fits with the three strategies against a plain second implementation, bit for bit; the
-// same answer at every call; pieces that meet and end at the last point.
+// Whole fits with the three strategies: the same answer at every call, and with two of them that of
+// a plain second implementation, bit for bit.
 #include <cstdint>
 
 #include "Input.h"

@@ -89,7 +89,7 @@ void RequireSame(IO::ContourFile const& written, IO::ContourFile const& read) {
   }
 }
 
-/// DXF and G-code may split or merge nothing, but WKT turns lines into strings of them.
+/// A format that cannot hold the contour refuses it; what is written comes back, piece for piece.
 void TryRoundTrip(IO::ContourFile contour, IO::Format format, std::string* text) {
   IO::WriteOptions options;
   options.gcode.feed = 100.0;
