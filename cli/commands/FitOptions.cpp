@@ -119,7 +119,8 @@ Format FitOptions::FormatFor(std::string const& path) const {
 void AddFitOptions(Command& command, FitOptions* options) {
   command
       .AddTexts("POINTS", &options->paths, "FILE",
-                "CSV files with the measured points, each a contour; - is the standard input")
+                "Files with the measured points, CSV tables or else drawings or tool paths; - is "
+                "the standard input")
       .Require();
   AddPointsOptions(command, &options->points);
   AddPointsOutline(command, &options->points);

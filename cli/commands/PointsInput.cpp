@@ -41,7 +41,8 @@ Option AddColumns(Command& command, ColumnChoice* columns) {
 void AddPointsInput(Command& command, PointsInput* input) {
   command
       .AddText("POINTS", &input->path, "FILE",
-               "CSV file with the measured points; - is the standard input")
+               "File with the measured points, a CSV table or else a drawing or tool path; - is "
+               "the standard input")
       .Require();
   AddPointsOptions(command, input);
 }
