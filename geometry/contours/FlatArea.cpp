@@ -13,10 +13,14 @@ using Numeric::kTruncatedPi;
 /// The sum with twice the signed area of the straight pieces that start in a run. Nothing when a
 /// vertex would lie outside the data.
 std::optional<double> WithVertexRun(Data const& data, Run const& run, double sum) {
-  for (std::int64_t i = run.begin; i < run.end; i += kVertexStride) {
-    std::int64_t const next = i + kVertexStride;
-    if (!data.Holds(i, next + 1)) return std::nullopt;
-    sum += data[next] * data[i + 1] - data[next + 1] * data[i];
+  std::int64_t const end = run.begin + kVertexStride * run.CountPieces();
+  if (run.begin == end) return sum;
+  if (!data.Holds(run.begin, end + 1)) return std::nullopt;
+  Point from = data.PointAt(run.begin);
+  for (std::int64_t next = run.begin + kVertexStride; next <= end; next += kVertexStride) {
+    Point const to = data.PointAt(next);
+    sum += to.x * from.y - to.y * from.x;
+    from = to;
   }
   return sum;
 }

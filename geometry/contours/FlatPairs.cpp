@@ -3,27 +3,27 @@
 #include <optional>
 
 #include "geometry/intersections/Arcs.h"
-#include "geometry/intersections/SegmentPair.h"
 
 namespace Vorn::Flat {
 
 namespace {
 
 using Elementary::Segment;
+using Intersections::ArcRange;
 using Intersections::CirclePoints;
 
 constexpr Verdict Invalid(ErrorCode code) { return {code, false}; }
 constexpr Verdict CrossingIf(bool isCrossing) { return {ErrorCode::Ok, isCrossing}; }
 
 /// Deliberate: one common point is no crossing here, but it is one in the opposite order.
-Verdict JudgeStraightArc(Segment const& straight, Arc const& arc) {
-  std::optional<CirclePoints> const common = Intersections::CutArcBySegment(arc, straight);
-  return common ? CrossingIf(common->count == 2) : Invalid(ErrorCode::Failed);
+Verdict JudgeStraightArc(Segment const& straight, ArcRange const& arc) {
+  if (arc.range.IsUndefined()) return Invalid(ErrorCode::Failed);
+  return CrossingIf(Intersections::CutArcBySegment(arc, straight).count == 2);
 }
 
-Verdict JudgeArcStraight(Arc const& arc, Segment const& straight) {
-  std::optional<CirclePoints> const common = Intersections::CutArcBySegment(arc, straight);
-  return common ? CrossingIf(common->count > 0) : Invalid(ErrorCode::Failed);
+Verdict JudgeArcStraight(ArcRange const& arc, Segment const& straight) {
+  if (arc.range.IsUndefined()) return Invalid(ErrorCode::Failed);
+  return CrossingIf(Intersections::CutArcBySegment(arc, straight).count > 0);
 }
 
 /// One common point is accepted as the joint of consecutive records.
@@ -35,12 +35,9 @@ Verdict JudgeArcs(Arc const& first, Arc const& second, bool areConsecutive) {
 
 }  // namespace
 
-Verdict Judge(Data const& data, FlatPiece const& first, FlatPiece const& second) {
-  if (!IsInside(data, first) || !IsInside(data, second)) return Invalid(ErrorCode::Failed);
+Verdict JudgeWithArc(Data const& data, FlatPiece const& first, FlatPiece const& second) {
   if (first.kind == kVertexRun) {
-    Segment const straight = StraightAt(data, first.offset);
-    if (second.kind != kVertexRun) return JudgeStraightArc(straight, data.ArcAt(second.offset));
-    return CrossingIf(Intersections::HaveOneCommonPoint(straight, StraightAt(data, second.offset)));
+    return JudgeStraightArc(StraightAt(data, first.offset), data.ArcAt(second.offset));
   }
   Arc const arc = data.ArcAt(first.offset);
   if (second.kind == kVertexRun) return JudgeArcStraight(arc, StraightAt(data, second.offset));

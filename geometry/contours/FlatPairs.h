@@ -7,6 +7,7 @@
 
 #include "geometry/contours/FlatLayout.h"
 #include "geometry/elementary/Shapes.h"
+#include "geometry/intersections/SegmentPair.h"
 
 namespace Vorn::Flat {
 
@@ -37,8 +38,19 @@ inline Elementary::Segment StraightAt(Data const& data, std::int64_t offset) {
   return {data.PointAt(offset), data.PointAt(offset + kVertexStride)};
 }
 
-/// What a pair says, the first piece being the earlier one. Straight pieces cross with exactly one
-/// common point, so that overlaps are no crossing.
-Verdict Judge(Data const& data, FlatPiece const& first, FlatPiece const& second);
+/// What a pair of which one piece is an arc says.
+Verdict JudgeWithArc(Data const& data, FlatPiece const& first, FlatPiece const& second);
+
+/// What a pair says, the first piece being the earlier one; Failed where a piece is not inside the
+/// data. Straight pieces cross with exactly one common point, so that overlaps are no crossing.
+/// Inline, since most pairs of straight pieces are settled by the first comparisons.
+inline Verdict Judge(Data const& data, FlatPiece const& first, FlatPiece const& second) {
+  if (!IsInside(data, first) || !IsInside(data, second)) return {ErrorCode::Failed, false};
+  if (first.kind != kVertexRun || second.kind != kVertexRun) {
+    return JudgeWithArc(data, first, second);
+  }
+  return {ErrorCode::Ok, Intersections::HaveOneCommonPoint(StraightAt(data, first.offset),
+                                                           StraightAt(data, second.offset))};
+}
 
 }  // namespace Vorn::Flat

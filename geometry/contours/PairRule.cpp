@@ -8,6 +8,7 @@ namespace Vorn::Contours {
 
 namespace {
 
+using Intersections::ArcRange;
 using Intersections::CirclePoints;
 
 PairResult JudgeTouch(int count, bool isAccepted) {
@@ -15,19 +16,17 @@ PairResult JudgeTouch(int count, bool isAccepted) {
   return PairResult::Crossing;
 }
 
-PairResult JudgeSegmentArc(Piece const& segment, Arc const& arc, PairPlace const& place) {
-  std::optional<CirclePoints> const common =
-      Intersections::CutArcBySegment(arc, segment.AsSegment());
-  if (!common) return PairResult::Invalid;
-  return JudgeTouch(common->count, place.isClosing);
+PairResult JudgeSegmentArc(Piece const& segment, ArcRange const& arc, PairPlace const& place) {
+  if (arc.range.IsUndefined()) return PairResult::Invalid;
+  return JudgeTouch(Intersections::CutArcBySegment(arc, segment.AsSegment()).count,
+                    place.isClosing);
 }
 
-PairResult JudgeArcSegment(Arc const& arc, Piece const& segment, PairPlace const& place) {
-  std::optional<CirclePoints> const common =
-      Intersections::CutArcBySegment(arc, segment.AsSegment());
+PairResult JudgeArcSegment(ArcRange const& arc, Piece const& segment, PairPlace const& place) {
   // Deliberate: unlike as a candidate, an arc of equal angles passes here for free of crossings.
-  if (!common) return PairResult::Clear;
-  return JudgeTouch(common->count, place.isFirstCandidate || place.isClosing);
+  if (arc.range.IsUndefined()) return PairResult::Clear;
+  return JudgeTouch(Intersections::CutArcBySegment(arc, segment.AsSegment()).count,
+                    place.isFirstCandidate || place.isClosing);
 }
 
 PairResult JudgeArcs(Arc const& first, Arc const& second, PairPlace const& place) {

@@ -79,9 +79,9 @@ int GeometryUtils::GetLineSegmentAndCircleArcIntersection(double x1, double y1, 
                                                           double d, double startAngle,
                                                           double endAngle, double* ax, double* ay,
                                                           double* bx, double* by) {
-  std::optional<CirclePoints> const found = Intersections::CutArcBySegment(
-      {{{cx, cy}, r}, {d, startAngle, endAngle}}, {{x1, y1}, {x2, y2}});
-  return found ? Write(*found, ax, ay, bx, by) : kInvalidArc;
+  Intersections::ArcRange const arc{{{cx, cy}, r}, {d, startAngle, endAngle}};
+  if (arc.range.IsUndefined()) return kInvalidArc;
+  return Write(Intersections::CutArcBySegment(arc, {{x1, y1}, {x2, y2}}), ax, ay, bx, by);
 }
 
 int GeometryUtils::GetCircleArcAndCircleArcIntersection(double cx1, double cy1, double r1,

@@ -18,6 +18,7 @@
 #include "geometry/elementary/Angles.h"
 #include "geometry/elementary/Shapes.h"
 #include "geometry/intersections/Circles.h"
+#include "math/Assert.h"
 #include "math/NumericConstants.h"
 #include "vorn/GeometryUtils.h"
 
@@ -35,7 +36,7 @@ class AngularRange {
       : low_(direction > 0.0 ? startAngle : endAngle),
         high_(direction > 0.0 ? endAngle : startAngle) {}
 
-  /// Whether both angles are equal, which leaves open what is meant.
+  /// Whether both angles are equal, which leaves open what is meant. Not-a-numbers are not equal.
   bool IsUndefined() const { return low_ == high_; }
 
   /// Whether a polar angle lies inside.
@@ -98,11 +99,12 @@ inline CirclePoints CutCircles(Circle const& bigger, Circle const& smaller) {
 }
 
 /// The common points of a segment, ends included, and an arc: of two the one nearer to the end of
-/// the segment first. Nothing for an arc of equal angles, which has no range.
-inline std::optional<CirclePoints> CutArcBySegment(ArcRange const& arc, Segment const& segment) {
-  std::optional<CirclePoints> found;
-  if (arc.range.IsUndefined()) return found;
-  arc.Keep(CutCircleBySegment(arc.circle, segment), &found.emplace());
+/// the segment first. The arc must have a range: see IsUndefined.
+inline CirclePoints CutArcBySegment(ArcRange const& arc, Segment const& segment) {
+  VORN_ASSERT(!arc.range.IsUndefined());
+  CirclePoints const onCircle = CutCircleBySegment(arc.circle, segment);
+  CirclePoints found;
+  arc.Keep(onCircle, &found);
   return found;
 }
 
