@@ -122,6 +122,14 @@ class ChainSearch {
   bool MakeCornerGate(Level const& level, std::int32_t split, Gate* gate) {
     State const* from = BestFor(level, split);
     if (from == nullptr) return false;
+    RunFit const behind =
+        path_.limits.looksFar ? search_.FitLongestAlone(split) : FitShortlyBehind(split);
+    if (!behind.isFound || behind.ratio > 1.0) return false;
+    return CornerGate(path_, split, BeforeCorner(*from, split), behind.circle, gate);
+  }
+
+  /// The circle of the points that follow a gap.
+  RunFit FitShortlyBehind(std::int32_t split) {
     RunFit behind;
     for (std::int32_t length = kPointsBehind * StrideFrom(path_, split);;) {
       std::int32_t const end = std::min(split + length, path_.Count());
@@ -130,8 +138,16 @@ class ChainSearch {
       if (behind.isFound && behind.ratio <= 1.0) break;
       length = (end - split) / 2;
     }
-    if (!behind.isFound || behind.ratio > 1.0) return false;
-    return CornerGate(path_, split, from->reach.circle, behind.circle, gate);
+    return behind;
+  }
+
+  /// The circle of a piece that ends before a gap. Noise near the tolerance leaves both circles of
+  /// a corner hardly any room, so that the gate has to pass within a small share of the tolerance
+  /// of their crossing: then the smallest largest ratio counts, not only that it is below 1.
+  Circle BeforeCorner(State const& from, std::int32_t split) {
+    if (!path_.limits.looksFar) return from.reach.circle;
+    RunFit const best = search_.FindBestUpTo(from.opening, split, {from.reach.circle, 1.0, true});
+    return best.isFound ? best.circle : from.reach.circle;
   }
 
   static State const* BestFor(Level const& level, std::int32_t split) {

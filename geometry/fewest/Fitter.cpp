@@ -102,10 +102,13 @@ class Fitter {
   bool Search(double share, Answer* answer, Promises::Report* report) {
     *answer = {};
     path_.limits.mostSources = kSources[0];
+    path_.limits.looksFar = false;
     Chain chain = FindOpen(share);
     // A wider look starts from other gates, so it may also end with more pieces.
     for (std::int32_t effort = 1; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
+      if (chain.pieces.size() == bound_) break;
       path_.limits.mostSources = kSources[effort];
+      path_.limits.looksFar = true;
       Chain wider = FindOpen(share);
       bool const isBetter = chain.pieces.empty() || wider.pieces.size() < chain.pieces.size();
       if (isBetter && !wider.pieces.empty()) chain = std::move(wider);

@@ -20,6 +20,9 @@ struct Limits {
   double farthestBetweenPoints = std::numeric_limits<double>::infinity();
   /// From how many states of the level before a gate takes offsets; more look wider.
   std::size_t mostSources = 2;
+  /// Whether the gate of a corner lies where the circles of the longest runs on both sides cross,
+  /// not only those of the points beside it: this takes longer and finds corners in any noise.
+  bool looksFar = false;
 };
 
 }  // namespace Vorn::Fewest

@@ -265,25 +265,19 @@ void PieceSearch::Grow(Opening const& from, std::int32_t expected, Reach* reach)
 }
 
 RunFit PieceSearch::FindBest(Opening const& from, Opening const& to, RunFit const& start) {
-  std::int32_t const first = from.First();
   std::int32_t const end = to.isFree ? path_.Count() : to.gate.split;
   BeginProgramme(from, end);
   AddOpening(to);
-  RunFit fit =
-      Fit({ToLocal(start.circle), start.ratio, start.isFound}, false, {&from, &to, first, end});
-  if (fit.isFound) fit.circle = FromLocal(fit.circle);
-  return fit;
+  return FitFrom(start, {&from, &to, from.First(), end});
 }
 
-RunFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
-  UseRows(first, last);
-  Simplex simplex(slack_);
-  Basis basis;
-  RunFit fit = FitRun(programme_,
-                      {LineThrough(PlaceOf(frame_.ToLocal(path_.At(first))),
-                                   PlaceOf(frame_.ToLocal(path_.At(last - 1)))),
-                       0.0, false},
-                      false, &simplex, &basis);
+RunFit PieceSearch::FindBestUpTo(Opening const& from, std::int32_t end, RunFit const& start) {
+  BeginProgramme(from, end);
+  return FitFrom(start, {&from, nullptr, from.First(), end});
+}
+
+RunFit PieceSearch::FitFrom(RunFit const& start, Ends const& ends) {
+  RunFit fit = Fit({ToLocal(start.circle), start.ratio, start.isFound}, false, ends);
   if (fit.isFound) fit.circle = FromLocal(fit.circle);
   return fit;
 }

@@ -63,8 +63,15 @@ class PieceSearch {
   /// `start` is a circle to begin with; isFound when it is a piece of its ratio.
   RunFit FindBest(Opening const& from, Opening const& to, RunFit const& start);
 
+  /// The same where the piece may end anywhere behind its last point, the one before `end`.
+  RunFit FindBestUpTo(Opening const& from, std::int32_t end, RunFit const& start);
+
   /// The circle of the smallest largest ratio through some points alone; its guess is their chord.
   RunFit FitAlone(std::int32_t first, std::int32_t last);
+
+  /// The same for the longest run from a point on that a circle was found for; not found where two
+  /// points are left or fewer.
+  RunFit FitLongestAlone(std::int32_t first);
 
  private:
   void Cover(std::int32_t first, std::int32_t last);
@@ -96,6 +103,8 @@ class PieceSearch {
   PieceRules Rules() { return {path_, frame_, share_, &programme_}; }
   Reach FindFirstReach(Opening const& from);
   void Grow(Opening const& from, std::int32_t expected, Reach* reach);
+  /// The fit of the programme for a start in the coordinates of the path, and in these.
+  RunFit FitFrom(RunFit const& start, Ends const& ends);
   RunFit FirstFit(Opening const& from, std::int32_t end);
   Circle ToLocal(Circle const& circle) const;
   Circle FromLocal(Circle const& circle) const;

@@ -42,6 +42,17 @@ TEST(FewestPiecesInvariants, NoisyProfilesHaveTheirTrueNumber) {
   }
 }
 
+TEST(FewestPiecesInvariants, NoiseNearTheToleranceTakesAWideLook) {
+  FewestOptions options;
+  options.effort = FewestPieces::Effort::Wide;
+  for (ProfileStyle const style : kStyles) {
+    for (std::uint64_t seed = 1; seed <= 5; ++seed) {
+      SCOPED_TRACE(testing::Message() << "style " << static_cast<int>(style) << ", seed " << seed);
+      ExpectSixteen(MakeNoisyProfile(seed, style, 1, 1000, 0.99), options);
+    }
+  }
+}
+
 TEST(FewestPiecesInvariants, ReversingThePointsKeepsTheNumber) {
   for (Scan const& scan : Profiles(600)) ExpectSixteen(Reversed(scan));
 }

@@ -23,6 +23,19 @@ TEST(FewestPiecesAtScale, OneArcOfAMillionPointsIsOnePiece) {
   ExpectPieces(MakeNoisyArc(1, 1000000, 0.45), 1);
 }
 
+TEST(FewestPiecesAtScale, NoiseNearTheToleranceTakesAWideLook) {
+  FewestOptions options;
+  options.effort = FewestPieces::Effort::Wide;
+  for (ProfileStyle const style : kStyles) {
+    for (std::uint64_t seed = 1; seed <= 5; ++seed) {
+      SCOPED_TRACE(testing::Message() << "style " << static_cast<int>(style) << ", seed " << seed);
+      FewestResult const result = FitKept(MakeNoisyProfile(seed, style, 10, 10000, 0.99), options);
+      EXPECT_EQ(result.fewestPossible, 160);
+      EXPECT_LE(PieceCount(result), 161);
+    }
+  }
+}
+
 TEST(FewestPiecesAtScale, ScansOneMicrometreApartHaveTheirTrueNumber) {
   for (std::uint64_t seed = 1; seed <= 3; ++seed) {
     SCOPED_TRACE(testing::Message() << "seed " << seed);
