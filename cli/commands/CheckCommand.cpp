@@ -123,12 +123,13 @@ void AddOptions(Command& command, Options* options) {
       [options](std::string const& word) { options->from = FormatNamed(word); },
       "Read the contour as this");
   AddOutline(command, &options->outline);
-  command.AddText("--table", &options->table, "FILE",
-                  "Write every point's deviation to this CSV file; - is the standard output, which "
-                  "then holds nothing else");
-  command.AddText("--json", &options->json, "FILE",
-                  "Write all that is found to this JSON file, with all digits; - is the standard "
-                  "output, which then holds nothing else");
+  command.AddOutput(
+      "--table", &options->table,
+      "Write every point's deviation to this CSV file; - is the standard output, which "
+      "then holds nothing else");
+  command.AddOutput("--json", &options->json,
+                    "Write all that is found to this JSON file, with all digits; - is the standard "
+                    "output, which then holds nothing else");
   command.AddFlag("--all", &options->all, "List every point, not just the ten worst");
   command.SetFooter(std::string(kPointsFileText) + kFooter);
 }

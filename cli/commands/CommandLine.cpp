@@ -31,6 +31,17 @@ void RefuseUnknownCommand(CLI::App const& program, int argc, char const* const* 
                            (nearest ? "; did you mean " + Quoted(*nearest) + "?" : ""));
 }
 
+/// The first of the names of an option: "-o" of "-o,--output".
+std::string FirstName(std::string const& names) { return names.substr(0, names.find(',')); }
+
+CLI::Validator DashForStandardOutput() {
+  auto const replace = [](std::string& path) {
+    if (path == "/dev/stdout") path = "-";
+    return std::string();
+  };
+  return {replace, ""};
+}
+
 }  // namespace
 
 Option Option::Require() const { return Option(option_->required()); }
@@ -47,6 +58,19 @@ Option Command::AddText(std::string const& name, std::string* value, std::string
 Option Command::AddText(std::string const& name, std::optional<std::string>* value,
                         std::string const& valueName, std::string const& help) {
   return Option(command_->add_option(name, *value, help)->type_name(valueName));
+}
+
+Option Command::AddOutput(std::string const& name, std::string* file, std::string const& help) {
+  Option const option = AddText(name, file, "FILE", help);
+  command_->get_option(FirstName(name))->transform(DashForStandardOutput());
+  return option;
+}
+
+Option Command::AddOutputs(std::string const& name, std::vector<std::string>* files,
+                           std::string const& help) {
+  Option const option = AddRepeatable(name, files, "FILE", help);
+  command_->get_option(FirstName(name))->transform(DashForStandardOutput());
+  return option;
 }
 
 Option Command::AddTexts(std::string const& name, std::vector<std::string>* values,

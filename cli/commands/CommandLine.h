@@ -50,6 +50,13 @@ class Command {
   Option AddText(std::string const& name, std::optional<std::string>* value,
                  std::string const& valueName, std::string const& help);
 
+  /// A file to write. The name /dev/stdout is taken for "-": the program must know that a result
+  /// goes there, and print nothing else.
+  Option AddOutput(std::string const& name, std::string* file, std::string const& help);
+  /// Such a file each time it is given.
+  Option AddOutputs(std::string const& name, std::vector<std::string>* files,
+                    std::string const& help);
+
   /// Takes one word or several in a row.
   Option AddTexts(std::string const& name, std::vector<std::string>* values,
                   std::string const& valueName, std::string const& help);

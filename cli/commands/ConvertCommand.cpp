@@ -184,8 +184,8 @@ void AddOptions(Command& command, Options* options) {
   command
       .AddText("CONTOUR", &options->input, "FILE", "File with the contour; - is the standard input")
       .Require();
-  command.AddRepeatable(
-      "-o,--output", &options->outputs, "FILE",
+  command.AddOutputs(
+      "-o,--output", &options->outputs,
       "Write the contour to this file; may be given several times; - is the standard "
       "output, which --to without -o means as well");
   AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},

@@ -64,9 +64,9 @@ void AddManyOptions(Command& command, FitOptions* options) {
   command.AddText("--out-dir", &options->outFolder, "FOLDER",
                   "Fit one or many files and write the contours into this folder, named after the "
                   "inputs; it is made if need be");
-  command.AddText("--summary", &options->summary, "FILE",
-                  "Write a table with a row for each file, the worst first, and totals: .csv, or "
-                  ".html with a small picture of each contour");
+  command.AddOutput("--summary", &options->summary,
+                    "Write a table with a row for each file, the worst first, and totals: .csv, or "
+                    ".html with a small picture of each contour");
   AddWholeNumber(command, "-j,--jobs", &options->jobs, {1, kMostJobs},
                  "Fit so many files at once; as many as there are processors if not said");
   command.AddFlag("--no-time", &options->hideTime,
@@ -142,17 +142,16 @@ void AddFitOptions(Command& command, FitOptions* options) {
   AddWholeNumber(command, "--start", &options->start, {0, std::numeric_limits<int>::max(), "INDEX"},
                  "Cut a closed contour open at this point, counted from 0; without it, at its "
                  "sharpest corner");
-  command.AddRepeatable(
-      "-o,--output", &options->outputs, "FILE",
-      "Write the contour to this file, in the format that its ending names; may be "
-      "given several times; - is the standard output");
+  command.AddOutputs("-o,--output", &options->outputs,
+                     "Write the contour to this file, in the format that its ending names; may be "
+                     "given several times; - is the standard output");
   AddFormats(command, options);
   AddManyOptions(command, options);
   AddWriteOptions(command, &options->write);
   AddWholeNumber(command, "--digits", &options->digits, {0, kMostDigits},
                  "Digits after the point of lengths in the table; files always hold every digit");
-  command.AddText("--json", &options->json, "FILE", "The same as -o, always as JSON");
-  command.AddText("--svg", &options->svg, "FILE", "The same as -o, always as SVG");
+  command.AddOutput("--json", &options->json, "The same as -o, always as JSON");
+  command.AddOutput("--svg", &options->svg, "The same as -o, always as SVG");
   AddFieldOption(command, &options->fields);
   command.AddFlag("-q,--quiet", &options->isQuiet, "Draw no progress bar on the terminal");
   command.SetFooter(std::string(kPointsFileText) + kFitFooter);

@@ -103,8 +103,8 @@ void AddOptions(Command& command, Options* options) {
   AddOutline(command, &options->outline);
   AddOutline(command, &options->outlineB, "--outline-b");
   AddFlatten(command, &options->flattening);
-  command.AddText("-o,--output", &options->output, "FILE",
-                  "Write the points to this CSV file; - is the standard output");
+  command.AddOutput("-o,--output", &options->output,
+                    "Write the points to this CSV file; - is the standard output");
   command.AddFlag("--json", &options->asJson, "Write the points as JSON, with every digit");
   command.AddFlag("--fail-if-any", &options->failIfAny, "Exit with 1 when there are intersections");
   command.SetFooter(kFooter);

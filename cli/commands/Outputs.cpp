@@ -4,7 +4,6 @@
 #include <memory>
 #include <ostream>
 
-#include "cli/terminal/Interruption.h"
 #include "vorn/io/Files.h"
 
 namespace Vorn::Cli {
@@ -26,21 +25,6 @@ bool AreSameFile(std::string const& a, std::string const& b) {
   std::string const what = b.path == "-" ? "the standard output" : "the same file: " + b.path;
   std::string const who = a.option == b.option ? "two " + a.option : a.option + " and " + b.option;
   throw Failure(FailureKind::BadArgument, who + " name " + what);
-}
-
-/// All of them or, when interrupted, none.
-void CommitFiles(std::vector<std::unique_ptr<AtomicFile>> const& files) {
-  auto const lock = HoldOffInterruption();
-  for (auto const& file : files) {
-    if (!file->IsStream()) file->Commit();
-  }
-}
-
-void Commit(std::vector<std::unique_ptr<AtomicFile>> const& files) {
-  CommitFiles(files);
-  for (auto const& file : files) {
-    if (file->IsStream()) file->Commit();
-  }
 }
 
 }  // namespace
@@ -72,7 +56,7 @@ void Outputs::Write(Console const& console) const {
   for (auto const& [path, text] : texts_) {
     if (path != "-") files.push_back(std::make_unique<AtomicFile>(path, text));
   }
-  Commit(files);
+  AtomicFile::CommitAll(files);
   for (auto const& [path, text] : texts_) {
     if (path == "-") console.out << text;
   }

@@ -223,8 +223,8 @@ void AddOptions(Command& command, Options* options) {
   AddPointsInput(command, &options->points);
   command.AddText("CONTOUR", &options->contour, "FILE",
                   "File with a contour; - is the standard input");
-  command.AddRepeatable(
-      "-o,--output", &options->outputs, "FILE",
+  command.AddOutputs(
+      "-o,--output", &options->outputs,
       "Write the drawing to this file; may be given several times; - is the standard "
       "output, which --to without -o means as well");
   AddWord(

@@ -262,11 +262,11 @@ void AddOptions(Command& command, Options* options) {
   AddPositiveNumber(command, "--outliers", &options->outliers, "K",
                     "Leave out points further than K standard deviations from where their "
                     "neighbours have them");
-  command.AddText(
-      "-o,--output", &options->output, "FILE",
+  command.AddOutput(
+      "-o,--output", &options->output,
       "Write the points that are left to this file; - is the standard output (default)");
-  command.AddText("--dropped", &options->dropped, "FILE",
-                  "Write the points that are left out to this file");
+  command.AddOutput("--dropped", &options->dropped,
+                    "Write the points that are left out to this file");
   command.SetFooter(std::string(kPointsFileText) + kFooter);
 }
 

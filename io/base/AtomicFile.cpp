@@ -22,11 +22,19 @@ namespace fs = std::filesystem;
   throw Failure(FailureKind::File, {path}, "cannot be written: " + reason);
 }
 
-/// Behind symbolic links: the new contents go where a plain write would have put them.
+/// A device such as /dev/null or a pipe with a name, which takes what it is given at once.
+bool IsStreamFile(fs::file_status const& status) {
+  return fs::is_character_file(status) || fs::is_fifo(status);
+}
+
+/// Behind symbolic links: the new contents go where a plain write would have put them. The links of
+/// /dev/fd to pipes lead to no name, so what is a stream keeps its own.
 std::string Target(std::string const& path) {
   std::error_code error;
-  if (!fs::is_symlink(path, error)) return path;
-  if (!fs::exists(path, error)) {
+  if (!fs::is_symlink(path, error) || IsStreamFile(fs::status(path, error))) return path;
+  bool const isThere = fs::exists(path, error);
+  if (error) Refuse(path, error.message());
+  if (!isThere) {
     Refuse(path, "is a link to " + fs::read_symlink(path, error).string() + ", which is not there");
   }
   fs::path const target = fs::weakly_canonical(path, error);
@@ -57,9 +65,22 @@ mode_t ModeFor(std::string const& target) {
   return stat(target.c_str(), &status) == 0 ? (status.st_mode & kPermissions) : DefaultMode();
 }
 
-/// A device such as /dev/null or a pipe with a name, which takes what it is given at once.
-bool IsStreamFile(fs::file_status const& status) {
-  return fs::is_character_file(status) || fs::is_fifo(status);
+bool IsThere(std::string const& path) {
+  struct stat status {};
+  return lstat(path.c_str(), &status) == 0;
+}
+
+/// Makes each of two files have the name of the other.
+/// @return false when that is not possible here, for one that a rename of the first would tell.
+bool Exchange(std::string const& a, std::string const& b) {
+#if defined(RENAME_EXCHANGE)
+  // A folder that has got the name meanwhile would be exchanged as well.
+  std::error_code error;
+  if (!fs::is_regular_file(b, error)) return false;
+  return renameat2(AT_FDCWD, a.c_str(), AT_FDCWD, b.c_str(), RENAME_EXCHANGE) == 0;
+#else
+  return false;
+#endif
 }
 
 }  // namespace
@@ -148,14 +169,49 @@ void AtomicFile::WriteStream() const {
   if (close(descriptor) != 0) Refuse(path_, std::strerror(errno));
 }
 
+void AtomicFile::Rename() {
+  if (std::rename(temporary_.c_str(), target_.c_str()) != 0) Refuse(path_, std::strerror(errno));
+  ForgetTemporary(temporary_);
+  temporary_.clear();
+}
+
+void AtomicFile::TakePlace() {
+  isNew_ = !IsThere(target_);
+  if (isNew_ || !Exchange(temporary_, target_)) Rename();
+}
+
+void AtomicFile::GiveBack() {
+  if (!temporary_.empty()) {
+    Exchange(temporary_, target_);
+  } else if (isNew_) {
+    unlink(target_.c_str());
+  }
+}
+
 void AtomicFile::Commit() {
   if (IsStream()) return WriteStream();
   auto const lock = LockStagedFiles();
-  if (std::rename(temporary_.c_str(), target_.c_str()) != 0) {
-    Refuse(path_, std::strerror(errno));
+  Rename();
+}
+
+void AtomicFile::CommitAll(std::vector<std::unique_ptr<AtomicFile>> const& files) {
+  std::vector<AtomicFile*> staged;
+  std::vector<AtomicFile*> streams;
+  for (auto const& file : files) (file->IsStream() ? streams : staged).push_back(file.get());
+  {
+    auto const lock = LockStagedFiles();
+    std::size_t placed = 0;
+    try {
+      for (; placed < staged.size(); ++placed) staged[placed]->TakePlace();
+    } catch (...) {
+      while (placed > 0) staged[--placed]->GiveBack();
+      throw;
+    }
+    for (AtomicFile* const file : staged) {
+      if (!file->temporary_.empty()) file->RemoveTemporary();
+    }
   }
-  ForgetTemporary(temporary_);
-  temporary_.clear();
+  for (AtomicFile* const stream : streams) stream->WriteStream();
 }
 
 }  // namespace Vorn::IO

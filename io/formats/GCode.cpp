@@ -63,13 +63,21 @@ void CutPieces(ContourFile const& contour, GCodeOptions const& options, ToolPath
   }
 }
 
+/// The name of a file as it may stand in a comment: a parenthesis of its own would end the comment,
+/// and a controller would obey what follows.
+std::string InComment(std::string text) {
+  std::replace(text.begin(), text.end(), '(', '[');
+  std::replace(text.begin(), text.end(), ')', ']');
+  return text;
+}
+
 std::vector<NamedField> FieldsOf(ContourFile const& contour, GCodeOptions const& options) {
   double length = 0.0;
   for (Piece const& piece : contour.pieces) length += piece.length;
   auto const number = [](std::optional<double> const& value) {
     return value ? FormatShort(*value) : std::string();
   };
-  return {{"name", contour.path},
+  return {{"name", InComment(contour.path)},
           {"units", contour.units},
           {"tolerance", number(options.tolerance)},
           {"feed", number(options.feed)},

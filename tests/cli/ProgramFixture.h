@@ -23,6 +23,9 @@ inline std::string Contents(fs::path const& path) {
   return text.str();
 }
 
+/// What a shell adds to the number of the signal that ended a program.
+inline constexpr int kSignalled = 128;
+
 struct Ended {
   int code = -1;
   std::string out;
@@ -46,16 +49,13 @@ class Program : public testing::Test {
   /// `arguments` as typed into a shell after the name of the program, `before` what goes before it.
   Ended Run(std::string const& arguments, std::string const& before = "",
             std::string const& in = "/dev/null") const {
-    std::string const command = "cd '" + folder_.string() + "' && " + before + " '" +
-                                CONTOUR_PROGRAM + "' " + arguments + " >.out 2>.err <'" + in + "'";
-    int const status = std::system(command.c_str());
-    Ended ended;
-    ended.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-    ended.out = Contents(folder_ / ".out");
-    ended.err = Contents(folder_ / ".err");
-    fs::remove(folder_ / ".out");
-    fs::remove(folder_ / ".err");
-    return ended;
+    return System(before + " '" + CONTOUR_PROGRAM + "' " + arguments + " >.out 2>.err <'" + in +
+                  "'");
+  }
+
+  /// A line for the shell, in which $CONTOUR is the program; for pipes and redirections.
+  Ended RunShell(std::string const& line) const {
+    return System("CONTOUR='" CONTOUR_PROGRAM "'; { " + line + "\n} >.out 2>.err </dev/null");
   }
 
   std::vector<std::string> Files() const {
@@ -75,6 +75,19 @@ class Program : public testing::Test {
   }
 
   fs::path folder_;
+
+ private:
+  Ended System(std::string const& line) const {
+    int const status = std::system(("cd '" + folder_.string() + "' && " + line).c_str());
+    Ended ended;
+    // A shell that makes itself the program ends as the program does.
+    ended.code = WIFEXITED(status) ? WEXITSTATUS(status) : kSignalled + WTERMSIG(status);
+    ended.out = Contents(folder_ / ".out");
+    ended.err = Contents(folder_ / ".err");
+    fs::remove(folder_ / ".out");
+    fs::remove(folder_ / ".err");
+    return ended;
+  }
 };
 
 /// A corner: ten points along x, ten along y.

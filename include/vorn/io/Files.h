@@ -1,10 +1,12 @@
 #pragma once
 
 #include <iosfwd>
+#include <memory>
 #include <mutex>
 #include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "vorn/io/Export.h"
 
@@ -24,9 +26,9 @@ VORN_IO_EXPORT std::string ReadTextFile(std::string const& path, std::istream& i
 /// to the disk, and only then given its real name. Until Commit() an existing file stays as it
 /// was; dropped before, it leaves nothing behind.
 ///
-/// Stage all files of a run first and commit them together: what commonly fails (no folder, no
-/// permission, a full disk) fails while staging, with none of the files changed. A device or a
-/// named pipe cannot be staged: it is written when it is committed, so commit it after the others.
+/// Stage all files of a run first and commit them by CommitAll(): what commonly fails (no folder,
+/// no permission, a full disk) fails while staging, with none of the files changed. A device or a
+/// named pipe cannot be staged: it is written when it is committed.
 class VORN_IO_EXPORT AtomicFile {
  public:
   /// @throws Failure (FailureKind::File) naming the file when it cannot be written.
@@ -37,6 +39,12 @@ class VORN_IO_EXPORT AtomicFile {
 
   /// @throws Failure (FailureKind::File) naming the file.
   void Commit();
+
+  /// Commits all files or none of them, then the devices and pipes. When a file cannot get its
+  /// name, those before it are put back: a replaced one has its old contents again, a new one goes.
+  /// Where the file system cannot exchange two files, a replaced one keeps its new contents.
+  /// @throws Failure (FailureKind::File) naming the file.
+  static void CommitAll(std::vector<std::unique_ptr<AtomicFile>> const& files);
 
   /// Whether it is a device or a named pipe, which may keep Commit() waiting for a reader.
   bool IsStream() const;
@@ -50,10 +58,17 @@ class VORN_IO_EXPORT AtomicFile {
   void RemoveTemporary();
   /// Writes the contents through to the disk.
   void Write(int descriptor, std::string_view contents) const;
+  /// Gives the staged file its name; what had the name is staged in its place, if that is possible.
+  void TakePlace();
+  /// Gives the staged file its name for good.
+  void Rename();
+  /// Undoes TakePlace().
+  void GiveBack();
 
   std::string path_;                     ///< as the user wrote it, for messages
   std::string target_;                   ///< behind symbolic links
   std::string temporary_;                ///< empty when there is none
+  bool isNew_ = false;                   ///< whether nothing had its name before TakePlace()
   std::optional<std::string> contents_;  ///< of a device or a named pipe
 };
 
