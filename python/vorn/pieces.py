@@ -6,6 +6,9 @@ import dataclasses
 from typing import Optional, Tuple, Union
 
 import numpy as np
+import numpy.typing as npt
+
+from vorn import _core
 
 __all__ = ["Arc", "Line", "Piece", "Place"]
 
@@ -36,7 +39,11 @@ class Line:
 
     @property
     def length(self) -> float:
-        """From start to end."""
+        """From start to end, in the unit of the points.
+
+        >>> Line((1, 1), (1, 3)).length
+        2.0
+        """
         # As the library rounds it; math.hypot may differ in the last bit.
         return float(np.hypot(self.end[0] - self.start[0], self.end[1] - self.start[1]))
 
@@ -74,7 +81,11 @@ class Arc:
 
     @property
     def length(self) -> float:
-        """Along the arc."""
+        """Along the arc, in the unit of the points.
+
+        >>> Arc((2, 0), (0, 2), (0, 0), 2.0, True, 1.5).length
+        3.0
+        """
         return self.radius * self.sweep
 
 
@@ -89,3 +100,19 @@ def piece_of(row: np.void) -> Piece:
     if not r[13]:
         return Line((r[0], r[1]), (r[2], r[3]), points)
     return Arc((r[0], r[1]), (r[2], r[3]), (r[4], r[5]), r[6], r[14], r[9], points)
+
+
+def row_of(piece: Piece) -> npt.NDArray[np.void]:
+    """The row, alone in its array, that describes a piece."""
+    if isinstance(piece, Arc):
+        row = _core.arc(piece.start, piece.end, piece.center, piece.ccw)
+        row["radius"] = piece.radius
+        row["sweep"] = piece.sweep
+        row["length"] = piece.length
+    elif isinstance(piece, Line):
+        row = _core.line(piece.start, piece.end)
+    else:
+        raise TypeError(f"a contour is made of Line and Arc values, not {piece!r}")
+    if piece.points is not None:
+        row["first_point"], row["last_point"] = piece.points
+    return row
