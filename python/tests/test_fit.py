@@ -139,6 +139,16 @@ def test_points_too_close_are_named(corner):
     assert caught.value.code is vorn.ErrorCode.POINTS_TOO_CLOSE
 
 
+@pytest.mark.parametrize("closing", [[], [(10, 0, 1e-6)]])
+def test_points_too_close_across_the_seam_are_named(circle, closing):
+    points = np.column_stack((circle, np.full(90, 0.01)))
+    points = np.vstack((points, [(10, -0.002, 1e-6)], *closing))
+    with pytest.raises(vorn.PointsTooCloseError, match='"fewest"') as caught:
+        vorn.fit(points, strategy="mixed", closed=True)
+    assert caught.value.indices == (90, 0)
+    assert "--" not in str(caught.value)
+
+
 def test_points_without_an_arc_have_no_fit(corner):
     with pytest.raises(vorn.ContourError) as caught:
         vorn.fit(corner, tol=0.0001, strategy="arc")
