@@ -1,24 +1,27 @@
-"""Python and the program give the same bits; what runs long leaks nothing."""
+"""Python and the program give the same bits."""
 
 import json
 import os
-import pathlib
-import resource
 import shutil
 import subprocess
-import sys
-import threading
-import time
 
 import numpy as np
 import pytest
 import vorn
-from scans import TOL, scan
+
+STRATEGIES = ["fewest", "mixed", "cells", "arc"]
 
 # Tolerances that suit the measured contours; a tuple is a cap for tolerances by the spacing.
 SHARED = {"rail_head_known_arcs": 0.01, "wheel_worn_a": 0.03, "rail_worn_low": 0.025,
           "mirror_sphere_83m": 0.00005, "hatch_boundary": 0.002, "glyph_five": (2.0,),
-          "gcode_letter_d": 0.015, "airfoil_clark_y": 0.0004, "circle_r3": 0.001}
+          "gcode_letter_d": 0.015, "airfoil_clark_y": 0.0004, "circle_r3": 0.001,
+          "test_track_centreline": (0.03,)}
+
+#: What has no fit: shapes that are no single arc, and runs that "cells" has no shape for. Of the
+#: others some have a contour that leaves the tolerance, which is compared as well.
+REFUSED = {("rail_head_known_arcs", "cells"), ("wheel_worn_a", "arc"), ("rail_worn_low", "cells"),
+           ("hatch_boundary", "cells"), ("hatch_boundary", "arc"), ("glyph_five", "cells"),
+           ("glyph_five", "arc"), ("gcode_letter_d", "arc"), ("airfoil_clark_y", "arc")}
 
 
 @pytest.fixture
@@ -34,7 +37,9 @@ def with_tolerances(path, tol):
     if not isinstance(tol, tuple):
         return np.column_stack((points, np.full(len(points), tol)))
     steps = np.hypot(*np.diff(points, axis=0).T)
-    nearer = np.minimum(np.append(steps, np.inf), np.append(np.inf, steps))
+    # The last point of a closed contour is the first one again, so both have the same neighbours.
+    outside = steps[[-1, 0]] if np.array_equal(points[0], points[-1]) else [np.inf, np.inf]
+    nearer = np.minimum(np.append(steps, outside[1]), np.append(outside[0], steps))
     return np.column_stack((points, np.minimum(tol[0], 0.3 * nearer)))
 
 
@@ -59,83 +64,46 @@ def assert_same_bits(contour, document):
 EXIT_CODES = {vorn.PointsTooCloseError: 4, vorn.NoFitError: 5}
 
 
-def compare_with_program(program, points, folder, strategy):
+def program_fit(program, points, folder, strategy):
+    """The contour that the program writes, or the number that it ends with."""
     path, out = folder / "points.csv", folder / "contour.json"
     path.write_text("x,y,w\n" + "".join(f"{x!r},{y!r},{w!r}\n" for x, y, w in points.tolist()))
+    out.unlink(missing_ok=True)
     done = subprocess.run([program, "fit", path, "--strategy", strategy, "-o", out],
                           capture_output=True, text=True, check=False)
+    return json.loads(out.read_text()) if out.exists() else done.returncode
+
+
+def compare_with_program(program, points, folder, strategy):
+    """Whether there is a contour, after it was compared."""
+    expected = program_fit(program, points, folder, strategy)
     try:
         contour = vorn.fit(points, strategy=strategy)
     except vorn.ContourError as error:
-        assert done.returncode == EXIT_CODES[type(error)], done.stderr
-        return
-    assert_same_bits(contour, json.loads(out.read_text()))
+        assert expected == EXIT_CODES[type(error)]
+        return False
+    assert_same_bits(contour, expected)
+    return True
 
 
-@pytest.mark.parametrize("strategy", ["fewest", "mixed", "cells"])
+@pytest.mark.parametrize("strategy", STRATEGIES)
 def test_the_examples_have_the_bits_of_the_program(program, examples, tmp_path, strategy):
     for path in sorted(examples.glob("*.csv")):
         compare_with_program(program, vorn.read_points(path), tmp_path, strategy)
 
 
-@pytest.mark.thorough
-@pytest.mark.parametrize("strategy", ["fewest", "mixed", "cells"])
+@pytest.mark.parametrize("strategy", STRATEGIES)
 @pytest.mark.parametrize("name", SHARED)
 def test_measured_contours_have_the_bits_of_the_program(program, shared, tmp_path, name, strategy):
     points = with_tolerances(shared / f"{name}.csv", SHARED[name])
-    compare_with_program(program, points, tmp_path, strategy)
+    fitted = compare_with_program(program, points, tmp_path, strategy)
+    assert fitted == ((name, strategy) not in REFUSED)
 
 
-def resident_pages():
-    return int(pathlib.Path("/proc/self/statm").read_text().split()[1])
-
-
-@pytest.mark.thorough
-def test_ten_thousand_fits_leak_nothing():
-    points, bad = scan(0, 60), np.full((5, 2), np.nan)
-
-    def stop(percent):
-        raise InterruptedError
-
-    def rounds(count):
-        for _ in range(count):
-            contour = vorn.fit(points, tol=TOL)
-            contour.deviations(points)
-            hash(contour)
-            with pytest.raises(vorn.ContourError):
-                vorn.fit(bad, tol=TOL)
-            with pytest.raises(InterruptedError):
-                vorn.fit(points, tol=TOL, progress=stop)
-
-    rounds(1000)
-    before, references = resident_pages(), sys.getrefcount(None)
-    rounds(10_000)
-    # A kilobyte of each fit would be 2,500 pages.
-    assert resident_pages() - before < 500
-    assert sys.getrefcount(None) - references < 100
-
-
-@pytest.mark.thorough
-@pytest.mark.skipif((os.cpu_count() or 1) < 2, reason="there is one processor")
-def test_two_threads_fit_side_by_side():
-    """Judged by the time of the processor against that of the clock, whatever else runs."""
-    scans = [scan(seed) for seed in range(200)]
-
-    def work(part):
-        for points in part:
-            vorn.fit(points, tol=TOL)
-
-    threads = [threading.Thread(target=work, args=(scans[i::2],)) for i in range(2)]
-    begin, used = time.perf_counter(), resource.getrusage(resource.RUSAGE_SELF)
-    for thread in threads:
-        thread.start()
-    lone = []
-    for thread in threads:
-        thread.join()
-        lone.append(time.perf_counter() - begin)
-    after = resource.getrusage(resource.RUSAGE_SELF)
-    processor = after.ru_utime + after.ru_stime - used.ru_utime - used.ru_stime
-    # Behind one lock the processor could not be busy for longer than the clock runs.
-    if os.getloadavg()[0] > os.cpu_count():
-        pytest.skip(f"the machine is busy; {processor / lone[-1]:.2f} processors were used")
-    assert processor / lone[-1] > 1.7
+@pytest.mark.parametrize("turn", [0.4, 1.0, -1.5])
+def test_one_arc_has_the_bits_of_the_program(program, tmp_path, turn):
+    angles = np.linspace(0.3, 0.3 + turn, 50)
+    noise = np.random.default_rng(11).normal(0, 0.002, (50, 2))
+    places = np.column_stack((40 * np.cos(angles), 40 * np.sin(angles))) + noise
+    points = np.column_stack((places, np.full(50, 0.01)))
+    assert compare_with_program(program, points, tmp_path, "arc")
