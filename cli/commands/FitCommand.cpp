@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "cli/commands/ContourOutput.h"
+#include "cli/commands/FineToleranceWarning.h"
 #include "cli/commands/FitFiles.h"
 #include "cli/commands/FitHelp.h"
 #include "cli/commands/FitMany.h"
@@ -54,20 +55,22 @@ void WriteResults(FitOptions const& options, FitReport const& report,
   if (!isOutTaken) PrintResults(options, report, files, console);
 }
 
-FitReport FitWithProgress(FitOptions const& options, PointFile file) {
+FitReport FitWithProgress(FitOptions const& options, PointFile file, Console const& console) {
   ProgressBar progress(stderr, file.points.size(), options.isQuiet);
-  FitReport report = FitContour(std::move(file), options.Choice(), &progress);
+  FitChoice const choice = WarningOfFineTolerances(options.Choice(), console);
+  FitReport report = FitContour(std::move(file), choice, &progress);
   report.head = options.head;
   return report;
 }
 
 /// Reads from the file alone: a standard input is not among many.
-FitReport FitOneOfMany(FitOptions const& options, std::string const& path, Console const& console) {
+FitReport FitOneOfMany(FitOptions const& options, FitChoice const& choice, std::string const& path,
+                       Console const& console) {
   PointsInput input = options.points;
   input.path = path;
   std::vector<FitReport> reports;
   for (PointFile& outline : ReadPointOutlinesInput(input, console)) {
-    reports.push_back(FitContour(std::move(outline), options.Choice(), nullptr));
+    reports.push_back(FitContour(std::move(outline), choice, nullptr));
     reports.back().head = options.head;
   }
   return reports.size() == 1 ? std::move(reports.front()) : Joined(reports);
@@ -76,7 +79,8 @@ FitReport FitOneOfMany(FitOptions const& options, std::string const& path, Conso
 ExitCode RunMany(FitOptions const& options, Console const& console) {
   FitMany many = ManyOf(options);
   WarnOfMissingFeed(options.write, options.WritesGCode(), console);
-  many.fit = [&](std::string const& path) { return FitOneOfMany(options, path, console); };
+  FitChoice const choice = WarningOfFineTolerances(options.Choice(), console);
+  many.fit = [&](std::string const& path) { return FitOneOfMany(options, choice, path, console); };
   return RunFitMany(many, console);
 }
 
@@ -84,7 +88,7 @@ ExitCode Run(FitOptions const& options, Console const& console) {
   RequireWritable(options.Written());
   std::vector<PointFile> outlines = ReadPointOutlinesInput(options.points, console);
   if (outlines.size() > 1) return RunFitOutlines(options, std::move(outlines), console);
-  FitReport report = FitWithProgress(options, std::move(outlines.front()));
+  FitReport report = FitWithProgress(options, std::move(outlines.front()), console);
   std::vector<FittedFile> const files = FilesOf(options, report);
   Verdict const verdict = VerdictOf(report, files);
   std::string const complaint = verdict == Verdict::WithinTolerance ? "" : Complaint(report, files);

@@ -6,6 +6,7 @@
 #include <utility>
 
 #include "cli/commands/ContourOutput.h"
+#include "cli/commands/FineToleranceWarning.h"
 #include "cli/commands/FitFiles.h"
 #include "cli/commands/Outputs.h"
 #include "cli/terminal/Progress.h"
@@ -19,11 +20,13 @@ namespace Vorn::Cli {
 
 namespace {
 
-std::vector<FitReport> FitEach(FitOptions const& options, std::vector<PointFile> outlines) {
+std::vector<FitReport> FitEach(FitOptions const& options, std::vector<PointFile> outlines,
+                               Console const& console) {
+  FitChoice const choice = WarningOfFineTolerances(options.Choice(), console);
   std::vector<FitReport> reports;
   for (PointFile& outline : outlines) {
     ProgressBar progress(stderr, outline.points.size(), options.isQuiet);
-    reports.push_back(FitContour(std::move(outline), options.Choice(), &progress));
+    reports.push_back(FitContour(std::move(outline), choice, &progress));
     reports.back().head = options.head;
   }
   return reports;
@@ -76,7 +79,7 @@ ExitCode RunFitOutlines(FitOptions const& options, std::vector<PointFile> outlin
                                                 ": --outline N takes one of them");
   }
   Results results;
-  results.reports = FitEach(options, std::move(outlines));
+  results.reports = FitEach(options, std::move(outlines), console);
   results.joined = Joined(results.reports);
   Outputs outputs;
   bool isOutTaken = false;

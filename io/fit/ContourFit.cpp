@@ -164,11 +164,18 @@ void RequirePoints(PointFile const& file, Closure const& closure) {
   }
 }
 
+void WarnIfFine(PointFile const& file, FitChoice const& choice) {
+  if (!choice.warnOfFineTolerance || !SuffersFromFineTolerances(choice.strategy)) return;
+  std::optional<FineTolerance> const fine = FindFineTolerance(file.points);
+  if (fine) choice.warnOfFineTolerance(file, *fine);
+}
+
 /// The points lie in a local frame already.
 FitReport FitLocally(PointFile file, FitChoice const& choice, ExecutionState* progress) {
   Closure const closure = FindClosure(file.points, choice.closed);
   if (closure.isClosed) RequirePoints(file, closure);
   std::string source = AssignTolerances(choice.tolerance, &file, closure.isClosed);
+  WarnIfFine(file, choice);
   auto const fit = choice.strategy == Strategy::Fewest ? FitFewest
                    : closure.isClosed                  ? FitClosed
                                                        : FitOpen;

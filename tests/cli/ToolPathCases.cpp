@@ -69,7 +69,7 @@ class ToolPathProgram : public Program {
 TEST_F(ToolPathProgram, EveryPointIsWithinToleranceOfWhatTheToolCuts) {
   auto const points = Rim(1.0);
   WritePoints("p.csv", points);
-  for (double const tolerance : {0.1, 0.001, 0.00001, 0.0000001}) {
+  for (double const tolerance : {0.1, 0.001, 0.00001, 0.0000002}) {
     for (char const* options : {"", "--r-words", "--plane xz", "--plane xz --r-words",
                                 "--safe-height 5 --cut-height -1 --plunge-feed 50"}) {
       std::ostringstream line;

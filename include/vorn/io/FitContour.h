@@ -1,12 +1,14 @@
 #pragma once
 
 #include <cstddef>
+#include <functional>
 #include <optional>
 
 #include "vorn/FewestPieces.h"
 #include "vorn/Types.h"
 #include "vorn/io/Closure.h"
 #include "vorn/io/Export.h"
+#include "vorn/io/FineTolerances.h"
 #include "vorn/io/FitReport.h"
 #include "vorn/io/Points.h"
 #include "vorn/io/Strategy.h"
@@ -24,6 +26,9 @@ struct FitChoice {
   std::optional<std::size_t> start;
   /// What the fewest pieces are asked for; `closed` follows from the points.
   FewestPieces::Options fewest;
+  /// Told before a fit by a strategy that suffers from the fine tolerance of these points: it may
+  /// take minutes, and the contour fall apart. May be empty.
+  std::function<void(PointFile const& file, FineTolerance const& fine)> warnOfFineTolerance;
 };
 
 /// Finds out whether the points are closed, gives them their tolerances, fits and measures them.
