@@ -2,6 +2,7 @@
 
 import os
 import pathlib
+import shutil
 
 import numpy as np
 import pytest
@@ -24,6 +25,15 @@ def shared():
     if not folder:
         pytest.skip("VORN_DATA_DIR is not set")
     return pathlib.Path(folder)
+
+
+@pytest.fixture
+def program():
+    """The program contour of this build."""
+    found = os.environ.get("CONTOUR_PROGRAM") or shutil.which("contour")
+    if not found:
+        pytest.skip("the program contour is not there: CONTOUR_PROGRAM does not name it")
+    return found
 
 
 @pytest.fixture

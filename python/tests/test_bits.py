@@ -1,8 +1,6 @@
 """Python and the program give the same bits."""
 
 import json
-import os
-import shutil
 import subprocess
 
 import numpy as np
@@ -22,14 +20,6 @@ SHARED = {"rail_head_known_arcs": 0.01, "wheel_worn_a": 0.03, "rail_worn_low": 0
 REFUSED = {("rail_head_known_arcs", "cells"), ("wheel_worn_a", "arc"), ("rail_worn_low", "cells"),
            ("hatch_boundary", "cells"), ("hatch_boundary", "arc"), ("glyph_five", "cells"),
            ("glyph_five", "arc"), ("gcode_letter_d", "arc"), ("airfoil_clark_y", "arc")}
-
-
-@pytest.fixture
-def program():
-    found = os.environ.get("CONTOUR_PROGRAM") or shutil.which("contour")
-    if not found:
-        pytest.skip("the program contour is not there: CONTOUR_PROGRAM does not name it")
-    return found
 
 
 def with_tolerances(path, tol):
