@@ -30,11 +30,8 @@ class Nearest(NamedTuple):
     ([0, 0], [2.0, 5.0])
     """
 
-    #: (n, 2): the places.
     places: npt.NDArray[np.float64]
-    #: (n,): the positions of the pieces that they lie on.
     pieces: npt.NDArray[np.int64]
-    #: (n,): how far the points are from them.
     distances: npt.NDArray[np.float64]
 
 

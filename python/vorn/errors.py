@@ -63,15 +63,39 @@ class PointsTooCloseError(ContourError):
 
     The strategies "mixed" and "cells" need neighbours more than 1.5 times the sum of their
     tolerances apart. The strategy "fewest" does not.
+
+    >>> import vorn
+    >>> try:
+    ...     vorn.fit([(0, 0), (0.1, 0), (2, 0)], tol=0.1, strategy="mixed")
+    ... except vorn.PointsTooCloseError as error:
+    ...     print(error.indices)
+    (0, 1)
     """
 
 
 class NoFitError(ContourError):
-    """The points have no contour within their tolerances."""
+    """The points have no contour within their tolerances.
+
+    >>> import vorn
+    >>> try:
+    ...     vorn.fit([(0, 0), (1, 1), (2, 0), (3, 1), (4, 0)], tol=0.01, strategy="arc")
+    ... except vorn.NoFitError as error:
+    ...     print("no single arc")
+    no single arc
+    """
 
 
 class SelfIntersectionError(ContourError):
-    """A contour crosses or touches itself where it must not."""
+    """A contour crosses or touches itself where it must not.
+
+    >>> import vorn.geometry
+    >>> places = [(0, 0), (2, 2), (2, 0), (0, 2), (0, 0)]
+    >>> try:
+    ...     vorn.geometry.get_area([vorn.geometry.Elem.segment(place) for place in places])
+    ... except vorn.SelfIntersectionError as error:
+    ...     print(error.code.name)
+    SELF_INTERSECTION
+    """
 
 
 class FileError(ContourError, OSError):
@@ -83,6 +107,13 @@ class FileError(ContourError, OSError):
         The file.
     line, column : int
         Where, both counted from 1; 0 where it is about no line or no column.
+
+    >>> import vorn
+    >>> try:
+    ...     vorn.Contour.from_wkt("LINESTRING (0 0, one 1)")
+    ... except vorn.FileError as error:
+    ...     print(error.line, error.column)
+    1 18
     """
 
     def __init__(self, message: str, path: str = "", line: int = 0, column: int = 0) -> None:

@@ -48,6 +48,13 @@ def fit(frame: Any, by: str = "scan", x: str = "x", y: str = "y", w: Optional[st
         contours), closed, max_deviation, max_index, fewest_possible (-1 where not known), verdict
         and error. A scan that fails has one row with its error and, among pieces, the number -1.
 
+    Raises
+    ------
+    KeyError
+        The frame has no such column.
+    ValueError
+        `rows` is something else.
+
     >>> import pandas
     >>> points = pandas.DataFrame({"scan": [7, 7, 7, 8], "x": [0, 1, 2, 0], "y": [0, 0, 0, 5]})
     >>> fit(points, tol=0.01, rows="scans")[["scan", "pieces", "length", "error"]]

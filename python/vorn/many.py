@@ -21,15 +21,27 @@ _AHEAD = 4
 
 
 class FitResult(NamedTuple):
-    """What became of one scan: a contour or an error."""
+    """What became of one scan: a contour or an error.
 
-    #: The position of the scan, from 0.
+    Attributes
+    ----------
+    number : int
+        The position of the scan, from 0.
+    path : str or None
+        The path of a scan that was read from a file.
+    contour : Contour or None
+        None where the fit failed.
+    error : Exception or None
+        None where it did not.
+
+    >>> result = next(fit_many([[(0, 0), (3, 4)]], tol=0.01))
+    >>> result.number, result.contour.length, result.error
+    (0, 5.0, None)
+    """
+
     number: int
-    #: The path of a scan that was read from a file.
     path: Optional[str]
-    #: None where it failed.
     contour: Optional[Contour]
-    #: None where it did not.
     error: Optional[Exception]
 
 
@@ -66,6 +78,12 @@ def fit_many(scans: Iterable[Any], tol: Optional[npt.ArrayLike] = None, client: 
     ------
     FitResult
         (number, path, contour, error).
+
+    Raises
+    ------
+    TypeError, ValueError
+        There is a progress, or batch is below 1. What is wrong with a scan or with the options of
+        its fit is the error of its result.
 
     >>> scans = [[(0, 0), (1, 0), (2, 0)], [(0, 0)], [(0, 0), (0, 3)]]
     >>> for number, path, contour, error in fit_many(scans, tol=0.01):

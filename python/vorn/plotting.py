@@ -46,6 +46,11 @@ def plot(contour: Contour, points: Optional[npt.ArrayLike] = None,
     -------
     matplotlib axes
 
+    Raises
+    ------
+    ContourError
+        A point is not finite, or the contour has no pieces.
+
     >>> import matplotlib
     >>> matplotlib.use("Agg")
     >>> contour = Contour.starting_at((0, 0)).append_line((4, 0))

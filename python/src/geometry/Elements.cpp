@@ -66,28 +66,73 @@ A contour is a list of them; its first one is a segment whose end is the start o
 >>> Elem.segment((1, 2)).end
 (1.0, 2.0)
 )")
-      .def_static("segment", &Segment, py::arg("end"), "A straight element that ends there.")
+      .def_static("segment", &Segment, py::arg("end"), R"(
+A straight element that ends there, at (x, y).
+
+>>> Elem.segment((1, 2))
+Elem.segment((1.0, 2.0))
+)")
       .def_static("arc", &ArcElem, py::arg("end"), py::arg("center"), py::arg("radius"),
                   py::arg("direction"), py::arg("angles"),
-                  "An arc; direction is +1 counter-clockwise, -1 clockwise, and angles are the "
-                  "polar angles of start and end in radians.")
+                  R"(
+An arc that ends there; direction is +1 counter-clockwise, -1 clockwise, and angles are the polar
+angles of start and end in radians. Nothing is checked.
+
+>>> get_arc_length(Elem.arc((0, 2), (0, 0), 2.0, 1.0, (0.0, 1.5)))
+3.0
+)")
       .def_property_readonly(
-          "type", [](Elem const& e) { return e.type; }, "Segment or arc.")
+          "type", [](Elem const& e) { return e.type; }, R"(
+Whether it is a segment or an arc.
+
+>>> Elem.segment((1, 2)).type == ElemType.SEGMENT
+True
+)")
       .def_property_readonly(
-          "end", [](Elem const& e) { return PlaceOf(e.end); }, "Where it ends.")
+          "end", [](Elem const& e) { return PlaceOf(e.end); }, R"(
+Where it ends, (x, y).
+
+>>> Elem.segment((1, 2)).end
+(1.0, 2.0)
+)")
       .def_property_readonly(
-          "center", [](Elem const& e) { return PlaceOf(e.center); }, "Of the circle of an arc.")
+          "center", [](Elem const& e) { return PlaceOf(e.center); }, R"(
+The center (x, y) of the circle of an arc.
+
+>>> Elem.arc((0, 2), (1, 2), 1.0, -1.0, (0.0, 3.0)).center
+(1.0, 2.0)
+)")
       .def_property_readonly(
-          "radius", [](Elem const& e) { return e.radius; }, "Of the circle of an arc.")
+          "radius", [](Elem const& e) { return e.radius; }, R"(
+The radius of the circle of an arc, in the unit of its ends.
+
+>>> Elem.arc((0, 2), (1, 2), 1.0, -1.0, (0.0, 3.0)).radius
+1.0
+)")
       .def_property_readonly(
           "direction", [](Elem const& e) { return e.direction; },
-          "+1 counter-clockwise, -1 clockwise.")
+          R"(
+How an arc runs: +1 counter-clockwise, -1 clockwise.
+
+>>> Elem.arc((0, 2), (1, 2), 1.0, -1.0, (0.0, 3.0)).direction
+-1.0
+)")
       .def_property_readonly(
           "start_angle", [](Elem const& e) { return e.startAngle; },
-          "Polar angle of the start of an arc, radians.")
+          R"(
+Polar angle of the start of an arc from its center, radians.
+
+>>> Elem.arc((0, 2), (1, 2), 1.0, -1.0, (0.0, 3.0)).start_angle
+0.0
+)")
       .def_property_readonly(
           "end_angle", [](Elem const& e) { return e.endAngle; },
-          "Polar angle of the end of an arc, radians.")
+          R"(
+Polar angle of the end of an arc from its center, radians.
+
+>>> Elem.arc((0, 2), (1, 2), 1.0, -1.0, (0.0, 3.0)).end_angle
+3.0
+)")
       .def(
           "__eq__", [](Elem const& a, Elem const& b) { return FieldsOf(a).equal(FieldsOf(b)); },
           py::is_operator())
@@ -99,16 +144,33 @@ A contour is a list of them; its first one is a segment whose end is the start o
 }  // namespace
 
 void BindElements(py::module_& module) {
-  py::enum_<Type>(module, "ElemType", "Kind of a contour element.")
+  py::enum_<Type>(module, "ElemType", R"(
+Kind of a contour element.
+
+>>> ElemType.ARC == Elem.arc((0, 2), (0, 0), 2.0, 1.0, (0.0, 1.5)).type
+True
+)")
       .value("SEGMENT", Type::Segment)
       .value("ARC", Type::Arc);
   py::enum_<GeometryUtils::FittingStrategy>(module, "FittingStrategy",
-                                            "How create_fitting_curve cuts the points.")
+                                            R"(
+How create_fitting_curve cuts the points.
+
+>>> curve = create_fitting_curve([(1, 0, 0.1), (0, 1, 0.1), (-1, 0, 0.1)],
+...                              FittingStrategy.SINGLE_ARC)
+>>> curve[0][1].type
+<ElemType.ARC: 1>
+)")
       .value("MIXED", GeometryUtils::FittingStrategy::Mixed)
       .value("MIXED_CELLS", GeometryUtils::FittingStrategy::MixedCells)
       .value("SINGLE_ARC", GeometryUtils::FittingStrategy::SingleArc);
   py::enum_<SegmentsRelPosition>(module, "SegmentsRelPosition",
-                                 "How two segments lie to each other.")
+                                 R"(
+How two segments lie to each other.
+
+>>> SegmentsRelPosition(2)
+<SegmentsRelPosition.INTERSECTING: 2>
+)")
       .value("DISJOINT", SegmentsRelPosition::Disjoint)
       .value("PARALLEL", SegmentsRelPosition::Parallel)
       .value("COLLINEAR", SegmentsRelPosition::Collinear)

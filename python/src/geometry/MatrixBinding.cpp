@@ -106,24 +106,109 @@ point.
 >>> [round(float(v), 12) for v in turn.mxv([1, 0, 0])]
 [0.0, -1.0, 0.0]
 )")
-      .def(py::init<>(), "The identity.")
-      .def(py::init(&FromArray), py::arg("elements"), "Takes nine elements, row by row.")
-      .def("det", &Matrix::Det, "The determinant.")
-      .def("init_i", &Matrix::InitI, "Makes it the identity.")
+      .def(py::init<>(), R"(
+The identity.
+
+>>> Matrix().det()
+1.0
+)")
+      .def(py::init(&FromArray), py::arg("elements"), R"(
+Takes nine elements, row by row, or an array (3, 3). Raises ValueError for another number of them.
+
+>>> Matrix([[2, 0, 0], [0, 3, 0], [0, 0, 4]]).det()
+24.0
+)")
+      .def("det", &Matrix::Det, R"(
+The determinant.
+
+>>> Matrix([2, 0, 0, 0, 3, 0, 0, 0, 4]).det()
+24.0
+)")
+      .def("init_i", &Matrix::InitI, R"(
+Makes it the identity.
+
+>>> turn = Matrix()
+>>> turn.init_mx_my_mz(0.1, 0.2, 0.3)
+>>> turn.init_i()
+>>> turn.det()
+1.0
+)")
       .def("init_mx_my_mz", &Matrix::InitMxMyMz, py::arg("ax"), py::arg("ay"), py::arg("az"),
-           "Makes it the product of the rotations about x, y and z.")
+           R"(
+Makes it the product of the rotations about x, y and z by angles in radians.
+
+>>> turn = Matrix()
+>>> turn.init_mx_my_mz(0.1, 0.2, 0.3)
+>>> [round(angle, 6) for angle in turn.get_angles_from_mx_my_mz()]
+[0.1, 0.2, 0.3]
+)")
       .def("init_mz_my_mx", &Matrix::InitMzMyMx, py::arg("ax"), py::arg("ay"), py::arg("az"),
-           "Makes it the product of the rotations about z, y and x.")
-      .def("get_angles_from_mx_my_mz", &AnglesMxMyMz, "The angles [ax, ay, az] of init_mx_my_mz.")
-      .def("get_angles_from_mz_my_mx", &AnglesMzMyMx, "The angles [ax, ay, az] of init_mz_my_mx.")
+           R"(
+Makes it the product of the rotations about z, y and x by angles in radians.
+
+>>> turn = Matrix()
+>>> turn.init_mz_my_mx(0.1, 0.2, 0.3)
+>>> [round(angle, 6) for angle in turn.get_angles_from_mz_my_mx()]
+[0.1, 0.2, 0.3]
+)")
+      .def("get_angles_from_mx_my_mz", &AnglesMxMyMz, R"(
+The angles [ax, ay, az] of init_mx_my_mz, radians.
+
+>>> turn = Matrix()
+>>> turn.init_mx_my_mz(0.1, 0.2, 0.3)
+>>> [round(angle, 6) for angle in turn.get_angles_from_mx_my_mz()]
+[0.1, 0.2, 0.3]
+)")
+      .def("get_angles_from_mz_my_mx", &AnglesMzMyMx, R"(
+The angles [ax, ay, az] of init_mz_my_mx, radians.
+
+>>> [abs(angle) for angle in Matrix().get_angles_from_mz_my_mx()]
+[0.0, 0.0, 0.0]
+)")
       .def("mxv", &TimesColumn, py::arg("vector"),
-           "The matrix times a column of three numbers; a fourth and fifth ride along.")
-      .def("vxm", &TimesRow, py::arg("vector"), "A row of numbers times the matrix.")
-      .def("quantity_of_data_elements", &Matrix::QuantityOfDataElements, "9.")
+           R"(
+The matrix times a column of three numbers, as an array (3,). Of a column of five the last two come
+back as they are. Raises ValueError for another number of them.
+
+>>> Matrix([1, 2, 0, 0, 1, 0, 0, 0, 1]).mxv([1, 1, 1])
+array([3., 1., 1.])
+)")
+      .def("vxm", &TimesRow, py::arg("vector"), R"(
+A row of three numbers, or of five as for mxv, times the matrix, as an array.
+
+>>> Matrix([1, 2, 0, 0, 1, 0, 0, 0, 1]).vxm([1, 1, 1])
+array([1., 3., 1.])
+)")
+      .def("quantity_of_data_elements", &Matrix::QuantityOfDataElements, R"(
+How many elements it has.
+
+>>> Matrix().quantity_of_data_elements()
+9
+)")
       .def("reorth", py::overload_cast<int>(&Matrix::Reorth), py::arg("terms"),
-           "Pulls it back to a rotation by so many terms of a series.")
-      .def("transpose", &Matrix::Transpose, "Exchanges rows and columns.")
-      .def("to_array", &ToArray, "The elements as an array (3, 3).")
+           R"(
+Pulls it back to a rotation by so many terms of a series; answers whether that went well.
+
+>>> drifted = Matrix([1.001, 0, 0, 0, 1.001, 0, 0, 0, 1.001])
+>>> drifted.reorth(8)
+True
+>>> round(drifted.det(), 9)
+1.0
+)")
+      .def("transpose", &Matrix::Transpose, R"(
+Exchanges rows and columns.
+
+>>> upper = Matrix([1, 2, 0, 0, 1, 0, 0, 0, 1])
+>>> upper.transpose()
+>>> upper.to_array()[1]
+array([2., 1., 0.])
+)")
+      .def("to_array", &ToArray, R"(
+The elements as an array (3, 3).
+
+>>> Matrix().to_array()[0]
+array([1., 0., 0.])
+)")
       .def(
           "__mul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
           "The product of two matrices.")
