@@ -22,13 +22,17 @@ class Line:
 
     Attributes
     ----------
-    start, end : (float, float)
-        Where it begins and ends.
+    start : (float, float)
+        Where it begins, (x, y).
+    end : (float, float)
+        Where it ends, (x, y).
     points : (int, int) or None
         Positions of the first and the last point that it covers; None when that is not known. In
         a closed contour first > last means from first to the end of the input and on from its
         beginning to last. Neighbouring pieces may share a point.
 
+    Examples
+    --------
     >>> Line((0, 0), (3, 4)).length
     5.0
     """
@@ -54,8 +58,10 @@ class Arc:
 
     Attributes
     ----------
-    start, end : (float, float)
-        Where it begins and ends.
+    start : (float, float)
+        Where it begins, (x, y).
+    end : (float, float)
+        Where it ends, (x, y).
     center : (float, float)
         Of the circle.
     radius : float
@@ -67,6 +73,8 @@ class Arc:
     points : (int, int) or None
         As for Line.
 
+    Examples
+    --------
     >>> Arc((1, 0), (0, 1), (0, 0), 1.0, True, 1.5).length
     1.5
     """
