@@ -581,10 +581,19 @@ class VORN_EXPORT GeometryUtils {
   ///       (Mixed). Map and machine coordinates are like that. Take an offset off first that makes
   ///       every difference exact, such as a whole number near the middle of the points, and add it
   ///       to the ends and centres of the result; the program does so.
-  /// @note Cost: a segment over m points takes about m overlaps of a pair cell with the running
-  ///       cell; an arc over m points is fitted anew for every length, so O(m^2) triples. Running
-  ///       cells are bounded at 78125 (lines) and 19531 (arcs) triangles. SingleArc compares all
-  ///       pairs of points, O(n^2).
+  /// @note Cost, in narrowings of a cell, each of which cuts the triangles of one cell by those of
+  ///       another. Running cells are bounded at 78125 triangles (lines) and 19531 (arcs), copies
+  ///       included, of which equal ones are cut once. Mixed takes at most five narrowings a point
+  ///       on lines, arcs, spirals and zigzags, exact or noisy, with tolerances over six orders of
+  ///       magnitude: 1 to 200 us a point. MixedCells takes less on the same points where its arcs
+  ///       fit; where they do not, they are tried again for every length, up to one narrowing a
+  ///       point for each point. SingleArc compares all pairs of points, O(n^2), in nanoseconds.
+  /// @note Costly inputs: tolerances of zero, and those below 1e-8 of the points' extent. Cells then
+  ///       accept a run that its measurement refuses, and it is grown again for every length: n/2
+  ///       narrowings a point with Mixed. 1000 exactly straight points with a tolerance of 1e-12 of
+  ///       their extent take 30 ms a point. With a tolerance of zero, cells also fill up with
+  ///       copies, all of which every centre sums: MixedCells takes 45 ms a point for 50 points and
+  ///       minutes for 250. Use FewestPieces for such points; the program warns of them.
   static ErrorCode CreateFittingCurve(std::vector<WPoint> const& points, FittingStrategy strategy,
                                       std::vector<Elem>* contour, double* maxDeviation,
                                       std::int32_t* maxDeviationIndex,

@@ -29,8 +29,6 @@ class ContourEdits(ContourRows):
         units : str
             "mm", "inch" and so on, for files; may be empty.
 
-        Examples
-        --------
         >>> from vorn import Contour
         >>> Contour.starting_at((1, 2)).append_line((4, 6)).length
         5.0
@@ -104,8 +102,6 @@ class ContourEdits(ContourRows):
         ValueError
             There would be less than two parts.
 
-        Examples
-        --------
         >>> from vorn import Contour
         >>> [p.end for p in Contour.starting_at((0, 0)).append_line((4, 0)).split(0)]
         [(2.0, 0.0), (4.0, 0.0)]
@@ -135,8 +131,6 @@ class ContourEdits(ContourRows):
         ccw : bool
             Whether the arc runs counter-clockwise, the y axis pointing up.
 
-        Examples
-        --------
         >>> from vorn import Contour
         >>> bend = Contour.starting_at((0, 0)).append_arc((2, 2), center=(0, 2), ccw=True)
         >>> bend[0].radius, round(bend.length, 6)

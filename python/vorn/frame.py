@@ -55,8 +55,6 @@ def fit(frame: Any, by: str = "scan", x: str = "x", y: str = "y", w: Optional[st
     ValueError
         `rows` is something else.
 
-    Examples
-    --------
     >>> import pandas
     >>> points = pandas.DataFrame({"scan": [7, 7, 7, 8], "x": [0, 1, 2, 0], "y": [0, 0, 0, 5]})
     >>> fit(points, tol=0.01, rows="scans")[["scan", "pieces", "length", "error"]]

@@ -34,8 +34,6 @@ class FitResult(NamedTuple):
     error : Exception or None
         None where it did not.
 
-    Examples
-    --------
     >>> result = next(fit_many([[(0, 0), (3, 4)]], tol=0.01))
     >>> result.number, result.contour.length, result.error
     (0, 5.0, None)
@@ -87,8 +85,6 @@ def fit_many(scans: Iterable[Any], tol: Optional[npt.ArrayLike] = None, client: 
         There is a progress, or batch is below 1. What is wrong with a scan or with the options of
         its fit is the error of its result.
 
-    Examples
-    --------
     >>> scans = [[(0, 0), (1, 0), (2, 0)], [(0, 0)], [(0, 0), (0, 3)]]
     >>> for number, path, contour, error in fit_many(scans, tol=0.01):
     ...     print(number, contour, error)

@@ -22,17 +22,13 @@ class Line:
 
     Attributes
     ----------
-    start : (float, float)
-        Where it begins, (x, y).
-    end : (float, float)
-        Where it ends, (x, y).
+    start, end : (float, float)
+        Where it begins and ends.
     points : (int, int) or None
         Positions of the first and the last point that it covers; None when that is not known. In
         a closed contour first > last means from first to the end of the input and on from its
         beginning to last. Neighbouring pieces may share a point.
 
-    Examples
-    --------
     >>> Line((0, 0), (3, 4)).length
     5.0
     """
@@ -58,10 +54,8 @@ class Arc:
 
     Attributes
     ----------
-    start : (float, float)
-        Where it begins, (x, y).
-    end : (float, float)
-        Where it ends, (x, y).
+    start, end : (float, float)
+        Where it begins and ends.
     center : (float, float)
         Of the circle.
     radius : float
@@ -73,8 +67,6 @@ class Arc:
     points : (int, int) or None
         As for Line.
 
-    Examples
-    --------
     >>> Arc((1, 0), (0, 1), (0, 0), 1.0, True, 1.5).length
     1.5
     """

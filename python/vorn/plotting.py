@@ -51,8 +51,6 @@ def plot(contour: Contour, points: Optional[npt.ArrayLike] = None,
     ContourError
         A point is not finite, or the contour has no pieces.
 
-    Examples
-    --------
     >>> import matplotlib
     >>> matplotlib.use("Agg")
     >>> contour = Contour.starting_at((0, 0)).append_line((4, 0))

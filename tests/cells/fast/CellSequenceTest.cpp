@@ -188,7 +188,6 @@ TEST(CellSequence, EmptyHasNoCentreAndNoBounds) {
   CellSequence const ofNothing{Cell{}};
   ExpectSameSummary({}, ofNothing);
   EXPECT_FALSE(ofNothing.CentreOfOverlapWith(Triangle{}));
-  EXPECT_FALSE(CellSequence().CentreOfOverlapWith(Triangle{}));
 }
 
 TEST(CellSequence, NarrowedByNothingIsEmpty) {
