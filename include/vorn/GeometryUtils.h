@@ -588,7 +588,8 @@ class VORN_EXPORT GeometryUtils {
   ///       magnitude: 1 to 200 us a point. MixedCells takes less on the same points where its arcs
   ///       fit; where they do not, they are tried again for every length, up to one narrowing a
   ///       point for each point. SingleArc compares all pairs of points, O(n^2), in nanoseconds.
-  /// @note Costly inputs: tolerances of zero, and those below 1e-8 of the points' extent. Cells then
+  /// @note Costly inputs: tolerances of zero, and those below 1e-8 of the points' extent. Cells
+  /// then
   ///       accept a run that its measurement refuses, and it is grown again for every length: n/2
   ///       narrowings a point with Mixed. 1000 exactly straight points with a tolerance of 1e-12 of
   ///       their extent take 30 ms a point. With a tolerance of zero, cells also fill up with
