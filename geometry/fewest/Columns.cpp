@@ -21,6 +21,70 @@ Lanes Magnitude(Lanes v) {
 
 Lanes Larger(Lanes v, Lanes u) { return v > u ? v : u; }
 
+/// The coefficients of the rows, an array for each.
+struct Coefficients {
+  double const* a;
+  double const* bx;
+  double const* by;
+  double const* d;
+};
+
+/// |row applied to a circle|, for one row, for two side by side or for a block of them. Every way
+/// adds the same products in the same order, so that all of them give the same bits.
+class Residuals {
+ public:
+  /// Reads the rows in place; they have to outlive this.
+  Residuals(Coefficients const& rows, Circle const& circle)
+      : rows_(rows),
+        circle_(circle),
+        a_{circle.a, circle.a},
+        bx_{circle.bx, circle.bx},
+        by_{circle.by, circle.by},
+        d_{circle.d, circle.d} {}
+
+  /// That of row i.
+  double At(std::int32_t i) const {
+    return std::fabs(
+        ((circle_.a * rows_.a[i] + circle_.bx * rows_.bx[i]) + circle_.by * rows_.by[i]) +
+        circle_.d * rows_.d[i]);
+  }
+
+  /// The largest of the kBlock rows from i on.
+  double LargestOfBlock(std::int32_t i) const {
+    Lanes even{0.0, 0.0};
+    Lanes odd{0.0, 0.0};
+    for (std::int32_t k = 0; k < kBlock; k += 4) {
+      even = Larger(PairAt(i + k), even);
+      odd = Larger(PairAt(i + k + 2), odd);
+    }
+    even = Larger(odd, even);
+    return even[0] > even[1] ? even[0] : even[1];
+  }
+
+  /// The first row of the block from i on that is not below its largest; the last row of the block
+  /// where none is.
+  std::int32_t FirstInBlock(std::int32_t i, double largest) const {
+    std::int32_t const last = i + kBlock - 1;
+    while (At(i) < largest && i < last) ++i;
+    return i;
+  }
+
+ private:
+  /// Those of rows i and i + 1.
+  Lanes PairAt(std::int32_t i) const {
+    return Magnitude(
+        ((a_ * Load(rows_.a + i) + bx_ * Load(rows_.bx + i)) + by_ * Load(rows_.by + i)) +
+        d_ * Load(rows_.d + i));
+  }
+
+  Coefficients rows_;
+  Circle circle_;
+  Lanes a_;
+  Lanes bx_;
+  Lanes by_;
+  Lanes d_;
+};
+
 }  // namespace
 
 void Columns::Clear() {
@@ -45,51 +109,25 @@ Row Columns::At(std::int32_t i) const {
 
 Columns::Worst Columns::FindWorst(std::int32_t first, std::int32_t last,
                                   Circle const& circle) const {
-  double const* const a = a_.data();
-  double const* const bx = bx_.data();
-  double const* const by = by_.data();
-  double const* const d = d_.data();
-  auto const valueAt = [&](std::int32_t i) {
-    return std::fabs(((circle.a * a[i] + circle.bx * bx[i]) + circle.by * by[i]) + circle.d * d[i]);
-  };
-  Lanes const ca{circle.a, circle.a};
-  Lanes const cx{circle.bx, circle.bx};
-  Lanes const cy{circle.by, circle.by};
-  Lanes const cd{circle.d, circle.d};
-  auto const pairAt = [&](std::int32_t i) {
-    return Magnitude(((ca * Load(a + i) + cx * Load(bx + i)) + cy * Load(by + i)) +
-                     cd * Load(d + i));
-  };
-
+  Residuals const residuals({a_.data(), bx_.data(), by_.data(), d_.data()}, circle);
   Worst worst;
-  std::int32_t worstBlock = -1;
+  bool isBlock = false;
   std::int32_t i = first;
   for (; i + kBlock <= last; i += kBlock) {
-    Lanes even{0.0, 0.0};
-    Lanes odd{0.0, 0.0};
-    for (std::int32_t k = 0; k < kBlock; k += 4) {
-      even = Larger(pairAt(i + k), even);
-      odd = Larger(pairAt(i + k + 2), odd);
-    }
-    even = Larger(odd, even);
-    double const largest = even[0] > even[1] ? even[0] : even[1];
+    double const largest = residuals.LargestOfBlock(i);
     if (largest > worst.value || worst.index < 0) {
-      worst.value = largest;
-      worst.index = worstBlock = i;
+      worst = {i, largest};
+      isBlock = true;
     }
   }
   for (; i < last; ++i) {
-    double const value = valueAt(i);
+    double const value = residuals.At(i);
     if (value > worst.value || worst.index < 0) {
       worst = {i, value};
-      worstBlock = -1;
+      isBlock = false;
     }
   }
-  if (worstBlock >= 0) {
-    while (valueAt(worst.index) < worst.value && worst.index < worstBlock + kBlock - 1) {
-      ++worst.index;
-    }
-  }
+  if (isBlock) worst.index = residuals.FirstInBlock(worst.index, worst.value);
   return worst;
 }
 

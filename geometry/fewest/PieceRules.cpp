@@ -75,9 +75,6 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
   return programme_->Add(broken) ? Check::Added : Check::Hopeless;
 }
 
-/// The feet of two points on a circle are as far apart as the points, divided by the distance of
-/// the nearer one from the centre in radii; `near2` is the square of that distance. Points nearer
-/// than their tolerance make no step.
 bool PieceRules::IsLargeStep(Circle const& circle, double gap2, double near2, double w) const {
   double const limit = kStepShare * path_.limits.sineOfHalfStep;
   return !(circle.a * circle.a * gap2 <= limit * limit * near2 || gap2 <= w * w);
@@ -105,39 +102,53 @@ bool PieceRules::IsFullTurn(Circle const& circle, Ends const& ends) const {
 
 PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const& opening,
                                              std::int32_t point) const {
-  Sample const sample = frame_.ToLocal(path_.At(point));
-  Place const p = PlaceOf(sample);
-  Gate gate = opening.gate;
-  gate.origin = frame_.ToLocal(gate.origin);
-  double const sense = point >= gate.split ? 1.0 : -1.0;
-  bool const isFixed = opening.low == opening.high;
-  double offset = opening.low * frame_.scale;
-  if (!isFixed && !FindCrossing(circle, gate, &offset)) return Check::Hopeless;
-  Place const joint = PlaceOn(gate, offset);
-  double const dx = p.x - joint.x;
-  double const dy = p.y - joint.y;
-  double const room = share_ * sample.w;
-  double const gap2 = dx * dx + dy * dy;
-  if (point == (sense > 0.0 ? gate.split : gate.split - 1)) {
-    double const near2 = SquaredGradient(circle, p);
-    if (IsLargeStep(circle, gap2, near2, sample.w)) return AddStep(gap2, near2);
+  std::optional<JointView> const found = ViewJoint(circle, opening, point);
+  if (!found) return Check::Hopeless;
+  JointView const& view = *found;
+  if (view.isNextToGate) {
+    double const near2 = SquaredGradient(circle, view.point);
+    if (IsLargeStep(circle, view.gap2, near2, view.tolerance)) return AddStep(view.gap2, near2);
   }
   // From a quarter turn on the direction at the point says nothing about its order.
-  if (2.0 * circle.a * circle.a * gap2 > 1.0) return Check::Holds;
-  Row const advance = AdvanceRow(p, sense * dx, sense * dy);
-  if (Apply(advance, circle) >= -kRoundingRoom * sample.w ||
-      gap2 <= room * room * (1.0 + kRoundingRoom)) {
+  if (2.0 * circle.a * circle.a * view.gap2 > 1.0) return Check::Holds;
+  double const room = share_ * view.tolerance;
+  Row const advance = AdvanceRow(view.point, view.sense * view.dx, view.sense * view.dy);
+  if (Apply(advance, circle) >= -kRoundingRoom * view.tolerance ||
+      view.gap2 <= room * room * (1.0 + kRoundingRoom)) {
     return Check::Holds;
   }
-  if (isFixed) {
-    Condition const condition{Negated(advance), Condition::Kind::HalfSpace, 0.0};
-    return programme_->Add(condition) ? Check::Added : Check::Hopeless;
-  }
-  // The offsets for which the point lies beside the piece end at a limit; those within tolerance of
-  // the point may go beyond.
-  Place const normal = GradientAt(circle, p);
-  double const fromOriginX = p.x - gate.origin.x;
-  double const fromOriginY = p.y - gate.origin.y;
+  if (!view.isFixed) return AddOffsetLimit(circle, view);
+  Condition const condition{Negated(advance), Condition::Kind::HalfSpace, 0.0};
+  return programme_->Add(condition) ? Check::Added : Check::Hopeless;
+}
+
+std::optional<PieceRules::JointView> PieceRules::ViewJoint(Circle const& circle,
+                                                           Opening const& opening,
+                                                           std::int32_t point) const {
+  Sample const sample = frame_.ToLocal(path_.At(point));
+  JointView view;
+  view.point = PlaceOf(sample);
+  view.tolerance = sample.w;
+  view.gate = opening.gate;
+  view.gate.origin = frame_.ToLocal(opening.gate.origin);
+  view.sense = point >= view.gate.split ? 1.0 : -1.0;
+  view.isNextToGate = point == (view.sense > 0.0 ? view.gate.split : view.gate.split - 1);
+  view.isFixed = opening.low == opening.high;
+  view.offset = opening.low * frame_.scale;
+  if (!view.isFixed && !FindCrossing(circle, view.gate, &view.offset)) return {};
+  Place const joint = PlaceOn(view.gate, view.offset);
+  view.dx = view.point.x - joint.x;
+  view.dy = view.point.y - joint.y;
+  view.gap2 = view.dx * view.dx + view.dy * view.dy;
+  return view;
+}
+
+PieceRules::Check PieceRules::AddOffsetLimit(Circle const& circle, JointView const& view) const {
+  Gate const& gate = view.gate;
+  Place const normal = GradientAt(circle, view.point);
+  double const room = share_ * view.tolerance;
+  double const fromOriginX = view.point.x - gate.origin.x;
+  double const fromOriginY = view.point.y - gate.origin.y;
   double const slope = normal.y * gate.across.x - normal.x * gate.across.y;
   double const foot = fromOriginX * gate.across.x + fromOriginY * gate.across.y;
   double const apart = fromOriginX * gate.across.y - fromOriginY * gate.across.x;
@@ -145,7 +156,7 @@ PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const
   double const half = reach > 0.0 ? std::sqrt(reach) : -1.0;
   bool const hasLimit = std::fabs(slope) > kLeastSlope;
   double limit = hasLimit ? (normal.y * fromOriginX - normal.x * fromOriginY) / slope : foot;
-  bool const isUpper = offset > limit;
+  bool const isUpper = view.offset > limit;
   if (std::fabs(limit - foot) <= half) {
     limit = isUpper ? foot + half : foot - half;
   } else if (!hasLimit) {

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <cstdint>
+#include <optional>
 
 #include "geometry/fewest/Columns.h"
 #include "geometry/fewest/Gates.h"
@@ -42,11 +43,39 @@ class PieceRules {
   Check AddBroken(Circle const& circle, Ends const& ends) const;
 
  private:
+  /// A point near a gate of the piece, and the joint on that gate, in local coordinates.
+  struct JointView {
+    Place point;
+    double tolerance = 0.0;  ///< of the point
+    Gate gate;
+    double sense = 1.0;         ///< 1 where the point follows the gate, -1 where it precedes it
+    bool isNextToGate = false;  ///< whether no other point lies between
+    bool isFixed = false;       ///< whether the gate leaves the joint one place
+    double offset = 0.0;        ///< of the joint on the gate
+    double dx = 0.0;            ///< from the joint to the point
+    double dy = 0.0;
+    double gap2 = 0.0;  ///< the square of that distance
+  };
+
+  /// The order of the points along the circle, the greatest step and less than a full turn.
   Check AddBrokenOrder(Circle const& circle, Ends const& ends) const;
+  /// Whether two points are further apart along the circle than the greatest step. Their feet on
+  /// the circle are as far apart as the points, divided by the distance of the nearer one from the
+  /// centre in radii; `near2` is the square of that distance. Points nearer than `w` make no step.
   bool IsLargeStep(Circle const& circle, double gap2, double near2, double w) const;
+  /// Bounds the curvature so that two points this far apart are within the greatest step.
   Check AddStep(double gap2, double near2) const;
+  /// Whether the points and joints of the piece turn about the centre by more than 2 pi.
   bool IsFullTurn(Circle const& circle, Ends const& ends) const;
+  /// The rules between a joint and one of the points next to it: the step between the two, and that
+  /// the point does not lie beyond the joint.
   Check AddBrokenJoint(Circle const& circle, Opening const& opening, std::int32_t point) const;
+  /// How the point sees the joint; nothing where the circle does not cross the gate.
+  std::optional<JointView> ViewJoint(Circle const& circle, Opening const& opening,
+                                     std::int32_t point) const;
+  /// The offsets for which the point lies beside the piece end at a limit; those within tolerance
+  /// of the point may go beyond. Keeps the joint on its side of the limit.
+  Check AddOffsetLimit(Circle const& circle, JointView const& view) const;
 
   Path const& path_;
   LocalFrame const& frame_;
