@@ -18,6 +18,7 @@ struct FewestOptions {
   std::optional<double> between;
 };
 
+/// Adds the options to a command; they fill in `options` when its words are read.
 void AddFewestOptions(Command& command, FewestOptions* options);
 
 /// The options as the service takes them.

@@ -69,7 +69,6 @@ bool FlatSearch::AreAllPairsValid() const {
   return true;
 }
 
-/// Whether all pieces of a run are inside the data and none of its arcs makes a pair invalid.
 bool FlatSearch::IsValid(Run const& run, bool hasStraight) const {
   std::int64_t const count = run.CountPieces();
   if (count == 0) return true;
@@ -83,7 +82,6 @@ bool FlatSearch::IsValid(Run const& run, bool hasStraight) const {
   return true;
 }
 
-/// What the pieces of a run are compared with after it: for either layout the longest stretch.
 std::vector<Run> FlatSearch::LaterStretches(std::size_t r) const {
   std::vector<Run> stretches;
   for (std::int32_t const kind : {kVertexRun, kRecordRun}) {

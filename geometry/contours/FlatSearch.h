@@ -31,9 +31,13 @@ class FlatSearch {
   bool HasCrossing() const;
 
  private:
+  /// Whether all pieces of a run are inside the data and none of its arcs makes a pair invalid.
   bool IsValid(Run const& run, bool hasStraight) const;
+  /// What the pieces of run r are compared with after it: for either layout the longest stretch.
   std::vector<Run> LaterStretches(std::size_t r) const;
+  /// Whether two pieces of the run cross, from FirstStep of its kind apart on.
   bool HasCrossingWithin(Run const& run) const;
+  /// Whether a piece of the run crosses one of the stretch.
   bool HasCrossingBetween(Run const& run, Run const& stretch) const;
 
   Data const& data_;

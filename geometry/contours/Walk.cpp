@@ -2,7 +2,6 @@
 
 namespace Vorn::Contours {
 
-/// The first element that this one is tested against, or null.
 Elem const* Walk::FirstCandidate(Elem const* elem) const {
   Elem const* const next = Next(elem);
   if (next == nullptr) return nullptr;

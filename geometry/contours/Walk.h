@@ -46,6 +46,7 @@ class Walk {
   ErrorCode Scan(Elem const* elem, Pass pass) const;
 
  private:
+  /// The first element that this one is tested against; null when there is none.
   Elem const* FirstCandidate(Elem const* elem) const;
 
   Elem const* end_;

@@ -35,6 +35,7 @@ struct PieceDeviation {
   double value = 0.0;
   std::int32_t index = -1;
 };
+/// The first of equal ones counts; index -1 for no points.
 PieceDeviation MeasurePiece(Path const& path, BuiltPiece const& piece, std::int32_t first,
                             std::int32_t end);
 

@@ -51,7 +51,6 @@ bool FreeRun::Try(std::int32_t end) {
   return true;
 }
 
-/// The circle may hold for more points than it was asked for: the end of those below `bad`.
 std::int32_t FreeRun::ExtendCovered(std::int32_t good, std::int32_t bad) {
   auto const count = static_cast<std::int32_t>(points_.size());
   while (good + 1 < bad && good < count) {

@@ -17,6 +17,7 @@ namespace Vorn::Fewest {
 /// Finds longest runs; keeps its memory from one to the next.
 class FreeRun {
  public:
+  /// Reads the points in place; they have to outlive it.
   FreeRun(std::span<WPoint const> points, Limits const& limits)
       : points_(points), limits_(limits) {}
 
@@ -29,9 +30,14 @@ class FreeRun {
   Circle Covering() const { return LocalFrame().Convert(frame_, circle_); }
 
  private:
+  /// Moves the local coordinates to a start and empties the programme but for the limits of radii.
   void Begin(std::int32_t start, std::int32_t expected);
+  /// Makes the programme that of the points up to `end`.
   void Extend(std::int32_t end);
+  /// Whether one circle covers the points up to `end`; keeps that circle and its basis if so.
   bool Try(std::int32_t end);
+  /// The circle may hold for more points than it was asked for: the end of those below `bad`, at
+  /// least `good`.
   std::int32_t ExtendCovered(std::int32_t good, std::int32_t bad);
 
   std::span<WPoint const> points_;

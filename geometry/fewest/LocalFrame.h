@@ -20,10 +20,13 @@ struct LocalFrame {
   double originY = 0.0;
   double scale = 1.0;
 
+  /// A point of the path with its tolerance, in local coordinates.
   Sample ToLocal(WPoint const& p) const {
     return {(p.x - originX) * scale, (p.y - originY) * scale, p.w * scale};
   }
+  /// A place in local coordinates.
   Place ToLocal(Place const& p) const { return {(p.x - originX) * scale, (p.y - originY) * scale}; }
+  /// A place in the coordinates of the path.
   Place FromLocal(Place const& p) const { return {p.x / scale + originX, p.y / scale + originY}; }
   /// A normalised circle of another frame in this one.
   Circle Convert(LocalFrame const& other, Circle const& c) const {

@@ -25,7 +25,9 @@ struct Path {
   Opening start;
   Opening finish;
 
+  /// How many points there are.
   std::int32_t Count() const { return static_cast<std::int32_t>(points.size()); }
+  /// The point of an index in [0, Count()).
   WPoint const& At(std::int32_t i) const { return points[static_cast<std::size_t>(i)]; }
 };
 

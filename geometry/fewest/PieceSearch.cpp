@@ -71,8 +71,6 @@ void PieceSearch::Cover(std::int32_t first, std::int32_t last) {
   }
 }
 
-/// A piece that passes the middle of the way between neighbours this near stays near all of the
-/// way.
 Sample PieceSearch::MiddleOf(WPoint const& p, WPoint const& q) const {
   double const room = path_.limits.farthestBetweenPoints + share_ * std::max(p.w, q.w);
   return frame_.ToLocal(WPoint{0.5 * (p.x + q.x), 0.5 * (p.y + q.y), room * (1.0 - kRoundingRoom)});

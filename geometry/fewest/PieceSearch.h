@@ -74,21 +74,33 @@ class PieceSearch {
   RunFit FitLongestAlone(std::int32_t first);
 
  private:
+  /// Has the rows of the points [first, last) in the columns; moves the local coordinates where
+  /// they do not follow on those that are there.
   void Cover(std::int32_t first, std::int32_t last);
   /// Two where pieces have to stay near the path between points: its middle has a row of its own.
   std::int32_t RowsPerPoint() const {
     return std::isfinite(path_.limits.farthestBetweenPoints) ? 2 : 1;
   }
+  /// The middle between neighbours with the room that a piece has there. A piece that passes it
+  /// this near stays near all of the way.
   Sample MiddleOf(WPoint const& p, WPoint const& q) const;
+  /// Begins a programme of the rows of [first, last) without conditions.
   void UseRows(std::int32_t first, std::int32_t last);
+  /// Begins the programme of a piece from an opening over the points up to `end`: rows, limit of
+  /// curvature, opening.
   void BeginProgramme(Opening const& from, std::int32_t end);
+  /// Asks that the piece passes between the limits of an opening; a free one asks nothing.
   void AddOpening(Opening const& opening);
+  /// Asks for a radius of at least the smallest, for steps below the greatest, or for a line where
+  /// only segments are wanted; the box follows from that.
   void LimitCurvature(Opening const& from, std::int32_t end);
   struct Extreme {
     double offset = 0.0;
     Circle circle;
     bool isFound = false;
   };
+  /// The lowest or highest offset at which a piece can end on the gate of `ends`, from a circle
+  /// inside; not found where that circle does not cross the gate.
   Extreme FindExtreme(Ends const& ends, RunFit const& inner, bool isLow);
 
   /// A piece whose radius would be above the largest is straight or, where no line is within the
@@ -99,14 +111,24 @@ class PieceSearch {
   /// Asks for arcs near a circle, bent to its side, that are not flatter than that; false when
   /// there is no room.
   bool KeepBent(Circle const& circle);
+  /// Finds a circle that keeps the programme and the rules of a piece; radii have no upper limit
+  /// here.
   RunFit FitAnyRadius(RunFit const& start, bool isTest, Ends const& ends);
+  /// The rules in the local coordinates of now.
   PieceRules Rules() { return {path_, frame_, share_, &programme_}; }
+  /// The longest run of few points, each length begun anew from several chords. The circle is in
+  /// local coordinates.
   Reach FindFirstReach(Opening const& from);
+  /// Lengthens a reach by doubling steps and then by bisection; the circle is in local coordinates.
   void Grow(Opening const& from, std::int32_t expected, Reach* reach);
   /// The fit of the programme for a start in the coordinates of the path, and in these.
   RunFit FitFrom(RunFit const& start, Ends const& ends);
+  /// The best of fits that begin with chords to points ever further ahead; ends with the first that
+  /// covers all points.
   RunFit FirstFit(Opening const& from, std::int32_t end);
+  /// A normalised circle of the path in local coordinates.
   Circle ToLocal(Circle const& circle) const;
+  /// A normalised local circle in the coordinates of the path.
   Circle FromLocal(Circle const& circle) const;
 
   Path const& path_;

@@ -114,7 +114,6 @@ void Polytope::AddCornersOnEdges(std::array<double, kMostCorners> const& excess,
   }
 }
 
-/// Adds the corner at a share of the edge that leads from a corner off one of its planes.
 void Polytope::AddCorner(int from, int plane, double share) {
   Corner& old = corners_[At(from)];
   Corner& fresh = corners_[At(count_)];
@@ -133,7 +132,6 @@ void Polytope::AddCorner(int from, int plane, double share) {
   ++count_;
 }
 
-/// The links of kept corners to the new ones go back to the corners cut off.
 void Polytope::RemoveAdded(int firstNew) {
   for (int k = firstNew; k < count_; ++k) {
     Corner const& made = corners_[At(k)];
@@ -152,7 +150,6 @@ void Polytope::LinkNewCorners(int firstNew) {
   }
 }
 
-/// Neighbours share the new plane and two of the three others.
 void Polytope::LinkIfNeighbours(int i, int k) {
   Corner& one = corners_[At(i)];
   Corner& other = corners_[At(k)];

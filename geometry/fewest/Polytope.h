@@ -25,6 +25,7 @@ class Polytope {
     Circle circle;
     double form = -1.0;
   };
+  /// Form -1 when the polytope is empty or the form is nowhere above that.
   Peak FindPeak() const;
 
   /// Cuts off row > limit. Answers false when there is no room for the new corners or the new
@@ -50,13 +51,23 @@ class Polytope {
     double limit = 0.0;
   };
 
+  /// Notes the boundary row = limit; there must be room.
   void AddPlane(Row const& row, double limit);
+  /// Places a corner where its four planes meet, rounded on its own planes and not on the way
+  /// between its neighbours; leaves it where they depend on each other.
   void Sharpen(Corner* corner) const;
+  /// Adds a corner on every edge from a kept corner to one that is cut off, and counts them; -1,
+  /// and nothing changed, when there is no room.
   void AddCornersOnEdges(std::array<double, kMostCorners> const& excess, int* added);
+  /// Adds the corner at a share of the edge that leads from a corner off one of its planes.
   void AddCorner(int from, int plane, double share);
+  /// Takes the new corners out again; links of kept corners to them go back to the corners cut off.
   void RemoveAdded(int firstNew);
+  /// Links the new corners with each other.
   void LinkNewCorners(int firstNew);
+  /// Links two new corners if they share, besides the new plane, two of the three others.
   void LinkIfNeighbours(int i, int k);
+  /// Takes out the old corners of positive excess and renumbers the links.
   void RemoveCut(std::array<double, kMostCorners> const& excess, int oldCount);
 
   std::array<Corner, kMostCorners> corners_;

@@ -48,7 +48,9 @@ struct Programme {
 
   /// The row, the kind and the limit of a row that a basis may hold.
   Row RowOf(std::int32_t id) const;
+  /// Of points and the box: a slab.
   Condition::Kind KindOf(std::int32_t id) const;
+  /// Of points: 1.
   double LimitOf(std::int32_t id) const;
   /// Whether there is no row of that id any more.
   bool IsStale(std::int32_t id) const;

@@ -26,6 +26,7 @@ class Progress {
  private:
   static constexpr std::int64_t kWhole = 100;
 
+  /// Tells a percentage that is above all told before.
   void Report(std::int32_t percent) {
     if (state_ == nullptr || percent <= last_) return;
     last_ = percent;

@@ -50,14 +50,25 @@ class Simplex {
     bool isFound = false;
   };
 
+  /// Takes over the rows of a basis, stale ones replaced by the box, and inverts them; false when
+  /// they depend on each other.
   bool Load(Programme const& programme, Basis* basis);
+  /// Has every equality in the basis; false when one depends on the others.
   bool TakeEqualities(Programme const& programme, Basis* basis);
+  /// Whether the solution lies on the rows of its basis within a share of the slack.
   bool IsAccurate(double slack) const;
+  /// Turns or exchanges rows until no step along one raises the objective; false when rounding
+  /// prevents it.
   bool MakeDualFeasible(Programme const& programme, Row const& objective, Basis* basis);
+  /// The circle where the rows of the basis meet their limits.
   void Solve();
+  /// The row that the solution breaks most, by more than the slack; not found when there is none.
   Entry Price(Programme const& programme, double slack) const;
+  /// The row of the basis that may leave for the entering one so that the basis stays dual
+  /// feasible, and how long the step is; -1 when the rows contradict each other.
   int FindLeaving(Programme const& programme, Basis const& basis, std::array<double, 4> const& step,
                   double* length) const;
+  /// Puts the entering row in place of the leaving one and updates inverse and duals.
   void Exchange(int leaving, Entry const& entry, std::array<double, 4> const& step);
 
   double slack_;

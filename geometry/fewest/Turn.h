@@ -10,6 +10,7 @@ namespace Vorn::Fewest {
 /// angles between neighbours, each from -pi to pi. Laps count.
 class Turn {
  public:
+  /// About a normalised circle; a line has no centre and makes no turn.
   explicit Turn(Circle const& circle) : circle_(circle) {}
 
   /// Goes on to a place.

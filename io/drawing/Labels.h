@@ -21,7 +21,9 @@ class Labels {
 
   /// Something is drawn here.
   void Take(Pixel const& at);
+  /// The same for all of a circle, in pixels.
   void TakeRing(Pixel const& at, double radius);
+  /// The same along a piece, which labels of others are not cut off by either.
   void TakePiece(Piece const& piece);
 
   /// The text element beside the piece; nothing when there is no room.
@@ -31,9 +33,14 @@ class Labels {
   std::string AddAnywhere(Piece const& piece, std::string const& text);
 
  private:
+  /// The text element in its place, which is taken from now on.
   std::string Write(Piece const& piece, Rect const& rect, std::string const& text);
+  /// The label in the nearest free place around with a line to the anchor; nothing when there is
+  /// none.
   std::string AddWithLeader(Piece const& piece, Anchor const& anchor, std::string const& text);
+  /// Whether the place is inside the frame and nothing is drawn there.
   bool IsFree(Rect const& rect) const;
+  /// Whether no piece and no label lies on the way of the line.
   bool IsLeaderFree(Pixel const& from, Pixel const& to) const;
   /// Whether another piece runs between the anchor and a label this far away.
   bool IsCutOff(Anchor const& anchor, double side, double distance) const;

@@ -20,7 +20,9 @@ inline constexpr int kBlackOrWhite = 7;
 /// The text of a file, group by group.
 class Writer {
  public:
+  /// A group: the code and the value, a line for each.
   void Group(int code, std::string const& value);
+  /// A group with a number that reads back to the same bits, without an exponent.
   void Number(int code, double value);
 
   /// x and y under `code` and `code` + 10.
@@ -37,10 +39,13 @@ class Writer {
 
   /// A section up to End().
   void Begin(std::string const& section);
+  /// Ends the section begun last.
   void End();
 
+  /// Begins an entity of R12 on a layer.
   void Entity(std::string const& type, std::string const& layer);
 
+  /// All groups so far.
   std::string const& Text() const { return text_; }
 
  private:

@@ -77,6 +77,7 @@ class Stairs {
   static constexpr unsigned kDownward = 8;
   static constexpr unsigned kEverySense = kRightward | kLeftward | kUpward | kDownward;
 
+  /// Of the senses in which the boxes are a staircase, a sum of the bits above.
   explicit Stairs(unsigned senses) : senses_(static_cast<std::uint8_t>(senses)) {}
 
   std::uint8_t senses_;

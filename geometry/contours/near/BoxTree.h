@@ -56,6 +56,7 @@ class BoxTree {
   };
 
   struct Node {
+    /// Of a single piece.
     explicit Node(Extent const& extent)
         : box(extent.box), stairs(Stairs::Of(extent.box)), hasPoint(extent.box.IsPoint()) {}
 
@@ -73,27 +74,40 @@ class BoxTree {
 
   static constexpr std::size_t kPiecesPerLeaf = kMostParts;
 
+  /// Nodes over kPiecesPerLeaf consecutive pieces each, the last one over the rest.
   std::vector<Node> MakeLeaves() const;
+  /// Nodes over two children each, the last one over one where their number is odd.
   static std::vector<Node> MakeParents(std::vector<Node> const& children);
 
   /// Of a node whose box is not empty. Amortised O(1): each is formed once.
   Trapezium const& TrapeziumAt(Place const& place);
+  /// The trapezium around the pieces of a leaf, or around the trapezia of both children.
   Trapezium FormTrapezium(Place const& place);
 
+  /// Whether a bound says that no piece of my node meets one of theirs. Neighbours on the chain and
+  /// nodes that hold a point are told apart by their boxes only.
   bool AreApart(Place const& mine, BoxTree& other, Place const& theirs);
 
+  /// Where the whole tree begins; only for a tree that has pieces.
   Place Root() const { return {levels_.size() - 1, 0}; }
+  /// The node at a place.
   Node const& NodeAt(Place const& place) const { return levels_[place.level][place.number]; }
+  /// The child with the earlier pieces, which every node above the leaves has.
   static Place FirstChild(Place const& place) { return {place.level - 1, 2 * place.number}; }
+  /// Whether a node above the leaves has a child with later pieces too.
   bool HasSecondChild(Place const& place) const {
     return 2 * place.number + 1 < levels_[place.level - 1].size();
   }
+  /// The child with the later pieces.
   static Place SecondChild(Place const& place) { return {place.level - 1, 2 * place.number + 1}; }
+  /// The number of the first piece of a leaf.
   static std::size_t FirstPiece(Place const& leaf) { return leaf.number * kPiecesPerLeaf; }
+  /// One past the number of the last piece of a leaf.
   std::size_t EndOfPieces(Place const& leaf) const {
     return std::min(FirstPiece(leaf) + kPiecesPerLeaf, extents_.size());
   }
 
+  /// Whether the test answers true for a pair of pieces below one node.
   template <typename Test>
   bool AnyPairWithin(Place const& place, Neighbours neighbours, Test const& test) {
     if (neighbours == Neighbours::LeftOut && NodeAt(place).stairs.AreMonotone()) return false;
@@ -104,6 +118,7 @@ class BoxTree {
            AnyPairBetween(FirstChild(place), *this, SecondChild(place), test);
   }
 
+  /// The same for a leaf: every pair whose boxes are not apart.
   template <typename Test>
   bool AnyPairOfLeaf(Place const& leaf, Neighbours neighbours, Test const& test) const {
     std::size_t const leastStep = neighbours == Neighbours::LeftOut ? 2 : 1;
@@ -116,6 +131,7 @@ class BoxTree {
     return false;
   }
 
+  /// Whether the test answers true for a piece below my node and one below theirs.
   template <typename Test>
   bool AnyPairBetween(Place const& mine, BoxTree& other, Place const& theirs, Test const& test) {
     if (AreApart(mine, other, theirs)) return false;
@@ -129,6 +145,7 @@ class BoxTree {
     return search(FirstChild(mine)) || (HasSecondChild(mine) && search(SecondChild(mine)));
   }
 
+  /// The same with their node divided.
   template <typename Test>
   bool AnyPairWithChildren(Place const& mine, BoxTree& other, Place const& theirs,
                            Test const& test) {
@@ -136,6 +153,7 @@ class BoxTree {
            (other.HasSecondChild(theirs) && AnyPairBetween(mine, other, SecondChild(theirs), test));
   }
 
+  /// The same for two leaves: every pair whose boxes are not apart.
   template <typename Test>
   bool AnyPairOfLeaves(Place const& mine, BoxTree& other, Place const& theirs, Test const& test) {
     std::size_t near[kPiecesPerLeaf];

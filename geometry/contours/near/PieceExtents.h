@@ -53,12 +53,20 @@ class PieceExtents {
   double SlantedMargin() const;
 
  private:
+  /// Enters the regions of segments, and empty ones for arcs, and takes note of the largest ends
+  /// and coordinates. Segments with irregular ends go to the irregular pieces.
   void AddSegments(std::vector<Piece> const& pieces, Extents* extents);
+  /// Takes note of the largest centre coordinate and radius of regular arcs.
   void MeasureArcs(std::vector<Piece> const& pieces);
+  /// Enters the regions of arcs. Called when all sets are measured.
   void AddArcs(std::vector<Piece> const& pieces, Extents* extents) const;
 
+  /// Whether the bounds on rounding hold for the arc: centre and radius in range and not far larger
+  /// than the ends of all pieces, angles finite.
   bool IsRegular(Arc const& arc) const;
+  /// The box around what the arc covers between its angles, widened by PaddingOf.
   Box BoxOfArc(Arc const& arc) const;
+  /// How far a common point of the arc may lie off its circle.
   double PaddingOf(Arc const& arc) const;
 
   std::vector<Extents> extents_;

@@ -40,7 +40,6 @@ std::optional<Coverage> Coverage::Of(Chain const& chain) {
   return coverage;
 }
 
-/// False when a point is left out or covered twice.
 bool Coverage::NumberPoints() {
   std::size_t const size = chain_.points.size();
   auto next = static_cast<std::size_t>(chain_.ranges.front().first);

@@ -24,7 +24,9 @@ struct DrawnPiece {
   double length = 0.0;
 };
 
+/// The piece that an element makes from a point on.
 DrawnPiece Draw(GeometryUtils::Point const& start, GeometryUtils::Elem const& elem);
+/// The segment between two points.
 DrawnPiece DrawSegment(GeometryUtils::Point const& start, GeometryUtils::Point const& end);
 
 enum class Beside { Start, Piece, End };
@@ -40,6 +42,7 @@ struct Place {
   double left = 0.0;      ///< deviation from the whole line or circle, positive on the left
 };
 
+/// Where p lies to a piece; of a piece without length beside its start.
 Place PlaceOf(DrawnPiece const& piece, GeometryUtils::Point const& p);
 
 /// |p - centre|^2 - radius^2 of an arc's circle, exact but for one rounding.

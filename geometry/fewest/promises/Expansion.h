@@ -13,6 +13,7 @@ namespace Vorn::Promises {
 class Expansion {
  public:
   Expansion() = default;
+  /// A double as it is.
   explicit Expansion(double value) { Add(value); }
 
   /// The exact difference of two doubles.

@@ -22,6 +22,7 @@ struct Meetings {
   Meeting list[kMost];
   std::size_t count = 0;
 
+  /// Appends one; there must be room.
   void Add(Meeting const& meeting) { list[count++] = meeting; }
 };
 

@@ -9,6 +9,7 @@
 /// On which side of a line a point lies, exactly, and whether two straight edges meet.
 namespace Vorn::Promises {
 
+/// Orientation without the short cut: the sign of the exact cross product.
 inline int ExactOrientation(GeometryUtils::Point const& a, GeometryUtils::Point const& b,
                             GeometryUtils::Point const& c) {
   Expansion cross;
@@ -30,6 +31,7 @@ inline int Orientation(GeometryUtils::Point const& a, GeometryUtils::Point const
   return ExactOrientation(a, b, c);
 }
 
+/// Whether the stretches from a to b and from c to d, ends included, have a number in common.
 inline bool DoOverlap(double a, double b, double c, double d) {
   return std::fmin(a, b) <= std::fmax(c, d) && std::fmin(c, d) <= std::fmax(a, b);
 }

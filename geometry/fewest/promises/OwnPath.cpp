@@ -52,8 +52,6 @@ OwnPath::OwnPath(Coverage const& coverage)
   }
 }
 
-/// Do the first and the last point of an open path, but not all of its points, lie within their
-/// tolerances of p?
 bool OwnPath::IsWhereThePathCloses(Point const& p) const {
   auto const isWithin = [&p](WPoint const& other) {
     return std::hypot(other.x - p.x, other.y - p.y) <= other.w;
@@ -82,8 +80,6 @@ OwnPath::Passage OwnPath::Follow(std::size_t piece, double along, std::size_t ot
   return {back.number, forth.number, before, after};
 }
 
-/// By bisection: the points of a piece are in order but for their noise, which the search around
-/// the place found takes in.
 std::int64_t OwnPath::FirstNumberBeyond(std::size_t piece, double along) const {
   DrawnPiece const drawn = coverage_.Drawn(piece);
   NumberRange const& range = coverage_.RangeOf(piece);
@@ -100,7 +96,6 @@ std::int64_t OwnPath::FirstNumberBeyond(std::size_t piece, double along) const {
   return static_cast<std::int64_t>(low);
 }
 
-/// Steps along until the strands are apart, meet or end. The strand is left at the last point.
 OwnPath::Side OwnPath::FollowOneWay(Strand* strand) {
   while (StepOn(strand)) {
     if (--budget_ < 0) return Side::Joined;
@@ -112,7 +107,6 @@ OwnPath::Side OwnPath::FollowOneWay(Strand* strand) {
   return Side::Unknown;
 }
 
-/// False at the end of the path, and on a closed contour after one round.
 bool OwnPath::StepOn(Strand* strand) const {
   auto const size = static_cast<std::int64_t>(coverage_.GetChain().points.size());
   std::int64_t const next = strand->number + strand->step;
@@ -131,8 +125,6 @@ bool OwnPath::StepOn(Strand* strand) const {
   return true;
 }
 
-/// Goes over to the neighbour of the other piece when p is beyond an end and nearer to that.
-/// False when this leads to the piece that covers p itself: the strands run into each other.
 bool OwnPath::MoveToNearest(Strand* strand, Point const& p, Place* place) const {
   if (strand->other == strand->piece) return false;
   *place = PlaceOf(strand->drawnOther, p);
@@ -154,8 +146,6 @@ bool OwnPath::MoveToNearest(Strand* strand, Point const& p, Place* place) const 
   return true;
 }
 
-/// Outside a corner, where a point is beyond the ends of both pieces, the sum of both deviations
-/// has the right sign; beyond the end of the contour there are no sides.
 OwnPath::Side OwnPath::SideOf(Strand const& strand, Point const& p, Place const& place) const {
   double left = place.left;
   if (place.beside != Beside::Piece) {
@@ -172,8 +162,6 @@ WPoint const& OwnPath::PointOf(std::int64_t number) const {
   return coverage_.GetChain().points[static_cast<std::size_t>((number % size + size) % size)];
 }
 
-/// Do the straight lines through two runs of points meet? The longer run is halved until few edges
-/// are left or the runs have no room in common.
 bool OwnPath::DoMeet(std::int64_t first, std::int64_t last, std::int64_t otherFirst,
                      std::int64_t otherLast) {
   budget_ -= last - first + otherLast - otherFirst;

@@ -13,6 +13,7 @@ namespace Vorn::Promises {
 
 class OwnPath {
  public:
+  /// Of the points of a coverage, which must outlive it. O(n).
   explicit OwnPath(Coverage const& coverage);
 
   /// Is this meeting of two pieces the path's own? The number of points looked at, over all calls,
@@ -39,21 +40,41 @@ class OwnPath {
     Side before;
     Side after;
 
+    /// Whether a strand runs into the other one, or the budget is used up.
     bool IsJoined() const { return before == Side::Joined || after == Side::Joined; }
+    /// Whether the strand leaves the other one on the side from which it came.
     bool StaysOnOneSide() const {
       return before == after && (before == Side::Left || before == Side::Right);
     }
   };
 
+  /// Whether the first and the last point of an open path, but not all of its points, lie within
+  /// their tolerances of p.
   bool IsWhereThePathCloses(GeometryUtils::Point const& p) const;
+  /// Follows the strand of a piece both ways from a length along it, beside that of the other
+  /// piece.
   Passage Follow(std::size_t piece, double along, std::size_t other);
+  /// Steps along until the strands are apart, meet or end; the strand is left at the last point.
   Side FollowOneWay(Strand* strand);
+  /// Goes on to the next point and its piece; false at the end of the path, and on a closed contour
+  /// after one round.
   bool StepOn(Strand* strand) const;
+  /// Goes over to the neighbour of the other piece when p is beyond an end and nearer to that.
+  /// False when this leads to the piece that covers p itself: the strands run into each other.
   bool MoveToNearest(Strand* strand, GeometryUtils::Point const& p, Place* place) const;
+  /// On which side of the other strand p lies; unknown beyond the end of the contour. Outside a
+  /// corner, where p is beyond the ends of both pieces, the sum of both deviations has the right
+  /// sign.
   Side SideOf(Strand const& strand, GeometryUtils::Point const& p, Place const& place) const;
+  /// The running number of the first point of a piece that lies beyond a length along it, by
+  /// bisection: points are in order but for their noise, which the search around the place takes
+  /// in.
   std::int64_t FirstNumberBeyond(std::size_t piece, double along) const;
+  /// Whether the straight lines through two runs of points meet. The longer run is halved until few
+  /// edges are left or the runs have no room in common.
   bool DoMeet(std::int64_t first, std::int64_t last, std::int64_t otherFirst,
               std::int64_t otherLast);
+  /// The point of a running number, which may go below zero and above the size.
   WPoint const& PointOf(std::int64_t number) const;
 
   Coverage const& coverage_;
