@@ -4,10 +4,7 @@
 
 #include "cli/commands/Command.h"
 #include "cli/commands/CommonOptions.h"
-#include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
-#include "vorn/io/Messages.h"
-#include "vorn/io/Numbers.h"
 
 namespace Vorn::Cli {
 
@@ -89,14 +86,6 @@ void WarnOfMissingFeed(WriteOptions const& options, bool writesGCode, Console co
   if (!writesGCode || options.gcode.feed) return;
   console.err << "contour: G-code without a feed: a controller stops at the first cut; --feed F "
                  "gives it one\n";
-}
-
-Format OutputFormat(std::string const& path, std::optional<Format> otherwise,
-                    std::string const& option) {
-  if (std::optional<Format> const format = FormatOf(path)) return *format;
-  if (otherwise) return *otherwise;
-  throw Failure(FailureKind::BadArgument, (path == "-" ? "the standard output" : Quoted(path)) +
-                                              ": " + option + " must say which format to write");
 }
 
 }  // namespace Vorn::Cli

@@ -1,8 +1,5 @@
 #pragma once
 
-#include <optional>
-#include <string>
-
 #include "cli/base/Library.h"
 #include "vorn/io/Formats.h"
 
@@ -16,11 +13,5 @@ void AddWriteOptions(Command& command, WriteOptions* options);
 
 /// Says on standard error that a controller will not cut, if G-code is written without a feed.
 void WarnOfMissingFeed(WriteOptions const& options, bool writesGCode, Console const& console);
-
-/// The format of a file to write: by its ending, else `otherwise`.
-/// @param option what to give when neither tells, for the message
-/// @throws Failure (FailureKind::BadArgument) when neither tells.
-Format OutputFormat(std::string const& path, std::optional<Format> otherwise,
-                    std::string const& option);
 
 }  // namespace Vorn::Cli

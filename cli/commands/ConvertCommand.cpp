@@ -8,7 +8,7 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourInput.h"
 #include "cli/commands/ContourOutput.h"
-#include "cli/commands/Outputs.h"
+#include "cli/commands/OutputFiles.h"
 #include "vorn/io/Departure.h"
 #include "vorn/io/Drawing.h"
 #include "vorn/io/Formats.h"
@@ -75,29 +75,14 @@ constexpr double kChordsInTolerance = 0.5;
 
 struct Options {
   std::string input;
-  std::vector<std::string> outputs;
+  OutputFiles outputs;
   std::optional<Format> from;
-  std::optional<Format> to;
   std::string units;
   std::optional<double> tolerance;
   std::optional<int> outline;
   std::optional<double> flattening;
   WriteOptions write;
-
-  std::vector<NamedFile> Written() const {
-    std::vector<NamedFile> files;
-    for (std::string const& path : outputs) files.push_back({"--output", path});
-    return files;
-  }
 };
-
-Format FormatFor(Options const& options, std::string const& path) {
-  std::optional<Format> const format = options.to ? options.to : FormatOf(path);
-  std::string const what = path == "-" ? "the standard output" : path;
-  if (!format)
-    throw Failure(FailureKind::BadArgument, what + ": --to must say which format to write");
-  return *format;
-}
 
 std::string Summary(ContourFile const& contour) {
   auto const arcs =
@@ -117,7 +102,7 @@ struct Converted {
 };
 
 Converted ConvertTo(Options const& options, ContourFile const& contour, std::string const& path) {
-  Format const format = FormatFor(options, path);
+  Format const format = OutputFormat(path, options.outputs.otherwise);
   if (!HoldsContour(format, options.write))
     return {path, format, Drawn(DrawingOf(contour), format), {}};
   Converted file = {path, format, ToText(contour, format, options.write), {}};
@@ -146,21 +131,19 @@ void PrintSummary(Options const& options, ContourFile const& contour,
     console.err << "contour: " << (file.path == "-" ? "the standard output" : file.path)
                 << ": leaves the contour by " << FormatShort(*file.departure) << '\n';
   }
-  bool const isOutTaken = std::any_of(files.begin(), files.end(),
-                                      [](Converted const& file) { return file.path == "-"; });
-  if (isOutTaken) return;
+  if (options.outputs.TakeStandardOutput()) return;
   console.out << "pieces      " << Summary(contour) << '\n';
   for (Converted const& file : files) console.out << LineFor(options, contour, file);
 }
 
 ExitCode Run(Options const& options, Console const& console) {
-  RequireWritable(options.Written());
+  RequireWritable(options.outputs.Named());
   ContourFile contour =
       ReadContourInput({options.input, options.from, options.outline, options.flattening}, console);
   if (!options.units.empty()) contour.units = Printable(options.units);
   Outputs outputs;
   std::vector<Converted> files;
-  for (std::string const& path : options.outputs) {
+  for (std::string const& path : options.outputs.paths) {
     files.push_back(ConvertTo(options, contour, path));
     outputs.Add(path, files.back().text);
   }
@@ -173,26 +156,17 @@ ExitCode Run(Options const& options, Console const& console) {
   return isTooFar ? ExitCode::OutsideTolerance : ExitCode::Ok;
 }
 
-void AddFormat(Command& command, std::string const& name, std::vector<std::string> const& words,
-               std::optional<Format>* format, std::string const& help) {
-  AddWord(
-      command, name, words, [format](std::string const& word) { *format = FormatNamed(word); },
-      help);
-}
-
 void AddOptions(Command& command, Options* options) {
   command
       .AddText("CONTOUR", &options->input, "FILE", "File with the contour; - is the standard input")
       .Require();
-  command.AddOutputs(
-      "-o,--output", &options->outputs,
-      "Write the contour to this file; may be given several times; - is the standard "
-      "output, which --to without -o means as well");
-  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-            &options->from, "Read the input as this");
-  AddFormat(command, "--to",
-            {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg", "png", "html"}, &options->to,
-            "Write the outputs as this");
+  AddOutputFiles(command, "contour",
+                 {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg", "png", "html"},
+                 &options->outputs);
+  AddWord(
+      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
+      [options](std::string const& word) { options->from = FormatNamed(word); },
+      "Read the input as this");
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
   AddOutline(command, &options->outline);
@@ -210,12 +184,10 @@ void AddConvertCommand(CommandLine& program, Action* action) {
   auto const options = std::make_shared<Options>();
   AddOptions(command, options.get());
   command.OnParsed([options, action] {
-    if (options->outputs.empty() && options->to) options->outputs = {"-"};
-    if (options->outputs.empty()) {
-      throw Failure(FailureKind::BadArgument, "--output is required, or --to");
-    }
-    RefuseSharedFiles({{"CONTOUR", options->input}}, options->Written());
-    for (std::string const& path : options->outputs) FormatFor(*options, path);
+    OutputFiles& outputs = options->outputs;
+    CompleteOutputFiles(&outputs);
+    RefuseSharedFiles({{"CONTOUR", options->input}}, outputs.Named());
+    for (std::string const& path : outputs.paths) OutputFormat(path, outputs.otherwise);
     options->write.gcode.tolerance = options->tolerance;
     if (!options->write.chords && options->tolerance) {
       options->write.chords = kChordsInTolerance * *options->tolerance;

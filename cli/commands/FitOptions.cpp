@@ -7,6 +7,7 @@
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourOutput.h"
 #include "cli/commands/FitHelp.h"
+#include "cli/commands/OutputFiles.h"
 #include "cli/commands/ReportFields.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Messages.h"
@@ -113,7 +114,7 @@ bool FitOptions::WritesGCode() const {
 Format FitOptions::FormatFor(std::string const& path) const {
   std::optional<Format> otherwise;
   if (!formats.empty()) otherwise = formats.front();
-  return OutputFormat(path, otherwise, "--to");
+  return OutputFormat(path, otherwise);
 }
 
 void AddFitOptions(Command& command, FitOptions* options) {

@@ -1,6 +1,5 @@
 #include "cli/commands/PlotCommand.h"
 
-#include <algorithm>
 #include <cmath>
 #include <filesystem>
 #include <memory>
@@ -9,7 +8,7 @@
 
 #include "cli/commands/CommonOptions.h"
 #include "cli/commands/ContourInput.h"
-#include "cli/commands/Outputs.h"
+#include "cli/commands/OutputFiles.h"
 #include "cli/commands/PointsInput.h"
 #include "cli/commands/ReportFields.h"
 #include "vorn/io/Drawing.h"
@@ -61,10 +60,9 @@ Examples:
 struct Options {
   PointsInput points;
   std::string contour;
-  std::vector<std::string> outputs;
+  OutputFiles outputs;
   std::vector<std::string> fields;
   ReportHead head;  ///< of the fields
-  std::optional<Format> to;
   std::optional<int> outline;
   std::optional<double> magnify;
   std::optional<double> dpi;
@@ -83,25 +81,15 @@ struct Options {
     return tolerance.same || tolerance.column || tolerance.cap || points.columns.IsGiven() ||
            magnify;
   }
-
-  std::vector<NamedFile> Written() const {
-    std::vector<NamedFile> files;
-    for (std::string const& path : outputs) files.push_back({"--output", path});
-    return files;
-  }
 };
 
-Format FormatFor(Options const& options, std::string const& path) {
-  std::optional<Format> const format = options.to ? options.to : FormatOf(path);
-  if (!format) {
-    std::string const what = path == "-" ? "the standard output" : path;
-    throw Failure(FailureKind::BadArgument, what + ": --to must say which format to write");
-  }
-  if (HoldsContour(*format)) {
+Format DrawingFormat(Options const& options, std::string const& path) {
+  Format const format = OutputFormat(path, options.outputs.otherwise);
+  if (HoldsContour(format)) {
     throw Failure(FailureKind::BadArgument,
-                  path + ": not a drawing; 'contour convert' writes " + NameOf(*format));
+                  path + ": not a drawing; 'contour convert' writes " + NameOf(format));
   }
-  return *format;
+  return format;
 }
 
 /// A single file in a format that holds no points is the contour.
@@ -186,18 +174,16 @@ std::string Summary(Drawing const& drawing) {
 }
 
 ExitCode Run(Options const& options, Console const& console) {
-  RequireWritable(options.Written());
+  RequireWritable(options.outputs.Named());
   Drawing const drawing = ReadDrawing(options, console);
   Outputs outputs;
-  for (std::string const& path : options.outputs) {
-    outputs.Add(path, Drawn(options, drawing, FormatFor(options, path)));
+  for (std::string const& path : options.outputs.paths) {
+    outputs.Add(path, Drawn(options, drawing, DrawingFormat(options, path)));
   }
   outputs.Write(console);
-  bool const isOutTaken =
-      std::find(options.outputs.begin(), options.outputs.end(), "-") != options.outputs.end();
-  if (isOutTaken) return ExitCode::Ok;
+  if (options.outputs.TakeStandardOutput()) return ExitCode::Ok;
   console.out << Summary(drawing);
-  for (std::string const& path : options.outputs)
+  for (std::string const& path : options.outputs.paths)
     console.out << "wrote       " << Printable(path) << '\n';
   return ExitCode::Ok;
 }
@@ -223,14 +209,7 @@ void AddOptions(Command& command, Options* options) {
   AddPointsInput(command, &options->points);
   command.AddText("CONTOUR", &options->contour, "FILE",
                   "File with a contour; - is the standard input");
-  command.AddOutputs(
-      "-o,--output", &options->outputs,
-      "Write the drawing to this file; may be given several times; - is the standard "
-      "output, which --to without -o means as well");
-  AddWord(
-      command, "--to", {"svg", "png", "html"},
-      [options](std::string const& word) { options->to = FormatNamed(word); },
-      "Write the outputs as this");
+  AddOutputFiles(command, "drawing", {"svg", "png", "html"}, &options->outputs);
   AddOutline(command, &options->outline);
   AddMagnify(command, &options->magnify);
   AddFieldOption(command, &options->fields);
@@ -248,15 +227,12 @@ void AddPlotCommand(CommandLine& program, Action* action) {
   auto const options = std::make_shared<Options>();
   AddOptions(command, options.get());
   command.OnParsed([options, action] {
-    if (options->outputs.empty() && options->to) options->outputs = {"-"};
-    if (options->outputs.empty()) {
-      throw Failure(FailureKind::BadArgument, "--output is required, or --to");
-    }
+    CompleteOutputFiles(&options->outputs);
     options->head = HeadOf(options->fields);
     TellContourFromPoints(options.get());
     RefuseSharedInput(*options);
-    RefuseSharedFiles(options->Read(), options->Written());
-    for (std::string const& path : options->outputs) FormatFor(*options, path);
+    RefuseSharedFiles(options->Read(), options->outputs.Named());
+    for (std::string const& path : options->outputs.paths) DrawingFormat(*options, path);
     *action = [options](Console const& console) { return Run(*options, console); };
   });
 }
