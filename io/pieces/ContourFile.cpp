@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Numbers.h"
@@ -15,19 +16,47 @@ std::size_t RemovePiecesWithoutLength(std::vector<Piece>* pieces) {
   return std::erase_if(*pieces, isPoint);
 }
 
-double JointTolerance(std::vector<Piece> const& pieces) {
-  // Nine digits of a file are kept, and a centre far away loses some last digits at the ends.
-  constexpr double kOfCoordinates = 1e-9;
-  constexpr double kOfRadius = 1e-14;
-  double coordinate = 0.0;
-  double radius = 0.0;
+namespace {
+
+/// Files write nine digits of what they show, which is the extent and not the offset of it.
+constexpr double kOfExtent = 1e-9;
+
+/// An end that is taken off an offset, turned or read from text is rounded a few times, each time
+/// by half a last place of its coordinates at most. Two ends of three roundings in x and y are
+/// 2 * 3 * 0.5 * sqrt(2) = 4.3 last places apart; sixteen leave room for longer ways.
+constexpr double kOfCoordinates = 16.0 * std::numeric_limits<double>::epsilon();
+
+/// An end that follows from centre c, radius r and angle is rounded, with u half a last place of
+/// one, by u (|c| + |end|) for the offset and the sum, by u r for the radius and by 2 pi r times 3
+/// u for an angle of up to one turn that comes in degrees: with |c| <= |end| + r by u (2 |end| + 21
+/// r). Two such ends in x and y are 2 * sqrt(2) times that apart: 60 u r = 6.6e-15 r, and below
+/// three last places of the coordinates, which kOfCoordinates has room for.
+constexpr double kOfRadius = 1e-14;
+
+double LargestCoordinate(std::vector<Piece> const& pieces) {
+  double largest = 0.0;
   for (Piece const& piece : pieces) {
     for (XY const& end : {piece.start, piece.end}) {
-      coordinate = std::max({coordinate, std::fabs(end.x), std::fabs(end.y)});
+      largest = std::max({largest, std::fabs(end.x), std::fabs(end.y)});
     }
-    radius = std::max(radius, piece.radius);
   }
-  return std::max(kOfCoordinates * coordinate, kOfRadius * radius);
+  return largest;
+}
+
+double LargestRadius(std::vector<Piece> const& pieces) {
+  double largest = 0.0;
+  for (Piece const& piece : pieces) largest = std::max(largest, piece.radius);
+  return largest;
+}
+
+}  // namespace
+
+double JointTolerance(std::vector<Piece> const& pieces) {
+  if (pieces.empty()) return 0.0;
+  Extent const extent = ExtentOf(pieces);
+  double const size = std::max(extent.high.x - extent.low.x, extent.high.y - extent.low.y);
+  return kOfExtent * size + kOfCoordinates * LargestCoordinate(pieces) +
+         kOfRadius * LargestRadius(pieces);
 }
 
 bool ReturnsToStart(std::vector<Piece> const& pieces) {

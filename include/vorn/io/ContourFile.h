@@ -40,8 +40,10 @@ struct Gap {
 /// the order of the contour, that of the seam last.
 VORN_IO_EXPORT std::vector<Gap> FindGaps(ContourFile const& contour);
 
-/// How far apart two ends may lie that are meant to be one point: 1e-9 of the largest coordinate
-/// or radius. Contours of the fit meet to some last digits; files with nine digits still pass.
+/// How far apart two ends may lie that are meant to be one point: 1e-9 of the extent, which nine
+/// digits of a file keep, and the rounding of an end, which is 16 last places of the largest
+/// coordinate and 1e-14 of the largest radius. At 1e8 of the unit that rounding is some 4e-7. Zero
+/// without pieces.
 VORN_IO_EXPORT double JointTolerance(std::vector<Piece> const& pieces);
 
 /// Whether the last piece leads back to the start of the first, up to JointTolerance: what a file
