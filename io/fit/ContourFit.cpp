@@ -7,10 +7,10 @@
 #include "io/fit/Fit.h"
 #include "io/fit/FullCircle.h"
 #include "io/fit/LocalFrame.h"
-#include "io/fit/MakeReport.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/FitContour.h"
 #include "vorn/io/Spacing.h"
+#include "vorn/io/SpacingFailure.h"
 
 namespace Vorn::IO {
 
@@ -20,9 +20,7 @@ constexpr std::size_t kLeastClosedPoints = 3;
 
 [[noreturn]] void RefuseTooClose(PointFile const& file, FitChoice const& choice,
                                  std::vector<WPoint> const& fitted, ClosePair const& pair) {
-  throw Failure(
-      FailureKind::PointsTooClose, {file.path},
-      DescribeClosePair(file, pair, LargestSingleTolerance(fitted), OptionsFor(choice.tolerance)));
+  throw SpacingFailure::TooClose(file, {pair, LargestSingleTolerance(fitted), choice.tolerance, 0});
 }
 
 void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
@@ -34,12 +32,13 @@ void RefuseFailedFit(PointFile const& file, FitAnswer const& answer) {
   }
 }
 
-FitReport FitOpen(PointFile file, std::string toleranceSource, Closure const& closure,
-                  FitChoice const& choice, ExecutionState* progress) {
+FitReport FitOpen(FitInput input, FitChoice const& choice, ExecutionState* progress) {
+  PointFile const& file = input.file;
   if (choice.start) {
-    throw Failure(FailureKind::BadArgument, {file.path},
-                  "a start is for closed contours, and this one is open (" + closure.reason + ")",
-                  Remedy::CloseContour);
+    throw Failure(
+        FailureKind::BadArgument, {file.path},
+        "a start is for closed contours, and this one is open (" + input.closure.reason + ")",
+        Remedy::CloseContour);
   }
   FitAnswer answer = Fit(file.points, choice.strategy, progress);
   if (answer.code == ErrorCode::PointsTooClose) {
@@ -48,13 +47,12 @@ FitReport FitOpen(PointFile file, std::string toleranceSource, Closure const& cl
     }
   }
   RefuseFailedFit(file, answer);
-  return MakeReport(std::move(file), std::move(toleranceSource), choice.strategy, std::move(answer),
-                    closure);
+  return MakeReport(std::move(input), choice.strategy, std::move(answer));
 }
 
-std::optional<std::size_t> SeamOf(PointFile const& file, Closure const& closure,
-                                  FitChoice const& choice) {
-  if (!choice.start) return SharpestCorner(file.points, closure);
+std::optional<std::size_t> SeamOf(FitInput const& input, FitChoice const& choice) {
+  PointFile const& file = input.file;
+  if (!choice.start) return SharpestCorner(file.points, input.closure);
   if (*choice.start >= file.points.size()) {
     throw Failure(FailureKind::BadArgument, {file.path},
                   "start " + std::to_string(*choice.start) + ": the points are counted from 0 to " +
@@ -87,21 +85,21 @@ double SecondsSince(std::chrono::steady_clock::time_point begin) {
   return std::chrono::duration<double>(std::chrono::steady_clock::now() - begin).count();
 }
 
-FitReport FitFrom(std::size_t seam, PointFile file, std::string toleranceSource,
-                  Closure const& closure, FitChoice const& choice, ExecutionState* progress) {
-  Circuit const circuit = MakeCircuit(file.points, closure, seam);
-  RefuseClosePair(file, choice, circuit);
+FitReport FitFrom(std::size_t seam, FitInput input, FitChoice const& choice,
+                  ExecutionState* progress) {
+  Circuit const circuit = MakeCircuit(input.file.points, input.closure, seam);
+  RefuseClosePair(input.file, choice, circuit);
   auto const begin = std::chrono::steady_clock::now();
   std::optional<std::vector<Piece>> circle = FitFullCircle(circuit.points);
   FitAnswer answer;
   if (!circle) {
     answer = Fit(circuit.points, choice.strategy, progress);
-    RefuseFailedFit(file, answer);
+    RefuseFailedFit(input.file, answer);
     circle = FullCircleOf(PiecesOf(answer.contour), circuit.points);
   }
   if (circle) answer = AnswerOfCircle(SecondsSince(begin));
-  return MakeClosedReport(std::move(file), std::move(toleranceSource), choice.strategy,
-                          std::move(answer), closure, circuit, std::move(circle));
+  return MakeClosedReport(std::move(input), choice.strategy, std::move(answer), circuit,
+                          std::move(circle));
 }
 
 /// One of two halves of the progress.
@@ -132,15 +130,14 @@ bool IsBetter(FitReport const& a, FitReport const& b) {
 
 /// A contour without a corner. Cut open at its first point it would in most cases have a piece too
 /// many, so it is fitted again from a joint that the first attempt found.
-FitReport FitSmooth(PointFile const& file, std::string const& toleranceSource,
-                    Closure const& closure, FitChoice const& choice, ExecutionState* progress) {
+FitReport FitSmooth(FitInput const& input, FitChoice const& choice, ExecutionState* progress) {
   Half firstHalf(progress, 0);
   Half secondHalf(progress, kFullProgress / 2);
-  FitReport first = FitFrom(0, file, toleranceSource, closure, choice, &firstHalf);
+  FitReport first = FitFrom(0, input, choice, &firstHalf);
   std::optional<std::size_t> const joint = JointOf(first);
   if (!joint) return first;
   try {
-    FitReport second = FitFrom(*joint, file, toleranceSource, closure, choice, &secondHalf);
+    FitReport second = FitFrom(*joint, input, choice, &secondHalf);
     double const seconds = first.fit.seconds + second.fit.seconds;
     FitReport& best = IsBetter(second, first) ? second : first;
     best.fit.seconds = seconds;
@@ -150,11 +147,10 @@ FitReport FitSmooth(PointFile const& file, std::string const& toleranceSource,
   }
 }
 
-FitReport FitClosed(PointFile file, std::string toleranceSource, Closure const& closure,
-                    FitChoice const& choice, ExecutionState* progress) {
-  std::optional<std::size_t> const seam = SeamOf(file, closure, choice);
-  if (!seam) return FitSmooth(file, toleranceSource, closure, choice, progress);
-  return FitFrom(*seam, std::move(file), std::move(toleranceSource), closure, choice, progress);
+FitReport FitClosed(FitInput input, FitChoice const& choice, ExecutionState* progress) {
+  std::optional<std::size_t> const seam = SeamOf(input, choice);
+  if (!seam) return FitSmooth(input, choice, progress);
+  return FitFrom(*seam, std::move(input), choice, progress);
 }
 
 void RequirePoints(PointFile const& file, Closure const& closure) {
@@ -179,7 +175,7 @@ FitReport FitLocally(PointFile file, FitChoice const& choice, ExecutionState* pr
   auto const fit = choice.strategy == Strategy::Fewest ? FitFewest
                    : closure.isClosed                  ? FitClosed
                                                        : FitOpen;
-  return fit(std::move(file), std::move(source), closure, choice, progress);
+  return fit({std::move(file), std::move(source), closure}, choice, progress);
 }
 
 }  // namespace

@@ -7,7 +7,6 @@
 #include <utility>
 
 #include "io/fit/FullCircle.h"
-#include "io/fit/MakeReport.h"
 #include "vorn/FewestPieces.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Spacing.h"
@@ -87,17 +86,15 @@ FitAnswer AnswerOfCircle(FitAnswer const& answer) {
   return ofCircle;
 }
 
-FitReport ReportClosed(PointFile file, std::string toleranceSource, Closure const& closure,
-                       FitChoice const& choice, FitAnswer answer) {
+FitReport ReportClosed(FitInput input, FitChoice const& choice, FitAnswer answer) {
   answer.fewestPossible = std::max(*answer.fewestPossible, kLeastClosedPieces);
   std::size_t const seam = answer.ranges->front().first;
-  Circuit const circuit = MakeCircuit(file.points, closure, seam);
+  Circuit const circuit = MakeCircuit(input.file.points, input.closure, seam);
   if (auto circle = CircleFor(choice.fewest, answer, circuit)) {
-    return MakeClosedReport(std::move(file), std::move(toleranceSource), choice.strategy,
-                            AnswerOfCircle(answer), closure, circuit, std::move(circle));
+    return MakeClosedReport(std::move(input), choice.strategy, AnswerOfCircle(answer), circuit,
+                            std::move(circle));
   }
-  FitReport report = MakeReport(std::move(file), std::move(toleranceSource), choice.strategy,
-                                std::move(answer), closure);
+  FitReport report = MakeReport(std::move(input), choice.strategy, std::move(answer));
   report.seam = seam;
   return report;
 }
@@ -110,11 +107,11 @@ void RefuseStart(PointFile const& file, FitChoice const& choice) {
 
 }  // namespace
 
-FitReport FitFewest(PointFile file, std::string toleranceSource, Closure const& closure,
-                    FitChoice const& choice, ExecutionState* progress) {
+FitReport FitFewest(FitInput input, FitChoice const& choice, ExecutionState* progress) {
+  PointFile const& file = input.file;
   RefuseStart(file, choice);
   FewestPieces::Options options = choice.fewest;
-  options.closed = closure.isClosed;
+  options.closed = input.closure.isClosed;
   FewestPieces::Result result;
   auto const begin = std::chrono::steady_clock::now();
   ErrorCode const code = FewestPieces::Fit(file.points, options, &result, progress, kFullProgress);
@@ -124,12 +121,10 @@ FitReport FitFewest(PointFile file, std::string toleranceSource, Closure const& 
   }
   FitAnswer answer = AnswerOf(std::move(result), file.points.size());
   answer.seconds = taken.count();
-  if (closure.isClosed) {
-    return ReportClosed(std::move(file), std::move(toleranceSource), closure, choice,
-                        std::move(answer));
+  if (input.closure.isClosed) {
+    return ReportClosed(std::move(input), choice, std::move(answer));
   }
-  return MakeReport(std::move(file), std::move(toleranceSource), choice.strategy, std::move(answer),
-                    closure);
+  return MakeReport(std::move(input), choice.strategy, std::move(answer));
 }
 
 }  // namespace Vorn::IO

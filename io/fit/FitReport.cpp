@@ -35,6 +35,17 @@ std::optional<std::vector<PointRange>> RangesInFile(Circuit const& circuit,
   return ranges;
 }
 
+/// A report that knows what the fit began with and what it answered, and nothing measured yet.
+FitReport ReportOf(FitInput input, Strategy strategy, FitAnswer fit) {
+  FitReport report;
+  report.file = std::move(input.file);
+  report.toleranceSource = std::move(input.toleranceSource);
+  report.closure = std::move(input.closure);
+  report.strategy = strategy;
+  report.fit = std::move(fit);
+  return report;
+}
+
 }  // namespace
 
 std::size_t FitReport::ArcCount() const {
@@ -65,14 +76,8 @@ FitReport::Deviation FitReport::LargestDeviation() const {
 
 bool FitReport::IsFewest() const { return fit.fewestPossible == pieces.size(); }
 
-FitReport MakeReport(PointFile file, std::string toleranceSource, Strategy strategy, FitAnswer fit,
-                     Closure const& closure) {
-  FitReport report;
-  report.file = std::move(file);
-  report.toleranceSource = std::move(toleranceSource);
-  report.strategy = strategy;
-  report.fit = std::move(fit);
-  report.closure = closure;
+FitReport MakeReport(FitInput input, Strategy strategy, FitAnswer fit) {
+  FitReport report = ReportOf(std::move(input), strategy, std::move(fit));
   report.pieces = PiecesOf(report.fit.contour);
   report.ranges =
       report.fit.ranges ? report.fit.ranges : AssignPoints(report.file.points, report.pieces);
@@ -81,15 +86,9 @@ FitReport MakeReport(PointFile file, std::string toleranceSource, Strategy strat
   return report;
 }
 
-FitReport MakeClosedReport(PointFile file, std::string toleranceSource, Strategy strategy,
-                           FitAnswer fit, Closure const& closure, Circuit const& circuit,
+FitReport MakeClosedReport(FitInput input, Strategy strategy, FitAnswer fit, Circuit const& circuit,
                            std::optional<std::vector<Piece>> circle) {
-  FitReport report;
-  report.file = std::move(file);
-  report.toleranceSource = std::move(toleranceSource);
-  report.strategy = strategy;
-  report.fit = std::move(fit);
-  report.closure = closure;
+  FitReport report = ReportOf(std::move(input), strategy, std::move(fit));
   report.seam = circuit.origin.front();
   report.isFullCircle = circle.has_value();
   report.pieces = circle ? std::move(*circle) : PiecesOf(report.fit.contour);

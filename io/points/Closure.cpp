@@ -124,7 +124,7 @@ Closure FindClosure(std::vector<WPoint> const& points, ClosedChoice choice) {
   closure.repeatsFirst = first.x == last.x && first.y == last.y;
   if (choice == ClosedChoice::Auto) return Judge(points, closure);
   closure.isClosed = choice == ClosedChoice::Yes;
-  closure.reason = "given by --closed";
+  closure.reason = "as asked for";
   return closure;
 }
 

@@ -4,7 +4,6 @@
 #include <cmath>
 #include <limits>
 
-#include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
@@ -65,32 +64,14 @@ std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points) 
 }
 
 std::string DescribeClosePair(PointFile const& file, ClosePair const& pair,
-                              std::optional<double> largest, std::string const& options) {
-  std::string const arguments = ArgumentFor(file) + (options.empty() ? "" : " " + options);
-  std::string text = file.NameOf(pair.first) + " and " + file.NameOf(pair.second) +
-                     " are too close: distance " + FormatShort(pair.distance) +
-                     ", needed more than " + FormatShort(pair.needed) +
-                     " (1.5 times the sum of their tolerances)\n";
-  if (largest) {
-    text += "the largest single tolerance that would pass for this file is " +
-            FormatShort(*largest) + "\n";
-  } else {
-    text += "no tolerance would pass: neighbours in this file coincide\n";
-  }
-  text += "see: contour info " + arguments +
-          "\nways out: --strategy fewest, which takes points of any density\n";
-  if (largest) {
-    text += "or --tolerance " + FormatShort(*largest) +
-            ", or --tolerance-per-point CAP to follow the spacing\n";
-  }
-  return text + "or leave points out: contour simplify " + arguments + " --drop-close";
-}
-
-std::string ArgumentFor(PointFile const& file) {
-  std::string const suffix = OutlineSuffix(file.outline);
-  std::string const path = file.path.substr(0, file.path.size() - suffix.size());
-  std::string const argument = path == kStandardInputName ? "-" : ShellQuoted(path);
-  return file.outline == 0 ? argument : argument + " --outline " + std::to_string(file.outline);
+                              std::optional<double> largest) {
+  std::string const text = file.NameOf(pair.first) + " and " + file.NameOf(pair.second) +
+                           " are too close: distance " + FormatShort(pair.distance) +
+                           ", needed more than " + FormatShort(pair.needed) +
+                           " (1.5 times the sum of their tolerances)\n";
+  if (!largest) return text + "no tolerance would pass: neighbours in this file coincide";
+  return text + "the largest single tolerance that would pass for this file is " +
+         FormatShort(*largest);
 }
 
 }  // namespace Vorn::IO

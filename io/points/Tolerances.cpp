@@ -6,6 +6,7 @@
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 #include "vorn/io/Spacing.h"
+#include "vorn/io/SpacingFailure.h"
 
 namespace Vorn::IO {
 
@@ -14,19 +15,8 @@ namespace {
 /// With 0.3 of the spacing on both sides, 1.5 times the sum is at most 0.9 of it.
 constexpr double kShareOfSpacing = 0.3;
 
-/// As many as any decimal text that a user types keeps through a double.
-constexpr int kDigits = 15;
-
 void AssignOne(double tolerance, PointFile* file) {
   for (WPoint& point : file->points) point.w = tolerance;
-}
-
-[[noreturn]] void RefuseCoinciding(PointFile const& file, std::size_t first, std::size_t second) {
-  throw Failure(FailureKind::PointsTooClose, {file.path},
-                file.NameOf(first) + " and " + file.NameOf(second) +
-                    " coincide: no tolerance can follow from a spacing of zero\n" +
-                    "to leave one of them out: contour simplify " + ArgumentFor(file) +
-                    " --drop-close");
 }
 
 bool RepeatsFirst(std::vector<WPoint> const& points) {
@@ -39,7 +29,12 @@ void AssignBySpacing(double cap, bool isClosed, Coinciding coinciding, PointFile
   auto const limit = [&](std::size_t i, std::size_t k) {
     double const most = kShareOfSpacing * Distance(points[i], points[k]);
     bool const isGood = most > 0.0 || coinciding == Coinciding::GivenZero;
-    if (!isGood) RefuseCoinciding(*file, i, k);
+    if (!isGood) {
+      CloseNeighbours neighbours;
+      neighbours.pair = {i, k, 0.0, 0.0};
+      neighbours.tolerance.cap = cap;
+      throw SpacingFailure::Coinciding(*file, neighbours);
+    }
     points[i].w = std::min(points[i].w, most);
     points[k].w = std::min(points[k].w, most);
   };
@@ -78,7 +73,7 @@ std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, boo
   }
   if (choice.same) {
     AssignOne(*choice.same, file);
-    return "given by --tolerance";
+    return "given for all points";
   }
   if (file->hasTolerances) return "column " + Quoted(file->toleranceColumn) + " of the file";
   if (file->tolerance) {
@@ -88,13 +83,6 @@ std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file, boo
   throw Failure(FailureKind::BadArgument, {},
                 "no tolerance: " + file->path + " has no column 'w' and no comment '# tolerance T'",
                 Remedy::GiveTolerance);
-}
-
-std::string OptionsFor(ToleranceChoice const& choice) {
-  if (choice.cap) return "--tolerance-per-point " + FormatShort(*choice.cap, kDigits);
-  if (choice.same) return "-t " + FormatShort(*choice.same, kDigits);
-  if (choice.column) return "--tolerance-column " + ShellQuoted(*choice.column);
-  return "";
 }
 
 }  // namespace Vorn::IO

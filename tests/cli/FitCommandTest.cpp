@@ -40,9 +40,9 @@ TEST(FitCommand, ToleranceIsReadInEveryForm) {
     words.insert(words.begin(), {"fit", "-"});
     return SummaryLine(RunInProcess(words, kPoints).out, "tolerance");
   };
-  EXPECT_EQ(tolerance({"--tolerance", "+2e-2"}), "0.02 (given by --tolerance)");
-  EXPECT_EQ(tolerance({"-t", ".5"}), "0.5 (given by --tolerance)");
-  EXPECT_EQ(tolerance({"-t.5", "--units", "mm"}), "0.5 mm (given by --tolerance)");
+  EXPECT_EQ(tolerance({"--tolerance", "+2e-2"}), "0.02 (given for all points)");
+  EXPECT_EQ(tolerance({"-t", ".5"}), "0.5 (given for all points)");
+  EXPECT_EQ(tolerance({"-t.5", "--units", "mm"}), "0.5 mm (given for all points)");
   EXPECT_EQ(tolerance({"--tolerance-per-point", ".5"}), "0.5 (0.3 of the spacing, at most 0.5)");
   EXPECT_EQ(tolerance({"--tolerance-column", "tol"}), "0.25 (column 'tol' of the file)");
 }

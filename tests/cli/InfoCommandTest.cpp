@@ -40,7 +40,7 @@ TEST(InfoCommand, TellsTheFactsOnStandardOutput) {
 TEST(InfoCommand, ListsThePairsThatBreakTheRule) {
   RunResult const run = RunInProcess({"info", "-", "-t", "0.4"}, kSmall);
   EXPECT_EQ(run.code, ExitCode::Ok);
-  EXPECT_NE(run.out.find("tolerance   0.4 (given by --tolerance): 2 of 4 pairs are too close\n"
+  EXPECT_NE(run.out.find("tolerance   0.4 (given for all points): 2 of 4 pairs are too close\n"
                          "            point 1 (line 4) and point 2 (line 5): distance 1, needed "
                          "more than 1.2\n"
                          "            point 2 (line 5) and point 3 (line 6): distance 0, needed "
@@ -49,7 +49,7 @@ TEST(InfoCommand, ListsThePairsThatBreakTheRule) {
             std::string::npos)
       << run.out;
   EXPECT_NE(RunInProcess({"info", "-", "-t", "0.3"}, "0,0\n1,0\n2,0\n")
-                .out.find("tolerance   0.3 (given by --tolerance): no pair is too close\n"),
+                .out.find("tolerance   0.3 (given for all points): no pair is too close\n"),
             std::string::npos);
 }
 

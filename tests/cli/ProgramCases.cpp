@@ -37,7 +37,7 @@ TEST_F(Program, TwoPointsGiveOneLine) {
       "\n"
       "points      2\n"
       "columns     1 and 2\n"
-      "tolerance   0.1 (given by --tolerance)\n"
+      "tolerance   0.1 (given for all points)\n"
       "strategy    mixed\n"
       "closed      no (the last point is not the first)\n"
       "pieces      1: 1 line, 0 arcs\n"
@@ -97,7 +97,7 @@ TEST_F(Program, ToleranceComesFromOptionColumnOrComment) {
   };
   EXPECT_EQ(tolerance("comment.csv"), "tolerance   0.125 mm (comment in the file)");
   EXPECT_EQ(tolerance("column.csv"), "tolerance   0.25 to 0.5 (column 'w' of the file)");
-  EXPECT_EQ(tolerance("column.csv --tolerance 0.75"), "tolerance   0.75 (given by --tolerance)");
+  EXPECT_EQ(tolerance("column.csv --tolerance 0.75"), "tolerance   0.75 (given for all points)");
   EXPECT_EQ(tolerance("column.csv --tolerance-column W"),
             "tolerance   0.25 to 0.5 (column 'W' of the file)");
   EXPECT_EQ(tolerance("column.csv --tolerance-per-point 9"),

@@ -56,14 +56,14 @@ inline FitReport LineAndArcReport() {
   fit.deviation = 0.5;
   fit.deviationIndex = 1;
   fit.seconds = 0.25;
-  return MakeReport(FileWith({{0, 0, w},
-                              {2, 0.01, w},
-                              {4, 0, w},
-                              {5.015, -1, w},
-                              {4 + r, -1 - r, w},
-                              {4, -2, w},
-                              {3, -1, w}}),
-                    "given by --tolerance", Strategy::Mixed, std::move(fit));
+  PointFile file = FileWith({{0, 0, w},
+                             {2, 0.01, w},
+                             {4, 0, w},
+                             {5.015, -1, w},
+                             {4 + r, -1 - r, w},
+                             {4, -2, w},
+                             {3, -1, w}});
+  return MakeReport({std::move(file), "given for all points", {}}, Strategy::Mixed, std::move(fit));
 }
 
 }  // namespace Vorn::IO::Contours

@@ -26,6 +26,8 @@ enum class Remedy {
   CloseContour,   ///< saying that the contour is closed
   FlattenCurves,  ///< saying how far chords may be from arcs and curves that are read
   GiveChords,     ///< saying how far chords may be from arcs that are written
+  SpacePoints,    ///< smaller tolerances, fewer points, or the fewest pieces; see SpacingFailure
+  LeaveOneOut,    ///< leaving out one of two points in one place; see SpacingFailure
 };
 
 /// Where something is wrong.

@@ -45,7 +45,7 @@ struct FitChoice {
 /// holds.
 ///
 /// @param progress may be null
-/// @throws Failure (FailureKind::PointsTooClose) naming the pair and the ways out, (NoFit) when the
+/// @throws SpacingFailure naming a pair that is too close; Failure (FailureKind::NoFit) when the
 ///         library finds no contour, (BadArgument) when there is no tolerance, `start` does not fit
 ///         the points, or a contour said to be closed has less than three points.
 VORN_IO_EXPORT FitReport FitContour(PointFile file, FitChoice const& choice,

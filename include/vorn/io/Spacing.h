@@ -37,15 +37,10 @@ VORN_IO_EXPORT std::optional<ClosePair> FindClosePair(std::vector<WPoint> const&
 /// have it; nothing when neighbours coincide.
 VORN_IO_EXPORT std::optional<double> LargestSingleTolerance(std::vector<WPoint> const& points);
 
-/// What the user needs to know about the pair, and the ways out of it; the file is not named.
+/// What the user needs to know about the pair, in two lines; the file is not named.
 ///
 /// @param largest what LargestSingleTolerance says of the same points
-/// @param options the tolerance options of this run, for the commands that show or do more
 VORN_IO_EXPORT std::string DescribeClosePair(PointFile const& file, ClosePair const& pair,
-                                             std::optional<double> largest,
-                                             std::string const& options);
-
-/// How another command line names the points file: "-" for the standard input.
-VORN_IO_EXPORT std::string ArgumentFor(PointFile const& file);
+                                             std::optional<double> largest);
 
 }  // namespace Vorn::IO

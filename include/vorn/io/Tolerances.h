@@ -8,11 +8,11 @@
 
 namespace Vorn::IO {
 
-/// The ways to state tolerances on the command line; at most one is set.
+/// The ways to state tolerances; at most one is set.
 struct ToleranceChoice {
-  std::optional<double> same;         ///< --tolerance
-  std::optional<std::string> column;  ///< --tolerance-column
-  std::optional<double> cap;          ///< --tolerance-per-point
+  std::optional<double> same;         ///< that of every point
+  std::optional<std::string> column;  ///< the name of the column that holds them
+  std::optional<double> cap;          ///< the largest of those that follow from the spacing
 };
 
 /// Which column of the file the reader has to look for.
@@ -32,18 +32,14 @@ enum class Coinciding {
 
 /// Gives every point of the file its tolerance and says in words where it came from.
 ///
-/// An option goes before what the file holds; without one a column `w` goes before a comment
+/// The choice goes before what the file holds; without one a column `w` goes before a comment
 /// `# tolerance T`.
 ///
 /// @param isClosed the first and the last point are neighbours as well
-/// @throws Failure (FailureKind::BadArgument) when nobody gives a tolerance, or (PointsTooClose)
-/// when a
+/// @throws Failure (FailureKind::BadArgument) when nobody gives a tolerance; SpacingFailure when a
 ///         tolerance by spacing would be zero because neighbours coincide and this is refused.
 VORN_IO_EXPORT std::string AssignTolerances(ToleranceChoice const& choice, PointFile* file,
                                             bool isClosed = false,
                                             Coinciding coinciding = Coinciding::Refused);
-
-/// The choice as options for another command line; empty when there is none.
-VORN_IO_EXPORT std::string OptionsFor(ToleranceChoice const& choice);
 
 }  // namespace Vorn::IO

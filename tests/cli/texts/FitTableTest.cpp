@@ -30,7 +30,7 @@ TEST(Table, ShowsPiecesAndSummary) {
       " 2  arc        4  1.0070          -  0.0039     0.00712    0.00557             -\n"
       "\n"
       "points      7\n"
-      "tolerance   0.02 (given by --tolerance)\n"
+      "tolerance   0.02 (given for all points)\n"
       "strategy    mixed\n"
       "closed      no\n"
       "pieces      2: 1 line, 1 arc\n"
@@ -78,7 +78,7 @@ TEST(Table, TellsOfTheSeamAndTheGap) {
             std::string::npos)
       << closed;
   std::string const open = ToTable(FitSquare(ClosedChoice::No));
-  EXPECT_NE(open.find("closed      no (given by --closed)\n"), std::string::npos) << open;
+  EXPECT_NE(open.find("closed      no (as asked for)\n"), std::string::npos) << open;
 }
 
 }  // namespace

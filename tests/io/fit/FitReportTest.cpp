@@ -18,8 +18,8 @@ FitReport StraightReport(double offset, double reported, Strategy strategy, doub
   fit.contour = {Contours::Segment(0, 0), Contours::Segment(lastX, 0)};
   fit.deviation = reported;
   fit.deviationIndex = 1;
-  return MakeReport(Contours::FileWith({{0, 0, 0.125}, {1, offset, 0.125}, {2, 0, 0.125}}), "",
-                    strategy, std::move(fit));
+  PointFile file = Contours::FileWith({{0, 0, 0.125}, {1, offset, 0.125}, {2, 0, 0.125}});
+  return MakeReport({std::move(file), "", {}}, strategy, std::move(fit));
 }
 
 TEST(Verdict, RoundingBeyondOneIsForgivenAndNoMore) {

@@ -50,8 +50,7 @@ TEST(AssignTolerances, PerPointNamesCoincidingNeighbours) {
             FailureKind::PointsTooClose);
   EXPECT_EQ(message,
             "p.csv: point 1 (line 3) and point 2 (line 4) coincide: no tolerance can follow from "
-            "a spacing of zero\n"
-            "to leave one of them out: contour simplify p.csv --drop-close");
+            "a spacing of zero");
 }
 
 TEST(AssignTolerances, OptionGoesBeforeColumnBeforeComment) {
@@ -72,13 +71,6 @@ TEST(AssignTolerances, NoToleranceAnywhereIsAUsageError) {
   EXPECT_EQ(KindOfRefusal({}, FileWith({{0, 0, 0}, {1, 0, 0}}), &message),
             FailureKind::BadArgument);
   EXPECT_EQ(message, "no tolerance: p.csv has no column 'w' and no comment '# tolerance T'");
-}
-
-TEST(OptionsFor, SaysWhatWasTyped) {
-  EXPECT_EQ(OptionsFor({0.02, {}, {}}), "-t 0.02");
-  EXPECT_EQ(OptionsFor({{}, "my w", {}}), "--tolerance-column 'my w'");
-  EXPECT_EQ(OptionsFor({{}, {}, 0.0004}), "--tolerance-per-point 0.0004");
-  EXPECT_EQ(OptionsFor({}), "");
 }
 
 TEST(ColumnFor, ReadsAColumnOnlyWhenNoOtherOptionRules) {
