@@ -16,6 +16,12 @@ namespace {
 
 constexpr std::size_t kLongestQuote = 40;
 
+/// No double has more digits behind the point, so further ones would all be zeros.
+constexpr int kMostDigits = 1074;
+
+/// Sign, point, exponent and the end of the text.
+constexpr int kBesideDigits = 16;
+
 bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f'; }
 
 bool EveryCommaHasADigitBehind(std::string_view text) {
@@ -48,16 +54,18 @@ std::optional<double> ParseNumber(std::string_view text, DecimalMark mark) {
 }
 
 std::string FormatShort(double value, int digits) {
-  std::array<char, 64> buffer{};
-  std::snprintf(buffer.data(), buffer.size(), "%.*g", digits, value);
+  int const precision = std::clamp(digits, 1, kMostDigits);
+  std::array<char, kMostDigits + kBesideDigits> buffer{};
+  std::snprintf(buffer.data(), buffer.size(), "%.*g", precision, value);
   return WithoutMinusOnZero(buffer.data());
 }
 
 std::string FormatFixed(double value, int decimals) {
   // The largest double has 309 digits ahead of the point.
-  constexpr std::size_t kLongestFixed = 400;
-  std::array<char, kLongestFixed> buffer{};
-  std::snprintf(buffer.data(), buffer.size(), "%.*f", decimals, value);
+  constexpr std::size_t kLongestWhole = 309;
+  int const precision = std::clamp(decimals, 0, kMostDigits);
+  std::array<char, kLongestWhole + kMostDigits + kBesideDigits> buffer{};
+  std::snprintf(buffer.data(), buffer.size(), "%.*f", precision, value);
   return WithoutMinusOnZero(buffer.data());
 }
 

@@ -1,6 +1,7 @@
 #include "vorn/io/FitSummary.h"
 
 #include <algorithm>
+#include <cmath>
 
 #include "SummaryParts.h"
 #include "io/drawing/Layout.h"
@@ -17,11 +18,14 @@ namespace {
 constexpr double kPictureWidth = 132.0;
 constexpr double kPictureHeight = 84.0;
 
-/// Without a contour first, then the largest deviation; what is not a number is larger than all.
+/// What is not a number is larger than all.
+bool IsLarger(double a, double b) { return std::isnan(a) ? !std::isnan(b) : a > b; }
+
+/// Without a contour first, then the largest deviation.
 bool IsWorse(SummaryRow const& a, SummaryRow const& b) {
   if (!a.isFitted || !b.isFitted) return !a.isFitted && b.isFitted;
   if (a.isWithin != b.isWithin) return b.isWithin;
-  return a.deviation > b.deviation;
+  return IsLarger(a.deviation, b.deviation);
 }
 
 /// All rows together; its deviation is the largest one.
@@ -37,7 +41,7 @@ SummaryRow TotalOf(std::vector<SummaryRow> const& rows) {
     total.lines += row.lines;
     total.arcs += row.arcs;
     total.outside += row.outside;
-    total.deviation = std::max(total.deviation, row.deviation);
+    if (IsLarger(row.deviation, total.deviation)) total.deviation = row.deviation;
   }
   total.isWithin = within == rows.size();
   total.result =
@@ -125,10 +129,12 @@ std::string SummaryHtml(std::vector<SummaryRow> rows, ReportHead const& head) {
   std::stable_sort(rows.begin(), rows.end(), IsWorse);
   std::string body;
   for (SummaryRow const& row : rows) body += HtmlRow(row, false);
-  std::string page = Replaced(Html::kSummary, "{{total}}", HtmlRow(TotalOf(rows), true));
+  // From the last mark of the page to the first, so that no mark is looked for behind a text of the
+  // user, which may hold one as well.
+  std::string page = Replaced(Html::kSummary, "{{rows}}", body);
+  page = Replaced(std::move(page), "{{total}}", HtmlRow(TotalOf(rows), true));
   page = Replaced(std::move(page), "{{program}}", Svg::Escaped(head.program));
-  page = Replaced(std::move(page), "{{fields}}", HeadHtml(head));
-  return Replaced(std::move(page), "{{rows}}", body);
+  return Replaced(std::move(page), "{{fields}}", HeadHtml(head));
 }
 
 }  // namespace Vorn::IO

@@ -95,15 +95,20 @@ void WriteText(std::string const& text, ToolPath* tool) {
 
 int GCodeDecimals(std::string const& units, std::optional<double> tolerance) {
   int const usual = IsInch(units) ? kDecimalsOfInches : kDecimalsOfMillimetres;
-  if (!tolerance) return usual;
+  if (!tolerance || !(*tolerance >= 0.0)) return usual;
   double const needed = std::ceil(kDigitsBelowTolerance - std::log10(*tolerance));
-  return std::max(usual, static_cast<int>(std::min<double>(needed, kMostGCodeDecimals)));
+  return static_cast<int>(std::clamp<double>(needed, usual, kMostGCodeDecimals));
 }
 
 std::string ToGCode(ContourFile const& contour, GCodeOptions const& options) {
   if (options.plane == Plane::G18 && options.safeHeight) {
     throw Failure(FailureKind::BadArgument, {contour.path},
                   "heights are for the plane of X and Y, not for X and Z");
+  }
+  if (options.decimals && (*options.decimals < 0 || *options.decimals > kMostGCodeDecimals)) {
+    throw Failure(FailureKind::BadArgument, {contour.path},
+                  "G-code has from 0 to " + std::to_string(kMostGCodeDecimals) + " decimals, not " +
+                      std::to_string(*options.decimals));
   }
   std::vector<NamedField> const fields = FieldsOf(contour, options);
   ToolPath tool(contour, options);

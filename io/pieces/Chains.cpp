@@ -49,9 +49,14 @@ class EndIndex {
  private:
   using Cell = std::pair<std::int64_t, std::int64_t>;
 
-  Cell CellOf(XY const& place) const {
-    return {static_cast<std::int64_t>(std::floor(place.x / tolerance_)),
-            static_cast<std::int64_t>(std::floor(place.y / tolerance_))};
+  Cell CellOf(XY const& place) const { return {NumberOf(place.x), NumberOf(place.y)}; }
+
+  /// The column or row of cells. What is not finite, or further out than there are numbers for, is
+  /// all in one, where its distances tell it apart.
+  std::int64_t NumberOf(double coordinate) const {
+    constexpr double kFurthest = 0x1p62;
+    double const number = std::floor(coordinate / tolerance_);
+    return std::fabs(number) < kFurthest ? static_cast<std::int64_t>(number) : 0;
   }
 
   void Consider(End const& end, XY const& place, bool wantsStart, std::optional<End>* best) const {

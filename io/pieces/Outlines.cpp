@@ -1,6 +1,7 @@
 #include "vorn/io/Outlines.h"
 
 #include <algorithm>
+#include <cmath>
 
 #include "io/pieces/Chains.h"
 #include "io/pieces/Nesting.h"
@@ -42,7 +43,7 @@ double ChainTolerance(std::vector<Piece> const& pieces) {
 
 std::vector<ContourFile> OutlinesOf(ContourFile const& contour) {
   double const tolerance = ChainTolerance(contour.pieces);
-  if (!(tolerance > 0.0)) return {contour};
+  if (!(tolerance > 0.0) || !std::isfinite(tolerance)) return {contour};
   std::vector<Ends> ends;
   ends.reserve(contour.pieces.size());
   for (Piece const& piece : contour.pieces) ends.push_back({piece.start, piece.end});

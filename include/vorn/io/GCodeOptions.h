@@ -16,7 +16,7 @@ struct GCodeOptions {
   enum class Plane { G17, G18 };  ///< of X and Y, or of X and Z
 
   std::optional<double> feed;        ///< without it no F is written, and a controller stops
-  std::optional<int> decimals;       ///< digits after the point; goes before the tolerance
+  std::optional<int> decimals;       ///< digits after the point, 0 to 15; go before the tolerance
   std::optional<double> tolerance;   ///< what the digits follow from, see GCodeDecimals
   End end = End::M2;                 ///< how the program ends
   Plane plane = Plane::G17;          ///< G18: the y of the contour is the Z of a lathe
@@ -33,7 +33,8 @@ inline constexpr int kMostGCodeDecimals = 15;
 
 /// How many digits after the point a tool path of these units gets: 4 for millimetres and 5 for
 /// inches, a tenth of the increment that machines commonly resolve, and as many more as make the
-/// last digit a hundredth of the tolerance or less.
+/// last digit a hundredth of the tolerance or less, up to kMostGCodeDecimals. What is no tolerance,
+/// negative or not a number, asks for none.
 VORN_IO_EXPORT int GCodeDecimals(std::string const& units, std::optional<double> tolerance);
 
 }  // namespace Vorn::IO

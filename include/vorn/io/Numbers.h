@@ -18,10 +18,11 @@ enum class DecimalMark { Point, Comma };
 VORN_IO_EXPORT std::optional<double> ParseNumber(std::string_view text,
                                                  DecimalMark mark = DecimalMark::Point);
 
-/// At most `digits` significant digits, without trailing zeros.
+/// At most `digits` significant digits, without trailing zeros; one at least, and no more than the
+/// 1074 that a double can have.
 VORN_IO_EXPORT std::string FormatShort(double value, int digits = 6);
 
-/// Always `decimals` digits after the point; zero never carries a minus sign.
+/// Always `decimals` digits after the point, 0 to 1074; zero never carries a minus sign.
 VORN_IO_EXPORT std::string FormatFixed(double value, int decimals);
 
 /// A multiple of a tolerance, for people: four significant digits, and as many more as it takes not
