@@ -93,12 +93,12 @@ Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece> pieces) {
   drawing.pieces = std::move(pieces);
   if (drawing.HasTolerances()) drawing.facts = {DescribeTolerance(drawing)};
   if (drawing.points.empty() || !drawing.HasContour()) return drawing;
-  drawing.deviations = Remeasure(drawing.points, drawing.pieces).points;
+  Remeasured measured = Remeasure(drawing.points, drawing.pieces);
   if (drawing.HasTolerances()) {
-    bool const isWithin =
-        IsWithinTolerance(drawing.deviations[drawing.Worst()], drawing.points[drawing.Worst()]);
+    bool const isWithin = AreWithinTolerance(measured, drawing.points);
     drawing.verdict = isWithin ? Verdict::WithinTolerance : Verdict::OutsideTolerance;
   }
+  drawing.deviations = std::move(measured.points);
   return drawing;
 }
 

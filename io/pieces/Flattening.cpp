@@ -55,6 +55,7 @@ struct Part {
 
 bool AppendChords(BezierCurve const& curve, double tolerance, std::size_t mostChords,
                   std::vector<XY>* points) {
+  if (!(tolerance > 0.0)) return false;
   std::size_t const most = points->size() + mostChords;
   std::vector<Part> rest = {{curve, 0}};
   while (!rest.empty()) {
@@ -78,6 +79,7 @@ bool AppendChords(Piece const& arc, double tolerance, std::size_t mostChords,
   // A chord that turns by a is radius * (1 - cos(a / 2)) = 2 * radius * sin(a / 4)^2 from its arc,
   // and by a third of a turn, shapes become another.
   constexpr double kWidestChord = 2.0 * std::numbers::pi / 3.0;
+  if (!(tolerance > 0.0)) return false;
   double const sine = std::sqrt(std::min(1.0, tolerance / (2.0 * arc.radius)));
   double const widest = std::min(kWidestChord, 4.0 * std::asin(sine));
   double const needed = std::max(1.0, std::ceil(arc.sweep / widest));

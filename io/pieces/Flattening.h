@@ -31,7 +31,8 @@ using BezierCurve = std::vector<ControlPoint>;
 /// lies within the hull of its control points, so it is halved until all of these are so near to
 /// the chord. Rounding adds some last digits of the coordinates.
 ///
-/// @return false, with some points appended, when it would take more than `mostChords`
+/// @return false, with some points appended, when it would take more than `mostChords`, as it does
+///         for a tolerance that is not above 0
 bool AppendChords(BezierCurve const& curve, double tolerance, std::size_t mostChords,
                   std::vector<XY>* points);
 

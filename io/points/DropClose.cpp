@@ -23,7 +23,7 @@ std::vector<std::size_t> KeepSpaced(std::vector<WPoint> const& points, TooClose 
     if (kept.empty() || !tooClose(points[kept.back()], points[i])) kept.push_back(i);
   }
   while (kept.size() > 1 && tooClose(points[kept.back()], points[last])) kept.pop_back();
-  if (!tooClose(points[kept.back()], points[last])) kept.push_back(last);
+  if (kept.empty() || !tooClose(points[kept.back()], points[last])) kept.push_back(last);
   return kept;
 }
 

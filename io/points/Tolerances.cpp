@@ -39,7 +39,7 @@ void AssignBySpacing(double cap, bool isClosed, Coinciding coinciding, PointFile
     points[k].w = std::min(points[k].w, most);
   };
   for (std::size_t i = 1; i < points.size(); ++i) limit(i - 1, i);
-  if (!isClosed) return;
+  if (!isClosed || points.empty()) return;
   WPoint& first = points.front();
   WPoint& last = points.back();
   if (RepeatsFirst(points)) {

@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cmath>
 #include <random>
 
 #include "io/pieces/Nesting.h"
@@ -99,7 +100,8 @@ TEST(FacesOf, ConcentricRingsInAnyOrderPairUp) {
     std::shuffle(rank.begin(), rank.end(), engine);
     std::vector<ContourFile> outlines;
     for (std::size_t const r : rank) {
-      double const size = 1.0 + static_cast<double>(r);
+      // The corners of a square are 1.14 sizes away, so those of double size lie around it.
+      double const size = std::ldexp(1.0, static_cast<int>(r));
       outlines.push_back(engine() % 2 == 0 ? Circle(0, 0, size) : Square(0, 0, 0.8 * size));
     }
     // With as many around it as have a higher rank, every second one from outside is an outer.

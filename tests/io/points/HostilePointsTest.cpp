@@ -178,6 +178,24 @@ TEST(NoPoints, HaveNoCornersNoDuplicatesAndNoClosePair) {
   EXPECT_TRUE(Others({}, 0).empty());
 }
 
+TEST(OnePoint, IsItsOwnPathAndHasNoNeighbours) {
+  std::vector<WPoint> const one = {{3, 4, 0.5}};
+  EXPECT_FALSE(FindClosePair(one));
+  EXPECT_TRUE(FindCorners(one, 1.0, true).empty());
+  EXPECT_TRUE(FindDuplicates(one).empty());
+  EXPECT_EQ(KeepSpaced(one, RuleOfTolerances()), std::vector<std::size_t>{0});
+  EXPECT_EQ(KeepSpaced(one, RuleOfSpacing(1.0)), std::vector<std::size_t>{0});
+  EXPECT_EQ(KeepEvery(one, 1.0), std::vector<std::size_t>{0});
+  EXPECT_TRUE(FindOutliers(one, 3.0).empty());
+  EXPECT_FALSE(FitLine({{3, 4}}));
+}
+
+TEST(NoPoints, GetNoTolerances) {
+  PointFile file;
+  AssignTolerances({.same = {}, .column = {}, .cap = 1.0}, &file, true);
+  EXPECT_TRUE(file.points.empty());
+}
+
 TEST(NoPoints, AreAnOpenContour) {
   Closure const closure = FindClosure({}, ClosedChoice::Auto);
   EXPECT_FALSE(closure.isClosed);
