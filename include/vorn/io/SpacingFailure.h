@@ -40,6 +40,7 @@ class VORN_IO_EXPORT SpacingFailure : public Failure {
   CloseNeighbours const& Neighbours() const { return neighbours_; }
 
  private:
+  /// With a message that does not name the file, and the ways out.
   SpacingFailure(PointFile const& file, CloseNeighbours const& neighbours,
                  std::string const& message, Remedy help);
 

@@ -130,7 +130,7 @@ TEST(CheckJson, HoldsEveryFact) {
   EXPECT_EQ(json.at("tolerance"),
             Json({{"source", "by hand"}, {"smallest", 0.3}, {"largest", 0.3}}));
   EXPECT_EQ(json.at("result"), "outside tolerance");
-  EXPECT_EQ(json.at("outside"), Json({2}));
+  EXPECT_EQ(json.at("outside"), Json::array({2}));
   EXPECT_EQ(json.at("largest").at("point"), 2);
   EXPECT_EQ(json.at("largest").at("line"), 4);
   EXPECT_EQ(json.at("largest").at("deviation"), 0.5);

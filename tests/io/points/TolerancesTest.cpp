@@ -73,6 +73,70 @@ TEST(AssignTolerances, NoToleranceAnywhereIsAUsageError) {
   EXPECT_EQ(message, "no tolerance: p.csv has no column 'w' and no comment '# tolerance T'");
 }
 
+TEST(AssignTolerances, PerPointOfAClosedContourTakesTheSeamIn) {
+  PointFile open = FileWith({{0, 0, 0}, {10, 0, 0}, {10, 10, 0}, {0, 2, 0}});
+  PointFile closed = open;
+  AssignTolerances({.same = {}, .column = {}, .cap = 9.0}, &open, false);
+  AssignTolerances({.same = {}, .column = {}, .cap = 9.0}, &closed, true);
+  EXPECT_EQ(open.points[0].w, 0.3 * 10.0);
+  EXPECT_EQ(closed.points[0].w, 0.3 * 2.0);
+  EXPECT_EQ(closed.points[3].w, 0.3 * 2.0);
+  EXPECT_EQ(closed.points[1].w, open.points[1].w);
+}
+
+TEST(AssignTolerances, ARepeatedFirstPointHasOneTolerance) {
+  PointFile file = FileWith({{0, 0, 0}, {4, 0, 0}, {4, 4, 0}, {0, 1, 0}, {0, 0, 0}});
+  AssignTolerances({.same = {}, .column = {}, .cap = 9.0}, &file, true);
+  EXPECT_EQ(file.points.front().w, 0.3 * 1.0);
+  EXPECT_EQ(file.points.back().w, 0.3 * 1.0);
+}
+
+TEST(AssignTolerances, WhoOnlyLooksGetsZeroWherePointsCoincide) {
+  PointFile file = FileWith({{0, 0, 0}, {1, 0, 0}, {1, 0, 0}, {3, 0, 0}});
+  AssignTolerances({.same = {}, .column = {}, .cap = 4.0}, &file, false, Coinciding::GivenZero);
+  EXPECT_EQ(file.points[0].w, 0.3);
+  EXPECT_EQ(file.points[1].w, 0.0);
+  EXPECT_EQ(file.points[2].w, 0.0);
+  EXPECT_EQ(file.points[3].w, 0.3 * 2.0);
+}
+
+TEST(AssignTolerances, SaysWhereTheyCameFrom) {
+  PointFile file = FileWith({{0, 0, 0.1}, {1, 0, 0.2}});
+  EXPECT_EQ(AssignTolerances({.same = 0.5, .column = {}, .cap = {}}, &file),
+            "given for all points");
+  EXPECT_EQ(AssignTolerances({.same = {}, .column = {}, .cap = 0.5}, &file),
+            "0.3 of the spacing, at most 0.5");
+  file.tolerance = 0.7;
+  EXPECT_EQ(AssignTolerances({}, &file), "comment in the file");
+  file.hasTolerances = true;
+  file.toleranceColumn = "tol";
+  EXPECT_EQ(AssignTolerances({}, &file), "column 'tol' of the file");
+}
+
+TEST(IsToleranceStated, ByTheChoiceOrTheFile) {
+  PointFile file = FileWith({{0, 0, 0}});
+  EXPECT_FALSE(IsToleranceStated({}, file));
+  EXPECT_TRUE(IsToleranceStated({.same = 0.0, .column = {}, .cap = {}}, file));
+  EXPECT_TRUE(IsToleranceStated({.same = {}, .column = "w", .cap = {}}, file));
+  EXPECT_TRUE(IsToleranceStated({.same = {}, .column = {}, .cap = 1.0}, file));
+  file.tolerance = 1.0;
+  EXPECT_TRUE(IsToleranceStated({}, file));
+  file.tolerance.reset();
+  file.hasTolerances = true;
+  EXPECT_TRUE(IsToleranceStated({}, file));
+}
+
+TEST(ToleranceForSpacing, IsAtMostTheCapAndAlwaysPassesTheSpacingRule) {
+  EXPECT_EQ(ToleranceForSpacing(1.0, 2.0), 0.3 * 2.0);
+  EXPECT_EQ(ToleranceForSpacing(0.5, 2.0), 0.5);
+  EXPECT_EQ(ToleranceForSpacing(1.0, 0.0), 0.0);
+  for (double spacing = 1e-9; spacing < 1e9; spacing *= 1.7) {
+    double const w = ToleranceForSpacing(1e300, spacing);
+    EXPECT_FALSE(AreTooClose({0, 0, w}, {spacing, 0, w})) << spacing;
+    EXPECT_LT(NeededDistance({0, 0, w}, {spacing, 0, w}), spacing);
+  }
+}
+
 TEST(ColumnFor, ReadsAColumnOnlyWhenNoOtherOptionRules) {
   EXPECT_EQ(ColumnFor({}).use, ToleranceColumn::Use::IfPresent);
   EXPECT_EQ(ColumnFor({.same = 1.0, .column = {}, .cap = {}}).use, ToleranceColumn::Use::Ignore);
