@@ -4,13 +4,11 @@
 #include <string_view>
 
 #include "HtmlParts.h"
-#include "io/drawing/Band.h"
-#include "io/drawing/Feet.h"
+#include "io/drawing/HtmlPoints.h"
 #include "io/drawing/Layout.h"
 #include "io/drawing/SvgElements.h"
 #include "io/measure/MeasureJson.h"
 #include "vorn/io/Drawing.h"
-#include "vorn/io/Numbers.h"
 
 namespace Vorn::IO {
 
@@ -18,38 +16,11 @@ namespace {
 
 using Json = nlohmann::ordered_json;
 
-/// What is measured here need not be told to the last bit, and large files stay smaller.
-constexpr int kDigits = 9;
-
 /// The size on a common screen that the magnification is chosen for, in pixels.
 constexpr double kScreenWidth = 900.0;
 constexpr double kScreenHeight = 420.0;
 
-Json Rounded(double value) {
-  std::optional<double> const rounded = ParseNumber(FormatShort(value, kDigits));
-  if (!rounded) return nullptr;
-  return *rounded;
-}
-
 Json Place(GeometryUtils::Point const& point) { return Json::array({point.x, point.y}); }
-
-Json TolerancesJson(Drawing const& drawing) {
-  if (!drawing.HasTolerances()) return nullptr;
-  if (drawing.IsToleranceUniform()) return drawing.LargestTolerance();
-  Json tolerances = Json::array();
-  for (WPoint const& point : drawing.points) tolerances.push_back(point.w);
-  return tolerances;
-}
-
-Json PointsJson(Drawing const& drawing) {
-  Json x = Json::array();
-  Json y = Json::array();
-  for (WPoint const& point : drawing.points) {
-    x.push_back(point.x);
-    y.push_back(point.y);
-  }
-  return {{"x", std::move(x)}, {"y", std::move(y)}, {"w", TolerancesJson(drawing)}};
-}
 
 Json PieceJson(Piece const& piece, PieceMeasure const& measure) {
   Json json = {{"kind", piece.IsArc() ? "arc" : "line"},
@@ -97,37 +68,6 @@ Json HeadJson(Drawing const& drawing) {
   return fields;
 }
 
-Json DeviationsJson(Drawing const& drawing, std::vector<Foot> const& feet) {
-  Json deviations = Json::array();
-  Json pieces = Json::array();
-  Json alongs = Json::array();
-  for (std::size_t i = 0; i < feet.size(); ++i) {
-    PointDeviation const& deviation = drawing.deviations[i];
-    deviations.push_back(Rounded(deviation.isLeft ? deviation.distance : -deviation.distance));
-    pieces.push_back(deviation.piece);
-    alongs.push_back(Rounded(feet[i].along));
-  }
-  return {{"signed", std::move(deviations)},
-          {"piece", std::move(pieces)},
-          {"along", std::move(alongs)}};
-}
-
-/// Only where tolerances differ; else the band is as wide everywhere.
-Json BandJson(Drawing const& drawing, std::vector<Foot> const& feet) {
-  if (!drawing.HasTolerances() || drawing.IsToleranceUniform()) return nullptr;
-  Json band = {{"piece", Json::array()},
-               {"from", Json::array()},
-               {"to", Json::array()},
-               {"tolerance", Json::array()}};
-  for (Svg::BandSection const& section : Svg::BandSections(drawing, feet, 0.0)) {
-    band["piece"].push_back(section.piece);
-    band["from"].push_back(Rounded(section.from));
-    band["to"].push_back(Rounded(section.to));
-    band["tolerance"].push_back(section.tolerance);
-  }
-  return band;
-}
-
 double MagnifyOnScreen(Drawing const& drawing) {
   if (drawing.magnify) return *drawing.magnify;
   Svg::View const screen(Svg::BoxAround(drawing), 0.0, 0.0, kScreenWidth, kScreenHeight,
@@ -156,9 +96,8 @@ Json DataJson(Drawing const& drawing) {
   json["pieces"] = PiecesJson(drawing);
   json["isClosed"] = drawing.IsClosed();
   if (!drawing.IsMeasured()) return json;
-  std::vector<Foot> const feet = FeetOf(drawing);
-  json["deviations"] = DeviationsJson(drawing, feet);
-  json["band"] = BandJson(drawing, feet);
+  json["deviations"] = DeviationsJson(drawing);
+  json["band"] = BandJson(drawing);
   json["worst"] = drawing.Worst();
   json["summary"] = SummaryJson(drawing);
   json["magnify"] = MagnifyOnScreen(drawing);

@@ -51,9 +51,9 @@ describe('legendEntries', () => {
     assert.ok(words(scene).includes('tolerance'));
   });
   it('tells about points outside only where there are some', () => {
-    const last = (deviation) => words(new Scene(measuredData([0, deviation, 0], 0.2))).at(-1);
-    assert.equal(last(0.3), 'outside tolerance');
-    assert.equal(last(0.1), 'tolerance');
+    const last = (outside) => words(new Scene(measuredData([0, 0.3, 0], 0.2, outside))).at(-1);
+    assert.equal(last([1]), 'outside tolerance');
+    assert.equal(last([]), 'tolerance');
   });
   it('shows the order of points without a contour', () => {
     const data = {...contourData([]), points: {x: [0, 1], y: [0, 0], w: null}};

@@ -1,7 +1,7 @@
 import assert from 'node:assert/strict';
 import {describe, it} from 'node:test';
 
-import {boxOf, distanceTo, include, placeOn, PointGrid, Tracer, View}
+import {boxOf, distanceTo, footOn, include, placeOn, PointGrid, Tracer, View}
   from '../../io/drawing/html/geometry.js';
 import {arc, line} from './pieces.js';
 import {randomFrom} from './random.js';
@@ -195,6 +195,34 @@ describe('distanceTo', () => {
         least = Math.min(least, Math.hypot(px - x, py - y));
       }
       assert.ok(distance <= least + 1e-12 && distance >= least - 0.02, `${i}`);
+    }
+  });
+});
+
+describe('footOn', () => {
+  it('is the length from the start to the nearest place, the ends included', () => {
+    const piece = line([1, 1], [5, 1]);
+    assert.deepEqual([footOn(piece, 3, 7), footOn(piece, -9, 2), footOn(piece, 8, 2)], [2, 0, 4]);
+    const bow = arc([0, 0], 2, 0, quarter);
+    assertNear([footOn(bow, 3, 3), footOn(bow, 2, -1), footOn(bow, -1, 2)],
+               [quarter, 0, 2 * quarter]);
+    assertNear([footOn(arc([0, 0], 2, 0, quarter, false), 1, -1)], [quarter]);
+  });
+  it('is the start of a piece without length', () => {
+    assert.equal(footOn(line([3, 3], [3, 3]), 5, 5), 0);
+  });
+  it('is as near as any other place of the piece', () => {
+    const random = randomFrom(11);
+    for (let k = 0; k < 200; ++k) {
+      const piece = k % 2 ? line([random(), random()], [random(), random()])
+                          : arc([random(), random()], random() + 0.1, 6 * random(), 6 * random(),
+                                k % 4 === 0);
+      const [x, y] = [3 * random() - 1, 3 * random() - 1];
+      const distance = distanceTo(piece, x, y);
+      for (let i = 0; i <= 100; ++i) {
+        const place = placeOn(piece, piece.length * i / 100);
+        assert.ok(Math.hypot(x - place[0], y - place[1]) >= distance - 1e-12);
+      }
     }
   });
 });

@@ -21,13 +21,14 @@ export function contourData(pieces) {
 /**
  * A segment from (0, 0) to (10, 0) with points at x = 0, 5 and 10 that are `offsets` to its left.
  * @param w tolerance of all points, or of each
+ * @param outside indexes of the points outside it
  */
-export function measuredData(offsets, w) {
+export function measuredData(offsets, w, outside = []) {
   const x = [0, 5, 10];
   return {
     points: {x, y: offsets, w},
     pieces: [line([0, 0], [10, 0])],
-    deviations: {signed: offsets, piece: [0, 0, 0], along: x},
+    deviations: {signed: offsets, piece: [0, 0, 0], outside},
     magnify: 100,
     worst: 0,
     isClosed: false,

@@ -26,17 +26,18 @@ describe('Scene', () => {
     assert.equal(scene.length, 7);
     assert.equal(scene.isMeasured, false);
   });
-  it('knows what is outside its tolerance', () => {
-    const scene = new Scene(measuredData([0.1, -0.2, 0.3], 0.2));
+  it('takes from the data what is outside its tolerance', () => {
+    const scene = new Scene(measuredData([0.1, -0.2, 0.3], 0.2, [2]));
     assert.deepEqual([0, 1, 2].map((i) => scene.isOutside(i)), [false, false, true]);
     assert.equal(scene.relative(2), 0.3 / 0.2);
   });
-  it('forgives a tolerance exceeded by rounding alone', () => {
-    const scene = new Scene(measuredData([0.2 * (1 + 9e-7), 0.2 * (1 + 1.1e-6), 0], 0.2));
-    assert.deepEqual([0, 1, 2].map((i) => scene.isOutside(i)), [false, true, false]);
-  });
-  it('takes a deviation that is not a number for outside', () => {
-    assert.equal(new Scene(measuredData([NaN, 0, 0], 0.2)).isOutside(0), true);
+  it('finds the foot of each point on its piece', () => {
+    const data = measuredData([0.1, -0.2, 0.3], 0.2);
+    data.pieces = [line([-5, 0], [5, 0]), line([5, 0], [10, 0])];
+    data.deviations.piece = [0, 0, 1];
+    const scene = new Scene(data);
+    assert.deepEqual([...scene.alongs], [5, 10, 15]);
+    assert.deepEqual([[...scene.footX], [...scene.footY]], [[0, 5, 10], [0, 0, 0]]);
   });
   it('knows tolerances of their own from one for all', () => {
     const one = new Scene(measuredData([0, 0, 0], 0.2));

@@ -4,9 +4,10 @@ import {gridTicks, paintAxisLabels, paintGrid} from './axes.js';
 import {placeOn, boxOf, View, Tracer} from './geometry.js';
 import {bandPaths} from './band.js';
 import {arrow, ring, square} from './marks.js';
-import {paintPoints} from './points.js';
+import {paintPoints, pointRanges} from './points.js';
 import {FEW_POINTS, Occupancy} from './scene.js';
 import {PAPER_WIDTH, Surface} from './surface.js';
+import {Remembered} from './thinning.js';
 
 /** Pixels of a piece with its number beside it. */
 const LEAST_LABEL_ROOM = 34;
@@ -17,6 +18,7 @@ export class ContourDrawing {
     this.state = state;
     this.view = new View();
     this.isFresh = true;
+    this.ranges = new Remembered();
     const paper = [PAPER_WIDTH, scene.isMeasured && !scene.isTall ? 325 : 529];
     this.surface = new Surface(canvas, paper, (...page) => this.paint(...page));
   }
@@ -49,6 +51,13 @@ export class ContourDrawing {
   /** Pixel of a point as drawn. */
   pixelOf(i) { return [this.view.px(this.scene.x[i]), this.view.py(this.scene.y[i])]; }
 
+  /** The points that stand for all of very many, for as long as the view stays. */
+  thinned() {
+    const {x, y, scale, width, height} = this.view;
+    return this.ranges.get([x, y, scale, width, height, this.scene.times].join(),
+                           () => pointRanges(this));
+  }
+
   pointAt(px, py, reach) {
     const view = this.view;
     return this.scene.grid.nearest(view.planeX(px), view.planeY(py), reach / view.scale);
@@ -74,7 +83,7 @@ export class ContourDrawing {
     // So many points would hide the contour.
     const areMany = this.scene.count > FEW_POINTS;
     if (!areMany) this.paintPieces();
-    const visible = paintPoints(this);
+    const isPointVisible = paintPoints(this);
     if (areMany) this.paintPieces();
     this.paintJoints();
     this.paintEnds();
@@ -82,7 +91,7 @@ export class ContourDrawing {
     if (this.scene.hasContour) this.paintNumbers();
     this.paintHovered();
     paintAxisLabels(context, this.view, ticks, {colors, units: this.scene.units});
-    this.onPainted?.(visible.length > 0 || this.isPieceVisible());
+    this.onPainted?.(isPointVisible || this.isPieceVisible());
   }
 
   /** Whether any piece runs through the canvas. */

@@ -1,9 +1,11 @@
 // The deviations along the contour, positive to the left of the direction of travel.
 
+import {columnRanges, paintDots} from './dots.js';
+import {PointGrid} from './geometry.js';
+import {ring} from './marks.js';
 import {ticksBetween} from './numbers.js';
-import {FEW_POINTS, Occupancy} from './scene.js';
 import {PAPER_WIDTH, Surface} from './surface.js';
-import {cross, ring} from './marks.js';
+import {Remembered} from './thinning.js';
 
 const PLOT = {left: 72, right: 16, top: 26, bottom: 36};
 const STRIP = 14;
@@ -17,7 +19,7 @@ export class Diagram {
     this.state = state;
     this.isRelative = scene.hasTolerances && !scene.isToleranceUniform;
     this.values = new Float64Array(scene.count);
-    this.alongs = Float64Array.from({length: scene.count}, (_, i) => scene.along(i));
+    this.ranges = new Remembered();
     [this.from, this.to] = [0, scene.length];
     this.setRelative(this.isRelative);
     this.surface = new Surface(canvas, [PAPER_WIDTH - HISTOGRAM_ON_PAPER, 174],
@@ -42,8 +44,15 @@ export class Diagram {
   px(along) {
     return PLOT.left + this.plotWidth * (along - this.from) / (this.to - this.from || 1);
   }
+  alongAt(px) { return this.from + (px - PLOT.left) / this.plotWidth * (this.to - this.from); }
   py(value) { return PLOT.top + 0.5 * this.plotHeight * (1 - value / this.range); }
-  pixelOf(i) { return [this.px(this.alongs[i]), this.py(this.values[i])]; }
+  /** The points that stand for all of very many, for as long as the view stays. */
+  thinned() {
+    const {from, to, width, height, isRelative} = this;
+    return this.ranges.get([from, to, width, height, isRelative].join(), () => columnRanges(this));
+  }
+
+  pixelOf(i) { return [this.px(this.scene.along(i)), this.py(this.values[i])]; }
 
   zoom(px, py, factor) {
     const share = Math.min(1, Math.max(0, (px - PLOT.left) / this.plotWidth));
@@ -72,20 +81,25 @@ export class Diagram {
     this.show(0.5 * (starts[index] + starts[index + 1] - size), size);
   }
 
+  /** The points side by side along the contour, whatever their deviation. */
+  get grid() {
+    this.madeGrid ??= new PointGrid(this.scene.alongs, new Float64Array(this.scene.count));
+    return this.madeGrid;
+  }
+
   pointAt(px, py, reach) {
     let found = -1;
     let least = reach * reach;
-    for (let i = 0; i < this.scene.count; ++i) {
-      const dx = this.px(this.alongs[i]) - px;
-      if (Math.abs(dx) > reach) continue;
-      const distance = dx * dx + (this.py(this.values[i]) - py) ** 2;
-      if (distance < least) [least, found] = [distance, i];
-    }
+    this.grid.visit([this.alongAt(px - reach), 0, this.alongAt(px + reach), 0], (i) => {
+      const [x, y] = this.pixelOf(i);
+      const distance = (x - px) ** 2 + (y - py) ** 2;
+      if (distance < least || (distance === least && i < found)) [least, found] = [distance, i];
+    });
     return found;
   }
 
   pieceAt(px) {
-    const along = this.from + (px - PLOT.left) / this.plotWidth * (this.to - this.from);
+    const along = this.alongAt(px);
     if (!(along >= this.from && along <= this.to)) return -1;
     const starts = this.scene.starts;
     let low = 0, high = this.scene.pieces.length - 1;
@@ -107,7 +121,7 @@ export class Diagram {
     context.clip();
     this.paintBand();
     this.paintPieces();
-    this.paintDots();
+    paintDots(this);
     this.paintRings();
     context.restore();
     this.paintAxes();
@@ -181,43 +195,6 @@ export class Diagram {
         before = left;
       }
     });
-  }
-
-  paintDots() {
-    const {context, scene, colors} = this;
-    const free = new Occupancy(this.width, this.height, scene.count > FEW_POINTS ? 1 : 0.25);
-    const kinds = {line: [], arc: [], outside: []};
-    for (let i = 0; i < scene.count; ++i) {
-      if (this.alongs[i] < this.from || this.alongs[i] > this.to) continue;
-      const [x, y] = this.pixelOf(i);
-      if (!free.take(x, y)) continue;
-      kinds[scene.isOutside(i) ? 'outside' : scene.isOnArc(i) ? 'arc' : 'line'].push([x, y]);
-    }
-    const count = kinds.line.length + kinds.arc.length;
-    const room = 0.7 * this.plotWidth / Math.max(1, count);
-    const size = Math.min(5, Math.max(count > 2000 ? 1.8 : 3, room));
-    const isCoarse = count > FEW_POINTS;
-    context.fillStyle = colors.line;
-    context.beginPath();
-    for (const [x, y] of kinds.line) {
-      if (isCoarse) {
-        context.rect(x - 0.5 * size, y - 0.5 * size, size, size);
-      } else {
-        context.moveTo(x + 0.5 * size, y);
-        context.arc(x, y, 0.5 * size, 0, 2 * Math.PI);
-      }
-    }
-    context.fill();
-    context.fillStyle = colors.arc;
-    context.beginPath();
-    const side = 0.9 * size;
-    for (const [x, y] of kinds.arc) context.rect(x - 0.5 * side, y - 0.5 * side, side, side);
-    context.fill();
-    context.strokeStyle = colors.outside;
-    context.lineWidth = 1.2;
-    context.beginPath();
-    for (const place of kinds.outside) cross(context, place, 3);
-    context.stroke();
   }
 
   paintRings() {

@@ -207,40 +207,47 @@ export class PointGrid {
   nearest(x, y, reach) {
     let found = -1;
     let least = reach * reach;
-    const lastRow = this.row(y + reach), lastColumn = this.column(x + reach);
-    for (let row = this.row(y - reach); row <= lastRow; ++row) {
-      for (let column = this.column(x - reach); column <= lastColumn; ++column) {
-        const cell = row * this.columns + column;
-        for (let k = this.begin[cell]; k < this.begin[cell + 1]; ++k) {
-          const i = this.points[k];
-          const distance = (this.x[i] - x) ** 2 + (this.y[i] - y) ** 2;
-          if (distance < least || (distance === least && (found < 0 || i < found))) {
-            least = distance;
-            found = i;
-          }
-        }
+    this.visit([x - reach, y - reach, x + reach, y + reach], (i) => {
+      const distance = (this.x[i] - x) ** 2 + (this.y[i] - y) ** 2;
+      if (distance < least || (distance === least && (found < 0 || i < found))) {
+        least = distance;
+        found = i;
       }
-    }
+    });
     return found;
   }
+
+  /** Calls for each point of the cells that the box touches, in no order. */
+  visit([left, bottom, right, top], action) {
+    const lastRow = this.row(top), lastColumn = this.column(right);
+    for (let row = this.row(bottom); row <= lastRow; ++row) {
+      for (let column = this.column(left); column <= lastColumn; ++column) {
+        const cell = row * this.columns + column;
+        for (let k = this.begin[cell]; k < this.begin[cell + 1]; ++k) action(this.points[k]);
+      }
+    }
+  }
+}
+
+/** Length from the start of the piece to its place nearest to (x, y). */
+export function footOn(piece, x, y) {
+  if (piece.kind === 'arc') {
+    const angle = Math.atan2(y - piece.center[1], x - piece.center[0]);
+    let turn = (piece.ccw ? angle - piece.startAngle : piece.startAngle - angle) % (2 * Math.PI);
+    if (turn < 0) turn += 2 * Math.PI;
+    if (turn <= piece.sweep) return turn * piece.radius;
+    const toStart = Math.hypot(x - piece.start[0], y - piece.start[1]);
+    return toStart <= Math.hypot(x - piece.end[0], y - piece.end[1]) ? 0 : piece.length;
+  }
+  const dx = piece.end[0] - piece.start[0], dy = piece.end[1] - piece.start[1];
+  const length2 = dx * dx + dy * dy;
+  if (!(length2 > 0)) return 0;
+  const part = ((x - piece.start[0]) * dx + (y - piece.start[1]) * dy) / length2;
+  return Math.min(1, Math.max(0, part)) * piece.length;
 }
 
 /** Distance in the plane from a place to a piece. */
 export function distanceTo(piece, x, y) {
-  const toEnds = Math.min(Math.hypot(x - piece.start[0], y - piece.start[1]),
-                          Math.hypot(x - piece.end[0], y - piece.end[1]));
-  if (piece.kind === 'arc') {
-    const dx = x - piece.center[0], dy = y - piece.center[1];
-    const angle = Math.atan2(dy, dx);
-    let turn = (piece.ccw ? angle - piece.startAngle : piece.startAngle - angle) % (2 * Math.PI);
-    if (turn < 0) turn += 2 * Math.PI;
-    if (turn > piece.sweep) return toEnds;
-    return Math.min(toEnds, Math.abs(Math.hypot(dx, dy) - piece.radius));
-  }
-  const dx = piece.end[0] - piece.start[0], dy = piece.end[1] - piece.start[1];
-  const length2 = dx * dx + dy * dy;
-  if (!(length2 > 0)) return toEnds;
-  const part = ((x - piece.start[0]) * dx + (y - piece.start[1]) * dy) / length2;
-  if (part < 0 || part > 1) return toEnds;
-  return Math.hypot(x - piece.start[0] - part * dx, y - piece.start[1] - part * dy);
+  const [footX, footY] = placeOn(piece, footOn(piece, x, y));
+  return Math.hypot(x - footX, y - footY);
 }

@@ -1,6 +1,7 @@
 // The legend of the drawing.
 
 import {short} from './numbers.js';
+import {FEW_POINTS} from './scene.js';
 import {element, swatch} from './table.js';
 
 /** What is drawn, as pairs of a picture and its words. */
@@ -11,8 +12,6 @@ export function legendEntries(scene) {
   const outline = 'stroke="var(--text)" stroke-width="1.1"';
   const entries = [];
   const hasKind = (kind) => scene.pieces.some((piece) => piece.kind === kind);
-  const isAnyOutside = () => scene.pieces.some((piece) => piece.worst >= 0 &&
-                                                          scene.isOutside(piece.worst));
   if (scene.hasContour) {
     if (hasKind('line')) entries.push([stroke('line'), 'line']);
     if (hasKind('arc')) entries.push([stroke('arc', true), 'arc']);
@@ -27,7 +26,8 @@ export function legendEntries(scene) {
   if (scene.isMeasured) {
     entries.push(['<circle cx="7" cy="7" r="2.5" fill="var(--point)"/>' +
                   '<rect x="16" y="4.8" width="4.4" height="4.4" fill="var(--point)"/>',
-                  `point of a line, of an arc: deviation${times}`],
+                  `point of a line, of an arc: deviation${times}` +
+                      (scene.count > FEW_POINTS ? '; dense ones are bars' : '')],
                  ['<circle cx="13" cy="7" r="6" fill="none" stroke="var(--worst)" ' +
                   'stroke-width="2"/>',
                   'largest deviation']);
@@ -40,7 +40,7 @@ export function legendEntries(scene) {
   if (scene.hasTolerances) {
     entries.push(['<rect x="4" y="1.5" width="18" height="11" fill="var(--band)" ' +
                   'stroke="var(--band-edge)" stroke-width="1.2"/>', `tolerance${times}`]);
-    if (scene.hasContour && isAnyOutside()) {
+    if (scene.outside.length > 0) {
       entries.push(['<path d="M9.5 3.5l7 7m0-7l-7 7" stroke="var(--outside)" stroke-width="1.4"/>',
                     'outside tolerance']);
     }

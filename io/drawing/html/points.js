@@ -2,6 +2,7 @@
 
 import {cross} from './marks.js';
 import {FEW_POINTS, Occupancy} from './scene.js';
+import {rangesBy} from './thinning.js';
 
 /** The points on the canvas that are not hidden behind others. */
 export function visiblePoints({scene, view}) {
@@ -11,6 +12,25 @@ export function visiblePoints({scene, view}) {
     if (free.take(view.px(scene.x[i]), view.py(scene.y[i]))) visible.push(i);
   }
   return visible;
+}
+
+/**
+ * Of the points on the canvas, those that reach farthest to each side in each pixel along the
+ * contour; nothing while few are on it or nothing is measured.
+ */
+export function pointRanges({scene, view}) {
+  const none = {lowest: [], highest: []};
+  if (!scene.isMeasured || scene.count <= FEW_POINTS) return none;
+  const isOnCanvas = (i) => {
+    const x = view.px(scene.x[i]), y = view.py(scene.y[i]);
+    return x >= 0 && y >= 0 && x <= view.width && y <= view.height;
+  };
+  let onCanvas = 0;
+  for (let i = 0; i < scene.count; ++i) onCanvas += isOnCanvas(i) ? 1 : 0;
+  if (onCanvas <= FEW_POINTS) return none;
+  return rangesBy(scene.count,
+                  (i) => (isOnCanvas(i) ? Math.floor(scene.along(i) * view.scale) : null),
+                  (i) => scene.deviation(i));
 }
 
 /** As large as the distance of neighbours allows. */
@@ -27,10 +47,18 @@ export function dotSize({scene, view}, visible) {
 }
 
 /**
- * Draws the points of a contour drawing: dots on lines, squares on arcs, crosses outside.
- * @return those that are on the canvas and not hidden
+ * Draws the points of a contour drawing: dots on lines, squares on arcs, crosses outside; of very
+ * many the range in each pixel along the contour.
+ * @return whether any is on the canvas
  */
 export function paintPoints(drawing) {
+  const {lowest, highest} = drawing.thinned();
+  if (lowest.length === 0) return paintEachPoint(drawing);
+  paintBars(drawing, lowest, highest);
+  return true;
+}
+
+function paintEachPoint(drawing) {
   const {context, scene, colors} = drawing;
   const visible = visiblePoints(drawing);
   if (scene.times !== 1) paintWhiskers(drawing, visible);
@@ -40,7 +68,7 @@ export function paintPoints(drawing) {
   context.fillStyle = colors.point;
   context.beginPath();
   for (const i of visible) {
-    if (scene.hasContour && scene.isOutside(i)) {
+    if (scene.isOutside(i)) {
       outside.push(i);
       continue;
     }
@@ -55,7 +83,29 @@ export function paintPoints(drawing) {
   }
   context.fill();
   paintCrosses(drawing, outside);
-  return visible;
+  return visible.length > 0;
+}
+
+const BAR_WIDTH = 1.6;  // pixels: neighbours a pixel apart leave no gap
+
+/** A bar from the outermost on one side to the outermost on the other. */
+function paintBars(drawing, lowest, highest) {
+  const {context, scene, view} = drawing;
+  if (scene.times !== 1) paintWhiskers(drawing, [...lowest, ...highest]);
+  context.strokeStyle = drawing.colors.point;
+  context.lineWidth = BAR_WIDTH;
+  context.lineCap = 'round';
+  context.beginPath();
+  lowest.forEach((low, k) => {
+    const [x, y] = drawing.pixelOf(low);
+    context.moveTo(x, y);
+    // A round cap is drawn for a line of some length only.
+    context.lineTo(...(highest[k] === low ? [x + 0.1, y] : drawing.pixelOf(highest[k])));
+  });
+  context.stroke();
+  context.lineCap = 'butt';
+  const free = new Occupancy(view.width, view.height, 2);
+  paintCrosses(drawing, scene.outside.filter((i) => free.take(...drawing.pixelOf(i))));
 }
 
 function paintCrosses(drawing, points) {

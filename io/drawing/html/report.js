@@ -35,6 +35,10 @@ function fillHead() {
     byId('fields').append(entry);
   }
   if (scene.program) byId('program').textContent = `Made by ${scene.program}.`;
+  if (scene.step > 0) {
+    byId('rounding').textContent = `The numbers of so many points are rounded to ${scene.step}` +
+        `${units}; the table of the pieces and the verdict come from the exact ones.`;
+  }
 }
 
 function fillSummary() {

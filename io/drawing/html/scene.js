@@ -1,6 +1,7 @@
 // What is drawn: the data of the page and what follows from it and the magnification.
 
-import {placeOn, boxOf, include, PointGrid, distanceTo} from './geometry.js';
+import {placeOn, boxOf, include, PointGrid, distanceTo, footOn} from './geometry.js';
+import {unpacked} from './packed.js';
 
 /** A place is taken by the first mark that falls on it; later ones would not be seen. */
 export class Occupancy {
@@ -25,17 +26,16 @@ export class Occupancy {
 /** So many points may have true shapes and lines to the contour. */
 export const FEW_POINTS = 4000;
 
-/** The largest relative deviation that counts as within tolerance, as everywhere here. */
-export const LARGEST_RELATIVE = 1 + 1e-6;
-
 export class Scene {
   constructor(data) {
     Object.assign(this, data);
-    this.count = data.points.x.length;
+    this.unpack(data);
+    this.count = this.points.x.length;
     this.hasContour = data.pieces.length > 0;
     /** Whether there are points and a contour that they were measured against. */
     this.isMeasured = this.hasContour && this.count > 0;
     this.hasTolerances = data.points.w !== null;
+    this.findTolerances();
     this.starts = [0];
     for (const piece of this.pieces) this.starts.push(this.starts.at(-1) + piece.length);
     this.length = this.starts.at(-1);
@@ -44,22 +44,35 @@ export class Scene {
     this.setMagnify(1);
   }
 
-  tolerance(i) {
-    const w = this.points.w;
-    return w === null ? null : (Array.isArray(w) ? w[i] : w);
+  /** Numbers by point, and what packed ones keep exactly. */
+  unpack({points, deviations}) {
+    const columns = (table, names) => Object.fromEntries(
+      names.map((name) => [name, unpacked(table[name])]));
+    /** What packed coordinates are a multiple of; 0 for exact ones. */
+    this.step = points.x.bytes ? Number(`1e${-Math.min(points.x.decimals, points.y.decimals)}`) : 0;
+    this.points = columns(points, ['x', 'y', 'w']);
+    this.outside = deviations?.outside ?? [];
+    if (!deviations) return;
+    this.deviations = columns(deviations, ['signed', 'piece']);
+    const {exact} = deviations;
+    exact?.index.forEach((i, k) => {
+      this.deviations.signed[i] = exact.signed[k];
+      if (typeof this.points.w === 'object') this.points.w[i] = exact.w[k];
+    });
   }
 
-  get isToleranceUniform() { return !Array.isArray(this.points.w); }
-
-  get largestTolerance() {
-    const w = this.points.w;
-    return Array.isArray(w) ? w.reduce((a, b) => Math.max(a, b), 0) : w ?? 0;
+  findTolerances() {
+    const {w} = this.points;
+    this.isToleranceUniform = w === null || typeof w === 'number';
+    this.largestTolerance = this.isToleranceUniform ? w ?? 0
+                                                    : w.reduce((a, b) => Math.max(a, b), 0);
+    this.smallestTolerance = this.isToleranceUniform ? w ?? 0
+                                                     : w.reduce((a, b) => Math.min(a, b), Infinity);
+    this.outsideFlags = new Uint8Array(this.count);
+    for (const i of this.outside) this.outsideFlags[i] = 1;
   }
 
-  get smallestTolerance() {
-    const w = this.points.w;
-    return Array.isArray(w) ? w.reduce((a, b) => Math.min(a, b), Infinity) : w ?? 0;
-  }
+  tolerance(i) { return this.isToleranceUniform ? this.points.w : this.points.w[i]; }
 
   /** Whether the part is much higher than it is wide. */
   get isTall() {
@@ -69,20 +82,22 @@ export class Scene {
 
   deviation(i) { return this.deviations.signed[i]; }
   relative(i) { return this.hasTolerances ? this.deviation(i) / this.tolerance(i) : null; }
-  isOutside(i) {
-    return this.hasTolerances && !(Math.abs(this.relative(i)) <= LARGEST_RELATIVE);
-  }
+  isOutside(i) { return this.outsideFlags[i] === 1; }
   pieceOf(i) { return this.deviations.piece[i]; }
   isOnArc(i) { return this.hasContour && this.pieces[this.pieceOf(i)].kind === 'arc'; }
   /** Length along the whole contour of the place nearest to the point. */
-  along(i) { return this.starts[this.pieceOf(i)] + this.deviations.along[i]; }
+  along(i) { return this.alongs[i]; }
 
   findFeet() {
     this.footX = new Float64Array(this.count);
     this.footY = new Float64Array(this.count);
+    this.alongs = new Float64Array(this.count);
+    const {x, y} = this.points;
     for (let i = 0; i < this.count; ++i) {
-      const foot = placeOn(this.pieces[this.pieceOf(i)], this.deviations.along[i]);
-      [this.footX[i], this.footY[i]] = foot;
+      const index = this.pieceOf(i);
+      const along = footOn(this.pieces[index], x[i], y[i]);
+      [this.footX[i], this.footY[i]] = placeOn(this.pieces[index], along);
+      this.alongs[i] = this.starts[index] + along;
     }
   }
 
@@ -110,7 +125,14 @@ export class Scene {
         this.y[i] = this.footY[i] + times * (y[i] - this.footY[i]);
       }
     }
-    this.grid = new PointGrid(this.x, this.y);
+    this.madeGrid = null;
+    this.madeBox = null;
+  }
+
+  /** Of the points as drawn. */
+  get grid() {
+    this.madeGrid ??= new PointGrid(this.x, this.y);
+    return this.madeGrid;
   }
 
   /** Round magnifications up to ten times the one given, which is among them. */
@@ -126,6 +148,11 @@ export class Scene {
 
   /** A box around everything, without what strays far from the points where there are any. */
   box() {
+    this.madeBox ??= this.makeBox();
+    return this.madeBox;
+  }
+
+  makeBox() {
     if (this.count === 0) {
       const box = [Infinity, Infinity, -Infinity, -Infinity];
       for (const [xMin, yMin, xMax, yMax] of this.pieces.map(boxOf)) {

@@ -1,7 +1,6 @@
 // The table of the pieces beside the drawing.
 
 import {columnsOf, worstOf} from './columns.js';
-import {LARGEST_RELATIVE} from './scene.js';
 
 export class PieceTable {
   /** @param actions hover(index or -1), choose(index) */
@@ -32,7 +31,7 @@ export class PieceTable {
     row.append(element('td', String(i + 1)), kind);
     for (const column of this.columns) {
       const cell = element('td', column.text(piece));
-      if (column.isWorst && this.scene.hasTolerances) this.addBar(cell, worstOf(this.scene, piece));
+      if (column.isWorst && this.scene.hasTolerances) this.addBar(cell, piece);
       row.append(this.sorted(cell, column.isMain));
     }
     return row;
@@ -44,12 +43,13 @@ export class PieceTable {
     return cell;
   }
 
-  addBar(cell, value) {
+  addBar(cell, piece) {
+    const value = worstOf(this.scene, piece);
     if (value === null) return;
     cell.classList.add('share');
     const bar = element('i');
     bar.style.width = `${Math.min(100, 100 * value)}%`;
-    bar.classList.toggle('outside', !(value <= LARGEST_RELATIVE));
+    bar.classList.toggle('outside', this.scene.isOutside(piece.worst));
     cell.append(bar);
   }
 

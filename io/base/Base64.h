@@ -1,0 +1,12 @@
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace Vorn::IO {
+
+/// Bytes as text of the 64 characters A-Z, a-z, 0-9, + and /, four for three bytes, filled up with
+/// = at the end (RFC 4648).
+std::string Base64(std::string_view bytes);
+
+}  // namespace Vorn::IO
