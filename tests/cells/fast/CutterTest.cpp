@@ -168,6 +168,17 @@ TEST(Cutter, ASideOfNoLengthIsParallelToNothing) {
   ExpectSameOverlap({{{1, 1.25}, {1, 1.25}, {1, 1.25}}}, kLarge);
 }
 
+TEST(Cutter, LeavesASideTooShortToHaveADirectionToTheFullOverlap) {
+  // Products of its length count as zero, so the full overlap takes it for parallel.
+  Triangle const cutter{{{-1, -1}, {3, -1}, {-1, 3}}};
+  Triangle const alongX{{{0, 0}, {1e-309, 0}, {0.25, 0.5}}};
+  Triangle const alongY{{{0, 0}, {0.5, 0.25}, {0, 1e-309}}};
+  for (Triangle const& other : {alongX, alongY}) {
+    EXPECT_EQ(PlaceOf(other, cutter), Cutter::Place::Unclear);
+    ExpectSameOverlap(other, cutter);
+  }
+}
+
 TEST(Cutter, ATriangleAroundTheCutterIsNotWithin) {
   Triangle const around{{{-9, -8}, {30, -9}, {-7, 31}}};
   EXPECT_EQ(PlaceOf(around, kLarge), Cutter::Place::Crossing);
@@ -181,6 +192,13 @@ TEST(Cutter, KnowsNothingOfCoordinatesThatAreNotFinite) {
     EXPECT_EQ(PlaceOf(kLarge, odd), Cutter::Place::Unclear);
     ExpectSameOverlap(odd, kLarge);
     ExpectSameOverlap(kLarge, odd);
+  }
+}
+
+TEST(Cutter, MeasuresWhatIsClearByTheSizeOfTheTriangles) {
+  Triangle const inside{{{1, 1}, {1.5, 1.25}, {1.125, 1.75}}};
+  for (double const scale : {1e-100, 1e-12, 1e12, 1e90}) {
+    EXPECT_EQ(PlaceOf(Scaled(inside, scale), Scaled(kLarge, scale)), Cutter::Place::Within);
   }
 }
 

@@ -356,6 +356,22 @@ TEST(MeasurePromises, AClosedContourEndsExactlyWhereItBegins) {
   EXPECT_EQ(report.violations[0].amount, 0x1p-60);
 }
 
+TEST(MeasurePromises, WhatIsMissingToCloseIsALengthAtAnyScale) {
+  for (double const factor : {1.0, 0x1p-900, 0x1p900}) {
+    Case c{Points({{0, 0}, {4, 0}, {4, 4}}, 0.5),
+           ContourBuilder(0, 2).To(4, 0).To(4, 4).To(0.375, 1.5).Build(), RangesUpTo({0, 1, 2}),
+           true};
+    for (WPoint& p : c.points) p = {p.x * factor, p.y * factor, p.w * factor};
+    for (Elem& elem : c.contour) elem.end = Scale(elem.end, factor);
+    Report const report = MeasureCase(c);
+    auto const closed =
+        std::find_if(report.violations.begin(), report.violations.end(),
+                     [](Violation const& v) { return v.promise == Promise::Closed; });
+    ASSERT_NE(closed, report.violations.end());
+    EXPECT_EQ(closed->amount, 0.625 * factor);
+  }
+}
+
 TEST(MeasurePromises, AnArcOfEqualAnglesIsAFullTurn) {
   Case c = HalfCircle();
   c.contour = ContourBuilder(5, 0).Around({0, 0}, 5, 0, 1).Build();
