@@ -13,6 +13,7 @@ ROOT = pathlib.Path(__file__).resolve().parent.parent.parent
 WORK = ROOT / "build" / "mutate"
 PROGRAMS = ("unit_tests", "internal_tests")
 LIBRARY = "libGeometryUtils.so.0"
+WAITING = 6  # times the processor time that a test program may take, on a busy machine
 MEMORY = 6 << 30  # bytes; a change must not eat the memory of the machine
 
 
@@ -128,19 +129,20 @@ class Build:
 
 
 def _limits(seconds, is_sanitized):
-    """What bounds a test program even where this script is ended before it."""
+    """What bounds a test program, even where this script is ended before it."""
     def apply():
         os.setsid()
         resource.setrlimit(resource.RLIMIT_CORE, (0, 0))
-        resource.setrlimit(resource.RLIMIT_CPU, (int(seconds) + 1, int(seconds) + 1))
+        resource.setrlimit(resource.RLIMIT_CPU, (int(seconds) + 1, int(seconds) + 2))
         if not is_sanitized:
             resource.setrlimit(resource.RLIMIT_AS, (MEMORY, MEMORY))
     return apply
 
 
 def run_tests(program, library_folder, names, seconds, is_sanitized=False):
-    """Runs the named tests and stops at the first that fails. None when all pass, else what
-    happened: the name of the test that failed, "timeout", or how the program ended."""
+    """Runs the named tests, for so many seconds of processor time at most, and stops at the first
+    that fails. None when all pass, else what happened: the name of the test that failed,
+    "timeout", or how the program ended."""
     environment = dict(os.environ, LD_LIBRARY_PATH=str(library_folder))
     if is_sanitized:
         environment["LSAN_OPTIONS"] = f"suppressions={ROOT}/tests/support/leaks.txt"
@@ -153,15 +155,19 @@ def run_tests(program, library_folder, names, seconds, is_sanitized=False):
                                    errors="replace", env=environment, cwd=library_folder,
                                    preexec_fn=_limits(seconds, is_sanitized))
         try:
-            output, _ = process.communicate(timeout=seconds)
+            output, _ = process.communicate(timeout=WAITING * seconds)
         except subprocess.TimeoutExpired:
             os.killpg(process.pid, signal.SIGKILL)
             process.communicate()
             return "timeout"
     if process.returncode == 0:
         return None
-    started = [line for line in output.splitlines() if line.startswith("[ RUN ")]
-    last = started[-1].split("]")[1].strip() if started else "start of the program"
-    if process.returncode < 0:
-        return f"{signal.Signals(-process.returncode).name} in {last}"
-    return last
+    if process.returncode == -signal.SIGXCPU:
+        return "timeout"
+    mark = "[ RUN " if process.returncode < 0 else "[  FAILED  ]"
+    named = [line.split("]")[1].split(", where")[0].split(" (")[0].strip()
+             for line in output.splitlines() if line.startswith(mark)]
+    if process.returncode > 0:
+        return named[0] if named else "the program fails"
+    signal_name = signal.Signals(-process.returncode).name
+    return f"{signal_name} in {named[-1] if named else 'the start of the program'}"

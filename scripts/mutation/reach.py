@@ -13,6 +13,7 @@ _FOLDER = WORK / "reach"
 _TABLE = _FOLDER / "table.json"
 _LISTENER = "scripts/mutation/ReachListener.cpp"
 _LONGEST_BLOCK = 15  # lines
+_BESIDE = 2  # lines
 _INSTRUMENTED = ["-O1", "-g1", "-w",
                  "-fsanitize-coverage=inline-8bit-counters,pc-table,no-prune"]
 
@@ -69,6 +70,20 @@ def _places(executable, addresses):
     return places
 
 
+def _lines_by_object(objects):
+    """Which lines of which header each object has code of: header -> object -> lines."""
+    found = collections.defaultdict(lambda: collections.defaultdict(set))
+    for name, path in objects.items():
+        header = None
+        for line in run_quietly(["objdump", "--dwarf=decodedline", str(path)]).splitlines():
+            if line.startswith("/"):
+                header = os.path.relpath(line.rstrip(":"), ROOT) if line.endswith(".h:") else None
+            elif header and len(words := line.split()) >= 3 and words[1].isdigit():
+                found[header][name].add(int(words[1]))
+    return {header: {name: sorted(lines) for name, lines in by_object.items()}
+            for header, by_object in found.items()}
+
+
 def measure(build, jobs):
     """Runs every test once and writes down which lines it runs."""
     _FOLDER.mkdir(parents=True, exist_ok=True)
@@ -95,7 +110,8 @@ def measure(build, jobs):
     by_file = collections.defaultdict(dict)
     for (file, line), numbers in lines.items():
         by_file[file][line] = sorted(numbers)
-    _TABLE.write_text(json.dumps({"tests": tests, "lines": by_file}))
+    _TABLE.write_text(json.dumps({"tests": tests, "lines": by_file,
+                                  "objects": _lines_by_object(objects)}))
 
 
 class Reach:
@@ -103,10 +119,26 @@ class Reach:
 
     def __init__(self):
         table = json.loads(_TABLE.read_text())
+        self.objects = table["objects"]
         self.tests = [Test(*entry) for entry in table["tests"]]
         self.lines = {file: {int(line): set(numbers) for line, numbers in lines.items()}
                       for file, lines in table["lines"].items()}
         self.sorted_lines = {file: sorted(lines) for file, lines in self.lines.items()}
+
+    def users_of_line(self, file, line, users):
+        """Those of the objects that include a header and have code of a line of it, or of one
+        beside it; all of them where none has, as with a constant."""
+        lines = self.objects.get(file, {})
+        having = [name for name in users if any(abs(number - line) <= _BESIDE
+                                                for number in lines.get(name, ()))]
+        return having or users
+
+    def breadth(self, file):
+        """How many lines of a file each test runs."""
+        counts = collections.Counter()
+        for numbers in self.lines.get(file, {}).values():
+            counts.update(numbers)
+        return counts
 
     def of_line(self, file, line):
         """(tests that run the block of a line or one beside it, tests that run the file), as sets
@@ -116,7 +148,7 @@ class Reach:
             return set(), set(range(len(self.tests)))
         numbers = self.sorted_lines[file]
         here = bisect.bisect_right(numbers, line)
-        blocks = [number for number in numbers if abs(number - line) <= 2]
+        blocks = [number for number in numbers if abs(number - line) <= _BESIDE]
         if here > 0 and line - numbers[here - 1] <= _LONGEST_BLOCK:
             blocks.append(numbers[here - 1])
         whole = set().union(*self.lines[file].values())
