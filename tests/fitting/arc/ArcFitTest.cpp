@@ -216,6 +216,15 @@ TEST(GetFittingCircleO, KeepsBothFixedEnds) {
   EXPECT_LE(out.deviation, 1.0 + 1e-12);
 }
 
+TEST(GetFittingCircleO, FixedEndsInOnePlaceHaveNoBisectorAndFail) {
+  ArcFitInput in = WholeRun(MakeArcPoints({0, 0}, 10, 0, 6.0, 13, 0.5));
+  in.startFixed = in.endFixed = true;
+  in.start = in.end = {10, 0};
+  EXPECT_EQ(FitArcRun<GeometryUtils>(in).code, ErrorCode::Failed);
+  in.end = {10, -0.5};
+  EXPECT_EQ(FitArcRun<GeometryUtils>(in).code, ErrorCode::Ok);
+}
+
 TEST(GetFittingCircleO, CellsWithoutCommonPartAreNoFit) {
   std::vector<WPoint> points = MakeArcPoints({0, 0}, 10, 0, 1.5, 9, 0.02);
   points[6].x *= 1.05;
