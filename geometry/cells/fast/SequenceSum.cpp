@@ -188,7 +188,6 @@ SequenceSum::Movement const& SequenceSum::MovementOf(Place const& place, int exp
 
 SequenceSum::Movement SequenceSum::TermMovement(Letter letter, int exponent) const {
   Movement movement;
-  movement.exponent = exponent;
   movement.isKnown = true;
   if ((*isSkipped_)[letter]) return movement;
   double const units = (*terms_)[letter] * PowerOfTwo(kFractionBits - exponent);

@@ -188,6 +188,7 @@ TEST(CellSequence, EmptyHasNoCentreAndNoBounds) {
   CellSequence const ofNothing{Cell{}};
   ExpectSameSummary({}, ofNothing);
   EXPECT_FALSE(ofNothing.CentreOfOverlapWith(Triangle{}));
+  EXPECT_FALSE(CellSequence().CentreOfOverlapWith(Triangle{}));
 }
 
 TEST(CellSequence, NarrowedByNothingIsEmpty) {

@@ -106,6 +106,13 @@ TEST(Cutter, SeesWhatIsClearlyBeyondASide) {
   ExpectSameOverlap(beyond, kLarge);
 }
 
+TEST(Cutter, SeesWhatIsBeyondASideThoughItCrossesTheLinesOfOthers) {
+  // Below the lower side; its own sides cross the lines of the two others below their sides.
+  Triangle const below{{{-2, -1}, {6, -1.5}, {2, -3}}};
+  EXPECT_EQ(PlaceOf(below, kLarge), Cutter::Place::Apart);
+  ExpectSameOverlap(below, kLarge);
+}
+
 TEST(Cutter, LeavesCrossingSidesToTheFullOverlap) {
   EXPECT_EQ(PlaceOf({{{1, 1}, {5, 1.5}, {1.25, 2}}}, kLarge), Cutter::Place::Crossing);
 }
@@ -303,6 +310,19 @@ TEST(ChordCutter, SeesWhatLiesOnOneSide) {
   Triangle const crossed{{{0, 0}, {4, 1}, {1, 8}}};
   EXPECT_FALSE(ChordCutterFor(chord, crossed).IsClearlyApartFrom(BoxedTriangle(crossed)));
   ExpectSameChordOverlap(chord, crossed);
+}
+
+TEST(ChordCutter, LeavesEverySideAlongTheChordToTheFullOverlap) {
+  Triangle const chord{{{-5, 1}, {9, 6}, {9, 6}}};
+  // From (0, 0) to (7, 2.5) the side is parallel to the chord, and their boxes meet.
+  Point const start{0, 0};
+  Point const end{7, 2.5};
+  Point const apex{3, -3};
+  for (Triangle const& below :
+       {Triangle{{start, end, apex}}, Triangle{{apex, start, end}}, Triangle{{end, apex, start}}}) {
+    EXPECT_FALSE(ChordCutterFor(chord, below).IsClearlyApartFrom(BoxedTriangle(below)));
+    ExpectSameChordOverlap(chord, below);
+  }
 }
 
 TEST(ChordCutter, LeavesAnEndInTheBoxToTheFullOverlap) {

@@ -82,6 +82,21 @@ std::vector<Segment> RandomChain(RandomGeometry& random, std::int32_t size, doub
   return ChainOf(points);
 }
 
+TEST(Around, LiesAlongTheLongestPartWhereverThatStands) {
+  // Steep parts: an outline along the x axis would be about as wide as they are.
+  Contours::Trapezium const small = TrapeziumOf(ExtentOf({{0.0, 0.0}, {0.125, 0.0}}));
+  Contours::Trapezium const large = TrapeziumOf(ExtentOf({{0.0, 0.0}, {5.0, 10.0}}));
+  for (bool const isLargeFirst : {true, false}) {
+    Contours::Trapezium const parts[] = {isLargeFirst ? large : small,
+                                         isLargeFirst ? small : large};
+    auto const [lower, upper] = Contours::Around(parts, 2);
+    // Twice the area, by the diagonals.
+    double const area2 = std::fabs((upper.from.x - lower.from.x) * (upper.to.y - lower.to.y) -
+                                   (upper.to.x - lower.to.x) * (upper.from.y - lower.from.y));
+    EXPECT_LT(area2, 3.0);
+  }
+}
+
 TEST(BoxTree, WithoutPiecesHasNoPairs) {
   EXPECT_TRUE(PairsOf(BoxTree({}, kMargin)).empty());
   EXPECT_TRUE(PairsOf(BoxTree({ExtentOf({{0, 0}, {1, 1}})}, kMargin)).empty());

@@ -118,6 +118,23 @@ void Disturb(RandomGeometry& random, std::vector<Point>* points) {
   (*points)[static_cast<std::size_t>(random.Integer(0, last))] = random.PointIn(-15, 15);
 }
 
+TEST(AnyPair, TestsAPieceWithoutAnExtentAgainstEveryOther) {
+  Contours::Piece const regular{{0.0, 0.0}, {1.0, 0.0}, nullptr};
+  Contours::Piece const irregular{{50.0, 50.0}, {kInf, 50.0}, nullptr};
+  std::vector<Contours::Piece> const three = {regular, regular, regular};
+  std::vector<Contours::Piece> const odd = {irregular};
+  std::vector<std::size_t> tested;
+  auto const note = [&tested](std::size_t i, std::size_t k) {
+    tested.push_back(i + k);
+    return false;
+  };
+  EXPECT_FALSE(Contours::AnyPair(three, odd, note));
+  EXPECT_EQ(tested, (std::vector<std::size_t>{0, 1, 2}));
+  tested.clear();
+  EXPECT_FALSE(Contours::AnyPair(odd, three, note));
+  EXPECT_EQ(tested, (std::vector<std::size_t>{0, 1, 2}));
+}
+
 TEST(SearchOfContours, AgreesOnChainsOfSegments) {
   RandomGeometry random(61);
   ContourComparison comparison;

@@ -1,4 +1,5 @@
 #include <cmath>
+#include <utility>
 #include <vector>
 
 #include "geometry/fitting/arc/PointSpread.h"
@@ -67,6 +68,19 @@ TEST(FindSpread, AgreesWithAllPairsOnCirclesAndArcs) {
       SCOPED_TRACE(testing::Message() << count << " points over " << sweep);
       ExpectPlainSpread(CirclePoints(count, 25.0, sweep));
     }
+  }
+}
+
+TEST(FindSpread, FindsThePairFarthestAlongEitherAxisWhereverItStands) {
+  RandomGeometry random(31);
+  for (int round = 0; round < 40; ++round) {
+    SCOPED_TRACE(testing::Message() << "seed 31, round " << round);
+    std::vector<WPoint> flat;
+    for (int i = 0; i < 120; ++i)
+      flat.push_back({random.Uniform(-9.0, 9.0), random.Uniform(-0.1, 0.1), 0.1});
+    ExpectPlainSpread(flat);
+    for (WPoint& p : flat) std::swap(p.x, p.y);
+    ExpectPlainSpread(flat);
   }
 }
 
