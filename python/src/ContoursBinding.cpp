@@ -178,15 +178,25 @@ PieceRows Split(PieceRows const& rows, int parts) {
 
 using Place = std::pair<double, double>;
 
+IO::XY PlaceFrom(Place const& place) {
+  if (!std::isfinite(place.first) || !std::isfinite(place.second)) {
+    Raise({ErrorCode::Failed, "x or y of a place is not finite", {}});
+  }
+  return {place.first, place.second};
+}
+
 PieceRows Line(Place const& start, Place const& end) {
-  return RowsOf({IO::MakeLine({start.first, start.second}, {end.first, end.second})});
+  return RowsOf({IO::MakeLine(PlaceFrom(start), PlaceFrom(end))});
 }
 
 PieceRows Arc(Place const& start, Place const& end, Place const& center, bool ccw) {
-  IO::XY const from = {start.first, start.second};
-  IO::XY const about = {center.first, center.second};
-  return RowsOf(
-      {IO::MakeArc(from, {end.first, end.second}, about, IO::Distance(from, about), ccw)});
+  IO::XY const from = PlaceFrom(start);
+  IO::XY const about = PlaceFrom(center);
+  double const radius = IO::Distance(from, about);
+  if (!(radius > 0.0) || !std::isfinite(radius)) {
+    Raise({ErrorCode::InvalidArcRadius, "the radius of an arc is not a number above 0", {}});
+  }
+  return RowsOf({IO::MakeArc(from, PlaceFrom(end), about, radius, ccw)});
 }
 
 }  // namespace

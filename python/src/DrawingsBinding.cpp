@@ -1,11 +1,13 @@
 #include <pybind11/pybind11.h>
 #include <pybind11/stl.h>
 
+#include <cmath>
 #include <optional>
 #include <string>
 #include <utility>
 
 #include "Bindings.h"
+#include "Errors.h"
 #include "PieceRow.h"
 #include "Points.h"
 #include "vorn/io/Drawing.h"
@@ -19,6 +21,7 @@ namespace {
 
 IO::Drawing DrawingOf(PieceRows const& rows, bool isClosed, std::string const& units,
                       py::object const& points, py::object const& tolerance) {
+  if (rows.size() == 0) Raise({ErrorCode::Failed, "the contour has no pieces", {}});
   if (points.is_none()) return IO::DrawingOf(ContourFrom(rows, isClosed, units));
   PointsInput input = PointsFrom(points, tolerance);
   RequireUsable(input);
@@ -26,6 +29,13 @@ IO::Drawing DrawingOf(PieceRows const& rows, bool isClosed, std::string const& u
   IO::Drawing drawing = IO::MakeDrawing(std::move(input.points), PiecesFrom(rows));
   drawing.units = units;
   return drawing;
+}
+
+void SetMagnify(IO::Drawing& drawing, std::optional<double> magnify) {
+  if (magnify && !(*magnify > 0.0 && std::isfinite(*magnify))) {
+    throw py::value_error("magnify must be a number above 0");
+  }
+  drawing.magnify = magnify;
 }
 
 /// SVG and HTML as text in UTF-8, PNG as pixels.
@@ -44,7 +54,8 @@ void BindDrawings(py::module_& module) {
       .def(py::init(&DrawingOf))
       .def_readwrite("title", &IO::Drawing::title)
       .def_readwrite("facts", &IO::Drawing::facts)
-      .def_readwrite("magnify", &IO::Drawing::magnify)
+      .def_property(
+          "magnify", [](IO::Drawing const& drawing) { return drawing.magnify; }, &SetMagnify)
       .def("draw", &Draw);
 }
 

@@ -16,6 +16,12 @@ namespace {
   throw py::error_already_set();
 }
 
+/// What a message quotes of a file need not be UTF-8.
+py::object TextOf(std::string const& message) {
+  return py::reinterpret_steal<py::object>(PyUnicode_DecodeUTF8(
+      message.data(), static_cast<py::ssize_t>(message.size()), "backslashreplace"));
+}
+
 py::object ErrorsModule() { return py::module_::import("vorn.errors"); }
 
 ErrorCode CodeOf(IO::FailureKind kind) {
@@ -35,7 +41,7 @@ ErrorCode CodeOf(IO::FailureKind kind) {
 }  // namespace
 
 void Raise(Problem const& problem) {
-  RaiseInstance(ErrorsModule().attr("error_for")(problem.message,
+  RaiseInstance(ErrorsModule().attr("error_for")(TextOf(problem.message),
                                                  static_cast<std::int32_t>(problem.code),
                                                  py::tuple(py::cast(problem.indices))));
 }
@@ -43,14 +49,17 @@ void Raise(Problem const& problem) {
 void Raise(IO::Failure const& failure) {
   if (failure.Kind() == IO::FailureKind::File) {
     IO::Place const& place = failure.Where();
-    RaiseInstance(
-        ErrorsModule().attr("FileError")(failure.what(), place.file, place.line, place.column));
+    RaiseInstance(ErrorsModule().attr("FileError")(TextOf(failure.what()), TextOf(place.file),
+                                                   place.line, place.column));
   }
   Raise({CodeOf(failure.Kind()), failure.what(), {}});
 }
 
 void RequireOk(ErrorCode code, char const* operation) {
-  if (code != ErrorCode::Ok) Raise({code, std::string(operation) + ": " + IO::Describe(code), {}});
+  if (code == ErrorCode::Ok) return;
+  std::string const why =
+      code == ErrorCode::Failed ? "there is no answer for this input" : IO::Describe(code);
+  Raise({code, std::string(operation) + ": " + why, {}});
 }
 
 void RequireSuccess(bool succeeded, char const* operation) {

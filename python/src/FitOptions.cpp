@@ -21,8 +21,10 @@ IO::Strategy StrategyFrom(py::handle given) {
 }
 
 IO::ClosedChoice ClosedFrom(py::handle given) {
-  if (py::isinstance<py::bool_>(given)) {
-    return given.cast<bool>() ? IO::ClosedChoice::Yes : IO::ClosedChoice::No;
+  bool const isOfNumPy = py::isinstance(given, py::module_::import("numpy").attr("bool_"));
+  if (py::isinstance<py::bool_>(given) || isOfNumPy) {
+    return py::bool_(py::reinterpret_borrow<py::object>(given)) ? IO::ClosedChoice::Yes
+                                                                : IO::ClosedChoice::No;
   }
   return Chosen<IO::ClosedChoice>({{"auto", IO::ClosedChoice::Auto},
                                    {"yes", IO::ClosedChoice::Yes},

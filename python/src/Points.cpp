@@ -32,19 +32,29 @@ py::array ViewOf(std::vector<WPoint>* points, Columns const& columns) {
   return {py::dtype::of<double>(), shape, strides, data, py::none()};
 }
 
+py::object AsArray(py::object const& points) {
+  return py::module_::import("numpy").attr("asarray")(points);
+}
+
+/// What is masked has no value, which an array of the same numbers would not tell.
+void RefuseMasked(py::object const& source) {
+  if (py::module_::import("numpy").attr("ma").attr("is_masked")(source).cast<bool>()) {
+    throw py::value_error("some values are masked; leave those points out");
+  }
+}
+
 /// NumPy converts and walks the strides; it refuses what does not become a number, and shapes that
-/// do not fit.
+/// do not fit. Objects are taken where each of them is a number.
 void Copy(py::object const& source, std::vector<WPoint>* points, Columns const& columns) {
   if (points->empty()) return;
-  py::module_::import("numpy").attr("copyto")(ViewOf(points, columns), source, "same_kind");
+  RefuseMasked(source);
+  py::array const array = AsArray(source);
+  char const* const casting = array.dtype().kind() == 'O' ? "unsafe" : "same_kind";
+  py::module_::import("numpy").attr("copyto")(ViewOf(points, columns), array, casting);
 }
 
 bool IsFrame(py::object const& points) {
   return py::hasattr(points, "columns") && py::hasattr(points, "__getitem__");
-}
-
-py::object AsArray(py::object const& points) {
-  return py::module_::import("numpy").attr("asarray")(points);
 }
 
 PointsInput FromFrame(py::object const& frame) {
@@ -55,14 +65,15 @@ PointsInput FromFrame(py::object const& frame) {
   }
   PointsInput input;
   input.points.resize(py::len(frame));
-  Copy(AsArray(frame["x"]), &input.points, {0});
-  Copy(AsArray(frame["y"]), &input.points, {1});
+  Copy(frame["x"], &input.points, {0});
+  Copy(frame["y"], &input.points, {1});
   input.hasTolerances = frame.attr("columns").contains("w");
-  if (input.hasTolerances) Copy(AsArray(frame["w"]), &input.points, {2});
+  if (input.hasTolerances) Copy(frame["w"], &input.points, {2});
   return input;
 }
 
-PointsInput FromArray(py::array const& array) {
+PointsInput FromArray(py::object const& points) {
+  py::array const array = AsArray(points);
   py::ssize_t const width = array.ndim() == 2 ? array.shape(1) : 0;
   if (width != 2 && width != kLengthOfPoint) {
     throw py::value_error("points must have the shape (n, 2) or (n, 3), not " +
@@ -70,7 +81,7 @@ PointsInput FromArray(py::array const& array) {
   }
   PointsInput input;
   input.points.resize(static_cast<std::size_t>(array.shape(0)));
-  Copy(array, &input.points, {0, width});
+  Copy(points, &input.points, {0, width});
   input.hasTolerances = width == kLengthOfPoint;
   return input;
 }
@@ -84,7 +95,7 @@ PointsInput FromArray(py::array const& array) {
 }  // namespace
 
 PointsInput PointsFrom(py::object const& points, py::object const& tolerance) {
-  PointsInput input = IsFrame(points) ? FromFrame(points) : FromArray(AsArray(points));
+  PointsInput input = IsFrame(points) ? FromFrame(points) : FromArray(points);
   if (!tolerance.is_none()) {
     Copy(tolerance, &input.points, {2});
     input.hasTolerances = true;

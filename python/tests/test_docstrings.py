@@ -70,6 +70,15 @@ def test_the_list_is_whole():
 
 
 @pytest.mark.parametrize("name", MEMBERS)
+def test_its_example_has_its_own_section_behind_others(name):
+    """Else the reference would show it as one more parameter or error."""
+    text = inspect.getdoc(MEMBERS[name])
+    if "\n------" in text:
+        before, _ = text.split(">>>", 1)
+        assert before.endswith("Examples\n--------\n")
+
+
+@pytest.mark.parametrize("name", MEMBERS)
 def test_it_has_an_example_that_runs(name):
     text = inspect.getdoc(MEMBERS[name])
     assert text, "there is no docstring"

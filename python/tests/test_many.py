@@ -1,5 +1,6 @@
 """Many scans on the threads of one machine, and in frames of pandas."""
 
+import concurrent.futures
 import itertools
 import pickle
 import threading
@@ -51,6 +52,38 @@ def test_scans_are_fetched_only_a_little_ahead():
         next(results)
     assert last[0] < 30
     results.close()
+
+
+class Client:
+    """What of a Dask client is used; batches that hold a deadly scan kill the worker."""
+
+    def __init__(self):
+        self.batches = []
+
+    def nthreads(self):
+        return {"a": 1, "b": 1}
+
+    def submit(self, work, scans, options, pure):
+        assert not pure
+        self.batches.append([number for number, _ in scans])
+        future = concurrent.futures.Future()
+        if any(points == "deadly" for _, points in scans if isinstance(points, str)):
+            future.set_exception(ChildProcessError("the worker died"))
+        else:
+            future.set_result(work(scans, options))
+        return future
+
+
+def test_a_batch_that_kills_workers_is_taken_apart():
+    client = Client()
+    scans = [scan(seed, 50) for seed in range(7)]
+    scans[4] = "deadly"
+    results = list(vorn.fit_many(scans, tol=TOL, client=client, batch=3))
+    assert [result.number for result in results] == list(range(7))
+    assert [result.contour is None for result in results] == [n == 4 for n in range(7)]
+    assert isinstance(results[4].error, ChildProcessError)
+    assert results[3].contour == vorn.fit(scans[3], tol=TOL)
+    assert sorted(client.batches) == [[0, 1, 2], [3], [3, 4, 5], [4], [5], [6]]
 
 
 def test_no_scans_no_results():

@@ -50,6 +50,27 @@ def test_the_band_is_the_tolerance(ax, contour):
     assert upper == pytest.approx([0.1, 0.2, 0.2]) and lower == pytest.approx(-upper)
 
 
+def test_the_band_of_a_closed_contour_is_closed(ax):
+    square = vorn.Contour.starting_at((0, 0))
+    for corner in [(4, 0), (4, 4), (0, 4), (0, 0)]:
+        square = square.append_line(corner)
+    vorn.plot(square, points=[(2, 0), (4, 2), (2, 4), (0, 2)], tol=0.5, magnify=1, ax=ax)
+    for band in ax.lines[:2]:
+        assert len(band.get_xdata()) == 5
+        assert square.deviations(band.get_xydata()[1:4]) == pytest.approx(0.5)
+
+
+def test_what_cannot_be_drawn_is_refused(ax, contour):
+    with pytest.raises(vorn.ContourError):
+        vorn.plot(vorn.Contour(), ax=ax)
+    for wrong in ([], [1, 2], [(1, 2, 3, 4)]):
+        with pytest.raises(ValueError):
+            vorn.plot(contour, points=wrong, ax=ax)
+    for options in ({"tol": 0}, {"tol": np.nan}, {"magnify": -1}, {"magnify": np.inf}):
+        with pytest.raises(ValueError):
+            vorn.plot(contour, points=[(1, 0)], ax=ax, **options)
+
+
 @pytest.mark.parametrize("widest, times", [(0.1, "5"), (0.001, "500"), (0.0004, "1000"), (3, "")])
 def test_the_magnification_is_a_round_number(ax, contour, widest, times):
     vorn.plot(contour, points=[(1, 0), (2, 0)], tol=widest, ax=ax)

@@ -45,6 +45,8 @@ class Contour(ContourFacts, ContourMeasures, ContourEdits, ContourFiles, Sequenc
     ------
     TypeError
         A piece is neither a Line nor an Arc.
+    ContourError
+        A place is not finite, or a radius or sweep is none.
 
     Examples
     --------

@@ -36,6 +36,8 @@ class ContourDrawings(ContourRows):
         ValueError
             The points have another shape.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> line = Contour.starting_at((0, 0)).append_line((4, 0))
         >>> "</svg>" in line.to_svg([(1, 0.01), (3, -0.01)], tol=0.02, title="A line")

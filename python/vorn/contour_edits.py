@@ -9,7 +9,11 @@ import numpy.typing as npt
 
 from vorn import _core
 from vorn.contour_rows import ContourRows
+from vorn.errors import ContourError
 from vorn.pieces import Place
+
+#: The places of every piece.
+_ENDS = ("start_x", "start_y", "end_x", "end_y")
 
 _Contour = TypeVar("_Contour", bound="ContourEdits")
 
@@ -29,11 +33,19 @@ class ContourEdits(ContourRows):
         units : str
             "mm", "inch" and so on, for files; may be empty.
 
+        Raises
+        ------
+        ContourError
+            The start is not finite.
+
+        Examples
+        --------
         >>> from vorn import Contour
         >>> Contour.starting_at((1, 2)).append_line((4, 6)).length
         5.0
         """
-        return cls._of(_core.no_rows(), False, units, start=(float(start[0]), float(start[1])))
+        x, y = _core.line(start, start)[["start_x", "start_y"]].item()
+        return cls._of(_core.no_rows(), False, units, start=(x, y))
 
     @property
     def start(self) -> Place:
@@ -63,17 +75,21 @@ class ContourEdits(ContourRows):
         return self.start
 
     def shifted(self: _Contour, dx: float, dy: float) -> _Contour:
-        """The same contour moved by (dx, dy), in the unit of the points.
+        """The same contour moved by (dx, dy), in the unit of the points. Raises ContourError where
+        that leaves the range of numbers.
 
         >>> from vorn import Contour
         >>> Contour.starting_at((0, 0)).append_line((1, 0)).shifted(2, 3).end
         (3.0, 3.0)
         """
         rows = self._rows.copy()
-        for end in ("start", "end", "center"):
-            rows[end + "_x"] += dx
-            rows[end + "_y"] += dy
+        with np.errstate(over="ignore", invalid="ignore"):
+            for end in ("start", "end", "center"):
+                rows[end + "_x"] += dx
+                rows[end + "_y"] += dy
         start = None if self._start is None else (self._start[0] + dx, self._start[1] + dy)
+        if not np.isfinite([dx, dy, *(rows[name].sum() for name in _ENDS)]).all():
+            raise ContourError(f"a contour cannot be moved by {dx!r}, {dy!r}")
         return self._of(rows, self._closed, self._units, self._facts, start)
 
     def reversed(self: _Contour) -> _Contour:
@@ -102,6 +118,8 @@ class ContourEdits(ContourRows):
         ValueError
             There would be less than two parts.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> [p.end for p in Contour.starting_at((0, 0)).append_line((4, 0)).split(0)]
         [(2.0, 0.0), (4.0, 0.0)]
@@ -112,7 +130,8 @@ class ContourEdits(ContourRows):
                         self._units)
 
     def append_line(self: _Contour, end: Place) -> _Contour:
-        """The contour with a line from its end to `end`, (x, y), behind it.
+        """The contour with a line from its end to `end`, (x, y), behind it. Raises ContourError for
+        a place that is not finite.
 
         >>> from vorn import Contour
         >>> Contour.starting_at((0, 0)).append_line((1, 0)).append_line((1, 1)).length
@@ -131,6 +150,13 @@ class ContourEdits(ContourRows):
         ccw : bool
             Whether the arc runs counter-clockwise, the y axis pointing up.
 
+        Raises
+        ------
+        ContourError
+            A place is not finite, or the center is the end of the contour.
+
+        Examples
+        --------
         >>> from vorn import Contour
         >>> bend = Contour.starting_at((0, 0)).append_arc((2, 2), center=(0, 2), ccw=True)
         >>> bend[0].radius, round(bend.length, 6)

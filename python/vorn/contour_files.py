@@ -35,6 +35,8 @@ class ContourFiles(ContourDrawings):
         ValueError, TypeError
             There is no such format or option.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> Contour.starting_at((0, 0)).append_line((1, 0)).to_text("wkt")
         'LINESTRING (0 0, 1 0)\\n'
@@ -58,6 +60,8 @@ class ContourFiles(ContourDrawings):
         ValueError
             There is no such format.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> Contour.from_text("LINESTRING (0 0, 3 4)", "wkt").length
         5.0
@@ -183,11 +187,14 @@ class ContourFiles(ContourDrawings):
         FileError
             The file cannot be written.
 
+        Examples
+        --------
         >>> import pathlib, tempfile
         >>> from vorn import Contour
-        >>> path = pathlib.Path(tempfile.mkdtemp(), "line.wkt")
-        >>> Contour.starting_at((0, 0)).append_line((1, 0)).save(path)
-        >>> path.read_text()
+        >>> with tempfile.TemporaryDirectory() as folder:
+        ...     path = pathlib.Path(folder, "line.wkt")
+        ...     Contour.starting_at((0, 0)).append_line((1, 0)).save(path)
+        ...     path.read_text()
         'LINESTRING (0 0, 1 0)\\n'
         """
         name = os.fspath(path)
@@ -217,11 +224,13 @@ class ContourFiles(ContourDrawings):
         FileError
             The file cannot be read or holds no contour; `line` and `column` tell where that shows.
 
-        >>> import pathlib, tempfile
+        Examples
+        --------
+        >>> import tempfile
         >>> from vorn import Contour
-        >>> path = pathlib.Path(tempfile.mkdtemp(), "line.wkt")
-        >>> _ = path.write_text("LINESTRING (0 0, 3 4)")
-        >>> Contour.read(path).length
+        >>> with tempfile.NamedTemporaryFile("w", suffix=".wkt") as file:
+        ...     print("LINESTRING (0 0, 3 4)", file=file, flush=True)
+        ...     Contour.read(file.name).length
         5.0
         """
         return cls._of(*_core.from_file(os.fspath(path), format))

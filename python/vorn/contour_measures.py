@@ -23,6 +23,8 @@ class Nearest(NamedTuple):
     distances : (n,) array
         How far the points are from them, never negative.
 
+    Examples
+    --------
     >>> from vorn import Contour
     >>> line = Contour.starting_at((0, 0)).append_line((10, 0))
     >>> places, pieces, distances = line.nearest([(1, 2), (13, 4)])
@@ -127,6 +129,8 @@ class ContourMeasures(ContourRows):
         ContourError
             A point is not finite, or the contour has no pieces.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> line = Contour.starting_at((0, 0)).append_line((10, 0))
         >>> line.deviations([(1, 2), (5, -3), (13, 4)])
@@ -155,6 +159,8 @@ class ContourMeasures(ContourRows):
         ContourError
             A point is not finite, or the contour has no pieces.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> line = Contour.starting_at((0, 0)).append_line((10, 0))
         >>> line.nearest([(1, 2), (13, 4)]).places
@@ -183,6 +189,8 @@ class ContourMeasures(ContourRows):
         ContourError
             An arc would need more than ten million chords.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> Contour.starting_at((0, 0)).append_arc((2, 0), center=(1, 0), ccw=False).sample(0.3)
         array([[0., 0.],
@@ -204,6 +212,8 @@ class ContourMeasures(ContourRows):
         shapely Polygon or LineString
             A Polygon of a closed contour, else a LineString.
 
+        Examples
+        --------
         >>> from vorn import Contour
         >>> square = Contour.starting_at((0, 0)).append_line((2, 0)).append_line((2, 2))
         >>> square.append_line((0, 2)).append_line((0, 0)).to_shapely(chord=0.1).area

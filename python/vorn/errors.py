@@ -29,7 +29,8 @@ class ErrorCode(enum.IntEnum):
 
 
 class ContourError(ValueError):
-    """An operation on points or contours that has no answer.
+    """An operation on points or contours that has no answer. Errors can be pickled, so they come
+    back whole from other processes.
 
     Attributes
     ----------
@@ -38,8 +39,8 @@ class ContourError(ValueError):
     indices : tuple of int
         The points concerned, as positions in the input; empty where it is about no point.
 
-    Errors can be pickled, so they come back whole from other processes.
-
+    Examples
+    --------
     >>> import vorn
     >>> try:
     ...     vorn.fit([(0, 0), (1, 0), (float("nan"), 0)], tol=0.01)
@@ -105,9 +106,13 @@ class FileError(ContourError, OSError):
     ----------
     path : str
         The file.
-    line, column : int
-        Where, both counted from 1; 0 where it is about no line or no column.
+    line : int
+        Counted from 1; 0 where it is about no line.
+    column : int
+        Counted from 1; 0 where it is about no column.
 
+    Examples
+    --------
     >>> import vorn
     >>> try:
     ...     vorn.Contour.from_wkt("LINESTRING (0 0, one 1)")

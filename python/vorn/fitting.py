@@ -26,8 +26,8 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
     ----------
     points : array-like
         In the order of the path: (n, 2) with x and y, (n, 3) with x, y and tolerance, of any number
-        type and strides, or a frame with the columns x, y and perhaps w (the tolerance). They are
-        copied once.
+        type and strides, masked nowhere, or a frame with the columns x, y and perhaps w (the
+        tolerance). They are copied once.
     tol : float or (n,) array-like, optional
         How far the contour may pass from the points, in their unit; goes before the tolerances that
         the points bring.
@@ -43,12 +43,19 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
     start : int, optional
         Where a closed contour is cut open, as a position in the points; not for "fewest".
     effort : "quick", "wide" or "full", optional
-        How hard "fewest" looks for fewer pieces.
-    centre, segments_only, largest_step, smallest_radius, largest_radius, farthest_between_points
-        For "fewest": whether deviations are brought down (True), whether arcs are left out (False),
-        the largest angle between neighbouring points on an arc (pi / 3 radians), the limits of
-        radii (0, inf), and how far a piece may leave the straight path between neighbouring points
-        (inf).
+        How hard "fewest" looks for fewer pieces. What follows is for "fewest" as well; lengths are
+        in the unit of the points.
+    centre : bool
+        Whether deviations are brought down once the pieces are found; True if not said.
+    segments_only : bool
+        Whether arcs are left out; False if not said.
+    largest_step : float
+        The largest angle between neighbouring points on an arc, radians; pi / 3 if not said.
+    smallest_radius, largest_radius : float
+        The limits of radii; 0 and infinity if not said.
+    farthest_between_points : float
+        How far a piece may leave the straight path between neighbouring points; infinity if not
+        said.
 
     Returns
     -------
@@ -64,9 +71,13 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
     ContourError
         The points have no tolerances, or a value that is none, or are too few.
 
+    Notes
+    -----
     The interpreter lock is released, so fits in several threads run side by side, and an
     interruption from the keyboard ends a fit.
 
+    Examples
+    --------
     >>> import vorn
     >>> vorn.fit([(0, 0), (1, 0), (2, 0), (2, 1), (2, 2)], tol=0.01)
     <Contour: 2 pieces (2 lines, 0 arcs), open, length 4>
@@ -86,7 +97,8 @@ def read_points(path: Union[str, "os.PathLike[str]"],
     Parameters
     ----------
     path : path-like
-        Lines of ``x,y`` or ``x,y,w`` with any usual separator, header and comments.
+        Lines of ``x,y`` or ``x,y,w`` with any usual separator, header and comments. "-" is the
+        standard input.
     columns : str, optional
         "x,y" or "x,y,w" as names of the header or numbers counted from 1; found if not said.
 
@@ -100,6 +112,8 @@ def read_points(path: Union[str, "os.PathLike[str]"],
     FileError
         The file cannot be read, or a line of it is wrong: `line` and `column` tell which.
 
+    Examples
+    --------
     >>> import tempfile
     >>> with tempfile.NamedTemporaryFile("w+", suffix=".csv") as file:
     ...     print("x;y\\n0,5;1\\n2;3", file=file, flush=True)

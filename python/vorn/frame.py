@@ -28,7 +28,7 @@ def fit(frame: Any, by: str = "scan", x: str = "x", y: str = "y", w: Optional[st
         One row for each point, those of a scan in the order of the path. Other scans may stand
         between them, and in Dask a scan may lie in several partitions.
     by : str
-        The column that tells the scans apart.
+        The column that tells the scans apart. Rows without a value there are left out.
     x, y : str
         The columns of the points.
     w : str, optional
@@ -55,6 +55,8 @@ def fit(frame: Any, by: str = "scan", x: str = "x", y: str = "y", w: Optional[st
     ValueError
         `rows` is something else.
 
+    Examples
+    --------
     >>> import pandas
     >>> points = pandas.DataFrame({"scan": [7, 7, 7, 8], "x": [0, 1, 2, 0], "y": [0, 0, 0, 5]})
     >>> fit(points, tol=0.01, rows="scans")[["scan", "pieces", "length", "error"]]
@@ -115,7 +117,9 @@ def _table_of_pieces(name: Any, result: FitResult, by: str) -> Any:
     import pandas
 
     if result.contour is None:
-        nothing = _core.line((np.nan, np.nan), (np.nan, np.nan))
+        nothing = _core.line((0.0, 0.0), (0.0, 0.0))
+        for field in ("start_x", "start_y", "end_x", "end_y", "length"):
+            nothing[field] = np.nan
         table = pandas.DataFrame(nothing)
         table.insert(0, "piece", -1)
     else:

@@ -34,6 +34,8 @@ class FitResult(NamedTuple):
     error : Exception or None
         None where it did not.
 
+    Examples
+    --------
     >>> result = next(fit_many([[(0, 0), (3, 4)]], tol=0.01))
     >>> result.number, result.contour.length, result.error
     (0, 5.0, None)
@@ -82,9 +84,11 @@ def fit_many(scans: Iterable[Any], tol: Optional[npt.ArrayLike] = None, client: 
     Raises
     ------
     TypeError, ValueError
-        There is a progress, or batch is below 1. What is wrong with a scan or with the options of
-        its fit is the error of its result.
+        There is a progress, or batch or workers is below 1. What is wrong with a scan or with the
+        options of its fit is the error of its result.
 
+    Examples
+    --------
     >>> scans = [[(0, 0), (1, 0), (2, 0)], [(0, 0)], [(0, 0), (0, 3)]]
     >>> for number, path, contour, error in fit_many(scans, tol=0.01):
     ...     print(number, contour, error)
@@ -94,8 +98,8 @@ def fit_many(scans: Iterable[Any], tol: Optional[npt.ArrayLike] = None, client: 
     """
     if "progress" in options:
         raise TypeError("fit_many() takes no progress; count the results")
-    if batch < 1:
-        raise ValueError("batch must be 1 or more")
+    if batch < 1 or (workers is not None and workers < 1):
+        raise ValueError("batch and workers must be 1 or more")
     fitting = dict(options, tol=tol)
     numbered = enumerate(scans)
     if client is not None:

@@ -3,12 +3,14 @@
 from __future__ import annotations
 
 import dataclasses
+import math
 from typing import Optional, Tuple, Union
 
 import numpy as np
 import numpy.typing as npt
 
 from vorn import _core
+from vorn.errors import ErrorCode, error_for
 
 __all__ = ["Arc", "Line", "Piece", "Place"]
 
@@ -22,13 +24,17 @@ class Line:
 
     Attributes
     ----------
-    start, end : (float, float)
-        Where it begins and ends.
+    start : (float, float)
+        Where it begins, (x, y).
+    end : (float, float)
+        Where it ends, (x, y).
     points : (int, int) or None
         Positions of the first and the last point that it covers; None when that is not known. In
         a closed contour first > last means from first to the end of the input and on from its
         beginning to last. Neighbouring pieces may share a point.
 
+    Examples
+    --------
     >>> Line((0, 0), (3, 4)).length
     5.0
     """
@@ -54,8 +60,10 @@ class Arc:
 
     Attributes
     ----------
-    start, end : (float, float)
-        Where it begins and ends.
+    start : (float, float)
+        Where it begins, (x, y).
+    end : (float, float)
+        Where it ends, (x, y).
     center : (float, float)
         Of the circle.
     radius : float
@@ -67,6 +75,8 @@ class Arc:
     points : (int, int) or None
         As for Line.
 
+    Examples
+    --------
     >>> Arc((1, 0), (0, 1), (0, 0), 1.0, True, 1.5).length
     1.5
     """
@@ -106,6 +116,9 @@ def row_of(piece: Piece) -> npt.NDArray[np.void]:
     """The row, alone in its array, that describes a piece."""
     if isinstance(piece, Arc):
         row = _core.arc(piece.start, piece.end, piece.center, piece.ccw)
+        if not (0 < piece.radius < math.inf and 0 <= piece.sweep < math.inf):
+            raise error_for(f"an arc has no radius above 0 or no sweep: {piece!r}",
+                            ErrorCode.INVALID_ARC_RADIUS)
         row["radius"] = piece.radius
         row["sweep"] = piece.sweep
         row["length"] = piece.length

@@ -50,7 +50,11 @@ def plot(contour: Contour, points: Optional[npt.ArrayLike] = None,
     ------
     ContourError
         A point is not finite, or the contour has no pieces.
+    ValueError
+        The points have another shape, or tol or magnify is not a number above 0.
 
+    Examples
+    --------
     >>> import matplotlib
     >>> matplotlib.use("Agg")
     >>> contour = Contour.starting_at((0, 0)).append_line((4, 0))
@@ -96,9 +100,11 @@ def _draw_points(ax: Any, contour: Contour, points: npt.NDArray[np.float64],
                  tol: Optional[npt.ArrayLike], magnify: Optional[float]) -> None:
     if tol is None and points.ndim == 2 and points.shape[1] > 2:
         tol = points[:, 2]
-    points = points[:, :2]
     feet = contour.nearest(points)
+    points = points[:, :2]
     away = points - feet.places
+    _require_above_zero("tol", tol)
+    _require_above_zero("magnify", magnify)
     if magnify is None:
         widest = feet.distances.max(initial=0.0) if tol is None else np.max(tol)
         magnify = _round_number(_READABLE * _size(contour) / widest) if widest > 0 else 1.0
@@ -107,6 +113,11 @@ def _draw_points(ax: Any, contour: Contour, points: npt.NDArray[np.float64],
         _draw_band(ax, contour, feet.places, magnify * np.broadcast_to(tol, len(points)), times)
     ax.plot(*(feet.places + magnify * away).T, ".", color=_POINT_COLOUR, markersize=3, zorder=5,
             linestyle="none", label="points" + times)
+
+
+def _require_above_zero(name: str, value: Optional[npt.ArrayLike]) -> None:
+    if value is not None and not np.all(np.isfinite(value) & np.greater(value, 0)):
+        raise ValueError(f"{name} must be a number above 0")
 
 
 def _draw_band(ax: Any, contour: Contour, places: npt.NDArray[np.float64],
