@@ -37,7 +37,7 @@ deviations are lengths, and none is judged.
 
 Deviations to the left of the contour's sense of travel are positive in the tables. Points are
 counted from 0, pieces from 1. Pieces cross where two of them that are not neighbours have a point
-in common; gaps are bridged by straight lines for this test and for the area.
+in common. Gaps are no pieces; for the area they are bridged by straight lines.
 
 Exit codes:
   0   every point is within its tolerance, or none is given

@@ -4,6 +4,7 @@
 #include <sys/wait.h>
 
 #include <algorithm>
+#include <csignal>
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
@@ -36,6 +37,9 @@ struct Ended {
 class Program : public testing::Test {
  protected:
   Program() {
+    // Tests that run in the background of a shell have interruptions ignored, and would pass that
+    // on to the program.
+    for (int const signal : {SIGINT, SIGTERM, SIGHUP}) std::signal(signal, SIG_DFL);
     std::string name = (fs::temp_directory_path() / "contour-run-XXXXXX").string();
     folder_ = mkdtemp(name.data());
   }

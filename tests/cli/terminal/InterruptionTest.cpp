@@ -33,6 +33,8 @@ class EndCleanlyOnSignals : public testing::Test {
   static int CodeOf(std::function<void()> const& work) {
     pid_t const child = fork();
     if (child == 0) {
+      // Ignored where the tests run in the background of a shell.
+      for (int const signal : {SIGINT, SIGTERM, SIGHUP}) std::signal(signal, SIG_DFL);
       Cli::EndCleanlyOnSignals();
       work();
       _exit(99);
