@@ -44,9 +44,9 @@ TEST(ClosedRule, EndsAreNearWithinOneAndAHalfOfTheSpacingBesideThem) {
 }
 
 TEST(ClosedRule, WhatIsSaidGoesFirst) {
-  EXPECT_EQ(ClosedOf(Square(1.0), {"--closed", "no"}), "no (given by --closed): the gap is 1");
+  EXPECT_EQ(ClosedOf(Square(1.0), {"--closed", "no"}), "no (as asked for): the gap is 1");
   std::string const yes = ClosedOf(Square(5.0), {"--closed", "yes"});
-  EXPECT_TRUE(yes.starts_with("yes (given by --closed)")) << yes;
+  EXPECT_TRUE(yes.starts_with("yes (as asked for)")) << yes;
 }
 
 TEST(ClosedRule, AThinBodyThatTurnsBackBetweenItsEndsIsOpen) {
