@@ -9,6 +9,9 @@ namespace {
 /// How often a piece behind is asked for a joint nearer to the middle of its interval.
 constexpr int kMostRetries = 6;
 
+/// By this many least tolerances rounding may put an offset outside an opening.
+constexpr double kOffsetRounding = 1e-3;
+
 class BackwardPass {
  public:
   BackwardPass(Path const& path, std::vector<Link> links, PieceSearch* search)
@@ -44,15 +47,24 @@ class BackwardPass {
     std::int32_t const first = link.opening.First();
     std::int32_t const last = end.isFree ? path_.Count() : end.gate.split;
     search_.MoveTo(first, last);
-    RunFit const fit = search_.FindBest(link.opening, end, StartFor(k));
+    RunFit fit = search_.FindStraight(link.opening, end);
+    if (!fit.isFound || fit.ratio > 1.0) fit = search_.FindBest(link.opening, end, StartFor(k));
     if (!fit.isFound || fit.ratio > kWholeTolerance) return false;
     chain_.pieces[k] = {first, last, fit.circle, fit.ratio};
     if (k == 0) return true;
     double offset = 0.0;
     if (!FindCrossing(fit.circle, link.opening.gate, &offset)) return false;
+    if (!IsWithin(link.opening, offset)) return false;
     chain_.gates[k - 1] = SeenFromBehind(link.opening.gate);
     chain_.offsets[k - 1] = link.opening.gate.isCusp ? -offset : offset;
     return true;
+  }
+
+  /// The piece known beforehand, which stands in where no better one is found, may start outside an
+  /// opening that was narrowed since.
+  bool IsWithin(Opening const& opening, double offset) const {
+    double const rounding = kOffsetRounding * path_.leastTolerance;
+    return offset >= opening.low - rounding && offset <= opening.high + rounding;
   }
 
   /// Between two pieces that end on both sides of a joint there is one that ends there.

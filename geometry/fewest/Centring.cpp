@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "geometry/fewest/Balance.h"
+#include "geometry/fewest/FollowGates.h"
 
 namespace Vorn::Fewest {
 
@@ -15,7 +16,7 @@ constexpr double kLeastShare = 1.0 / 64.0;
 constexpr double kWholeShare = 1.0 - 1e-6;
 
 /// The factor is found to this share of itself.
-constexpr double kAccuracy = 0.03;
+constexpr double kAccuracy = 0.01;
 
 /// A chain and the share of the tolerances that it needs.
 struct Centred {
@@ -44,7 +45,7 @@ Centred Bisect(Path const& path, Centred best, double leastShare) {
 
 Chain Centre(Path const& path, Chain const& chain) {
   BalancedChain const balanced = Balance(path, chain);
-  Chain moved = FollowGates(path, kWholeShare, balanced.chain);
+  Chain moved = FollowGatesOr(path, kWholeShare, balanced.chain, chain);
   if (moved.pieces.empty()) return Bisect(path, {chain, 1.0}, 0.0).chain;
   return Bisect(path, {std::move(moved), 1.0}, balanced.leastShare).chain;
 }

@@ -19,12 +19,6 @@ struct State {
 
 using Level = std::vector<State>;
 
-Opening StartOn(Gate const& gate, Interval const& interval) {
-  Gate const behind = SeenFromBehind(gate);
-  return gate.isCusp ? Opening{behind, -interval.high, -interval.low, false}
-                     : Opening{behind, interval.low, interval.high, false};
-}
-
 /// Points behind a gate whose circle tells whether there is a corner.
 constexpr std::int32_t kPointsBehind = 16;
 
@@ -234,26 +228,6 @@ class ChainSearch {
 
 Chain FindChain(Path const& path, double share, std::function<void(std::int32_t)> const& tell) {
   return ChainSearch(path, share, tell).Run();
-}
-
-Chain FollowGates(Path const& path, double share, Chain const& known) {
-  PieceSearch search(path, share);
-  std::vector<Link> links;
-  Link link;
-  link.opening = path.start;
-  for (std::size_t k = 0; k < known.pieces.size(); ++k) {
-    link.guess = known.pieces[k].circle;
-    links.push_back(link);
-    if (k + 1 == known.pieces.size()) break;
-    Gate const& gate = known.gates[k];
-    search.MoveTo(link.opening.First(), gate.split);
-    Interval const interval = search.FindInterval(link.opening, gate, link.guess);
-    if (!interval.isFound) return {};
-    link.opening = StartOn(gate, interval);
-    link.atLow = interval.atLow;
-    link.atHigh = interval.atHigh;
-  }
-  return PlacePieces(path, std::move(links), &search);
 }
 
 }  // namespace Vorn::Fewest

@@ -14,8 +14,4 @@ namespace Vorn::Fewest {
 /// are covered.
 Chain FindChain(Path const& path, double share, std::function<void(std::int32_t)> const& tell);
 
-/// The pieces for given gates: forwards the intervals, backwards the pieces of the smallest largest
-/// ratio. Empty when the gates do not allow the share.
-Chain FollowGates(Path const& path, double share, Chain const& known);
-
 }  // namespace Vorn::Fewest

@@ -5,10 +5,14 @@
 #include <cmath>
 #include <limits>
 #include <numbers>
+#include <utility>
+#include <vector>
 
 #include "geometry/fewest/Bound.h"
+#include "geometry/fewest/ClosedBound.h"
 #include "geometry/fewest/Fitter.h"
 #include "geometry/fewest/LocalFrame.h"
+#include "geometry/fewest/RepeatedEnd.h"
 #include "vorn/FewestPieces.h"
 
 namespace Vorn {
@@ -40,6 +44,67 @@ Fewest::Limits LimitsOf(Options const& options, double scale) {
           std::sin(0.5 * options.largestStep), options.farthestBetweenPoints * scale};
 }
 
+/// What to fit, as it came in.
+struct Order {
+  std::vector<WPoint> const& points;
+  Options const& options;
+};
+
+Fewest::Path PathOf(Order const& order, Fewest::Shift const& shift) {
+  Fewest::Path path;
+  path.points = shift.Apply(order.points);
+  path.limits = LimitsOf(order.options, shift.scale);
+  path.leastTolerance = Fewest::Tightest(order.points).w * shift.scale;
+  return path;
+}
+
+FewestPieces::Result ResultOf(Fewest::Answer answer, Promises::Report const& report,
+                              std::size_t bound) {
+  FewestPieces::Result result;
+  result.contour = std::move(answer.contour);
+  result.ranges = std::move(answer.ranges);
+  result.largestDeviation = report.largestRatio;
+  result.largestDeviationIndex = static_cast<std::int32_t>(report.largestIndex);
+  result.fewestPossible = static_cast<std::int32_t>(bound);
+  result.isFewest = result.ranges.size() == bound;
+  return result;
+}
+
+/// Fits points that a closed contour does not repeat.
+ErrorCode FitDistinct(Order const& order, Fewest::Progress* progress,
+                      FewestPieces::Result* result) {
+  Fewest::Shift const shift = Fewest::ShiftFor(order.points);
+  Fewest::Path path = PathOf(order, shift);
+  if (DoPointsCoincide(path.points)) return ErrorCode::NoFit;
+  Fewest::Cover const cover =
+      Fewest::CoverGreedily(path.points, path.limits,
+                            [&](std::int32_t done) { progress->Tell(0, Fewest::kCovered, done); });
+  std::size_t const open = cover.starts.size();
+  bool const isClosed = order.options.closed;
+  std::size_t const bound =
+      isClosed ? Fewest::LeastClosedCover(path.points, path.limits, cover) : open;
+  // Three points are covered without a circle.
+  bool const isOne = bound == 1 && path.points.size() > 3;
+  Fewest::FitTask task{order.points, order.options, shift, std::move(path), open, bound, *progress};
+  Fewest::Answer answer;
+  Promises::Report report;
+  if (!Fewest::FindContour(std::move(task), isOne ? &cover.last : nullptr, &answer, &report)) {
+    return ErrorCode::NoFit;
+  }
+  *result = ResultOf(std::move(answer), report, bound);
+  return ErrorCode::Ok;
+}
+
+/// Fits points of which the last may repeat the first.
+ErrorCode FitPoints(Order const& order, Fewest::Progress* progress, FewestPieces::Result* result) {
+  Fewest::RepeatedEnd const end(order.points);
+  if (!order.options.closed || !end.IsRepeated()) return FitDistinct(order, progress, result);
+  std::vector<WPoint> const distinct = end.Distinct();
+  ErrorCode const code = FitDistinct({distinct, order.options}, progress, result);
+  if (code == ErrorCode::Ok) end.Restore(result);
+  return code;
+}
+
 }  // namespace
 
 ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& options,
@@ -47,34 +112,12 @@ ErrorCode FewestPieces::Fit(std::vector<WPoint> const& points, Options const& op
                             std::int32_t maxPercent) {
   if (result == nullptr || !AreValid(points) || !IsValid(options)) return ErrorCode::Failed;
   Fewest::Progress progress(executionState, maxPercent, static_cast<std::int32_t>(points.size()));
-  Fewest::Shift const shift = Fewest::ShiftFor(points);
-  Fewest::Path path;
-  path.points = shift.Apply(points);
-  if (Fewest::DoCoincide(path.points)) return ErrorCode::NoFit;
-  path.limits = LimitsOf(options, shift.scale);
-  path.leastTolerance = Fewest::Tightest(points).w * shift.scale;
-
-  Fewest::Cover const cover =
-      Fewest::CoverGreedily(path.points, path.limits,
-                            [&](std::int32_t done) { progress.Tell(0, Fewest::kCovered, done); });
-  Fewest::Answer answer;
-  Promises::Report report;
-  // Three points are covered without a circle; a closed contour takes two pieces at least.
-  bool const isOne = !options.closed && cover.starts.size() == 1 && points.size() > 3;
-  Fewest::FitTask task{points, options, shift, std::move(path), cover.starts.size(), progress};
-  if (!Fewest::FindContour(std::move(task), isOne ? &cover.last : nullptr, &answer, &report)) {
-    return ErrorCode::NoFit;
-  }
+  Result found;
+  ErrorCode const code = FitPoints({points, options}, &progress, &found);
+  if (code != ErrorCode::Ok) return code;
   progress.Finish();
-  result->contour = std::move(answer.contour);
-  result->ranges = std::move(answer.ranges);
-  result->largestDeviation = report.largestRatio;
-  result->largestDeviationIndex = static_cast<std::int32_t>(report.largestIndex);
-  // A closed cover of m runs, cut where the input ends, is an open one of m + 1 at most.
-  auto const open = static_cast<std::int32_t>(cover.starts.size());
-  result->fewestPossible = options.closed ? std::max(1, open - 1) : open;
-  result->isFewest = static_cast<std::int32_t>(result->ranges.size()) == result->fewestPossible;
-  return ErrorCode::Ok;
+  *result = std::move(found);
+  return code;
 }
 
 }  // namespace Vorn

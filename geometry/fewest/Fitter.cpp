@@ -22,7 +22,10 @@ using Options = FewestPieces::Options;
 constexpr double kSearchShare = 1.0 - 1e-6;
 
 /// From how many states a gate takes offsets, for each effort.
-constexpr std::size_t kSources[] = {2, 4, 64};
+constexpr std::size_t kSources[] = {1, 4, 64};
+
+/// The same for the quick one once a chain has broken a promise.
+constexpr std::size_t kMoreSources = 2;
 
 /// By how much rounding may change a radius, relative to it.
 constexpr double kRadiusRounding = 1e-9;
@@ -48,6 +51,7 @@ class Fitter {
         options_(task.options),
         shift_(task.shift),
         path_(std::move(task.path)),
+        openBound_(task.openBound),
         bound_(task.bound),
         progress_(task.progress) {}
 
@@ -63,6 +67,9 @@ class Fitter {
 
   /// The first contour found that keeps every promise; false when there is none.
   bool Run(Answer* answer, Promises::Report* report) {
+    if (Search(1.0, answer, report)) return true;
+    // Gates that take offsets from more states lead to another chain, perhaps of as many pieces.
+    quickSources_ = kMoreSources;
     if (Search(1.0, answer, report) || RunTighter(answer, report)) return true;
     for (double const factor : kTightening) {
       if (answer->ranges.empty()) break;
@@ -89,7 +96,8 @@ class Fitter {
       Answer other;
       Promises::Report otherReport;
       bool const isKept = Search(share, &other, &otherReport);
-      if (other.ranges.size() > answer->ranges.size()) return false;
+      bool const hasAny = !answer->ranges.empty();
+      if (hasAny && other.ranges.size() > answer->ranges.size()) return false;
       if (!isKept) continue;
       *answer = std::move(other);
       *report = std::move(otherReport);
@@ -101,12 +109,12 @@ class Fitter {
   /// Finds and measures one contour; `answer` is without ranges when there was none to measure.
   bool Search(double share, Answer* answer, Promises::Report* report) {
     *answer = {};
-    path_.limits.mostSources = kSources[0];
+    path_.limits.mostSources = quickSources_;
     path_.limits.looksFar = false;
     Chain chain = FindOpen(share);
     // A wider look starts from other gates, so it may also end with more pieces.
     for (std::int32_t effort = 1; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
-      if (chain.pieces.size() == bound_) break;
+      if (chain.pieces.size() == openBound_) break;
       path_.limits.mostSources = kSources[effort];
       path_.limits.looksFar = true;
       Chain wider = FindOpen(share);
@@ -119,7 +127,7 @@ class Fitter {
   }
 
   Chain FindOpen(double share) {
-    return FindChainBothWays(path_, share * kSearchShare, bound_,
+    return FindChainBothWays(path_, share * kSearchShare, openBound_,
                              [&](std::int32_t done) { Tell(done); });
   }
 
@@ -175,8 +183,7 @@ class Fitter {
       *report = std::move(closedReport);
       if (!isKept) continue;
       isFound = true;
-      // No closed chain has fewer than the open one less the piece that the end of the input cuts.
-      if (answer->ranges.size() + 1 <= open.pieces.size()) return true;
+      if (answer->ranges.size() <= bound_) return true;
     }
     if (isFound && answer->ranges.size() <= open.pieces.size() + 1) return true;
     return CloseBySegment(open, answer, report) || isFound;
@@ -233,7 +240,9 @@ class Fitter {
   Options const& options_;
   Shift const& shift_;
   Path path_;
+  std::size_t openBound_;
   std::size_t bound_;
+  std::size_t quickSources_ = kSources[0];
   Progress& progress_;
 };
 

@@ -27,7 +27,9 @@ struct FitTask {
   Shift const& shift;
   /// The points moved near the origin, with the limits of the options.
   Path path;
-  /// A number of pieces below which no chain can go.
+  /// A number of pieces below which no chain can go that need not close, and the same for what is
+  /// asked for.
+  std::size_t openBound = 1;
   std::size_t bound = 1;
   Progress& progress;
 };

@@ -34,12 +34,6 @@ WPoint const& Tightest(std::vector<WPoint> const& points) {
                            [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
 }
 
-bool DoCoincide(std::vector<WPoint> const& points) {
-  WPoint const& tightest = Tightest(points);
-  return std::all_of(points.begin(), points.end(),
-                     [&](WPoint const& p) { return DistanceBetween(p, tightest) <= p.w; });
-}
-
 std::int32_t StrideFrom(Path const& path, std::int32_t point) {
   WPoint const& from = path.At(point);
   std::int32_t const count = path.Count();

@@ -37,10 +37,6 @@ double DistanceBetween(WPoint const& p, WPoint const& q);
 /// The point of least tolerance, the first of equal ones.
 WPoint const& Tightest(std::vector<WPoint> const& points);
 
-/// Whether one place stands for all points: that of the point of least tolerance lies within the
-/// tolerance of every other.
-bool DoCoincide(std::vector<WPoint> const& points);
-
 /// How many points there are from one to the first that lies clearly ahead of it: 1 where points
 /// lie farther apart than their tolerances, more in denser scans, whose neighbours say nothing
 /// about direction or order. Every "few points" of the search counts in these strides.

@@ -26,6 +26,24 @@ RunFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
   return fit;
 }
 
+RunFit PieceSearch::FindStraight(Opening const& from, Opening const& to) {
+  if (path_.limits.segmentsOnly) return {};
+  std::int32_t const first = from.First();
+  std::int32_t const end = to.isFree ? path_.Count() : to.gate.split;
+  BeginProgramme(from, end);
+  AddOpening(to);
+  if (!programme_.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0})) return {};
+  auto const endOf = [&](Opening const& opening, std::int32_t point) {
+    return frame_.ToLocal(opening.isFree
+                              ? Place{path_.At(point).x, path_.At(point).y}
+                              : PlaceOn(opening.gate, 0.5 * (opening.low + opening.high)));
+  };
+  RunFit fit = FitAnyRadius({LineThrough(endOf(from, first), endOf(to, end - 1)), 0.0, false},
+                            false, {&from, &to, first, end});
+  if (fit.isFound) fit.circle = FromLocal(fit.circle);
+  return fit;
+}
+
 RunFit PieceSearch::FitLongestAlone(std::int32_t first) {
   std::int32_t const count = path_.Count();
   std::int32_t good = first + 2;

@@ -43,27 +43,32 @@ double SquaredGradient(Circle const& circle, Place const& place) {
 
 PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& ends) const {
   double worst = 0.0;
+  std::int32_t broken = -1;
   double length = 0.0;
-  Condition broken;
-  Sample p = frame_.ToLocal(path_.At(ends.first));
-  double here2 = SquaredGradient(circle, PlaceOf(p));
+  double const noise = kNoiseStep * (1.0 + kRoundingRoom) * frame_.scale;
+  WPoint const* last = &path_.At(ends.first);
+  Place p = frame_.ToLocal(Place{last->x, last->y});
+  Place gradient = GradientAt(circle, p);
+  double here2 = gradient.x * gradient.x + gradient.y * gradient.y;
   for (std::int32_t i = ends.first + 1; i < ends.end; ++i) {
-    Sample const q = frame_.ToLocal(path_.At(i));
+    WPoint const& next = path_.At(i);
+    Place const q = frame_.ToLocal(Place{next.x, next.y});
     double const dx = q.x - p.x;
     double const dy = q.y - p.y;
-    Row const row = AdvanceRow(PlaceOf(p), dx, dy);
-    double const room = kNoiseStep * (p.w + q.w);
-    double const advance = Apply(row, circle);
+    // The unit direction of travel times the step.
+    double const advance = gradient.y * dx - gradient.x * dy;
     length += advance;
-    double const excess = -advance - room * (1.0 + kRoundingRoom);
+    double const excess = -advance - noise * (last->w + next.w);
     if (excess > worst) {
       worst = excess;
-      broken = {Negated(row), Condition::Kind::HalfSpace, room};
+      broken = i;
     }
+    gradient = GradientAt(circle, q);
     double const gap2 = dx * dx + dy * dy;
-    double const there2 = SquaredGradient(circle, PlaceOf(q));
-    double const near2 = std::min(here2, there2);
-    if (IsLargeStep(circle, gap2, near2, p.w)) return AddStep(gap2, near2);
+    double const there2 = gradient.x * gradient.x + gradient.y * gradient.y;
+    double const near2 = there2 < here2 ? there2 : here2;
+    if (IsLargeStep(circle, gap2, near2, last->w * frame_.scale)) return AddStep(gap2, near2);
+    last = &next;
     p = q;
     here2 = there2;
   }
@@ -71,8 +76,16 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
   if (2.0 * std::fabs(circle.a) * length > kTurnToCount && IsFullTurn(circle, ends)) {
     return Check::Hopeless;
   }
-  if (!(worst > 0.0)) return Check::Holds;
-  return programme_->Add(broken) ? Check::Added : Check::Hopeless;
+  if (broken < 0) return Check::Holds;
+  return programme_->Add(StepCondition(broken)) ? Check::Added : Check::Hopeless;
+}
+
+/// That a point lies no farther back along the piece than noise may put it behind the one before.
+Condition PieceRules::StepCondition(std::int32_t point) const {
+  Sample const p = frame_.ToLocal(path_.At(point - 1));
+  Sample const q = frame_.ToLocal(path_.At(point));
+  Row const advance = AdvanceRow(PlaceOf(p), q.x - p.x, q.y - p.y);
+  return {Negated(advance), Condition::Kind::HalfSpace, kNoiseStep * (p.w + q.w)};
 }
 
 bool PieceRules::IsLargeStep(Circle const& circle, double gap2, double near2, double w) const {

@@ -59,6 +59,8 @@ class PieceRules {
 
   /// The order of the points along the circle, the greatest step and less than a full turn.
   Check AddBrokenOrder(Circle const& circle, Ends const& ends) const;
+  /// That a point lies no farther back than noise may put it behind the one before.
+  Condition StepCondition(std::int32_t point) const;
   /// Whether two points are further apart along the circle than the greatest step. Their feet on
   /// the circle are as far apart as the points, divided by the distance of the nearer one from the
   /// centre in radii; `near2` is the square of that distance. Points nearer than `w` make no step.

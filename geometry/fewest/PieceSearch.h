@@ -35,6 +35,13 @@ struct Interval {
   Circle atHigh;
 };
 
+/// Where the piece behind a gate may start when the one before ends within an interval.
+inline Opening StartOn(Gate const& gate, Interval const& interval) {
+  Gate const behind = SeenFromBehind(gate);
+  return gate.isCusp ? Opening{behind, -interval.high, -interval.low, false}
+                     : Opening{behind, interval.low, interval.high, false};
+}
+
 /// Searches pieces along one path; keeps its rows between searches.
 class PieceSearch {
  public:
@@ -63,7 +70,12 @@ class PieceSearch {
   /// `start` is a circle to begin with; isFound when it is a piece of its ratio.
   RunFit FindBest(Opening const& from, Opening const& to, RunFit const& start);
 
-  /// The same where the piece may end anywhere behind its last point, the one before `end`.
+  /// The same among straight pieces; not found where there is none within tolerance, and where all
+  /// pieces are straight anyway.
+  RunFit FindStraight(Opening const& from, Opening const& to);
+
+  /// The same as FindBest where the piece may end anywhere behind its last point, the one before
+  /// `end`.
   RunFit FindBestUpTo(Opening const& from, std::int32_t end, RunFit const& start);
 
   /// The circle of the smallest largest ratio through some points alone; its guess is their chord.
@@ -91,6 +103,8 @@ class PieceSearch {
   void BeginProgramme(Opening const& from, std::int32_t end);
   /// Asks that the piece passes between the limits of an opening; a free one asks nothing.
   void AddOpening(Opening const& opening);
+  /// The square of the largest distance between neighbours.
+  double WidestGap2(std::int32_t first, std::int32_t end) const;
   /// Asks for a radius of at least the smallest, for steps below the greatest, or for a line where
   /// only segments are wanted; the box follows from that.
   void LimitCurvature(Opening const& from, std::int32_t end);

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+#include "geometry/fewest/FollowGates.h"
+
 namespace Vorn::Fewest {
 
 namespace {

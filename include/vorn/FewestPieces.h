@@ -3,6 +3,8 @@
 
 #pragma once
 
+#include <algorithm>
+#include <cmath>
 #include <cstdint>
 #include <limits>
 #include <vector>
@@ -14,6 +16,16 @@ namespace Vorn {
 
 /// 60 degrees in radians.
 inline constexpr double kSixtyDegrees = 1.0471975511965976;
+
+/// Whether one place stands for all points: that of the point of least tolerance lies within the
+/// tolerance of every other. FewestPieces::Fit then has no fit. True for no points at all.
+inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
+  auto const tightest = std::min_element(
+      points.begin(), points.end(), [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
+  return std::all_of(points.begin(), points.end(), [&](WPoint const& p) {
+    return std::hypot(p.x - tightest->x, p.y - tightest->y) <= p.w;
+  });
+}
 
 /// Turns measured points into as few segments and arcs as their tolerances allow, and says below
 /// which number no chain of segments and arcs can go. A service of its own beside
@@ -29,6 +41,14 @@ inline constexpr double kSixtyDegrees = 1.0471975511965976;
 /// - No piece crosses itself or another one where the straight path through the points does not by
 ///   more than the tolerances.
 /// - No arc is a full turn: a full circle comes as two arcs.
+///
+/// Where it falls short
+/// - A path that runs several times along itself, as a circle scanned twice around, may take many
+///   more pieces than the bound: each lap has to stay on its side of the others.
+/// - Where largestRadius is below radii of the part, short pieces stand for its arcs; they may all
+/// be
+///   segments though some arcs would save a few. The bound takes no account of largestRadius.
+/// - Tolerances below 2^-1040 have too few digits left; such points may come as short segments.
 ///
 /// There is no state and there are no threads: the same input gives the same bits on every call.
 /// Calls from several threads at once are safe.
@@ -103,7 +123,8 @@ class VORN_EXPORT FewestPieces {
     /// and never too high: what one piece covers in exact numbers counts as covered. So does, where
     /// rounding decides, a run that would need tolerances wider by less than 1e-8 of them and 2e-14
     /// of its extent. Arcs of a radius below the tolerance of a point that they cover are left out
-    /// of account.
+    /// of account. Of a closed contour each piece covers neighbours on the way around, wherever the
+    /// contour starts; it has two pieces at least, since none of them alone ends where it begins.
     std::int32_t fewestPossible = 0;
     /// Whether the contour has exactly that many pieces.
     bool isFewest = false;
@@ -128,10 +149,10 @@ class VORN_EXPORT FewestPieces {
   ///             maxPercent; null for no reporting. What it throws passes through to the caller:
   ///             result is untouched and nothing is lost.
   /// @param[in]  maxPercent     the percentage to report when all is done
-  /// @return Ok; NoFit when all points coincide within their tolerances or no chain keeps the
-  ///         promises; Failed for a null result, fewer than two points, a coordinate that is not
-  ///         finite, a tolerance that is not above 0 or not finite, more points than an
-  ///         std::int32_t counts, or an option outside its range
+  /// @return Ok; NoFit when all points coincide within their tolerances, which DoPointsCoincide
+  ///         tells apart, or no chain keeps the promises; Failed for a null result, fewer than two
+  ///         points, a coordinate that is not finite, a tolerance that is not above 0 or not
+  ///         finite, more points than an std::int32_t counts, or an option outside its range
   /// @throws std::bad_alloc when memory runs out; result is untouched
   /// @note Time O(n log n) on noisy profiles and arcs with effort Quick, memory O(n). The answer
   ///       depends neither on where the part lies nor on how it is turned, apart from the rounding

@@ -1,6 +1,5 @@
 #include "io/fit/FewestFit.h"
 
-#include <algorithm>
 #include <chrono>
 #include <cmath>
 #include <limits>
@@ -14,10 +13,6 @@
 namespace Vorn::IO {
 
 namespace {
-
-/// One piece alone does not close: neither a segment nor an arc of less than a full turn ends where
-/// it begins.
-constexpr std::size_t kLeastClosedPieces = 2;
 
 /// Of a closed contour the piece across the end of the input has its first point behind its last.
 PointRange RangeOf(FewestPieces::Range const& range, std::size_t points) {
@@ -40,19 +35,11 @@ FitAnswer AnswerOf(FewestPieces::Result result, std::size_t points) {
   return answer;
 }
 
-/// Whether the point of the smallest tolerance lies within that of every other one.
-bool DoCoincide(std::vector<WPoint> const& points) {
-  WPoint const& tightest = *std::min_element(
-      points.begin(), points.end(), [](WPoint const& a, WPoint const& b) { return a.w < b.w; });
-  return std::all_of(points.begin(), points.end(),
-                     [&](WPoint const& point) { return Distance(tightest, point) <= point.w; });
-}
-
 std::string WhyNone(ErrorCode code, std::vector<WPoint> const& points) {
   if (code == ErrorCode::Failed) {
     return "the points, their tolerances or the options are not what the fewest pieces can take";
   }
-  if (DoCoincide(points)) return "all points coincide within their tolerances";
+  if (DoPointsCoincide(points)) return "all points coincide within their tolerances";
   return "no lines and arcs pass the points in order, each within its tolerance, without crossing "
          "where the points do not";
 }
@@ -87,7 +74,6 @@ FitAnswer AnswerOfCircle(FitAnswer const& answer) {
 }
 
 FitReport ReportClosed(FitInput input, FitChoice const& choice, FitAnswer answer) {
-  answer.fewestPossible = std::max(*answer.fewestPossible, kLeastClosedPieces);
   std::size_t const seam = answer.ranges->front().first;
   Circuit const circuit = MakeCircuit(input.file.points, input.closure, seam);
   if (auto circle = CircleFor(choice.fewest, answer, circuit)) {

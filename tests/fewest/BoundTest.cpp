@@ -1,8 +1,11 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
 
+#include "fewest/oracle/BoundOracle.h"
 #include "geometry/fewest/Bound.h"
+#include "geometry/fewest/ClosedBound.h"
 #include "support/Profiles.h"
 
 namespace Vorn::Fewest {
@@ -45,6 +48,57 @@ TEST(CoverGreedily, SegmentsOnlyCoversAnArcByChords) {
   double const sweep = 2.0 * std::acos((1.0 - 0.01) / (1.0 + 0.01));
   auto const cover = CoverGreedily(points, limits, [](std::int32_t) {});
   EXPECT_EQ(cover.starts.size(), static_cast<std::size_t>(std::ceil(1.5 / sweep)));
+}
+
+std::size_t ClosedBound(std::vector<WPoint> const& points) {
+  Cover const open = CoverGreedily(points, Limits(), [](std::int32_t) {});
+  return LeastClosedCover(points, Limits(), open);
+}
+
+/// The least number of runs over all starts, and over all divisions from each.
+std::size_t LeastOfAllStarts(std::vector<WPoint> points) {
+  std::int32_t least = Testing::LeastNumberOfRuns(points);
+  for (std::size_t start = 1; start < points.size(); ++start) {
+    std::rotate(points.begin(), points.begin() + 1, points.end());
+    least = std::min(least, Testing::LeastNumberOfRuns(points));
+  }
+  return std::max<std::size_t>(static_cast<std::size_t>(least), kLeastClosedPieces);
+}
+
+TEST(LeastClosedCover, OneCircleAndTwoRunsAreTwoPieces) {
+  auto const circle = Testing::MakeArcPoints({3.0, 4.0}, 10.0, 0.2, 6.0, 100, 0.001);
+  EXPECT_EQ(ClosedBound(circle), 2u);
+  EXPECT_EQ(ClosedBound({{0.0, 0.0, 0.1}, {1.0, 0.0, 0.1}}), 2u);
+}
+
+TEST(LeastClosedCover, ASquareThatBeginsWithinASideHasFourRuns) {
+  std::vector<WPoint> points;
+  for (int i = 0; i < 10; ++i) points.push_back({0.1 * i, 0.0, 1e-3});
+  for (int i = 0; i < 10; ++i) points.push_back({1.0, 0.1 * i, 1e-3});
+  for (int i = 0; i < 10; ++i) points.push_back({1.0 - 0.1 * i, 1.0, 1e-3});
+  for (int i = 0; i < 10; ++i) points.push_back({0.0, 1.0 - 0.1 * i, 1e-3});
+  std::rotate(points.begin(), points.begin() + 5, points.end());
+  EXPECT_EQ(Bound(points), 5u);
+  EXPECT_EQ(ClosedBound(points), 4u);
+}
+
+TEST(LeastClosedCover, IsTheLeastOfAllStartsAndDivisions) {
+  Testing::RandomGeometry random(8201);
+  int below = 0;
+  for (int round = 0; round < 120; ++round) {
+    SCOPED_TRACE(testing::Message() << "seed 8201, round " << round);
+    int const count = random.Integer(5, 13);
+    double const w = random.Uniform(0.02, 0.3);
+    std::vector<WPoint> points;
+    for (int i = 0; i < count; ++i) {
+      double const angle = 6.283185307179586 * i / count;
+      double const radius = random.Uniform(0.7, 1.3);
+      points.push_back({radius * std::cos(angle), radius * std::sin(angle), w});
+    }
+    EXPECT_EQ(ClosedBound(points), LeastOfAllStarts(points));
+    below += ClosedBound(points) < Bound(points) ? 1 : 0;
+  }
+  EXPECT_GT(below, 10) << "cases in which the start matters";
 }
 
 }  // namespace

@@ -108,6 +108,14 @@ TEST(FewestPieces, PointsThatCoincideHaveNoFit) {
             ErrorCode::NoFit);
 }
 
+TEST(FewestPieces, PointsCoincideWhenTheTightestLiesWithinEveryTolerance) {
+  EXPECT_TRUE(DoPointsCoincide({}));
+  EXPECT_TRUE(DoPointsCoincide({{1.0, 1.0, 0.1}, {1.05, 1.0, 0.1}, {1.0, 1.02, 0.1}}));
+  EXPECT_TRUE(DoPointsCoincide({{0.0, 0.0, 5.0}, {3.0, 4.0, 0.1}}));
+  EXPECT_FALSE(DoPointsCoincide({{0.0, 0.0, 4.9}, {3.0, 4.0, 0.1}}));
+  EXPECT_FALSE(DoPointsCoincide({{0.0, 0.0, 0.1}, {0.0, 0.0, 0.1}, {1e300, 1e300, 0.1}}));
+}
+
 TEST(FewestPieces, ScalingByAPowerOfTwoScalesTheBits) {
   FewestPieces::Result one;
   FewestPieces::Result other;

@@ -142,6 +142,22 @@ TEST(FewestPiecesInvariants, AClosedContourMayRepeatItsFirstPoint) {
   EXPECT_EQ(PieceCount(FitKept(scan, Closed())), 4);
 }
 
+TEST(FewestPiecesInvariants, ARepeatedFirstPointCountsOnceWhicheverToleranceIsSmaller) {
+  RandomGeometry random(6305);
+  double const third = 2.0943951023931953;
+  Scan const scan = SampleWithNormalNoise(
+      &random, {{15.0, 0.0}, {30.0, 0.0, third}, {30.0, 0.0, third}, {15.0, 0.0, third}}, 301, 0.02,
+      0.45);
+  for (double const factor : {0.5, 1.0, 2.0}) {
+    SCOPED_TRACE(testing::Message() << "last tolerance times " << factor);
+    Scan repeated = scan;
+    repeated.back() = {scan.front().x, scan.front().y, factor * scan.front().w};
+    FewestResult const result = FitKept(repeated, Closed());
+    EXPECT_EQ(PieceCount(result), 3);
+    EXPECT_EQ(result.fewestPossible, 3);
+  }
+}
+
 TEST(FewestPiecesInvariants, RepeatedPointsChangeNothing) {
   RandomGeometry random(6301);
   for (Scan const& scan : Profiles(500)) {

@@ -16,8 +16,9 @@ struct SharedContour {
   double tolerance;
   bool isPerPoint;  ///< the tolerance is a cap, see SetTolerancePerPoint
   bool isClosed;
-  std::int32_t bound;   ///< no chain has fewer pieces
-  std::int32_t pieces;  ///< a chain with steps of up to 60 degrees has that many
+  std::int32_t bound;            ///< no chain has fewer pieces, taken as an open path
+  std::int32_t pieces;           ///< a chain with steps of up to 60 degrees has that many
+  std::int32_t closedBound = 0;  ///< no closed chain has fewer pieces; 0 for an open contour
 
   Scan Read() const {
     Scan scan = ReadPoints(*SharedDataFolder() + "/" + name + ".csv");
@@ -42,11 +43,11 @@ inline constexpr SharedContour kSharedContours[] = {
     {"wheel_worn_a", 0.03, false, false, 26, 29},
     {"rail_worn_low", 0.025, false, false, 15, 16},
     {"mirror_sphere_83m", 0.00005, false, false, 1, 1},
-    {"hatch_boundary", 0.002, false, true, 85, 97},
-    {"glyph_five", 2.0, true, true, 18, 18},
-    {"gcode_letter_d", 0.015, false, true, 8, 9},
+    {"hatch_boundary", 0.002, false, true, 85, 97, 85},
+    {"glyph_five", 2.0, true, true, 18, 18, 17},
+    {"gcode_letter_d", 0.015, false, true, 8, 9, 7},
     {"airfoil_clark_y", 0.0004, false, false, 7, 8},
-    {"circle_r3", 0.001, false, true, 1, 1},
+    {"circle_r3", 0.001, false, true, 1, 1, 2},
     {"test_track_centreline", 0.03, true, false, 21, 22},
 };
 

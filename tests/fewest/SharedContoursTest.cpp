@@ -55,7 +55,7 @@ TEST_P(FewestPiecesOnMeasured, ClosedHasNoMoreThanOpen) {
   FewestResult const closed = FitKept(scan_, Closed());
   // A full circle is one arc when open and two when closed.
   EXPECT_LE(PieceCount(closed), std::max(PieceCount(open), 2));
-  EXPECT_LE(closed.fewestPossible, GetParam().bound);
+  EXPECT_EQ(closed.fewestPossible, GetParam().closedBound);
 }
 
 INSTANTIATE_TEST_SUITE_P(Contours, FewestPiecesOnMeasured, testing::ValuesIn(kSharedContours),

@@ -23,6 +23,10 @@ TEST(FewestPiecesAtScale, OneArcOfAMillionPointsIsOnePiece) {
   ExpectPieces(MakeNoisyArc(1, 1000000, 0.45), 1);
 }
 
+TEST(FewestPiecesAtScale, AProfileOfAMillionPointsHasItsTrueNumber) {
+  ExpectPieces(MakeNoisyProfile(1, ProfileStyle::Mixed, 1000, 1000000, 0.45), 16000);
+}
+
 TEST(FewestPiecesAtScale, NoiseNearTheToleranceTakesAWideLook) {
   FewestOptions options;
   options.effort = FewestPieces::Effort::Wide;

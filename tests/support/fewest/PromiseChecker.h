@@ -369,7 +369,8 @@ class Run {
     return false;
   }
 
-  /// The edges of piece k from the one that passes x on, in both directions.
+  /// The edges from the one of piece k that passes x on, in both directions; of an open path into
+  /// the neighbouring pieces where need be.
   std::vector<std::size_t> EdgesNear(std::size_t k, std::size_t other, Vec x) const {
     auto const [first, last] = spans_[k];
     std::size_t const begin = first == 0 ? 0 : first - 1;
@@ -381,8 +382,10 @@ class Run {
       return pieces_[other].Distance(PointAt(i)) <= 4 * ToleranceAt(i);
     };
     std::vector<std::size_t> edges{middle};
-    for (std::size_t i = middle; i > begin && isBeside(i); --i) edges.push_back(i - 1);
-    for (std::size_t i = middle + 1; i < end && isBeside(i); ++i) edges.push_back(i);
+    std::size_t const lowest = chain_.isClosed ? begin : 0;
+    std::size_t const highest = chain_.isClosed ? end : Count() - 1;
+    for (std::size_t i = middle; i > lowest && isBeside(i); --i) edges.push_back(i - 1);
+    for (std::size_t i = middle + 1; i < highest && isBeside(i); ++i) edges.push_back(i);
     return edges;
   }
 
