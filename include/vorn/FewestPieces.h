@@ -45,9 +45,9 @@ inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
 /// Where it falls short
 /// - A path that runs several times along itself, as a circle scanned twice around, may take many
 ///   more pieces than the bound: each lap has to stay on its side of the others.
-/// - Where largestRadius is below radii of the part, short pieces stand for its arcs; they may all
-/// be
-///   segments though some arcs would save a few. The bound takes no account of largestRadius.
+/// - Where largestRadius is below radii of the part, short pieces stand for its arcs; all of them
+///   may be segments though some arcs would save a few. The bound takes no account of
+///   largestRadius.
 /// - Tolerances below 2^-1040 have too few digits left; such points may come as short segments.
 ///
 /// There is no state and there are no threads: the same input gives the same bits on every call.
