@@ -38,6 +38,12 @@ inline std::vector<Elem> LineAndArc() {
   return {Segment(0.0, 0.0), Segment(4.0, 0.0), Arc(4.0, -1.0, 1.0, kHalfPi, 2.0 * kHalfPi, -1.0)};
 }
 
+/// Along the x axis to 10, then a quarter turn to the left about (10, 5).
+inline std::vector<Piece> LineAndQuarter() {
+  constexpr double kHalfPi = 1.5707963267948966;
+  return PiecesOf({Segment(0, 0), Segment(10, 0), Arc(10, 5, 5, -kHalfPi, 0.0, 1.0)});
+}
+
 inline PointFile FileWith(std::vector<WPoint> points) {
   PointFile file;
   file.path = "part.csv";

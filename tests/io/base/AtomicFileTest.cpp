@@ -116,5 +116,15 @@ TEST_F(AtomicFileTest, FailedCommitNamesTheFileAndLeavesNothing) {
   EXPECT_EQ(FileCount(), 1u);
 }
 
+TEST_F(AtomicFileTest, WhatIsStagedCanBeRemovedWhenTheProgramEnds) {
+  Write(In("kept.txt"), "old");
+  AtomicFile const first(In("kept.txt"), "new");
+  AtomicFile const second(In("other.txt"), "text");
+  EXPECT_EQ(FileCount(), 3u);
+  RemoveTemporaries();
+  EXPECT_EQ(FileCount(), 1u);
+  EXPECT_EQ(Contents(In("kept.txt")), "old");
+}
+
 }  // namespace
 }  // namespace Vorn::IO

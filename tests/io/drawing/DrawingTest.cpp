@@ -2,25 +2,17 @@
 
 #include <algorithm>
 #include <cmath>
-#include <numbers>
 #include <regex>
 
 #include "io/Contours.h"
 #include "io/Picture.h"
-#include "io/drawing/Band.h"
-#include "io/drawing/Decimation.h"
-#include "io/drawing/Feet.h"
 #include "io/drawing/Labels.h"
 #include "io/drawing/Layout.h"
 #include "io/drawing/Style.h"
-#include "io/drawing/SvgElements.h"
-#include "io/drawing/SvgPaths.h"
 #include "vorn/io/Failure.h"
 
 namespace Vorn::IO::Svg {
 namespace {
-
-using std::numbers::pi;
 
 std::size_t Occurrences(std::string const& text, std::string const& part) {
   std::size_t count = 0;
@@ -28,187 +20,6 @@ std::size_t Occurrences(std::string const& text, std::string const& part) {
     ++count;
   }
   return count;
-}
-
-/// A view with one pixel per unit and the origin of the plane at (100, 100).
-View PlainView() {
-  return {{-100.0 / 1.14, 100.0 / 1.14, -1.0, 1.0}, 0.0, 0.0, 200.0, 200.0, 400.0};
-}
-
-TEST(NiceStep, IsOneTwoOrFiveTimesAPowerOfTen) {
-  EXPECT_EQ(NiceStep(1.0), 1.0);
-  EXPECT_EQ(NiceStep(1.1), 2.0);
-  EXPECT_EQ(NiceStep(3.0), 5.0);
-  EXPECT_EQ(NiceStep(7.0), 10.0);
-  EXPECT_DOUBLE_EQ(NiceStep(0.03), 0.05);
-}
-
-TEST(TicksBetween, LabelsTellNeighboursApart) {
-  Ticks const ticks = TicksBetween(400770.1, 400770.9, 0.2);
-  ASSERT_EQ(ticks.values.size(), 4u);
-  EXPECT_EQ(ticks.Label(ticks.values.front()), "400770.2");
-  Ticks const whole = TicksBetween(-30.0, 30.0, 20.0);
-  ASSERT_EQ(whole.values.size(), 3u);
-  EXPECT_EQ(whole.Label(whole.values[1]), "0");
-}
-
-TEST(TicksBetween, EndsWhereStepsVanishAgainstTheValues) {
-  EXPECT_LE(TicksBetween(1e17, 1e17, 0.1).values.size(), 40u);
-}
-
-TEST(View, TurnsTheYAxisUpAndKeepsOneScale) {
-  View const view = PlainView();
-  EXPECT_NEAR(view.Scale(), 1.0, 1e-12);
-  EXPECT_NEAR(view(0.0, 0.0).x, 100.0, 1e-12);
-  EXPECT_NEAR(view(10.0, 30.0).x, 110.0, 1e-12);
-  EXPECT_NEAR(view(10.0, 30.0).y, 70.0, 1e-12);
-}
-
-TEST(View, PointsOnOneLineOrInOnePlaceStillGetAScale) {
-  for (Box const& box : {Box{0, 10, 3, 3}, Box{3, 3, 0, 10}, Box{3, 3, 3, 3}, Box{0, 1e-300, 0, 0},
-                         Box{-1e300, 1e300, 0, 1e300}}) {
-    View const view(box, 0.0, 0.0, 500.0, 100.0, 400.0);
-    EXPECT_GT(view.Scale(), 0.0);
-    EXPECT_TRUE(std::isfinite(view(box.xMax, box.yMax).x));
-  }
-}
-
-TEST(PathData, CounterClockwiseIsTheNegativeSenseOfSvg) {
-  auto const quarter = [](double direction) {
-    double const to = direction > 0.0 ? 0.5 * pi : -0.5 * pi;
-    return PathData(PiecesOf({Contours::Segment(50, 0), Contours::Arc(0, 0, 50, 0, to, direction)}),
-                    PlainView());
-  };
-  EXPECT_EQ(quarter(1.0), "M150,100A50,50 0 0 0 100,50");
-  EXPECT_EQ(quarter(-1.0), "M150,100A50,50 0 0 1 100,150");
-}
-
-TEST(PathData, ArcBeyondHalfATurnIsWrittenInParts) {
-  std::string const data =
-      PathData(PiecesOf({Contours::Segment(50, 0), Contours::Arc(0, 0, 50, 0, -0.5 * pi, 1.0)}),
-               PlainView());
-  EXPECT_EQ(data, "M150,100A50,50 0 0 0 100,50A50,50 0 0 0 50,100A50,50 0 0 0 100,150");
-}
-
-TEST(PathData, FlatArcOfAnEnormousRadiusIsALine) {
-  double const radius = 1e9;
-  std::string const data = PathData(
-      PiecesOf({Contours::Segment(0, 0),
-                Contours::Arc(0, -radius, radius, 0.5 * pi, 0.5 * pi - 50.0 / radius, -1.0)}),
-      PlainView());
-  EXPECT_EQ(data, "M100,100L150,100");
-}
-
-TEST(Escaped, LeavesNoMarkupAndNoControlCharacters) {
-  EXPECT_EQ(Escaped("a<b>&\"c\"\x01\n"), "a&lt;b&gt;&amp;&quot;c&quot;");
-}
-
-/// Along the x axis to 10, then a quarter turn to the left about (10, 5).
-std::vector<Piece> LineAndQuarter() {
-  return PiecesOf({Contours::Segment(0, 0), Contours::Segment(10, 0),
-                   Contours::Arc(10, 5, 5, -0.5 * pi, 0.0, 1.0)});
-}
-
-TEST(FootOn, IsTheNearestPlaceOfALineAndItsLengthFromTheStart) {
-  Piece const line = LineAndQuarter()[0];
-  Foot const inside = FootOn(line, 4.0, 3.0);
-  EXPECT_EQ(inside.at.x, 4.0);
-  EXPECT_EQ(inside.at.y, 0.0);
-  EXPECT_EQ(inside.along, 4.0);
-  EXPECT_EQ(FootOn(line, -2.0, 3.0).along, 0.0);
-  EXPECT_EQ(FootOn(line, 12.0, 3.0).at.x, 10.0);
-  EXPECT_EQ(FootOn(line, 12.0, 3.0).along, 10.0);
-}
-
-TEST(FootOn, IsTheNearestPlaceOfAnArcAndItsLengthFromTheStart) {
-  Piece const arc = LineAndQuarter()[1];
-  Foot const inside = FootOn(arc, 13.0, 1.0);
-  EXPECT_DOUBLE_EQ(inside.at.x, 13.0);
-  EXPECT_DOUBLE_EQ(inside.at.y, 1.0);
-  EXPECT_DOUBLE_EQ(inside.along, 5.0 * std::atan2(3.0, 4.0));
-  EXPECT_EQ(FootOn(arc, 0.0, -1.0).along, 0.0);
-  EXPECT_EQ(FootOn(arc, 15.0, 9.0).along, arc.length);
-  EXPECT_EQ(FootOn(arc, 10.0, 5.0).along, 0.0) << "every place is as near to the centre";
-}
-
-TEST(Magnified, MovesThePointAwayFromItsFoot) {
-  std::vector<Piece> const pieces = LineAndQuarter();
-  WPoint const above{4.0, 0.25, 0.5};
-  GeometryUtils::Point const moved = Magnified(above, FootOn(pieces[0], 4.0, 0.25), 8.0);
-  EXPECT_EQ(moved.x, 4.0);
-  EXPECT_EQ(moved.y, 2.0);
-  // 1 inside the arc along its radius of slope -4/3.
-  WPoint const inner{12.4, 1.8, 0.5};
-  GeometryUtils::Point const far = Magnified(inner, FootOn(pieces[1], 12.4, 1.8), 3.0);
-  EXPECT_NEAR(far.x, 13.0 - 3.0 * 0.6, 1e-12);
-  EXPECT_NEAR(far.y, 1.0 + 3.0 * 0.8, 1e-12);
-}
-
-TEST(Magnified, OnceIsThePointItself) {
-  WPoint const point{0.1, 0.2, 0.5};
-  Foot const foot{{0.3, 0.7}, 0.0};
-  EXPECT_EQ(Magnified(point, foot, 1.0).x, 0.1);
-  EXPECT_EQ(Magnified(point, foot, 1.0).y, 0.2);
-}
-
-TEST(ReadableMagnification, IsARoundNumberThatMakesTheToleranceReadable) {
-  Drawing const drawing = MakeDrawing({{1, 0.01, 0.02}, {9, 0, 0.02}}, LineAndQuarter());
-  // 14 pixels for 0.02 units of 10 pixels each are 70 times as large.
-  EXPECT_EQ(ReadableMagnification(drawing, 10.0), 50.0);
-  EXPECT_EQ(ReadableMagnification(drawing, 1000.0), 1.0);
-  Drawing const outside = MakeDrawing({{1, 1.0, 0.02}, {9, 0, 0.02}}, LineAndQuarter());
-  EXPECT_EQ(ReadableMagnification(outside, 10.0), 5.0) << "70 pixels for the deviation at most";
-  Drawing const exact = MakeDrawing({{1, 0, 0}, {9, 0, 0}}, LineAndQuarter());
-  EXPECT_EQ(ReadableMagnification(exact, 10.0), 1.0) << "nothing to magnify";
-}
-
-TEST(NiceFloor, IsOneTwoOrFiveTimesAPowerOfTen) {
-  EXPECT_EQ(NiceFloor(1.0), 1.0);
-  EXPECT_EQ(NiceFloor(4.9), 2.0);
-  EXPECT_EQ(NiceFloor(70.0), 50.0);
-  EXPECT_EQ(NiceFloor(100.0), 100.0);
-}
-
-TEST(BandSections, ChangeWidthAtTheFeet) {
-  std::vector<WPoint> const points = {{0, 0, .1}, {3, 0, .1}, {6, 0, .3}, {10, 0, .3}};
-  Drawing const drawing = MakeDrawing(points, {LineAndQuarter()[0]});
-  std::vector<BandSection> const sections = BandSections(drawing, FeetOf(drawing), 0.0);
-  ASSERT_EQ(sections.size(), 2u);
-  EXPECT_EQ(sections[0].tolerance, 0.1);
-  EXPECT_EQ(sections[0].from, 0.0);
-  EXPECT_EQ(sections[0].to, 3.0);
-  EXPECT_EQ(sections[1].tolerance, 0.3);
-  EXPECT_EQ(sections[1].from, 3.0);
-  EXPECT_EQ(sections[1].to, 10.0);
-}
-
-TEST(BandSections, CoverPiecesWithoutPoints) {
-  Drawing const drawing = MakeDrawing({{0, 0, .1}, {3, 0, .1}}, LineAndQuarter());
-  std::vector<BandSection> const sections = BandSections(drawing, FeetOf(drawing), 0.0);
-  ASSERT_EQ(sections.size(), 2u);
-  EXPECT_EQ(sections[1].piece, 1u);
-  EXPECT_EQ(sections[1].tolerance, 0.1);
-  EXPECT_EQ(sections[1].to, LineAndQuarter()[1].length);
-}
-
-TEST(OnePerCell, KeepsTheFirstMarkOfEachCell) {
-  std::vector<Pixel> const at = {{0.1, 0.1}, {0.2, 0.2}, {1.1, 0.1}, {-0.1, 0.1}, {0.15, 0.1}};
-  EXPECT_EQ(OnePerCell(at, 1.0), (std::vector<std::size_t>{0, 2, 3}));
-}
-
-TEST(OnePerCell, LeavesOutWhatIsNowhere) {
-  double const nan = std::nan("");
-  EXPECT_EQ(OnePerCell({{nan, 0}, {0, HUGE_VAL}, {1e300, 0}, {5, 5}}, 1.0),
-            (std::vector<std::size_t>{3}));
-}
-
-TEST(StreaksOf, JoinsCellsOneAboveTheOther) {
-  std::vector<Streak> const runs = StreaksOf({{0.5, 2.5}, {0.5, 0.5}, {0.2, 1.7}, {0.5, 9.0}}, 1.0);
-  ASSERT_EQ(runs.size(), 2u);
-  EXPECT_EQ(runs[0].top.y, 0.5);
-  EXPECT_EQ(runs[0].height, 2.0);
-  EXPECT_EQ(runs[1].top.y, 9.5);
-  EXPECT_EQ(runs[1].height, 0.0);
 }
 
 TEST(ToPng, ShowsEveryKindInItsColour) {
@@ -279,7 +90,7 @@ TEST(ToSvg, OnePointIsDrawn) {
 
 TEST(ToSvg, PointsBeyondTheirToleranceAreCrosses) {
   Drawing const drawing =
-      MakeDrawing({{0, 0, 0.1}, {5, 0.3, 0.1}, {10, 0, 0.1}}, {LineAndQuarter()[0]});
+      MakeDrawing({{0, 0, 0.1}, {5, 0.3, 0.1}, {10, 0, 0.1}}, {Contours::LineAndQuarter()[0]});
   EXPECT_EQ(drawing.verdict, Verdict::OutsideTolerance);
   std::string const svg = ToSvg(drawing);
   EXPECT_EQ(Occurrences(svg, "class=\"outside\""), 2u) << "in the contour and in the diagram";
@@ -298,19 +109,20 @@ std::vector<Piece> Comb(int teeth) {
 }
 
 TEST(ToSvg, OutsideIsRed) {
-  Drawing const drawing = MakeDrawing({{1, 0.5, 0.02}, {9, 0, 0.02}}, LineAndQuarter());
+  Drawing const drawing = MakeDrawing({{1, 0.5, 0.02}, {9, 0, 0.02}}, Contours::LineAndQuarter());
   std::string const svg = ToSvg(drawing);
   EXPECT_NE(svg.find("class=\"outside\" fill=\"none\" stroke=\"#c8102e\""), std::string::npos);
   EXPECT_NE(svg.find("fill=\"#c8102e\" font-weight=\"bold\">OUTSIDE TOLERANCE"), std::string::npos);
 }
 
 TEST(ToSvg, DeviationBesideTheToleranceDoesNotReadAsAllOfIt) {
-  std::string const svg = ToSvg(MakeDrawing({{1, 0.199992, 0.2}, {9, 0, 0.2}}, LineAndQuarter()));
+  std::string const svg =
+      ToSvg(MakeDrawing({{1, 0.199992, 0.2}, {9, 0, 0.2}}, Contours::LineAndQuarter()));
   EXPECT_NE(svg.find("0.99996 of the tolerance"), std::string::npos) << svg.substr(0, 2000);
 }
 
 TEST(ToSvg, AxesTellTheirUnits) {
-  Drawing drawing = MakeDrawing({}, LineAndQuarter());
+  Drawing drawing = MakeDrawing({}, Contours::LineAndQuarter());
   EXPECT_NE(ToSvg(drawing).find(">x</text>"), std::string::npos);
   drawing.units = "mm";
   EXPECT_NE(ToSvg(drawing).find(">x [mm]</text>"), std::string::npos);
@@ -341,8 +153,34 @@ TEST(Labels, StandAsideWithALeaderWhereThereIsNoRoomBeside) {
   EXPECT_EQ(Occurrences(aside, "<text"), 1u);
 }
 
+TEST(ToSvg, TolerancesOfPointsAloneAreDiscsWhereTheyCanBeSeen) {
+  auto const discs = [](double w) {
+    std::string const svg = ToSvg(MakeDrawing({{0, 0, w}, {10, 4, w}, {20, 0, w}}, {}));
+    return Picture::FromSvg(svg, 800).Count(kBandColor);
+  };
+  EXPECT_EQ(discs(1e-4), 0);
+  // Three discs of a tenth of the width across: the page shows some 23 units on 800 pixels.
+  EXPECT_GT(discs(1.0), 3 * 500);
+  EXPECT_GT(discs(2.0), 3 * discs(1.0)) << "four times the area, less what covers them";
+}
+
+TEST(ToSvg, MoreThanTwoThousandPiecesAreOnePathOfEachKind) {
+  auto const paths = [](int pieces) {
+    std::vector<Piece> zigzag;
+    for (int i = 0; i < pieces; ++i) {
+      zigzag.push_back(MakeLine({1.0 * i, 1.0 * (i % 2)}, {i + 1.0, 1.0 * ((i + 1) % 2)}));
+    }
+    std::string const svg = ToSvg(MakeDrawing({}, zigzag));
+    std::size_t const begin = svg.find("<g class=\"pieces\"");
+    return Occurrences(svg.substr(begin, svg.find("</g>", begin) - begin), "<path ");
+  };
+  EXPECT_EQ(paths(2000), 2000u);
+  EXPECT_EQ(paths(2001), 1u);
+}
+
 TEST(ToSvg, WithoutTolerancesThereIsNoVerdict) {
-  Drawing const drawing = MakeDrawing({{0, 0, 0}, {5, 0.3, 0}, {10, 0, 0}}, {LineAndQuarter()[0]});
+  Drawing const drawing =
+      MakeDrawing({{0, 0, 0}, {5, 0.3, 0}, {10, 0, 0}}, {Contours::LineAndQuarter()[0]});
   EXPECT_FALSE(drawing.verdict.has_value());
   EXPECT_EQ(drawing.Worst(), 1u);
   EXPECT_EQ(ToSvg(drawing).find("tolerance"), std::string::npos);

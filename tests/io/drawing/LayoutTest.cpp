@@ -4,13 +4,18 @@
 #include <limits>
 #include <random>
 
-#include "io/drawing/Feet.h"
+#include "io/Contours.h"
 #include "io/drawing/Layout.h"
 
 namespace Vorn::IO::Svg {
 namespace {
 
 constexpr double kInfinity = std::numeric_limits<double>::infinity();
+
+/// A view with one pixel per unit and the origin of the plane at (100, 100).
+View PlainView() {
+  return {{-100.0 / 1.14, 100.0 / 1.14, -1.0, 1.0}, 0.0, 0.0, 200.0, 200.0, 400.0};
+}
 
 TEST(Rect, ContainsItsBordersAndOverlapsWithoutThem) {
   Rect const rect = {10, 20, 30, 40};
@@ -32,6 +37,44 @@ TEST(Box, GrowsToWhatItIncludes) {
   EXPECT_EQ(box.Height(), 3.0);
   box.Include(0, 3);
   EXPECT_EQ(box.Width(), 4.0);
+}
+
+TEST(NiceStep, IsOneTwoOrFiveTimesAPowerOfTen) {
+  EXPECT_EQ(NiceStep(1.0), 1.0);
+  EXPECT_EQ(NiceStep(1.1), 2.0);
+  EXPECT_EQ(NiceStep(3.0), 5.0);
+  EXPECT_EQ(NiceStep(7.0), 10.0);
+  EXPECT_DOUBLE_EQ(NiceStep(0.03), 0.05);
+}
+
+TEST(TicksBetween, LabelsTellNeighboursApart) {
+  Ticks const ticks = TicksBetween(400770.1, 400770.9, 0.2);
+  ASSERT_EQ(ticks.values.size(), 4u);
+  EXPECT_EQ(ticks.Label(ticks.values.front()), "400770.2");
+  Ticks const whole = TicksBetween(-30.0, 30.0, 20.0);
+  ASSERT_EQ(whole.values.size(), 3u);
+  EXPECT_EQ(whole.Label(whole.values[1]), "0");
+}
+
+TEST(TicksBetween, EndsWhereStepsVanishAgainstTheValues) {
+  EXPECT_LE(TicksBetween(1e17, 1e17, 0.1).values.size(), 40u);
+}
+
+TEST(View, TurnsTheYAxisUpAndKeepsOneScale) {
+  View const view = PlainView();
+  EXPECT_NEAR(view.Scale(), 1.0, 1e-12);
+  EXPECT_NEAR(view(0.0, 0.0).x, 100.0, 1e-12);
+  EXPECT_NEAR(view(10.0, 30.0).x, 110.0, 1e-12);
+  EXPECT_NEAR(view(10.0, 30.0).y, 70.0, 1e-12);
+}
+
+TEST(View, PointsOnOneLineOrInOnePlaceStillGetAScale) {
+  for (Box const& box : {Box{0, 10, 3, 3}, Box{3, 3, 0, 10}, Box{3, 3, 3, 3}, Box{0, 1e-300, 0, 0},
+                         Box{-1e300, 1e300, 0, 1e300}}) {
+    View const view(box, 0.0, 0.0, 500.0, 100.0, 400.0);
+    EXPECT_GT(view.Scale(), 0.0);
+    EXPECT_TRUE(std::isfinite(view(box.xMax, box.yMax).x));
+  }
 }
 
 TEST(NiceStep, IsTheLeastNiceNumberNotBelow) {
@@ -130,6 +173,24 @@ TEST(BoxAround, PlacesAtInfinityAreLeftOut) {
   EXPECT_EQ(box.yMax, 4.0);
 }
 
+TEST(ReadableMagnification, IsARoundNumberThatMakesTheToleranceReadable) {
+  Drawing const drawing = MakeDrawing({{1, 0.01, 0.02}, {9, 0, 0.02}}, Contours::LineAndQuarter());
+  // 14 pixels for 0.02 units of 10 pixels each are 70 times as large.
+  EXPECT_EQ(ReadableMagnification(drawing, 10.0), 50.0);
+  EXPECT_EQ(ReadableMagnification(drawing, 1000.0), 1.0);
+  Drawing const outside = MakeDrawing({{1, 1.0, 0.02}, {9, 0, 0.02}}, Contours::LineAndQuarter());
+  EXPECT_EQ(ReadableMagnification(outside, 10.0), 5.0) << "70 pixels for the deviation at most";
+  Drawing const exact = MakeDrawing({{1, 0, 0}, {9, 0, 0}}, Contours::LineAndQuarter());
+  EXPECT_EQ(ReadableMagnification(exact, 10.0), 1.0) << "nothing to magnify";
+}
+
+TEST(NiceFloor, IsOneTwoOrFiveTimesAPowerOfTen) {
+  EXPECT_EQ(NiceFloor(1.0), 1.0);
+  EXPECT_EQ(NiceFloor(4.9), 2.0);
+  EXPECT_EQ(NiceFloor(70.0), 50.0);
+  EXPECT_EQ(NiceFloor(100.0), 100.0);
+}
+
 TEST(ReadableMagnification, NothingMeasuredIsNotMagnified) {
   EXPECT_EQ(ReadableMagnification(MakeDrawing({{0, 0, 1}, {1, 0, 1}}, {}), 3.0), 1.0);
 }
@@ -142,55 +203,6 @@ TEST(ReadableMagnification, IsNeverBelowOne) {
 TEST(ReadableMagnification, PointsOnTheContourWithoutTolerancesAreNotMagnified) {
   Drawing const exact = MakeDrawing({{0, 0, 0}, {10, 0, 0}}, {MakeLine({0, 0}, {10, 0})});
   EXPECT_EQ(ReadableMagnification(exact, 50.0), 1.0);
-}
-
-TEST(PlaceOn, IsThatFarFromTheStartAlongThePiece) {
-  Piece const line = MakeLine({1, 1}, {4, 5});
-  EXPECT_DOUBLE_EQ(PlaceOn(line, 2.5).x, 2.5);
-  EXPECT_DOUBLE_EQ(PlaceOn(line, 2.5).y, 3.0);
-  Piece const arc = MakeArc({2, 0}, {-2, 0}, {0, 0}, 2, true);
-  EXPECT_NEAR(PlaceOn(arc, 0.5 * arc.length).y, 2.0, 1e-15);
-  EXPECT_EQ(PlaceOn(line, line.length).x, 4.0);
-  EXPECT_EQ(PlaceOn(MakeLine({3, 7}, {3, 7}), 0.0).y, 7.0) << "a piece without length";
-}
-
-TEST(PieceStarts, AddUpTheLengths) {
-  EXPECT_EQ(PieceStarts({}), std::vector<double>{0.0});
-  EXPECT_EQ(PieceStarts({MakeLine({0, 0}, {3, 4}), MakeLine({9, 9}, {9, 11})}),
-            (std::vector<double>{0.0, 5.0, 7.0}));
-}
-
-TEST(MakeDrawing, MeasuresOnlyPointsAgainstPieces) {
-  EXPECT_FALSE(MakeDrawing({{0, 1, 1}}, {}).IsMeasured());
-  EXPECT_FALSE(MakeDrawing({}, {MakeLine({0, 0}, {1, 0})}).IsMeasured());
-  EXPECT_FALSE(MakeDrawing({}, {}).HasContour());
-  Drawing const both = MakeDrawing({{0, 1, 2}, {1, -3, 2}}, {MakeLine({0, 0}, {5, 0})});
-  ASSERT_TRUE(both.IsMeasured());
-  EXPECT_EQ(both.deviations[1].distance, 3.0);
-  EXPECT_EQ(both.Worst(), 1u);
-  EXPECT_EQ(both.verdict, Verdict::OutsideTolerance);
-}
-
-TEST(MakeDrawing, OnePointWithoutAToleranceLeavesItUnjudged) {
-  Drawing const drawing = MakeDrawing({{0, 1, 2}, {1, 0, 0}}, {MakeLine({0, 0}, {5, 0})});
-  EXPECT_FALSE(drawing.HasTolerances());
-  EXPECT_FALSE(drawing.verdict);
-}
-
-TEST(MakeDrawing, APlaceThatIsNoneIsOutside) {
-  Drawing const drawing =
-      MakeDrawing({{0, 0, 1}, {std::nan(""), 0, 1}, {2, 0, 1}}, {MakeLine({0, 0}, {5, 0})});
-  EXPECT_EQ(drawing.verdict, Verdict::OutsideTolerance);
-}
-
-TEST(DescribeTolerance, TellsOneOrARangeWithUnits) {
-  Drawing drawing = MakeDrawing({{0, 0, 0.02}, {1, 0, 0.02}}, {});
-  EXPECT_EQ(DescribeTolerance(drawing), "tolerance 0.02");
-  drawing.units = "mm";
-  drawing.points[1].w = 0.05;
-  EXPECT_EQ(DescribeTolerance(drawing), "tolerance 0.02 to 0.05 mm");
-  drawing.points[0].w = 0.0;
-  EXPECT_EQ(DescribeTolerance(drawing), "");
 }
 
 }  // namespace

@@ -32,6 +32,10 @@ TEST(Px, WhatIsNoPlaceIsWrittenAsZero) {
   }
 }
 
+TEST(Escaped, LeavesNoMarkupAndNoControlCharacters) {
+  EXPECT_EQ(Escaped("a<b>&\"c\"\x01\n"), "a&lt;b&gt;&amp;&quot;c&quot;");
+}
+
 TEST(Escaped, EveryByteIsItselfOrAnEntityOrLeftOut) {
   for (int byte = 0; byte < 256; ++byte) {
     std::string const c(1, static_cast<char>(byte));
@@ -85,6 +89,26 @@ TEST(Dots, BeyondTheMostExactOnesCellsAreMerged) {
   EXPECT_EQ(Count(Dots(column, {}), 'M'), 1u) << "one streak";
   column.pop_back();
   EXPECT_EQ(Count(Dots(column, {}), 'M'), kMostExactDots) << "exact places";
+}
+
+TEST(OnePerCell, KeepsTheFirstMarkOfEachCell) {
+  std::vector<Pixel> const at = {{0.1, 0.1}, {0.2, 0.2}, {1.1, 0.1}, {-0.1, 0.1}, {0.15, 0.1}};
+  EXPECT_EQ(OnePerCell(at, 1.0), (std::vector<std::size_t>{0, 2, 3}));
+}
+
+TEST(OnePerCell, LeavesOutWhatIsNowhere) {
+  double const nan = std::nan("");
+  EXPECT_EQ(OnePerCell({{nan, 0}, {0, HUGE_VAL}, {1e300, 0}, {5, 5}}, 1.0),
+            (std::vector<std::size_t>{3}));
+}
+
+TEST(StreaksOf, JoinsCellsOneAboveTheOther) {
+  std::vector<Streak> const runs = StreaksOf({{0.5, 2.5}, {0.5, 0.5}, {0.2, 1.7}, {0.5, 9.0}}, 1.0);
+  ASSERT_EQ(runs.size(), 2u);
+  EXPECT_EQ(runs[0].top.y, 0.5);
+  EXPECT_EQ(runs[0].height, 2.0);
+  EXPECT_EQ(runs[1].top.y, 9.5);
+  EXPECT_EQ(runs[1].height, 0.0);
 }
 
 TEST(OnePerCell, KeepsWhatTheStreaksCover) {

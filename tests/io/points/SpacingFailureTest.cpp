@@ -1,20 +1,13 @@
 #include <gtest/gtest.h>
 
-#include <exception>
-
+#include "io/Contours.h"
 #include "vorn/io/FitContour.h"
 #include "vorn/io/SpacingFailure.h"
 
 namespace Vorn::IO {
 namespace {
 
-PointFile FileWith(std::vector<WPoint> points) {
-  PointFile file;
-  file.path = "p.csv";
-  for (std::size_t i = 0; i < points.size(); ++i) file.lines.push_back(i + 2);
-  file.points = std::move(points);
-  return file;
-}
+using Contours::FileWith;
 
 /// The failure of a fit of these points, or nothing if there is none of this type.
 std::optional<SpacingFailure> FailureOf(PointFile file, FitChoice const& choice) {
@@ -33,7 +26,7 @@ TEST(SpacingFailure, OfAFitTellsThePairAndWhatWasAsked) {
   ASSERT_TRUE(failure);
   EXPECT_EQ(failure->Kind(), FailureKind::PointsTooClose);
   EXPECT_EQ(failure->Help(), Remedy::SpacePoints);
-  EXPECT_EQ(failure->Where().file, "p.csv");
+  EXPECT_EQ(failure->Where().file, "part.csv");
   CloseNeighbours const& neighbours = failure->Neighbours();
   EXPECT_EQ(neighbours.pair.first, 1u);
   EXPECT_EQ(neighbours.pair.second, 2u);

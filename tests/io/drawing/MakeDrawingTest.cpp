@@ -1,0 +1,44 @@
+#include <gtest/gtest.h>
+
+#include <cmath>
+
+#include "vorn/io/Drawing.h"
+
+namespace Vorn::IO {
+namespace {
+
+TEST(MakeDrawing, MeasuresOnlyPointsAgainstPieces) {
+  EXPECT_FALSE(MakeDrawing({{0, 1, 1}}, {}).IsMeasured());
+  EXPECT_FALSE(MakeDrawing({}, {MakeLine({0, 0}, {1, 0})}).IsMeasured());
+  EXPECT_FALSE(MakeDrawing({}, {}).HasContour());
+  Drawing const both = MakeDrawing({{0, 1, 2}, {1, -3, 2}}, {MakeLine({0, 0}, {5, 0})});
+  ASSERT_TRUE(both.IsMeasured());
+  EXPECT_EQ(both.deviations[1].distance, 3.0);
+  EXPECT_EQ(both.Worst(), 1u);
+  EXPECT_EQ(both.verdict, Verdict::OutsideTolerance);
+}
+
+TEST(MakeDrawing, OnePointWithoutAToleranceLeavesItUnjudged) {
+  Drawing const drawing = MakeDrawing({{0, 1, 2}, {1, 0, 0}}, {MakeLine({0, 0}, {5, 0})});
+  EXPECT_FALSE(drawing.HasTolerances());
+  EXPECT_FALSE(drawing.verdict);
+}
+
+TEST(MakeDrawing, APlaceThatIsNoneIsOutside) {
+  Drawing const drawing =
+      MakeDrawing({{0, 0, 1}, {std::nan(""), 0, 1}, {2, 0, 1}}, {MakeLine({0, 0}, {5, 0})});
+  EXPECT_EQ(drawing.verdict, Verdict::OutsideTolerance);
+}
+
+TEST(DescribeTolerance, TellsOneOrARangeWithUnits) {
+  Drawing drawing = MakeDrawing({{0, 0, 0.02}, {1, 0, 0.02}}, {});
+  EXPECT_EQ(DescribeTolerance(drawing), "tolerance 0.02");
+  drawing.units = "mm";
+  drawing.points[1].w = 0.05;
+  EXPECT_EQ(DescribeTolerance(drawing), "tolerance 0.02 to 0.05 mm");
+  drawing.points[0].w = 0.0;
+  EXPECT_EQ(DescribeTolerance(drawing), "");
+}
+
+}  // namespace
+}  // namespace Vorn::IO
