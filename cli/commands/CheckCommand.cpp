@@ -30,10 +30,12 @@ constexpr char const* kText =
 
 constexpr char const* kFooter =
     R"(
-The contour is read from JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG, told by the ending of the name, by --from or
-by the content. Every point is measured against every piece as drawn, clipped at its ends. A
-relative deviation counts as within tolerance up to 1 + 1e-6, for rounding. Without any tolerance
-deviations are lengths, and none is judged.
+The contour is read from JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG, told by the ending of the
+name, by --from or by the content. Every point is measured against every piece as drawn, clipped at
+its ends. A relative deviation counts as within tolerance up to 1 + 1e-6, for rounding. Without any
+tolerance deviations are lengths, and none is judged. A last table tells for each piece the line or
+circle of least squares through its points, with form error and standard deviations, as 'contour
+fit' does.
 
 Deviations to the left of the contour's sense of travel are positive in the tables. Points are
 counted from 0, pieces from 1. Pieces cross where two of them that are not neighbours have a point

@@ -42,6 +42,29 @@ CLI::Validator DashForStandardOutput() {
   return {replace, ""};
 }
 
+/// The text with lines no longer than `width`, but for a word that is longer itself.
+std::string Wrapped(std::string const& text, std::size_t width) {
+  std::istringstream words(text);
+  std::string wrapped;
+  std::size_t used = 0;
+  for (std::string word; words >> word;) {
+    bool const fits = used == 0 || used + 1 + word.size() <= width;
+    if (used > 0) wrapped += fits ? ' ' : '\n';
+    used = fits && used > 0 ? used + 1 + word.size() : word.size();
+    wrapped += word;
+  }
+  return wrapped;
+}
+
+/// Help for terminals of 80 columns.
+class NarrowHelp : public CLI::Formatter {
+ public:
+  std::string make_option_desc(CLI::Option const* option) const override {
+    constexpr std::size_t kColumns = 80;
+    return Wrapped(CLI::Formatter::make_option_desc(option), kColumns - column_width_);
+  }
+};
+
 }  // namespace
 
 Option Option::Require() const { return Option(option_->required()); }
@@ -106,6 +129,8 @@ void Command::OnParsed(std::function<void()> const& call) { command_->callback(c
 CommandLine::CommandLine(std::string const& name, std::string const& text)
     : program_(std::make_unique<CLI::App>(text, name)) {
   program_->require_subcommand(1);
+  // The commands take it over.
+  program_->formatter(std::make_shared<NarrowHelp>());
 }
 
 CommandLine::~CommandLine() = default;

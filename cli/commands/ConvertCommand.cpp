@@ -27,7 +27,8 @@ constexpr char const* kText =
 constexpr char const* kFooter =
     R"(
 The ending of a file tells its format: .json, .csv, .dxf, .nc or .gcode, .wkt, .geojson, .svg (read:
-its shapes; written: a drawing, or with --svg-plain the contour), and for drawings .png, .html. For - and other names --from and --to say it; without --from the content tells.
+its shapes; written: a drawing, or with --svg-plain the contour), and for drawings .png, .html. For
+- and other names --from and --to say it; without --from the content tells.
 
 What a format keeps:
   json   everything: doubles to the last bit, gaps, units, closed or not

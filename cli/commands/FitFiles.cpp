@@ -61,6 +61,7 @@ FittedFile RenderFit(FitReport const& report, std::string const& path, Format fo
 FittedFile RenderFit(std::vector<FitReport> const& outlines, std::string const& path, Format format,
                      WriteOptions const& options) {
   FittedFile file = RenderFit(Joined(outlines), path, format, options);
+  if (format == Format::Json) file.text = ToJson(outlines);
   if (file.measure) file.measure = MeasureText(file.text, format, outlines);
   return file;
 }

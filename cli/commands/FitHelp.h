@@ -36,9 +36,9 @@ counts. Up to 1 + 1e-6 counts as within, for the rounding of the measurement. Po
 from 0. The strategy arc reports its deviation as a length, and no point.
 
 Outputs: the ending of a file tells its format: .json (the contour with deviations and all),
-.csv, .dxf, .nc or .gcode, .wkt, .geojson (the contour; see 'contour convert --help' for what each keeps),
-.svg, .png, .html (drawings). --to tells it for - and for other endings. Numbers are written so
-that they read back as the same doubles, but for G-code, which is rounded. Every file that holds
+.csv, .dxf, .nc or .gcode, .wkt, .geojson (the contour; see 'contour convert --help' for what each
+keeps), .svg, .png, .html (drawings). --to tells it for - and for other endings. Numbers are written
+so that they read back as the same doubles, but for G-code, which is rounded. Every file that holds
 the contour is read back and measured before the word "within" is said. With -o - the table is
 not printed.
 

@@ -39,7 +39,8 @@ struct Outcome {
   bool isFitted = false;
   std::size_t points = 0;
   std::size_t pieces = 0;
-  double deviation = 0.0;  ///< relative
+  std::optional<std::size_t> bound;  ///< below which no contour can go
+  double deviation = 0.0;            ///< relative
   double seconds = 0.0;
   std::vector<FittedFile> files;  ///< to write
   SummaryRow row;                 ///< only for a summary
@@ -64,6 +65,14 @@ std::string ShortMessage(std::string const& path, std::string const& message) {
   return text;
 }
 
+/// "29", "29 (26 at least)", "7 (fewest)".
+std::string PiecesText(Outcome const& outcome) {
+  std::string const pieces = std::to_string(outcome.pieces);
+  if (!outcome.bound) return pieces;
+  if (*outcome.bound == outcome.pieces) return pieces + " (fewest)";
+  return pieces + " (" + std::to_string(*outcome.bound) + " at least)";
+}
+
 Outcome Failed(std::string const& path, ExitCode code, std::string const& message) {
   Outcome outcome;
   outcome.path = path;
@@ -81,6 +90,7 @@ Outcome FitFile(FitMany const& many, std::string const& path) {
   outcome.isFitted = true;
   outcome.points = report.file.points.size();
   outcome.pieces = report.pieces.size();
+  outcome.bound = report.fit.fewestPossible;
   outcome.deviation = report.LargestDeviation().relative;
   if (!many.outFolder.empty()) {
     for (Format const format : many.formats) {
@@ -127,8 +137,8 @@ class Listing {
   void Add(Outcome const& outcome) {
     if (outcome.isFitted) {
       Print(outcome.path,
-            {std::to_string(outcome.points), std::to_string(outcome.pieces),
-             RelativeText(outcome.deviation), FormatFixed(outcome.seconds, kTimeDecimals)},
+            {std::to_string(outcome.points), PiecesText(outcome), RelativeText(outcome.deviation),
+             FormatFixed(outcome.seconds, kTimeDecimals)},
             outcome.verdict);
       points_ += outcome.points;
       pieces_ += outcome.pieces;
@@ -168,6 +178,8 @@ class Listing {
 
  private:
   static constexpr char const* kName = "file";
+  static constexpr std::size_t kWidth = 9;        ///< of a column
+  static constexpr std::size_t kBoundWidth = 20;  ///< of "1234 (1200 at least)"
 
   static SummaryRow RowOf(Outcome const& outcome) {
     if (outcome.isFitted) return outcome.row;
@@ -191,8 +203,8 @@ class Listing {
     for (std::size_t i = 0; i < numbers.size(); ++i) {
       bool const isTime = i + 1 == numbers.size();
       if (isTime && !many_.showTime) continue;
-      constexpr std::size_t kWidth = 9;
-      line += "  " + std::string(kWidth - std::min(kWidth, numbers[i].size()), ' ') + numbers[i];
+      std::size_t const width = i == 1 && many_.tellsBound ? kBoundWidth : kWidth;
+      line += "  " + std::string(width - std::min(width, numbers[i].size()), ' ') + numbers[i];
     }
     console_.out << Printable(line) << "  " << Printable(result)
                  << std::endl;  // at once, for who is waiting

@@ -19,8 +19,9 @@ struct FitMany {
   std::vector<Format> formats;
   std::optional<int> jobs;  ///< how many files at once; nothing: as many as there are processors
   bool showTime = true;
-  std::string summary;  ///< a file .csv or .html with a row for each; empty: none
-  ReportHead head;      ///< of the summary
+  bool tellsBound = false;  ///< how few pieces there can be at least, beside their number
+  std::string summary;      ///< a file .csv or .html with a row for each; empty: none
+  ReportHead head;          ///< of the summary
   std::function<FitReport(std::string const& path)> fit;
   std::function<FittedFile(FitReport const&, std::string const& path, Format)> render;
 };

@@ -177,6 +177,7 @@ FitMany ManyOf(FitOptions const& options) {
   many.formats = options.formats.empty() ? std::vector{Format::Json} : options.formats;
   many.jobs = options.jobs;
   many.showTime = !options.hideTime;
+  many.tellsBound = options.strategy == Strategy::Fewest;
   many.render = [&options](FitReport const& report, std::string const& path, Format format) {
     return RenderFit(report, path, format, options.write);
   };

@@ -20,9 +20,10 @@ tab or blanks; decimal commas are read where the separator is none. What follows
 comment; "# tolerance T" and "# units mm" are read.
 
 Points are taken from drawings and tool paths as well: the vertices of polylines and lines in DXF
-(.dxf), G-code (.nc, .gcode), WKT (.wkt), GeoJSON (.geojson, .json) and SVG (.svg). Lines are chained
-by their ends; several outlines are several contours. Arcs and curves are refused unless --flatten
-says how far chords may be from them. SVG is turned up, and true to a page in mm, cm or in.
+(.dxf), G-code (.nc, .gcode), WKT (.wkt), GeoJSON (.geojson, .json) and SVG (.svg). Lines are
+chained by their ends; several outlines are several contours. Arcs and curves are refused unless
+--flatten says how far chords may be from them. SVG is turned up, and true to a page in mm, cm or
+in.
 )";
 
 Option AddColumns(Command& command, ColumnChoice* columns) {

@@ -41,9 +41,9 @@ across the path in each window. Where the path bends, its bend is part of that.
 
 --drop-close keeps the first point, then always the next one that is more than 1.5 times the sum of
 their tolerances away from the one kept before, and the last point; in a closed contour that does
-not repeat its first point, the last one must be that far from the first as well. With --tolerance-per-point
-tolerances follow the spacing, so that only points in one place are left out; so it is without any
-tolerance.
+not repeat its first point, the last one must be that far from the first as well. With
+--tolerance-per-point tolerances follow the spacing, so that only points in one place are left out;
+so it is without any tolerance.
 
 With --outliers or --spacing and a tolerance, the rest is fitted and every point of the file, those
 that were dropped as well, is measured against that contour. What was found and what was dropped is

@@ -4,9 +4,13 @@
 #include <cmath>
 
 #include "cli/texts/Columns.h"
+#include "cli/texts/LengthFormat.h"
+#include "cli/texts/MeasureTable.h"
 #include "cli/texts/Relative.h"
+#include "cli/texts/ScatterText.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
+#include "vorn/io/PieceMeasures.h"
 
 namespace Vorn::Cli {
 
@@ -15,40 +19,48 @@ namespace {
 /// Gaps and places where the contour meets itself are listed up to here.
 constexpr std::size_t kMostPlaces = 10;
 
+/// Of the contour, what its lengths are told as finely as a tolerance of this size would ask.
+constexpr double kFineness = 1e-3;
+
 std::string PlaceOf(CheckReport const& report, std::size_t point) {
   PointDeviation const& deviation = report.deviations[point];
   return report.file.NameOf(point) + ", to the " + (deviation.isLeft ? "left" : "right") +
          " of piece " + std::to_string(deviation.piece + 1);
 }
 
+double LengthOf(CheckReport const& report) {
+  double length = 0.0;
+  for (Piece const& piece : report.contour.pieces) length += piece.length;
+  return length;
+}
+
 std::string PiecesText(CheckReport const& report) {
   std::vector<Piece> const& pieces = report.contour.pieces;
   auto const arcs = static_cast<std::size_t>(std::count_if(
       pieces.begin(), pieces.end(), [](Piece const& piece) { return piece.IsArc(); }));
-  double length = 0.0;
-  for (Piece const& piece : pieces) length += piece.length;
   return std::to_string(pieces.size()) + ": " + Counted(pieces.size() - arcs, "line") + ", " +
-         Counted(arcs, "arc") + ", " + FormatShort(length) + " long, " +
+         Counted(arcs, "arc") + ", " + FormatShort(LengthOf(report)) + " long, " +
          (report.contour.isClosed ? "closed" : "open");
 }
 
 std::string DeviationFacts(CheckReport const& report) {
   std::string text = Fact("largest", FormatShort(report.deviations[report.furthest].distance) +
                                          " at " + PlaceOf(report, report.furthest));
+  DeviationSummary const summary =
+      Summarise(report.file.points, report.deviations, report.HasTolerances());
+  text += Fact("scatter", ScatterText(summary, report.file.units));
   if (!report.HasTolerances()) return text;
   text += Fact("relative", RelativeText(report.deviations[report.worst].relative) +
                                " of the tolerance at " + PlaceOf(report, report.worst));
-  std::string const total = Counted(report.file.points.size(), "point");
-  return text + Fact("outside", report.outside.empty()
-                                    ? "none of " + total
-                                    : std::to_string(report.outside.size()) + " of " + total);
+  return text + Fact("outside", OutsideText(report.outside.size(), report.file.points.size()));
 }
+
+bool HasSmallerTolerance(WPoint const& a, WPoint const& b) { return a.w < b.w; }
 
 std::string ToleranceText(CheckReport const& report) {
   if (!report.HasTolerances()) return "none given: deviations are lengths";
-  auto const [smallest, largest] =
-      std::minmax_element(report.file.points.begin(), report.file.points.end(),
-                          [](WPoint const& a, WPoint const& b) { return a.w < b.w; });
+  auto const [smallest, largest] = std::minmax_element(
+      report.file.points.begin(), report.file.points.end(), HasSmallerTolerance);
   std::string text = FormatShort(smallest->w);
   if (smallest->w != largest->w) text += " to " + FormatShort(largest->w);
   return text + " (" + report.toleranceSource + ")";
@@ -131,6 +143,20 @@ Row PointRow(CheckReport const& report, std::size_t point) {
   return row;
 }
 
+/// Lengths to a hundredth of the smallest tolerance, without one of a thousandth of the contour.
+LengthFormat LengthFormatOf(CheckReport const& report) {
+  if (!report.HasTolerances()) return LengthFormat(kFineness * LengthOf(report));
+  std::vector<WPoint> const& points = report.file.points;
+  return LengthFormat(std::min_element(points.begin(), points.end(), HasSmallerTolerance)->w);
+}
+
+std::string Measures(CheckReport const& report) {
+  ContourFile const& contour = report.contour;
+  std::vector<PieceMeasure> const measures =
+      MeasurePieces(report.file.points, report.deviations, contour.pieces, contour.isClosed);
+  return MeasureTable(contour.pieces, measures, LengthFormatOf(report));
+}
+
 }  // namespace
 
 std::string ToText(CheckReport const& report, std::vector<std::size_t> const& order,
@@ -142,7 +168,7 @@ std::string ToText(CheckReport const& report, std::vector<std::size_t> const& or
   std::string const& units = report.file.units;
   return report.file.path + " against " + report.contour.path +
          (units.empty() ? "" : ", lengths in " + units) + "\n\n" + Summary(report) + "\n" +
-         Aligned(table);
+         Aligned(table) + "\n" + Measures(report);
 }
 
 }  // namespace Vorn::Cli

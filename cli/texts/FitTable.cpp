@@ -8,6 +8,7 @@
 #include "cli/texts/LengthFormat.h"
 #include "cli/texts/MeasureTable.h"
 #include "cli/texts/Relative.h"
+#include "cli/texts/ScatterText.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
 
@@ -114,11 +115,8 @@ std::string FieldsText(FitReport const& report) {
 
 std::string ScatterText(FitReport const& report) {
   DeviationSummary const summary = Summarise(report);
-  std::string const total = Counted(report.file.points.size(), "point");
-  return "root mean square " + WithUnits(FormatShort(summary.rootMeanSquare, 4), report) +
-         ", mean " + WithUnits(FormatShort(summary.mean, 3), report) + ", " +
-         (summary.outside == 0 ? "none" : std::to_string(summary.outside)) + " of " + total +
-         " outside";
+  return ScatterText(summary, report.file.units) + ", " +
+         OutsideText(summary.outside, report.file.points.size()) + " outside";
 }
 
 std::string Summary(FitReport const& report, std::string const& readBack) {
@@ -145,7 +143,8 @@ std::string ToTable(FitReport const& report, std::optional<int> digits,
   }
   std::string const units = report.file.units.empty() ? "" : ", lengths in " + report.file.units;
   return report.file.path + units + ", sweeps in degrees\n\n" +
-         Aligned(rows, {"kind", "direction"}) + "\n" + MeasureTable(report, length) + "\n" +
+         Aligned(rows, {"kind", "direction"}) + "\n" +
+         MeasureTable(report.pieces, MeasurePieces(report), length) + "\n" +
          Summary(report, readBack);
 }
 

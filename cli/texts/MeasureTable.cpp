@@ -1,11 +1,9 @@
 #include "cli/texts/MeasureTable.h"
 
 #include <numbers>
-#include <vector>
 
 #include "cli/texts/Columns.h"
 #include "vorn/io/Numbers.h"
-#include "vorn/io/PieceMeasures.h"
 
 namespace Vorn::Cli {
 
@@ -18,8 +16,7 @@ constexpr char const* kNothing = "-";
 
 constexpr char const* kHeading =
     "Measured by least squares over the points of each piece, angles in degrees. A radius of the\n"
-    "table above is one of those that the tolerance admits; the one here is that of the "
-    "points.\n\n";
+    "contour is one of those that the tolerance admits; the one here is that of the points.\n\n";
 
 std::string Degrees(double radians) {
   return FormatFixed(radians * kDegreesPerRadian, kAngleDecimals);
@@ -54,12 +51,12 @@ Row ScatterCells(PieceMeasure const& measure, LengthFormat const& length) {
 
 }  // namespace
 
-std::string MeasureTable(FitReport const& report, LengthFormat const& length) {
-  std::vector<PieceMeasure> const measures = MeasurePieces(report);
+std::string MeasureTable(std::vector<Piece> const& pieces,
+                         std::vector<PieceMeasure> const& measures, LengthFormat const& length) {
   std::vector<Row> rows = {{"no", "kind", "points", "radius", "direction", "+-", "form error",
                             "deviation", "turn to next"}};
   for (std::size_t i = 0; i < measures.size(); ++i) {
-    Row row = {std::to_string(i + 1), report.pieces[i].IsArc() ? "arc" : "line",
+    Row row = {std::to_string(i + 1), pieces[i].IsArc() ? "arc" : "line",
                std::to_string(measures[i].points)};
     for (Row const& cells : {FittedCells(measures[i], length), ScatterCells(measures[i], length)}) {
       row.insert(row.end(), cells.begin(), cells.end());

@@ -151,9 +151,16 @@ Json ExactJson(Drawing const& drawing) {
   return exact;
 }
 
-Json RoundedArray(std::vector<double> const& numbers) {
+/// Rounded to kDigits, but the very numbers near a tolerance: else they might read as all of it.
+Json RoundedDistances(Drawing const& drawing) {
+  constexpr double kNear = 1e-8;
   Json array = Json::array();
-  for (double const number : numbers) array.push_back(Rounded(number));
+  for (std::size_t i = 0; i < drawing.deviations.size(); ++i) {
+    double const distance = SignedDistance(drawing.deviations[i]);
+    double const w = drawing.points[i].w;
+    bool const isNear = std::fabs(std::fabs(distance) - w) <= kNear * w;
+    array.push_back(isNear ? Json(distance) : Rounded(distance));
+  }
   return array;
 }
 
@@ -173,9 +180,9 @@ Json PointsJson(Drawing const& drawing) {
 
 Json DeviationsJson(Drawing const& drawing) {
   bool const isPacked = IsPacked(drawing);
-  std::vector<double> const distances = SignedDistances(drawing);
   Json json;
-  json["signed"] = isPacked ? PackedJson(distances, LargestStep(drawing)) : RoundedArray(distances);
+  json["signed"] = isPacked ? PackedJson(SignedDistances(drawing), LargestStep(drawing))
+                            : RoundedDistances(drawing);
   json["piece"] = PiecesOfPoints(drawing, isPacked);
   json["outside"] = OutsideJson(drawing);
   if (isPacked) json["exact"] = ExactJson(drawing);

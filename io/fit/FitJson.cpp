@@ -4,6 +4,7 @@
 #include "io/measure/MeasureJson.h"
 #include "vorn/io/FitReport.h"
 #include "vorn/io/Formats.h"
+#include "vorn/io/JoinedFit.h"
 
 namespace Vorn::IO {
 
@@ -113,9 +114,15 @@ Json ProgramJson(FitReport const& report) {
   return report.head.program.empty() ? Json(nullptr) : Json(report.head.program);
 }
 
-}  // namespace
+Json CountsJson(FitReport const& report) {
+  return {{"elements", report.pieces.size()},
+          {"lines", report.LineCount()},
+          {"arcs", report.ArcCount()},
+          {"fewestPossible", FewestJson(report)},
+          {"isFewest", report.IsFewest()}};
+}
 
-std::string ToJson(FitReport const& report) {
+Json DocumentJson(FitReport const& report) {
   Json document = {
       {"schemaVersion", kJsonSchemaVersion},
       {"program", ProgramJson(report)},
@@ -124,18 +131,48 @@ std::string ToJson(FitReport const& report) {
       {"strategy", NameOf(report.strategy)},
       {"code", static_cast<std::int32_t>(report.fit.code)},
       {"verdict", VerdictName(report.verdict)},
-      {"counts",
-       {{"elements", report.pieces.size()},
-        {"lines", report.LineCount()},
-        {"arcs", report.ArcCount()},
-        {"fewestPossible", FewestJson(report)},
-        {"isFewest", report.IsFewest()}}},
+      {"counts", CountsJson(report)},
       {"deviation", DeviationsJson(report)},
   };
   document.update(ClosureJson(report));
   document["elements"] = ElementsJson(report);
-  // A file name need not be UTF-8; a replacement character is better than no document.
+  return document;
+}
+
+/// A file name need not be UTF-8; a replacement character is better than no document.
+std::string TextOf(Json const& document) {
   return document.dump(2, ' ', false, Json::error_handler_t::replace) + "\n";
+}
+
+/// What is known of one outline beside the elements, which stand in the list of all.
+Json OutlineJson(FitReport const& report, std::size_t firstPoint, std::size_t firstPiece) {
+  Json outline = {
+      {"points", {{"first", firstPoint}, {"count", report.file.points.size()}}},
+      {"elements", {{"first", firstPiece + 1}, {"count", report.pieces.size()}}},
+      {"verdict", VerdictName(report.verdict)},
+      {"counts", CountsJson(report)},
+      {"deviation", DeviationsJson(report)},
+  };
+  outline.update(ClosureJson(report));
+  return outline;
+}
+
+}  // namespace
+
+std::string ToJson(FitReport const& report) { return TextOf(DocumentJson(report)); }
+
+std::string ToJson(std::vector<FitReport> const& outlines) {
+  Json document = DocumentJson(Joined(outlines));
+  Json records = Json::array();
+  std::size_t firstPoint = 0;
+  std::size_t firstPiece = 0;
+  for (FitReport const& outline : outlines) {
+    records.push_back(OutlineJson(outline, firstPoint, firstPiece));
+    firstPoint += outline.file.points.size();
+    firstPiece += outline.pieces.size();
+  }
+  document["outlines"] = std::move(records);
+  return TextOf(document);
 }
 
 }  // namespace Vorn::IO

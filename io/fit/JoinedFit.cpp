@@ -37,6 +37,17 @@ void AppendDeviations(FitReport const& report, std::size_t firstPiece, FitReport
   }
 }
 
+/// What no fit of an outline can go below adds up, if it is known for each of them.
+void AppendBound(FitReport const& report, FitReport* joined) {
+  std::optional<std::size_t>& bound = joined->fit.fewestPossible;
+  if (!bound) return;
+  if (report.fit.fewestPossible) {
+    *bound += *report.fit.fewestPossible;
+  } else {
+    bound.reset();
+  }
+}
+
 /// What the fit itself says is a multiple of a tolerance; of one arc it is a length, and left out.
 void AppendAnswer(FitReport const& report, std::size_t firstPoint, FitReport* joined) {
   joined->fit.seconds += report.fit.seconds;
@@ -54,6 +65,7 @@ void Append(FitReport const& report, FitReport* joined) {
   AppendRanges(report, firstPoint, joined);
   AppendDeviations(report, firstPiece, joined);
   AppendAnswer(report, firstPoint, joined);
+  AppendBound(report, joined);
   joined->verdict = std::max(joined->verdict, report.verdict);
 }
 
@@ -105,6 +117,7 @@ FitReport Joined(std::vector<FitReport> const& reports) {
   joined.file = JoinedPoints(reports);
   joined.fit = {};
   joined.fit.code = ErrorCode::Ok;
+  joined.fit.fewestPossible = 0;
   joined.fit.deviation = std::numeric_limits<double>::quiet_NaN();
   joined.closure = {};
   joined.closure.reason = std::to_string(reports.size()) + " outlines";

@@ -4,6 +4,7 @@
 #include <optional>
 
 #include "io/base/Words.h"
+#include "io/formats/JsonPlace.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Failure.h"
@@ -72,7 +73,9 @@ nlohmann::json ParsedJson(std::string_view text, std::string const& path) {
 }
 
 void JsonField::Refuse(std::string const& message) const {
-  RefuseFile(file_, name_.empty() ? message : name_ + ": " + message);
+  throw Failure(FailureKind::File,
+                PlaceIn(source_.text, OffsetInJson(source_.text, name_), source_.file),
+                name_.empty() ? message : name_ + ": " + message);
 }
 
 bool JsonField::Has(char const* key) const {
@@ -82,8 +85,8 @@ bool JsonField::Has(char const* key) const {
 JsonField JsonField::operator[](char const* key) const {
   if (!value_.is_object()) Refuse("is not an object but " + Text());
   std::string const name = name_.empty() ? key : name_ + "." + key;
-  if (!value_.contains(key)) RefuseFile(file_, name + ": is missing");
-  return {value_.at(key), name, file_};
+  if (!value_.contains(key)) JsonField(value_, name, source_).Refuse("is missing");
+  return {value_.at(key), name, source_};
 }
 
 std::size_t JsonField::Count() const {
@@ -92,7 +95,7 @@ std::size_t JsonField::Count() const {
 }
 
 JsonField JsonField::Item(std::size_t index) const {
-  return {value_.at(index), name_ + "[" + std::to_string(index) + "]", file_};
+  return {value_.at(index), name_ + "[" + std::to_string(index) + "]", source_};
 }
 
 double JsonField::Number() const {

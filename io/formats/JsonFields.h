@@ -14,14 +14,20 @@ namespace Vorn::IO {
 ///         deeper than any document that is read here.
 nlohmann::json ParsedJson(std::string_view text, std::string const& path);
 
+/// Where a document comes from, for messages.
+struct JsonSource {
+  std::string file;
+  std::string_view text;
+};
+
 /// One value of the document, with the way to it for messages: `elements[2].end.x`.
 class JsonField {
  public:
-  /// The document and the name of its file must outlive the field.
-  JsonField(nlohmann::json const& value, std::string name, std::string const& file)
-      : value_(value), name_(std::move(name)), file_(file) {}
+  /// The document and its source must outlive the field.
+  JsonField(nlohmann::json const& value, std::string name, JsonSource const& source)
+      : value_(value), name_(std::move(name)), source_(source) {}
 
-  /// Ends the reading with a message about this value.
+  /// Ends the reading with a message about this value that names its line and column.
   [[noreturn]] void Refuse(std::string const& message) const;
 
   /// Whether the value is an object that holds something other than null under the key.
@@ -54,7 +60,7 @@ class JsonField {
  private:
   nlohmann::json const& value_;
   std::string name_;
-  std::string const& file_;
+  JsonSource const& source_;
 };
 
 }  // namespace Vorn::IO

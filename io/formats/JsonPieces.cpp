@@ -119,7 +119,8 @@ std::string ToJson(ContourFile const& contour) {
 
 ContourFile ParseJsonPieces(std::string_view text, std::string const& path) {
   nlohmann::json const value = ParsedJson(text, path);
-  Field const document(value, "", path);
+  JsonSource const source = {path, text};
+  Field const document(value, "", source);
   if (!value.is_object()) document.Refuse("is not an object but " + document.Text());
   if (IsGeoJson(document)) return GeoJsonContour(document);
   RequireVersion(document);

@@ -2,7 +2,9 @@
 #include <cmath>
 #include <nlohmann/json.hpp>
 
+#include "io/measure/MeasureJson.h"
 #include "vorn/io/CheckReport.h"
+#include "vorn/io/PieceMeasures.h"
 
 namespace Vorn::IO {
 
@@ -12,12 +14,12 @@ using Json = nlohmann::ordered_json;
 
 constexpr int kSchemaVersion = 1;
 
-Json OrNull(std::string const& text) { return text.empty() ? Json(nullptr) : Json(text); }
+Json TextOrNull(std::string const& text) { return text.empty() ? Json(nullptr) : Json(text); }
 
 Json PointsJson(CheckReport const& report) {
   return {{"file", report.file.path},
           {"count", report.file.points.size()},
-          {"units", OrNull(report.file.units)}};
+          {"units", TextOrNull(report.file.units)}};
 }
 
 Json ContourJson(CheckReport const& report) {
@@ -32,7 +34,7 @@ Json ContourJson(CheckReport const& report) {
           {"arcs", arcs},
           {"length", length},
           {"closed", report.contour.isClosed},
-          {"units", OrNull(report.contour.units)}};
+          {"units", TextOrNull(report.contour.units)}};
 }
 
 Json ToleranceJson(CheckReport const& report) {
@@ -58,6 +60,28 @@ Json DeviationJson(CheckReport const& report, std::size_t point) {
   json["tolerance"] = measured.w;
   json["relative"] = deviation.relative;
   return json;
+}
+
+/// What the points of each piece say by themselves.
+Json MeasuresJson(CheckReport const& report) {
+  ContourFile const& contour = report.contour;
+  Json pieces = Json::array();
+  for (PieceMeasure const& measure :
+       MeasurePieces(report.file.points, report.deviations, contour.pieces, contour.isClosed)) {
+    pieces.push_back({{"piece", pieces.size() + 1},
+                      {"points", measure.points},
+                      {"leastSquares", LeastSquaresJson(measure)},
+                      {"turn", OrNull(measure.turn)}});
+  }
+  return pieces;
+}
+
+Json ScatterJson(CheckReport const& report) {
+  DeviationSummary const summary =
+      Summarise(report.file.points, report.deviations, report.HasTolerances());
+  return {{"mean", summary.mean},
+          {"rootMeanSquare", summary.rootMeanSquare},
+          {"histogram", HistogramJson(summary)}};
 }
 
 Json GapsJson(CheckReport const& report) {
@@ -112,6 +136,8 @@ std::string ToJson(CheckReport const& report) {
       {"largest", DeviationJson(report, report.furthest)},
       {"relative", worst},
       {"outside", outside},
+      {"scatter", ScatterJson(report)},
+      {"pieces", MeasuresJson(report)},
       {"gaps", GapsJson(report)},
       {"crosses", !report.meetings.empty()},
       {"meetings", MeetingsJson(report)},

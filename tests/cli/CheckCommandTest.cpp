@@ -224,5 +224,30 @@ TEST_F(CheckCommand, ContourMayComeFromStandardInputWithItsFormatSaid) {
   EXPECT_EQ(run.code, ExitCode::Ok) << run.err;
 }
 
+TEST_F(CheckCommand, TellsScatterAndTheLineOfLeastSquares) {
+  std::string const contour = Write("line.csv", "kind,x0,y0,x1,y1\nline,0,0,4,0\n");
+  std::string const points = "x,y\n0,0.1\n1,-0.1\n3,-0.1\n4,0.1\n";
+  RunResult const run = RunInProcess({"check", "-", contour, "-t", "0.2"}, points);
+  EXPECT_NE(run.out.find("scatter     root mean square 0.1, mean "), std::string::npos) << run.out;
+  EXPECT_NE(run.out.find("outside     none of 4 points"), std::string::npos) << run.out;
+  EXPECT_NE(run.out.find("Measured by least squares over the points of each piece"),
+            std::string::npos);
+  // The line through the mean, along x: form error 0.2, deviation the root of 0.04 over 4 - 2.
+  EXPECT_NE(run.out.find("0.2000"), std::string::npos) << run.out;
+  EXPECT_NE(run.out.find("0.1414"), std::string::npos) << run.out;
+}
+
+TEST_F(CheckCommand, JsonHoldsScatterAndLeastSquares) {
+  std::string const contour = Write("line.csv", "kind,x0,y0,x1,y1\nline,0,0,4,0\n");
+  RunResult const run = RunInProcess({"check", "-", contour, "-t", "0.2", "--json", "-"},
+                                     "x,y\n0,0.1\n1,-0.1\n3,-0.1\n4,0.1\n");
+  nlohmann::json const json = nlohmann::json::parse(run.out);
+  EXPECT_NEAR(json.at("scatter").at("rootMeanSquare").get<double>(), 0.1, 1e-15);
+  EXPECT_EQ(json.at("scatter").at("histogram").at("kind"), "relative");
+  ASSERT_EQ(json.at("pieces").size(), 1U);
+  EXPECT_EQ(json.at("pieces")[0].at("points"), 4);
+  EXPECT_NEAR(json.at("pieces")[0].at("leastSquares").at("formError").get<double>(), 0.2, 1e-12);
+}
+
 }  // namespace
 }  // namespace Vorn::Cli

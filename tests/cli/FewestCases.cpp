@@ -67,6 +67,7 @@ TEST_F(Program, FewestFitsManyFilesToTheSameBytes) {
   EXPECT_EQ(one.code, 5);
   EXPECT_EQ(one.err, "contour: d.csv: no fit: all points coincide within their tolerances\n");
   EXPECT_EQ(one.out, four.out);
+  EXPECT_NE(one.out.find("  2 (fewest)  "), std::string::npos) << one.out;
   for (char const* name : {"a.json", "b.json", "c.json"}) {
     std::string const text = Contents(folder_ / "one" / name);
     EXPECT_EQ(text, Contents(folder_ / "four" / name));

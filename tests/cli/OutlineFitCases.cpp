@@ -1,5 +1,8 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
+#include <nlohmann/json.hpp>
+
 #include "cli/ProgramFixture.h"
 
 // Points from drawings, and contours in the formats of cutters and of maps.
@@ -27,6 +30,32 @@ TEST_F(OutlineFit, SeveralOutlinesGoIntoEveryFile) {
     EXPECT_EQ(Run("area --outline 2 " + std::string(name)).code, 2) << "the second is open";
     EXPECT_EQ(Run("check two.svg " + std::string(name) + " -t 0.1").code, 0) << name;
   }
+}
+
+TEST_F(OutlineFit, JsonHasARecordOfEachOutline) {
+  Write("two.svg", kTwoOutlines);
+  ASSERT_EQ(Run("fit two.svg -t 0.1 --strategy fewest -o a.json").code, 0);
+  nlohmann::json const all = nlohmann::json::parse(Contents(folder_ / "a.json"));
+  nlohmann::json const& outlines = all.at("outlines");
+  ASSERT_EQ(outlines.size(), 2U);
+  EXPECT_EQ(outlines[0].at("points").at("count").get<int>() +
+                outlines[1].at("points").at("count").get<int>(),
+            22);
+  EXPECT_EQ(outlines[1].at("points").at("first"), outlines[0].at("points").at("count"));
+  EXPECT_EQ(outlines[0].at("elements").at("count").get<std::size_t>() + 1,
+            outlines[1].at("elements").at("first").get<std::size_t>());
+  EXPECT_EQ(outlines[0].at("closed"), true);
+  EXPECT_EQ(outlines[1].at("closed"), false);
+  EXPECT_EQ(outlines[1].at("counts").at("elements"), 2);
+  EXPECT_EQ(outlines[1].at("counts").at("fewestPossible"), 2);
+  double largest = 0.0;
+  int bound = 0;
+  for (nlohmann::json const& outline : outlines) {
+    bound += outline.at("counts").at("fewestPossible").get<int>();
+    largest = std::max(largest, outline.at("deviation").at("largest").at("value").get<double>());
+  }
+  EXPECT_EQ(all.at("counts").at("fewestPossible"), bound);
+  EXPECT_EQ(all.at("deviation").at("largest").at("value"), largest);
 }
 
 TEST_F(OutlineFit, OneOutlineCanBeChosen) {

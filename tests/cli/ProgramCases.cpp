@@ -30,7 +30,7 @@ TEST_F(Program, TwoPointsGiveOneLine) {
       "\n"
       "Measured by least squares over the points of each piece, angles in degrees. A radius of "
       "the\n"
-      "table above is one of those that the tolerance admits; the one here is that of the points.\n"
+      "contour is one of those that the tolerance admits; the one here is that of the points.\n"
       "\n"
       "no  kind  points  radius  direction  +-  form error  deviation  turn to next\n"
       " 1  line       2       -     53.130   -      0.0000          -             -\n"

@@ -25,6 +25,46 @@ std::string MemoryLimit(int megabytes) {
   return "ulimit -v " + std::to_string(megabytes * 1000) + ";";
 }
 
+// Each as a single line, or lines, of a point in a few bytes, a little above the limit.
+TEST_F(Program, LargeContoursAreRefusedInLittleMemory) {
+  struct Large {
+    char const* name;
+    char const* head;
+    char const* unit;
+    char const* format;
+  };
+  for (Large const& large :
+       {Large{"a.json", "{\"schemaVersion\":1,\"elements\":[", "{},", "json"},
+        Large{"a.geojson", "{\"type\":\"LineString\",\"coordinates\":[", "[0,1],[1,0],", "geojson"},
+        Large{"a.wkt", "LINESTRING (", "0 1,1 0,", "wkt"},
+        Large{"a.nc", "G1 X0 Y0\nG1 ", "X1 Y1\nX0\n", "gcode"}}) {
+    std::string text = large.head;
+    while (text.size() <= std::size_t{33} << 20) text += large.unit;
+    Write(large.name, text);
+    std::string const wanted = "is too large: more than 32 MiB of " + std::string(large.format);
+    for (std::string const& line :
+         {"area " + std::string(large.name), "info " + std::string(large.name)}) {
+      Ended const ended = Run(line, MemoryLimit(700));
+      EXPECT_EQ(ended.code, 3) << line;
+      EXPECT_NE(ended.err.find(wanted), std::string::npos) << ended.err;
+    }
+  }
+}
+
+TEST_F(Program, HelpHasNoLineOfMoreThanAHundredColumns) {
+  for (char const* command :
+       {"", "fit", "check", "convert", "plot", "info", "simplify", "area", "intersect"}) {
+    std::istringstream help(Run(std::string(command) + " --help").out);
+    std::size_t lines = 0;
+    for (std::string line; std::getline(help, line); ++lines) {
+      EXPECT_LE(line.size(), 100U) << command << ": " << line;
+      bool const isOptionText = line.starts_with(std::string(30, ' '));
+      EXPECT_TRUE(!isOptionText || line.size() <= 80U) << command << ": " << line;
+    }
+    EXPECT_GT(lines, 10U) << command;
+  }
+}
+
 TEST_F(Program, NamesThatAreNoUtf8AreShownWithTheUsualSign) {
   std::string const name = "p\xff.csv";
   Write(name, Corner());

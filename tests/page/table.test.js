@@ -24,7 +24,8 @@ describe('decimalsOfRelatives', () => {
   it('is four, or as many as keep every value from reading as 1', () => {
     assert.equal(decimalsOfRelatives([0.5, 1, 0.9999]), 4);
     assert.equal(decimalsOfRelatives([0.5, 0.99996]), 5);
-    assert.equal(decimalsOfRelatives([1 - 1e-15]), 12, 'and no more than fit');
+    assert.equal(decimalsOfRelatives([1 - 2 ** -53]), 16);
+    assert.equal(decimalsOfRelatives([1 + 2 ** -52]), 16);
     assert.equal(decimalsOfRelatives([]), 4);
   });
 });

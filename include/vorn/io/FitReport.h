@@ -99,4 +99,9 @@ VORN_IO_EXPORT std::string Describe(Verdict verdict);
 /// radians; points are counted from 0; what is not known is null.
 VORN_IO_EXPORT std::string ToJson(FitReport const& report);
 
+/// The same of several outlines of one file, at least one. The document is that of Joined, and
+/// `outlines` holds a record for each: its points and elements, bound, verdict, closure and
+/// deviations, with points counted from its own first one.
+VORN_IO_EXPORT std::string ToJson(std::vector<FitReport> const& outlines);
+
 }  // namespace Vorn::IO

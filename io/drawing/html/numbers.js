@@ -17,7 +17,8 @@ export function decimalsFor(length) {
 }
 
 const FEWEST_OF_RELATIVE = 4;
-const MOST_OF_RELATIVE = 12;
+// Tells the doubles next to 1 from it.
+const MOST_OF_RELATIVE = 16;
 
 /** Digits after the point so that none of the multiples of a tolerance reads as 1 but 1 itself. */
 export function decimalsOfRelatives(values) {

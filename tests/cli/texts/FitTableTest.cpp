@@ -23,7 +23,7 @@ TEST(Table, ShowsPiecesAndSummary) {
       "\n"
       "Measured by least squares over the points of each piece, angles in degrees. A radius of "
       "the\n"
-      "table above is one of those that the tolerance admits; the one here is that of the points.\n"
+      "contour is one of those that the tolerance admits; the one here is that of the points.\n"
       "\n"
       "no  kind  points  radius  direction      +-  form error  deviation  turn to next\n"
       " 1  line       3       -      0.000    0.17     0.01000    0.00816         0.000\n"

@@ -48,20 +48,26 @@ TEST(ParseGeoJson, AnyNameOfJsonDoes) {
 
 TEST(ParseGeoJson, NamesWhatIsWrong) {
   EXPECT_EQ(Complaint(R"({"type":"LineString","coordinates":[[0,0],[4,"a"]]})"),
-            "p.geojson: coordinates[1][1]: is not a number but '\"a\"'");
+            "p.geojson:1:49: coordinates[1][1]: is not a number but '\"a\"'");
   EXPECT_EQ(Complaint(R"({"type":"LineString","coordinates":[[0,0]]})"),
-            "p.geojson: coordinates: a line needs at least two points");
+            "p.geojson:1:36: coordinates: a line needs at least two points");
   EXPECT_EQ(Complaint(R"({"type":"LineString","coordinates":[[0,0],[4]]})"),
-            "p.geojson: coordinates[1]: is no place but '[4]'");
+            "p.geojson:1:43: coordinates[1]: is no place but '[4]'");
   EXPECT_EQ(Complaint(R"({"type":"Polygon","coordinates":[[[0,0],[4,0],[4,3],[1,0]]]})"),
-            "p.geojson: coordinates[0]: the last point of a ring is not its first one again");
+            "p.geojson:1:34: coordinates[0]: the last point of a ring is not its first one again");
   EXPECT_EQ(Complaint(R"({"type":"Polygon","coordinates":[[[0,0],[4,0],[0,0]]]})"),
-            "p.geojson: coordinates[0]: a ring needs at least four points");
+            "p.geojson:1:34: coordinates[0]: a ring needs at least four points");
   EXPECT_EQ(Complaint(R"({"type":"Circle","coordinates":[]})"),
-            "p.geojson: type: 'Circle' is no kind of GeoJSON");
-  EXPECT_EQ(Complaint(R"({"type":"LineString"})"), "p.geojson: coordinates: is missing");
+            "p.geojson:1:9: type: 'Circle' is no kind of GeoJSON");
+  EXPECT_EQ(Complaint(R"({"type":"LineString"})"), "p.geojson:1:1: coordinates: is missing");
   EXPECT_EQ(Complaint("{\"type\":\"LineString\",\n\"coordinates\":[[0,0],[1"),
             "p.geojson:2:24: is not JSON to the end: the text stops early");
+}
+
+TEST(ParseGeoJson, NamesLineAndColumn) {
+  EXPECT_EQ(
+      Complaint("{\"type\": \"LineString\",\n \"coordinates\": [\n  [0, 0],\n  [1, true]\n]}"),
+      "p.geojson:4:7: coordinates[1][1]: is not a number but 'true'");
 }
 
 TEST(ParseGeoJson, RefusesDeepNesting) {
