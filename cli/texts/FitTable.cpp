@@ -113,7 +113,7 @@ std::string FieldsText(FitReport const& report) {
   return text;
 }
 
-std::string ScatterText(FitReport const& report) {
+std::string ScatterOfPoints(FitReport const& report) {
   DeviationSummary const summary = Summarise(report);
   return ScatterText(summary, report.file.units) + ", " +
          OutsideText(summary.outside, report.file.points.size()) + " outside";
@@ -126,8 +126,8 @@ std::string Summary(FitReport const& report, std::string const& readBack) {
          "\n" + "closed      " + ClosedText(report) + "\n" + "pieces      " + PiecesText(report) +
          "\n" + "compression " + CompressionText(report) + "\n" + "reported    " +
          ReportedText(report) + "\n" + "re-measured " + RemeasuredText(report) + "\n" +
-         "deviation   " + LargestText(report) + "\n" + "scatter     " + ScatterText(report) + "\n" +
-         (readBack.empty() ? "" : "read back   " + readBack + "\n") + "result      " +
+         "deviation   " + LargestText(report) + "\n" + "scatter     " + ScatterOfPoints(report) +
+         "\n" + (readBack.empty() ? "" : "read back   " + readBack + "\n") + "result      " +
          Describe(report.verdict) + "\n" + "time        " + FormatFixed(report.fit.seconds, 3) +
          " s\n";
 }

@@ -3,6 +3,7 @@
 #include "io/Contours.h"
 #include "io/FormatContours.h"
 #include "io/formats/JsonPieces.h"
+#include "vorn/io/Failure.h"
 #include "vorn/io/FitReport.h"
 
 namespace Vorn::IO {
@@ -10,8 +11,15 @@ namespace {
 
 using namespace FormatContours;
 
+/// What is wrong, without line and column.
 std::string Complaint(std::string const& text) {
-  return Refusal([&] { ParseJsonPieces(text, "p.json"); });
+  try {
+    ParseJsonPieces(text, "p.json");
+  } catch (Failure const& failure) {
+    EXPECT_EQ(failure.Kind(), FailureKind::File);
+    return failure.Where().file + ": " + failure.Message();
+  }
+  return "";
 }
 
 /// The document of Wedge with one text in place of another.
@@ -63,6 +71,16 @@ TEST(ParseJsonPieces, RefusesAnotherVersion) {
   EXPECT_EQ(Complaint(Changed("\"schemaVersion\": 1", "\"schemaVersion\": 2")),
             "p.json: schemaVersion: '2' is not the version that is read here, which is 1");
   EXPECT_EQ(Complaint("{\"elements\": []}"), "p.json: schemaVersion: is missing");
+}
+
+TEST(ParseJsonPieces, NamesLineAndColumnOfABadField) {
+  auto const refusal = [](std::string const& text) {
+    return Refusal([&] { ParseJsonPieces(text, "p.json"); });
+  };
+  EXPECT_EQ(refusal("{\"schemaVersion\": 1,\n  \"elements\": [\n    {\"kind\": \"spline\"}]}"),
+            "p.json:3:14: elements[0].kind: 'spline' is neither line nor arc");
+  EXPECT_EQ(refusal("{\"schemaVersion\": 1,\n \"elements\": [{\"kind\": \"line\"}]}"),
+            "p.json:2:15: elements[0].start: is missing");
 }
 
 TEST(ParseJsonPieces, NamesThePathOfABadField) {
@@ -135,7 +153,7 @@ TEST(ParseJsonPieces, OnlyTheBeginningOfABadValueIsQuoted) {
               ParseJsonPieces("{\"schemaVersion\": 1, \"elements\": {\"a\": " + numbers + "]}}",
                               "d.json");
             }),
-            "d.json: elements: is not an array but "
+            "d.json:1:34: elements: is not an array but "
             "'{\"a\":[1,1,1,1,1,1,1,1,1,1,1,1,1,1,1,1,1,...'");
 }
 
