@@ -60,9 +60,19 @@ std::string Wrapped(std::string const& text, std::size_t width) {
 class NarrowHelp : public CLI::Formatter {
  public:
   std::string make_option_desc(CLI::Option const* option) const override {
-    constexpr std::size_t kColumns = 80;
     return Wrapped(CLI::Formatter::make_option_desc(option), kColumns - column_width_);
   }
+
+  std::string make_subcommand(CLI::App const* command) const override {
+    std::ostringstream entry;
+    CLI::detail::format_help(entry, command->get_name(),
+                             Wrapped(command->get_description(), kColumns - column_width_),
+                             column_width_);
+    return entry.str();
+  }
+
+ private:
+  static constexpr std::size_t kColumns = 80;
 };
 
 }  // namespace

@@ -61,6 +61,7 @@ TEST_F(CheckCommand, WithoutAToleranceGivesLengthsAndExitCode0) {
                          "pieces      3: 2 lines, 1 arc, 12.1416 long, open\n"
                          "tolerance   none given: deviations are lengths\n"
                          "largest     0.5 at point 3 (line 6), to the left of piece 3\n"
+                         "scatter     root mean square 0.25, mean 0.15\n"
                          "joints      the pieces meet\n"
                          "crossing    the contour does not cross itself\n"
                          "area        none: the contour is open\n"
@@ -225,7 +226,9 @@ TEST_F(CheckCommand, ContourMayComeFromStandardInputWithItsFormatSaid) {
 }
 
 TEST_F(CheckCommand, TellsScatterAndTheLineOfLeastSquares) {
-  std::string const contour = Write("line.csv", "kind,x0,y0,x1,y1\nline,0,0,4,0\n");
+  std::string const contour = Write(
+      "line.csv",
+      "type,start_x,start_y,end_x,end_y,center_x,center_y,radius,direction\nline,0,0,4,0,,,,\n");
   std::string const points = "x,y\n0,0.1\n1,-0.1\n3,-0.1\n4,0.1\n";
   RunResult const run = RunInProcess({"check", "-", contour, "-t", "0.2"}, points);
   EXPECT_NE(run.out.find("scatter     root mean square 0.1, mean "), std::string::npos) << run.out;
@@ -238,7 +241,9 @@ TEST_F(CheckCommand, TellsScatterAndTheLineOfLeastSquares) {
 }
 
 TEST_F(CheckCommand, JsonHoldsScatterAndLeastSquares) {
-  std::string const contour = Write("line.csv", "kind,x0,y0,x1,y1\nline,0,0,4,0\n");
+  std::string const contour = Write(
+      "line.csv",
+      "type,start_x,start_y,end_x,end_y,center_x,center_y,radius,direction\nline,0,0,4,0,,,,\n");
   RunResult const run = RunInProcess({"check", "-", contour, "-t", "0.2", "--json", "-"},
                                      "x,y\n0,0.1\n1,-0.1\n3,-0.1\n4,0.1\n");
   nlohmann::json const json = nlohmann::json::parse(run.out);
