@@ -36,6 +36,12 @@ std::uint64_t DigestMixedFits();
 std::uint64_t DigestMixedCellsFits();
 std::uint64_t DigestSingleArcFits();
 
+/// The contour of the fewest pieces, with options drawn at random: profiles, scans of known number
+/// and points without order.
+std::uint64_t DigestFewestProfiles();
+std::uint64_t DigestFewestScans();
+std::uint64_t DigestFewestScribbles();
+
 /// Members that take numbers and points.
 std::uint64_t DigestAngles();
 std::uint64_t DigestDistances();
