@@ -41,9 +41,12 @@ bool IsCounterClockwise(Field const& direction) {
 }
 
 Piece ArcOf(Field const& element) {
-  Piece arc =
-      MakeArc(PointAt(element["start"]), PointAt(element["end"]), PointAt(element["center"]),
-              element["radius"].Number(), IsCounterClockwise(element["direction"]));
+  // One by one, so that the first bad field is the one that is named.
+  auto const start = PointAt(element["start"]);
+  auto const end = PointAt(element["end"]);
+  auto const centre = PointAt(element["center"]);
+  double const radius = element["radius"].Number();
+  Piece arc = MakeArc(start, end, centre, radius, IsCounterClockwise(element["direction"]));
   arc.startAngle = element.NumberOr("startAngle", arc.startAngle);
   arc.endAngle = element.NumberOr("endAngle", arc.endAngle);
   arc.sweep = element.NumberOr("sweep", arc.sweep);
@@ -56,7 +59,8 @@ Piece ArcOf(Field const& element) {
 }
 
 Piece LineOf(Field const& element) {
-  Piece line = MakeLine(PointAt(element["start"]), PointAt(element["end"]));
+  auto const start = PointAt(element["start"]);
+  Piece line = MakeLine(start, PointAt(element["end"]));
   line.length = element.NumberOr("length", line.length);
   return line;
 }

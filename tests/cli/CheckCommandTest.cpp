@@ -53,26 +53,41 @@ TEST_F(CheckCommand, WithoutAToleranceGivesLengthsAndExitCode0) {
   RunResult const run = RunInProcess({"check", "-", contour}, kPoints);
   EXPECT_EQ(run.code, ExitCode::Ok);
   EXPECT_EQ(run.err, "");
-  EXPECT_EQ(run.out, "standard input against " + contour +
-                         ", lengths in mm\n"
-                         "\n"
-                         "points      5\n"
-                         "columns     1 (x) and 2 (y)\n"
-                         "pieces      3: 2 lines, 1 arc, 12.1416 long, open\n"
-                         "tolerance   none given: deviations are lengths\n"
-                         "largest     0.5 at point 3 (line 6), to the left of piece 3\n"
-                         "scatter     root mean square 0.25, mean 0.15\n"
-                         "joints      the pieces meet\n"
-                         "crossing    the contour does not cross itself\n"
-                         "area        none: the contour is open\n"
-                         "result      measured\n"
-                         "\n"
-                         "point  line  x     y  deviation  piece\n"
-                         "    3     6  4   4.5        0.5      3\n"
-                         "    1     4  2  0.25       0.25      1\n"
-                         "    0     3  0     0          0      1\n"
-                         "    2     5  5     2          0      2\n"
-                         "    4     7  3     4          0      3\n");
+  EXPECT_EQ(run.out,
+            "standard input against " + contour +
+                ", lengths in mm\n"
+                "\n"
+                "points      5\n"
+                "columns     1 (x) and 2 (y)\n"
+                "pieces      3: 2 lines, 1 arc, 12.1416 long, open\n"
+                "tolerance   none given: deviations are lengths\n"
+                "largest     0.5 at point 3 (line 6), to the left of piece 3\n"
+                "scatter     root mean square 0.25 mm, mean 0.15 mm\n"
+                "joints      the pieces meet\n"
+                "crossing    the contour does not cross itself\n"
+                "area        none: the contour is open\n"
+                "result      measured\n"
+                "\n"
+                "point  line  x     y  deviation  piece\n"
+                "    3     6  4   4.5        0.5      3\n"
+                "    1     4  2  0.25       0.25      1\n"
+                "    0     3  0     0          0      1\n"
+                "    2     5  5     2          0      2\n"
+                "    4     7  3     4          0      3\n"
+                "\n"
+                "Measured by least squares over the points of each piece, angles in "
+                "degrees. A radius of the\n"
+                "contour is one of those that the tolerance admits; the one here is that "
+                "of the points.\n"
+                "\n"
+                "no  kind  points  radius  direction  +-  form error  deviation  turn to "
+                "next\n"
+                " 1  line       2       -      7.125   -     0.00000          -        "
+                "90.000\n"
+                " 2  line       1       -          -   -           -          -         "
+                "0.000\n"
+                " 3  arc        2       -          -   -           -          -             "
+                "-\n");
 }
 
 TEST_F(CheckCommand, WithAToleranceJudges) {

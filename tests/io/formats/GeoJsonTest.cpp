@@ -48,7 +48,7 @@ TEST(ParseGeoJson, AnyNameOfJsonDoes) {
 
 TEST(ParseGeoJson, NamesWhatIsWrong) {
   EXPECT_EQ(Complaint(R"({"type":"LineString","coordinates":[[0,0],[4,"a"]]})"),
-            "p.geojson:1:49: coordinates[1][1]: is not a number but '\"a\"'");
+            "p.geojson:1:46: coordinates[1][1]: is not a number but '\"a\"'");
   EXPECT_EQ(Complaint(R"({"type":"LineString","coordinates":[[0,0]]})"),
             "p.geojson:1:36: coordinates: a line needs at least two points");
   EXPECT_EQ(Complaint(R"({"type":"LineString","coordinates":[[0,0],[4]]})"),

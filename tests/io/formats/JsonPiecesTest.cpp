@@ -73,13 +73,15 @@ TEST(ParseJsonPieces, RefusesAnotherVersion) {
   EXPECT_EQ(Complaint("{\"elements\": []}"), "p.json: schemaVersion: is missing");
 }
 
+/// The whole message, with line and column.
+std::string RefusalOf(std::string const& text) {
+  return Refusal([&] { ParseJsonPieces(text, "p.json"); });
+}
+
 TEST(ParseJsonPieces, NamesLineAndColumnOfABadField) {
-  auto const refusal = [](std::string const& text) {
-    return Refusal([&] { ParseJsonPieces(text, "p.json"); });
-  };
-  EXPECT_EQ(refusal("{\"schemaVersion\": 1,\n  \"elements\": [\n    {\"kind\": \"spline\"}]}"),
+  EXPECT_EQ(RefusalOf("{\"schemaVersion\": 1,\n  \"elements\": [\n    {\"kind\": \"spline\"}]}"),
             "p.json:3:14: elements[0].kind: 'spline' is neither line nor arc");
-  EXPECT_EQ(refusal("{\"schemaVersion\": 1,\n \"elements\": [{\"kind\": \"line\"}]}"),
+  EXPECT_EQ(RefusalOf("{\"schemaVersion\": 1,\n \"elements\": [{\"kind\": \"line\"}]}"),
             "p.json:2:15: elements[0].start: is missing");
 }
 
@@ -120,8 +122,8 @@ TEST(ParseJsonPieces, RefusesASweepThatIsNone) {
 }
 
 TEST(ParseJsonPieces, SaysWhereTheTextIsNoJson) {
-  EXPECT_EQ(Complaint("{\n  \"a\": NaN\n}"), "p.json:2:8: is not JSON from here on: 'NaN'");
-  EXPECT_EQ(Complaint("{\"a\": [1, 2"),
+  EXPECT_EQ(RefusalOf("{\n  \"a\": NaN\n}"), "p.json:2:8: is not JSON from here on: 'NaN'");
+  EXPECT_EQ(RefusalOf("{\"a\": [1, 2"),
             "p.json:1:12: is not JSON to the end: the text stops early");
   EXPECT_EQ(Complaint("{\"a\": 1e999}"), "p.json: a number is too large for a double");
 }
