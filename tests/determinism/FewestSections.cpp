@@ -40,17 +40,25 @@ Options DrawOptions(RandomGeometry* random, double extent) {
   return options;
 }
 
+/// Sines and cosines of the platform's library differ in their last bits, and the points with them.
+void RoundToMillionths(Scan* scan) {
+  constexpr double kUnits = 0x1p20;
+  for (WPoint& p : *scan)
+    p = {std::round(p.x * kUnits) / kUnits, std::round(p.y * kUnits) / kUnits, p.w};
+}
+
 }  // namespace
 
 std::uint64_t DigestFewestProfiles() {
-  constexpr int kProfiles = 300;
+  constexpr int kProfiles = 150;
   Digest digest;
   for (int seed = 0; seed < kProfiles; ++seed) {
     RandomGeometry random(static_cast<std::uint64_t>(seed));
     Scan scan = MakeProfile(&random, random.Integer(2, 24));
     if (random.Integer(0, 7) == 0) AddHazard(&random, &scan);
-    double const extent =
-        std::hypot(scan.back().x - scan.front().x, scan.back().y - scan.front().y);
+    RoundToMillionths(&scan);
+    double const extent = std::max(std::fabs(scan.back().x - scan.front().x),
+                                   std::fabs(scan.back().y - scan.front().y));
     AddFit(scan, DrawOptions(&random, extent), &digest);
   }
   return digest.Value();
@@ -58,7 +66,7 @@ std::uint64_t DigestFewestProfiles() {
 
 std::uint64_t DigestFewestScans() {
   Digest digest;
-  for (std::uint64_t seed = 1; seed <= 3; ++seed) {
+  for (std::uint64_t seed = 1; seed <= 2; ++seed) {
     RandomGeometry random(seed);
     for (auto const style : {ProfileStyle::Smooth, ProfileStyle::Corners, ProfileStyle::Mixed}) {
       double const noise = random.Uniform(0.0, 0.9);
@@ -72,7 +80,7 @@ std::uint64_t DigestFewestScans() {
 }
 
 std::uint64_t DigestFewestScribbles() {
-  constexpr int kScribbles = 200;
+  constexpr int kScribbles = 60;
   RandomGeometry random(7);
   Digest digest;
   for (int i = 0; i < kScribbles; ++i) {
