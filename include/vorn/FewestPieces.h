@@ -18,7 +18,10 @@ namespace Vorn {
 inline constexpr double kSixtyDegrees = 1.0471975511965976;
 
 /// Whether one place stands for all points: that of the point of least tolerance lies within the
-/// tolerance of every other. FewestPieces::Fit then has no fit. True for no points at all.
+/// tolerance of every other. FewestPieces::Fit then has no fit.
+///
+/// @param[in] points in any order
+/// @return whether they coincide so; true for no points at all. O(n).
 inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
   auto const tightest = std::min_element(
       points.begin(), points.end(), [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
