@@ -67,7 +67,7 @@ std::string ShortMessage(std::string const& path, std::string const& message) {
 
 /// "29", "29 (26 at least)", "7 (fewest)".
 std::string PiecesText(Outcome const& outcome) {
-  std::string const pieces = std::to_string(outcome.pieces);
+  std::string pieces = std::to_string(outcome.pieces);
   if (!outcome.bound) return pieces;
   if (*outcome.bound == outcome.pieces) return pieces + " (fewest)";
   return pieces + " (" + std::to_string(*outcome.bound) + " at least)";

@@ -11,6 +11,8 @@ constexpr std::string_view kCharacters =
     "ABCDEFGHIJKLMNOPQRSTUVWXYZabcdefghijklmnopqrstuvwxyz0123456789+/";
 constexpr std::size_t kGroup = 3;        // bytes
 constexpr std::uint32_t kLowest = 0x3F;  // six bits
+constexpr unsigned kShift = 6;           // bits of a character
+constexpr unsigned kFirstShift = 3 * kShift;
 
 /// Up to three bytes as 24 bits, missing ones as 0.
 std::uint32_t BitsOf(std::string_view bytes) {
@@ -31,7 +33,7 @@ std::string Base64(std::string_view bytes) {
     std::uint32_t const bits = BitsOf(group);
     for (unsigned i = 0; i < 4; ++i) {
       bool const isFilled = i <= group.size();
-      text += isFilled ? kCharacters[bits >> (18U - 6U * i) & kLowest] : '=';
+      text += isFilled ? kCharacters[bits >> (kFirstShift - kShift * i) & kLowest] : '=';
     }
   }
   return text;

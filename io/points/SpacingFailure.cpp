@@ -1,10 +1,13 @@
 #include "vorn/io/SpacingFailure.h"
 
+#include <utility>
+
 namespace Vorn::IO {
 
-SpacingFailure::SpacingFailure(PointFile const& file, CloseNeighbours const& neighbours,
+SpacingFailure::SpacingFailure(PointFile const& file, CloseNeighbours neighbours,
                                std::string const& message, Remedy help)
-    : Failure(FailureKind::PointsTooClose, {file.path}, message, help), neighbours_(neighbours) {
+    : Failure(FailureKind::PointsTooClose, {file.path}, message, help),
+      neighbours_(std::move(neighbours)) {
   neighbours_.outline = file.outline;
 }
 

@@ -41,8 +41,8 @@ class VORN_IO_EXPORT SpacingFailure : public Failure {
 
  private:
   /// With a message that does not name the file, and the ways out.
-  SpacingFailure(PointFile const& file, CloseNeighbours const& neighbours,
-                 std::string const& message, Remedy help);
+  SpacingFailure(PointFile const& file, CloseNeighbours neighbours, std::string const& message,
+                 Remedy help);
 
   CloseNeighbours neighbours_;  ///< as given
 };

@@ -57,30 +57,9 @@ std::string Shown(Elem const& elem) {
          text(5) + ", " + text(6) + "))";
 }
 
-void BindElem(py::module_& module) {
-  py::class_<Elem>(module, "Elem", R"(
-One element of a contour: a segment or an arc from the end of the element before to its own end.
-
-A contour is a list of them; its first one is a segment whose end is the start of the contour.
-
->>> Elem.segment((1, 2)).end
-(1.0, 2.0)
-)")
-      .def_static("segment", &Segment, py::arg("end"), R"(
-A straight element that ends there, at (x, y).
-
->>> Elem.segment((1, 2))
-Elem.segment((1.0, 2.0))
-)")
-      .def_static("arc", &ArcElem, py::arg("end"), py::arg("center"), py::arg("radius"),
-                  py::arg("direction"), py::arg("angles"),
-                  R"(
-An arc that ends there; direction is +1 counter-clockwise, -1 clockwise, and angles are the polar
-angles of start and end in radians. Nothing is checked.
-
->>> get_arc_length(Elem.arc((0, 2), (0, 0), 2.0, 1.0, (0.0, 1.5)))
-3.0
-)")
+/// What an element holds.
+void BindFields(py::class_<Elem>* elem) {
+  (*elem)
       .def_property_readonly(
           "type", [](Elem const& e) { return e.type; }, R"(
 Whether it is a segment or an arc.
@@ -132,6 +111,32 @@ Polar angle of the end of an arc from its center, radians.
 
 >>> Elem.arc((0, 2), (1, 2), 1.0, -1.0, (0.0, 3.0)).end_angle
 3.0
+)");
+}
+
+void BindElem(py::module_& module) {
+  py::class_<Elem> type(module, "Elem", R"(
+One element of a contour: a segment or an arc from the end of the element before to its own end.
+
+A contour is a list of them; its first one is a segment whose end is the start of the contour.
+
+>>> Elem.segment((1, 2)).end
+(1.0, 2.0)
+)");
+  type.def_static("segment", &Segment, py::arg("end"), R"(
+A straight element that ends there, at (x, y).
+
+>>> Elem.segment((1, 2))
+Elem.segment((1.0, 2.0))
+)")
+      .def_static("arc", &ArcElem, py::arg("end"), py::arg("center"), py::arg("radius"),
+                  py::arg("direction"), py::arg("angles"),
+                  R"(
+An arc that ends there; direction is +1 counter-clockwise, -1 clockwise, and angles are the polar
+angles of start and end in radians. Nothing is checked.
+
+>>> get_arc_length(Elem.arc((0, 2), (0, 0), 2.0, 1.0, (0.0, 1.5)))
+3.0
 )")
       .def(
           "__eq__", [](Elem const& a, Elem const& b) { return FieldsOf(a).equal(FieldsOf(b)); },
@@ -139,6 +144,7 @@ Polar angle of the end of an arc from its center, radians.
       .def("__hash__", [](Elem const& elem) { return py::hash(FieldsOf(elem)); })
       .def("__repr__", &Shown)
       .def(py::pickle(&FieldsOf, &FromFields));
+  BindFields(&type);
 }
 
 }  // namespace

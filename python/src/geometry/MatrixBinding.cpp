@@ -92,38 +92,9 @@ array([1., 0., 0.])
 )");
 }
 
-}  // namespace
-
-void BindMatrix(py::module_& module) {
-  BindReorth(module);
-  py::class_<Matrix>(module, "Matrix", R"(
-A 3x3 rotation matrix; angles are radians, and the elementary rotations turn the frame, not the
-point.
-
->>> import math
->>> turn = Matrix()
->>> turn.init_mx_my_mz(0.0, 0.0, math.pi / 2)
->>> [round(float(v), 12) for v in turn.mxv([1, 0, 0])]
-[0.0, -1.0, 0.0]
-)")
-      .def(py::init<>(), R"(
-The identity.
-
->>> Matrix().det()
-1.0
-)")
-      .def(py::init(&FromArray), py::arg("elements"), R"(
-Takes nine elements, row by row, or an array (3, 3). Raises ValueError for another number of them.
-
->>> Matrix([[2, 0, 0], [0, 3, 0], [0, 0, 4]]).det()
-24.0
-)")
-      .def("det", &Matrix::Det, R"(
-The determinant.
-
->>> Matrix([2, 0, 0, 0, 3, 0, 0, 0, 4]).det()
-24.0
-)")
+/// The rotations that a matrix is made from, and their angles.
+void BindRotations(py::class_<Matrix>* matrix) {
+  (*matrix)
       .def("init_i", &Matrix::InitI, R"(
 Makes it the identity.
 
@@ -164,7 +135,11 @@ The angles [ax, ay, az] of init_mz_my_mx, radians.
 
 >>> [abs(angle) for angle in Matrix().get_angles_from_mz_my_mx()]
 [0.0, 0.0, 0.0]
-)")
+)");
+}
+
+void BindProducts(py::class_<Matrix>* matrix) {
+  (*matrix)
       .def("mxv", &TimesColumn, py::arg("vector"),
            R"(
 The matrix times a column of three numbers, as an array (3,). Of a column of five the last two come
@@ -179,6 +154,16 @@ A row of three numbers, or of five as for mxv, times the matrix, as an array.
 >>> Matrix([1, 2, 0, 0, 1, 0, 0, 0, 1]).vxm([1, 1, 1])
 array([1., 3., 1.])
 )")
+      .def(
+          "__mul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
+          "The product of two matrices.")
+      .def(
+          "__matmul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
+          "The product of two matrices.");
+}
+
+void BindContent(py::class_<Matrix>* matrix) {
+  (*matrix)
       .def("quantity_of_data_elements", &Matrix::QuantityOfDataElements, R"(
 How many elements it has.
 
@@ -208,14 +193,46 @@ The elements as an array (3, 3).
 
 >>> Matrix().to_array()[0]
 array([1., 0., 0.])
+)");
+}
+
+}  // namespace
+
+void BindMatrix(py::module_& module) {
+  BindReorth(module);
+  py::class_<Matrix> matrix(module, "Matrix", R"(
+A 3x3 rotation matrix; angles are radians, and the elementary rotations turn the frame, not the
+point.
+
+>>> import math
+>>> turn = Matrix()
+>>> turn.init_mx_my_mz(0.0, 0.0, math.pi / 2)
+>>> [round(float(v), 12) for v in turn.mxv([1, 0, 0])]
+[0.0, -1.0, 0.0]
+)");
+  matrix
+      .def(py::init<>(), R"(
+The identity.
+
+>>> Matrix().det()
+1.0
 )")
-      .def(
-          "__mul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
-          "The product of two matrices.")
-      .def(
-          "__matmul__", [](Matrix& a, Matrix const& b) { return a * b; }, py::is_operator(),
-          "The product of two matrices.")
+      .def(py::init(&FromArray), py::arg("elements"), R"(
+Takes nine elements, row by row, or an array (3, 3). Raises ValueError for another number of them.
+
+>>> Matrix([[2, 0, 0], [0, 3, 0], [0, 0, 4]]).det()
+24.0
+)")
+      .def("det", &Matrix::Det, R"(
+The determinant.
+
+>>> Matrix([2, 0, 0, 0, 3, 0, 0, 0, 4]).det()
+24.0
+)")
       .def(py::pickle(&ToArray, &FromArray));
+  BindRotations(&matrix);
+  BindProducts(&matrix);
+  BindContent(&matrix);
 }
 
 }  // namespace Vorn::Python
