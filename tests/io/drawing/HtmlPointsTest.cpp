@@ -25,7 +25,7 @@ Drawing Scan(std::size_t count, bool hasOwnTolerances = false) {
     double const x = along < 500.0 ? along : 500.0 + (100.0 - aside) * std::sin(turn);
     double const y = along < 500.0 ? aside : 100.0 - (100.0 - aside) * std::cos(turn);
     double const w = hasOwnTolerances && i % 1000 > 500 ? 2.0 * kTolerance : kTolerance;
-    points.emplace_back(1e-6 * std::round(1e6 * x), 1e-6 * std::round(1e6 * y), w);
+    points.push_back({1e-6 * std::round(1e6 * x), 1e-6 * std::round(1e6 * y), w});
   }
   Piece const line = MakeLine({0.0, 0.0}, {500.0, 0.0});
   Piece const arc = MakeArc({500.0, 0.0}, {600.0, 100.0}, {500.0, 100.0}, 100.0, true);
