@@ -1,7 +1,6 @@
 #include <pybind11/pybind11.h>
 #include <pybind11/stl.h>
 
-#include <optional>
 #include <string>
 #include <utility>
 #include <vector>
@@ -12,9 +11,8 @@
 #include "PieceRow.h"
 #include "Points.h"
 #include "Progress.h"
-#include "vorn/io/Closure.h"
 #include "vorn/io/FitContour.h"
-#include "vorn/io/Spacing.h"
+#include "vorn/io/SpacingFailure.h"
 
 namespace py = pybind11;
 
@@ -83,37 +81,16 @@ struct Call {
   IO::FitChoice choice;
 };
 
-/// The first neighbours that are too close, as the fit tests them: of a closed contour also across
-/// its seam, where the first point stands for one that repeats it.
-std::optional<IO::ClosePair> ClosePairOf(std::vector<WPoint> const& points,
-                                         IO::ClosedChoice closed) {
-  IO::Closure const closure = IO::FindClosure(points, closed);
-  if (!closure.isClosed) return IO::FindClosePair(points);
-  IO::Circuit const circuit = IO::MakeCircuit(points, closure, 0);
-  std::optional<IO::ClosePair> pair = IO::FindClosePair(circuit.points);
-  if (pair) {
-    pair->first = circuit.origin[pair->first];
-    pair->second = circuit.origin[pair->second];
-  }
-  return pair;
-}
-
-/// The library says which points are too close only in words, and with the options of the program;
-/// here they come as numbers.
-[[noreturn]] void RaiseTooClose(Call const& call) {
-  std::vector<WPoint> const points = PointsFrom(call.points, call.tolerance).points;
-  std::optional<IO::ClosePair> const pair = ClosePairOf(points, call.choice.closed);
-  if (!pair) {
-    Raise({ErrorCode::PointsTooClose, "two neighbours are too close for their tolerances", {}});
-  }
+/// The message of the library names points by what the file calls them; here they come as numbers.
+[[noreturn]] void RaiseTooClose(IO::ClosePair const& pair) {
   std::string const message =
-      "points " + std::to_string(pair->first) + " and " + std::to_string(pair->second) + " are " +
-      std::string(py::repr(py::float_(pair->distance))) + " apart, which must be more than " +
-      std::string(py::repr(py::float_(pair->needed))) +
+      "points " + std::to_string(pair.first) + " and " + std::to_string(pair.second) + " are " +
+      std::string(py::repr(py::float_(pair.distance))) + " apart, which must be more than " +
+      std::string(py::repr(py::float_(pair.needed))) +
       " for their tolerances; the strategy \"fewest\" takes points of any density";
   Raise({ErrorCode::PointsTooClose,
          message,
-         {static_cast<std::int64_t>(pair->first), static_cast<std::int64_t>(pair->second)}});
+         {static_cast<std::int64_t>(pair.first), static_cast<std::int64_t>(pair.second)}});
 }
 
 IO::FitReport FitUnlocked(IO::PointFile file, IO::FitChoice const& choice, Progress* progress) {
@@ -129,8 +106,9 @@ IO::FitReport FitPoints(Call const& call, Progress* progress) {
   file.hasTolerances = true;
   try {
     return FitUnlocked(std::move(file), call.choice, progress);
+  } catch (IO::SpacingFailure const& failure) {
+    RaiseTooClose(failure.Neighbours().pair);
   } catch (IO::Failure const& failure) {
-    if (failure.Kind() == IO::FailureKind::PointsTooClose) RaiseTooClose(call);
     Raise(failure);
   }
 }
