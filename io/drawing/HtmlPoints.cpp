@@ -49,16 +49,14 @@ std::vector<double> SignedDistances(Drawing const& drawing) {
   return distances;
 }
 
-bool ArePackable(std::vector<double> const& numbers) {
-  return std::all_of(numbers.begin(), numbers.end(),
-                     [](double number) { return std::fabs(number) <= kLargestPacked; });
-}
+bool IsPackable(double number) { return std::fabs(number) <= kLargestPacked; }
 
 bool IsPacked(Drawing const& drawing) {
   return drawing.points.size() > kMostExactPoints &&
-         ArePackable(Column(drawing.points, [](WPoint const& point) { return point.x; })) &&
-         ArePackable(Column(drawing.points, [](WPoint const& point) { return point.y; })) &&
-         ArePackable(SignedDistances(drawing));
+         std::all_of(drawing.points.begin(), drawing.points.end(),
+                     [](WPoint const& p) { return IsPackable(p.x) && IsPackable(p.y); }) &&
+         std::all_of(drawing.deviations.begin(), drawing.deviations.end(),
+                     [](PointDeviation const& d) { return IsPackable(d.distance); });
 }
 
 /// What rounded numbers are a multiple of, at most.
