@@ -11,15 +11,20 @@ export function paintDots(diagram) {
   else paintColumns(diagram, lowest, highest);
 }
 
+/** Whether a point lies in the stretch of the contour that the diagram shows. */
+function isInView(diagram, i) {
+  const along = diagram.scene.along(i);
+  return along >= diagram.from && along <= diagram.to;
+}
+
 /** For each column of pixels what reaches lowest and highest; nothing while few are in view. */
 export function columnRanges(diagram) {
-  const {scene, values, from, to} = diagram;
-  const isInView = (i) => scene.along(i) >= from && scene.along(i) <= to;
+  const {scene, values} = diagram;
   let inView = 0;
-  for (let i = 0; i < scene.count; ++i) inView += isInView(i) ? 1 : 0;
+  for (let i = 0; i < scene.count; ++i) inView += isInView(diagram, i) ? 1 : 0;
   if (inView <= FEW_POINTS) return {lowest: [], highest: []};
-  return rangesBy(scene.count, (i) => (isInView(i) ? Math.floor(diagram.px(scene.along(i))) : null),
-                  (i) => values[i]);
+  const columnOf = (i) => (isInView(diagram, i) ? Math.floor(diagram.px(scene.along(i))) : null);
+  return rangesBy(scene.count, columnOf, (i) => values[i]);
 }
 
 function paintEachDot(diagram) {
@@ -27,7 +32,7 @@ function paintEachDot(diagram) {
   const free = new Occupancy(diagram.width, diagram.height, 0.25);
   const kinds = {line: [], arc: [], outside: []};
   for (let i = 0; i < scene.count; ++i) {
-    if (scene.along(i) < diagram.from || scene.along(i) > diagram.to) continue;
+    if (!isInView(diagram, i)) continue;
     const [x, y] = diagram.pixelOf(i);
     if (!free.take(x, y)) continue;
     kinds[scene.isOutside(i) ? 'outside' : scene.isOnArc(i) ? 'arc' : 'line'].push([x, y]);
@@ -68,9 +73,8 @@ function paintColumns(diagram, lowest, highest) {
     context.fill();
   }
   const free = new Occupancy(diagram.width, diagram.height, 2);
-  const isInView = (i) => scene.along(i) >= diagram.from && scene.along(i) <= diagram.to;
-  paintOutsideDots(diagram, scene.outside.filter(isInView).map((i) => diagram.pixelOf(i))
-    .filter(([x, y]) => free.take(x, y)));
+  paintOutsideDots(diagram, scene.outside.filter((i) => isInView(diagram, i))
+    .map((i) => diagram.pixelOf(i)).filter(([x, y]) => free.take(x, y)));
 }
 
 function paintOutsideDots(diagram, places) {
