@@ -33,6 +33,12 @@ def _without(command, *unwanted):
     return [word for word in command if word not in unwanted]
 
 
+def _without_cache(words):
+    """The compiler and its options, without what runs it through the compiler cache."""
+    names = [pathlib.Path(word).name for word in words]
+    return words[names.index("ccache") + 1:] if "ccache" in names else words
+
+
 class Build:
     """A configured build of a preset, with everything needed to compile one source once more."""
 
@@ -57,8 +63,7 @@ class Build:
         """How each object is compiled: object, relative to the build folder -> words."""
         self.commands = {}
         for entry in json.loads((self.folder / "compile_commands.json").read_text()):
-            words = shlex.split(entry["command"])
-            words = words[1:] if pathlib.Path(words[0]).name == "ccache" else words
+            words = _without_cache(shlex.split(entry["command"]))
             self.commands[words[words.index("-o") + 1]] = words
         self.core_objects = [name for name in self.commands if "/GeometryUtils.dir/" in name]
         self.test_objects = {
