@@ -76,9 +76,9 @@ function(vorn_enable_instrumentation)
   endif()
 endfunction()
 
-# Rebuilds after a switch of branch or a fresh clone cost seconds instead of minutes. The cache takes
-# files that use a precompiled header only when it may overlook two things that no source here uses:
-# macros defined ahead of it, and the time of compilation.
+# Rebuilds after a switch of branch or a fresh clone cost seconds instead of minutes. The cache
+# takes files that use a precompiled header only when it may overlook two things that no source
+# here uses: macros defined ahead of it, and the time of compilation.
 macro(vorn_use_ccache)
   find_program(VORN_CCACHE ccache)
   mark_as_advanced(VORN_CCACHE)
