@@ -124,10 +124,9 @@ void AddOptions(Command& command, Options* options) {
   command
       .AddTexts("CONTOUR", &options->paths, "FILE", "Files with contours; - is the standard input")
       .Require();
-  Option const from = AddWord(
-      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-      [options](std::string const& word) { options->from = FormatNamed(word); },
-      "Read the contours as this");
+  Option const from =
+      AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
+                &options->from, "Read the contours as this");
   Option const points = command
                             .AddFlag("--points", &options->arePoints,
                                      "The files hold points; measure the polygon through them")

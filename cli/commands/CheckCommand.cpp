@@ -120,10 +120,8 @@ void AddOptions(Command& command, Options* options) {
                "File with the contour; - is the standard input")
       .Require();
   AddClosedChoice(command, &options->closed);
-  AddWord(
-      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-      [options](std::string const& word) { options->from = FormatNamed(word); },
-      "Read the contour as this");
+  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
+            &options->from, "Read the contour as this");
   AddOutline(command, &options->outline);
   command.AddOutput(
       "--table", &options->table,

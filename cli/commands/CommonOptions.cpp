@@ -39,13 +39,28 @@ Complaint WholeNumber(int least, int most) {
   };
 }
 
-Complaint OneOf(std::vector<std::string> const& words) {
-  return [words](std::string const& text) -> std::string {
-    if (std::find(words.begin(), words.end(), text) != words.end()) return "";
+/// `nameOf` gives the name under which a text goes; empty for one without meaning.
+Complaint OneOf(std::vector<std::string> const& words,
+                std::function<std::string(std::string const&)> const& nameOf) {
+  return [words, nameOf](std::string const& text) -> std::string {
+    if (std::find(words.begin(), words.end(), nameOf(text)) != words.end()) return "";
     std::string list;
     for (std::string const& word : words) list += (list.empty() ? "" : ", ") + word;
     return Quoted(text) + " is none of " + list;
   };
+}
+
+/// Words are ASCII, so that no language of the system changes them.
+std::string InSmallLetters(std::string text) {
+  for (char& c : text) {
+    if (c >= 'A' && c <= 'Z') c = static_cast<char>(c - 'A' + 'a');
+  }
+  return text;
+}
+
+std::string FormatName(std::string const& text) {
+  std::optional<Format> const format = FormatNamed(text);
+  return format ? NameOf(*format) : "";
 }
 
 }  // namespace
@@ -73,7 +88,14 @@ Option AddWholeNumber(Command& command, std::string const& name, std::optional<i
 
 Option AddWord(Command& command, std::string const& name, std::vector<std::string> const& words,
                std::function<void(std::string const&)> const& take, std::string const& help) {
-  return command.AddChecked(name, OneOf(words), take, "NAME", help);
+  auto const takeSmall = [take](std::string const& text) { take(InSmallLetters(text)); };
+  return command.AddChecked(name, OneOf(words, InSmallLetters), takeSmall, "NAME", help);
+}
+
+Option AddFormat(Command& command, std::string const& name, std::vector<std::string> const& names,
+                 std::optional<Format>* format, std::string const& help) {
+  auto const take = [format](std::string const& text) { *format = FormatNamed(text); };
+  return command.AddChecked(name, OneOf(names, FormatName), take, "NAME", help);
 }
 
 }  // namespace Vorn::Cli

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "cli/commands/CommandLine.h"
+#include "vorn/io/Formats.h"
 
 /// Kinds of options that several commands have.
 namespace Vorn::Cli {
@@ -30,9 +31,15 @@ struct WholeNumbers {
 Option AddWholeNumber(Command& command, std::string const& name, std::optional<int>* value,
                       WholeNumbers const& numbers, std::string const& help);
 
-/// An option whose value is one of the words; `take` is called with the one given.
+/// An option whose value is one of the words, which are in small letters; `take` is called with the
+/// one that was given, in small or capital letters.
 Option AddWord(Command& command, std::string const& name, std::vector<std::string> const& words,
                std::function<void(std::string const&)> const& take, std::string const& help);
+
+/// An option whose value is a format by any name that FormatNamed takes, which are the endings of
+/// its files as well. `names` has one for each format that it takes.
+Option AddFormat(Command& command, std::string const& name, std::vector<std::string> const& names,
+                 std::optional<Format>* format, std::string const& help);
 
 /// An option whose value is one of a few names, each standing for a value.
 template <typename Value>

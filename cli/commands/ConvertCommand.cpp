@@ -14,6 +14,7 @@
 #include "vorn/io/Formats.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
+#include "vorn/io/Outlines.h"
 
 namespace Vorn::Cli {
 
@@ -85,13 +86,25 @@ struct Options {
   WriteOptions write;
 };
 
+/// "closed", "open", or how many outlines of each kind where one of several is closed.
+std::string ClosureText(ContourFile const& contour) {
+  std::vector<ContourFile> const outlines = OutlinesOf(contour);
+  auto const closed = static_cast<std::size_t>(
+      std::count_if(outlines.begin(), outlines.end(),
+                    [](ContourFile const& outline) { return outline.isClosed; }));
+  if (outlines.size() == 1 || closed == 0) return contour.isClosed ? "closed" : "open";
+  std::size_t const open = outlines.size() - closed;
+  return Counted(closed, "closed outline") +
+         (open > 0 ? ", " + Counted(open, "open outline") : std::string());
+}
+
 std::string Summary(ContourFile const& contour) {
   auto const arcs =
       static_cast<std::size_t>(std::count_if(contour.pieces.begin(), contour.pieces.end(),
                                              [](Piece const& piece) { return piece.IsArc(); }));
   std::size_t const lines = contour.pieces.size() - arcs;
   return Counted(contour.pieces.size(), "piece") + ": " + Counted(lines, "line") + ", " +
-         Counted(arcs, "arc") + (contour.isClosed ? "; closed" : "; open");
+         Counted(arcs, "arc") + "; " + ClosureText(contour);
 }
 
 /// A file with the contour, and how far it leaves it; nothing of a drawing.
@@ -164,10 +177,8 @@ void AddOptions(Command& command, Options* options) {
   AddOutputFiles(command, "contour",
                  {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg", "png", "html"},
                  &options->outputs);
-  AddWord(
-      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-      [options](std::string const& word) { options->from = FormatNamed(word); },
-      "Read the input as this");
+  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
+            &options->from, "Read the input as this");
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
   AddOutline(command, &options->outline);

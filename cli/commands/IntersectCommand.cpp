@@ -96,10 +96,8 @@ void AddOptions(Command& command, Options* options) {
       .Require();
   command.AddText("B", &options->b, "FILE",
                   "File with another contour; without it, A meets itself");
-  AddWord(
-      command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-      [options](std::string const& word) { options->from = FormatNamed(word); },
-      "Read the contours as this");
+  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
+            &options->from, "Read the contours as this");
   AddOutline(command, &options->outline);
   AddOutline(command, &options->outlineB, "--outline-b");
   AddFlatten(command, &options->flattening);

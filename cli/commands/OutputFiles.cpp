@@ -30,10 +30,7 @@ void AddOutputFiles(Command& command, std::string const& noun,
                      "Write the " + noun +
                          " to this file; may be given several times; - is the standard "
                          "output, which --to without -o means as well");
-  AddWord(
-      command, "--to", formats,
-      [files](std::string const& word) { files->otherwise = FormatNamed(word); },
-      "Write the outputs as this");
+  AddFormat(command, "--to", formats, &files->otherwise, "Write the outputs as this");
 }
 
 void CompleteOutputFiles(OutputFiles* files) {

@@ -63,12 +63,10 @@ void AddPointsOptions(Command& command, PointsInput* input) {
   AddColumns(command, &input->columns);
   command.AddText("--units", &input->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
-  AddWord(
-      command, "--points-from", {"csv", "dxf", "gcode", "wkt", "geojson", "svg", "json"},
-      [input](std::string const& word) { input->from = FormatNamed(word); },
-      "Read the points from this: csv is a table; if not said, the ending of the file tells, or "
-      "its "
-      "content");
+  AddFormat(command, "--points-from", {"csv", "dxf", "gcode", "wkt", "geojson", "svg", "json"},
+            &input->from,
+            "Read the points from this: csv is a table; if not said, the ending of the file tells, "
+            "or its content");
   AddPositiveNumber(
       command, "--flatten", &input->flattening, "T",
       "Take points from arcs and curves as well: the ends of chords no further than T "

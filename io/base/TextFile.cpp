@@ -6,6 +6,7 @@
 #include <istream>
 #include <string_view>
 
+#include "io/base/Encoding.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 
@@ -36,7 +37,8 @@ std::size_t SizeToExpect(std::string const& path) {
                                                     : static_cast<std::size_t>(size) + 1;
 }
 
-/// Binary files need not be read to their end to be told from text.
+/// Binary files need not be read to their end to be told from text. Half of the bytes of UTF-16 are
+/// zero as a rule.
 void RefuseBinary(std::string const& path, std::string_view block, std::size_t offset) {
   std::size_t const zero = block.find('\0');
   if (zero == std::string_view::npos) return;
@@ -54,8 +56,9 @@ std::string ReadAll(std::string const& path, std::istream& in, std::size_t expec
     text.resize(std::min(room, largest + 1));
     in.read(text.data() + size, static_cast<std::streamsize>(text.size() - size));
     auto const count = static_cast<std::size_t>(in.gcount());
-    if (expected == kFirstBlock)
+    if (expected == kFirstBlock && !IsUtf16(text)) {
       RefuseBinary(path, std::string_view(text).substr(size, count), size);
+    }
     size += count;
   }
   if (in.bad()) Refuse(path, "cannot be read");

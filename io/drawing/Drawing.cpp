@@ -5,6 +5,7 @@
 #include <utility>
 
 #include "vorn/io/ContourFile.h"
+#include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Formats.h"
 #include "vorn/io/Messages.h"
@@ -50,6 +51,11 @@ std::size_t Drawing::ArcCount() const {
 }
 
 bool Drawing::IsClosed() const { return HasContour() && ReturnsToStart(pieces); }
+
+void Drawing::RequireContent() const {
+  if (!points.empty() || HasContour()) return;
+  throw Failure(FailureKind::BadArgument, "there is nothing to draw: no points and no pieces");
+}
 
 std::size_t Drawing::Worst() const {
   bool const isRelative = HasTolerances();

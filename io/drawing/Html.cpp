@@ -135,6 +135,7 @@ std::string Filled(std::string_view page,
 }  // namespace
 
 std::string ToHtml(Drawing const& drawing) {
+  drawing.RequireContent();
   std::string script;
   for (char const* const part : Html::kScript) script += part;
   // A file name need not be UTF-8; the page is.

@@ -96,6 +96,7 @@ std::string Diagram(Scene const& scene) {
 }  // namespace
 
 std::string ToSvg(Drawing const& drawing) {
+  drawing.RequireContent();
   Scene const scene = SceneOf(drawing);
   return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
          "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"297mm\" height=\"210mm\" "

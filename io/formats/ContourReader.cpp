@@ -50,21 +50,21 @@ Format RecognisedFormat(std::string_view text, std::string const& path) {
 }
 
 ContourFile ParseAs(Format format, std::string_view text, std::string const& path,
-                    std::optional<double> flattening) {
+                    ReadOptions const& options) {
   switch (format) {
     case Format::Json:
     case Format::GeoJson:
-      return ParseJsonPieces(text, path);
+      return ParseJsonPieces(text, path, options.arcs);
     case Format::Csv:
-      return ParseCsvPieces(text, path);
+      return ParseCsvPieces(text, path, options.arcs);
     case Format::Dxf:
-      return ParseDxf(text, path, flattening);
+      return ParseDxf(text, path, options);
     case Format::GCode:
-      return ParseGCode(text, path);
+      return ParseGCode(text, path, options.arcs);
     case Format::Wkt:
-      return ParseWkt(text, path);
+      return ParseWkt(text, path, options.arcs);
     case Format::Svg:
-      return ParseSvg(text, path, flattening);
+      return ParseSvg(text, path, options);
     default:
       throw Failure(FailureKind::BadArgument, {path},
                     "a contour cannot be read from " + NameOf(format));
@@ -79,7 +79,7 @@ ContourFile ParseContour(std::string_view text, std::string const& path,
   RefuseEmpty(text, path);
   Format const format = options.format ? *options.format : RecognisedFormat(text, path);
   RefuseTooLarge(text, path, format);
-  ContourFile contour = ParseAs(format, text, path, options.flattening);
+  ContourFile contour = ParseAs(format, text, path, options);
   contour.path = Printable(path);
   contour.units = Printable(contour.units);
   if (contour.pieces.empty()) RefuseFile(path, "holds no contour: there are no pieces");
@@ -90,7 +90,7 @@ ContourFile ParseContour(std::string_view text, std::string const& path,
 
 ContourFile ParseContour(std::string_view text, std::string const& path,
                          std::optional<Format> format) {
-  return ParseContour(text, path, ReadOptions{format, {}});
+  return ParseContour(text, path, ReadOptions{format, {}, ArcUse::Keep});
 }
 
 ContourFile ReadContour(std::string const& path, std::istream& in, ReadOptions const& options) {
@@ -98,7 +98,7 @@ ContourFile ReadContour(std::string const& path, std::istream& in, ReadOptions c
 }
 
 ContourFile ReadContour(std::string const& path, std::istream& in, std::optional<Format> format) {
-  return ReadContour(path, in, ReadOptions{format, {}});
+  return ReadContour(path, in, ReadOptions{format, {}, ArcUse::Keep});
 }
 
 }  // namespace Vorn::IO

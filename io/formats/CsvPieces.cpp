@@ -57,7 +57,8 @@ std::vector<std::string_view> Cells(std::string_view line, char separator) {
 
 class Reader {
  public:
-  Reader(std::string_view text, std::string path) : path_(std::move(path)), lines_(text) {}
+  Reader(std::string_view text, std::string path, ArcUse arcs)
+      : path_(std::move(path)), lines_(text), arcs_(arcs) {}
 
   ContourFile Read() {
     std::string_view line;
@@ -140,6 +141,7 @@ class Reader {
             : std::vector<Piece>{MakeArc(start, end, center, radius, isCounterClockwise)};
     for (Piece const& arc : arcs) {
       if (auto const fault = FaultOf(arc)) Refuse("is no arc: " + *fault);
+      if (arcs_ == ArcUse::Refuse) RefuseArc(arc, {path_, lines_.Number()});
       contour_.pieces.push_back(arc);
     }
   }
@@ -158,6 +160,7 @@ class Reader {
 
   std::string path_;
   Lines lines_;
+  ArcUse arcs_;
   ContourFile contour_;
   std::optional<bool> closed_;
   char separator_ = ',';
@@ -176,8 +179,8 @@ std::string ToCsv(ContourFile const& contour) {
   return text;
 }
 
-ContourFile ParseCsvPieces(std::string_view text, std::string const& path) {
-  return Reader(text, path).Read();
+ContourFile ParseCsvPieces(std::string_view text, std::string const& path, ArcUse arcs) {
+  return Reader(text, path, arcs).Read();
 }
 
 }  // namespace Vorn::IO

@@ -4,6 +4,7 @@
 #include <string_view>
 
 #include "vorn/io/ContourFile.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 
@@ -18,6 +19,7 @@ std::string ToCsv(ContourFile const& contour);
 /// and `centre_y` are taken as well. Separators are commas, semicolons or tabs. An arc that ends
 /// where it starts is a full circle and becomes two halves.
 /// @throws Failure (FailureKind::File) naming file, line and offending text.
-ContourFile ParseCsvPieces(std::string_view text, std::string const& path);
+ContourFile ParseCsvPieces(std::string_view text, std::string const& path,
+                           ArcUse arcs = ArcUse::Keep);
 
 }  // namespace Vorn::IO

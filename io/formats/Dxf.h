@@ -1,10 +1,10 @@
 #pragma once
 
-#include <optional>
 #include <string>
 #include <string_view>
 
 #include "vorn/io/ContourFile.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 
@@ -29,11 +29,11 @@ std::string ToDxf2000(ContourFile const& contour, DxfStyle style = DxfStyle::Pol
 /// entity that ends where the one before ends is turned round; arcs have no sense of their own and
 /// are turned to the nearer end. A circle becomes two halves. Texts, points, dimensions, viewports,
 /// paper space and blocks are passed over. SPLINE and ELLIPSE become chords no further than
-/// `flattening` from them.
+/// `options.flattening` from them.
 /// @throws Failure (FailureKind::File) naming file, line and entity, of a curve without
-/// `flattening`
+/// `options.flattening`
 ///         as well.
 ContourFile ParseDxf(std::string_view text, std::string const& path,
-                     std::optional<double> flattening = {});
+                     ReadOptions const& options = {});
 
 }  // namespace Vorn::IO

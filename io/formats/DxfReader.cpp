@@ -7,6 +7,7 @@
 #include "io/formats/Dxf.h"
 #include "io/formats/DxfCurves.h"
 #include "io/formats/DxfEntities.h"
+#include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Numbers.h"
 
@@ -147,10 +148,8 @@ void Mirror(Stretch* stretch) {
 /// Goes through the entities of a drawing.
 class Reader {
  public:
-  Reader(Dxf::Drawing const& drawing, std::optional<double> flattening)
-      : entities_(drawing.entities) {
-    flattening_.tolerance = flattening;
-  }
+  Reader(Dxf::Drawing const& drawing, ReadOptions const& options)
+      : entities_(drawing.entities), flattening_{options.flattening}, arcs_(options.arcs) {}
 
   std::vector<Stretch> Read() {
     std::vector<Stretch> stretches;
@@ -163,11 +162,18 @@ class Reader {
       stretches.push_back(StretchOf(entity));
       if (IsInOwnPlane(entity) && IsMirrored(entity)) Mirror(&stretches.back());
       RequireSameHeight(entity);
+      if (arcs_ == ArcUse::Refuse) RefuseArcs(entity, stretches.back());
     }
     return stretches;
   }
 
  private:
+  static void RefuseArcs(Entity const& entity, Stretch const& stretch) {
+    for (Piece const& piece : stretch.pieces) {
+      if (piece.IsArc()) entity.Refuse(DescribeArc(piece), Remedy::FlattenCurves);
+    }
+  }
+
   Stretch StretchOf(Entity const& entity) {
     if (entity.Type() == "LINE") return LineOf(entity);
     if (entity.Type() == "ARC") return ArcOf(entity);
@@ -215,8 +221,9 @@ class Reader {
   }
 
   std::vector<Entity> const& entities_;
-  std::size_t next_ = 0;
   Flattening flattening_;
+  ArcUse arcs_;
+  std::size_t next_ = 0;
   bool hasHeight_ = false;
   double height_ = 0.0;
 };
@@ -265,10 +272,9 @@ std::vector<Piece> Joined(std::vector<Stretch> const& stretches) {
 
 }  // namespace
 
-ContourFile ParseDxf(std::string_view text, std::string const& path,
-                     std::optional<double> flattening) {
+ContourFile ParseDxf(std::string_view text, std::string const& path, ReadOptions const& options) {
   Dxf::Drawing const drawing = Dxf::ReadDrawing(text, path);
-  std::vector<Stretch> stretches = Reader(drawing, flattening).Read();
+  std::vector<Stretch> stretches = Reader(drawing, options).Read();
   ContourFile contour;
   contour.units = drawing.units;
   if (stretches.empty()) return contour;

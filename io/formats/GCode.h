@@ -4,6 +4,7 @@
 #include <string_view>
 
 #include "vorn/io/ContourFile.h"
+#include "vorn/io/Formats.h"
 #include "vorn/io/GCodeOptions.h"
 
 namespace Vorn::IO {
@@ -25,6 +26,6 @@ std::string ToGCode(ContourFile const& contour, GCodeOptions const& options = {}
 /// plane alone are passed over. What follows M2 or M30 is not read. The contour is closed when it
 /// ends exactly where it starts.
 /// @throws Failure (FailureKind::File) naming file, line and word.
-ContourFile ParseGCode(std::string_view text, std::string const& path);
+ContourFile ParseGCode(std::string_view text, std::string const& path, ArcUse arcs = ArcUse::Keep);
 
 }  // namespace Vorn::IO

@@ -1,6 +1,5 @@
 // G-code: from the words of a tool path to the pieces of a contour.
 #include <algorithm>
-#include <array>
 #include <cmath>
 #include <iterator>
 #include <optional>
@@ -10,6 +9,7 @@
 #include "io/base/Words.h"
 #include "io/formats/GCode.h"
 #include "io/formats/GCodeBlocks.h"
+#include "io/formats/GCodePlane.h"
 #include "io/formats/LengthUnits.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
@@ -24,30 +24,10 @@ namespace {
 constexpr double kLargestRadiusError = 0.01;
 constexpr double kLargestRelativeRadiusError = 1e-3;
 
-/// The axes of a machine, as its words name them.
-constexpr char kAxes[] = {'X', 'Y', 'Z'};
-
-/// One coordinate for each axis; nothing where it is not known.
-using Place = std::array<std::optional<double>, std::size(kAxes)>;
-
-/// The axes that the first and the second coordinate of a contour are, the words for their ways to
-/// the centre of an arc, and the axis across.
-struct Plane {
-  std::size_t first = 0;
-  std::size_t second = 1;
-  char firstOffset = 'I';
-  char secondOffset = 'J';
-  std::size_t across = 2;
-  bool isMirrored = false;  ///< G2 and G3 are told from the side where the two are exchanged
-};
-
-constexpr Plane kPlaneXY = {};
-constexpr Plane kPlaneXZ = {0, 2, 'I', 'K', 1, true};
-
 /// What a machine would remember, and the pieces it has cut.
 class Machine {
  public:
-  explicit Machine(std::string path) : path_(std::move(path)) {}
+  Machine(std::string path, ArcUse arcs) : path_(std::move(path)), arcs_(arcs) {}
 
   void Run(GCodeBlock const& block, std::size_t line) {
     line_ = line;
@@ -150,7 +130,7 @@ class Machine {
     return std::find(std::begin(kKnown), std::end(kKnown), code) != std::end(kKnown);
   }
 
-  void TakePlane(Plane const& plane) {
+  void TakePlane(MachinePlane const& plane) {
     if (!pieces_.empty() && plane.second != plane_.second) {
       Refuse("the plane changes within the contour");
     }
@@ -177,8 +157,8 @@ class Machine {
     }
   }
 
-  Place Target(GCodeBlock const& block) const {
-    Place target = at_;
+  MachinePlace Target(GCodeBlock const& block) const {
+    MachinePlace target = at_;
     for (std::size_t axis = 0; axis < at_.size(); ++axis) {
       std::optional<double> const& word = block[kAxes[axis]];
       if (word) target[axis] = isIncremental_ ? at_[axis].value_or(0.0) + *word : *word;
@@ -188,7 +168,7 @@ class Machine {
 
   void Move(GCodeBlock const& block) {
     if (!motion_) Refuse("a move before any of G0 to G3");
-    Place const target = Target(block);
+    MachinePlace const target = Target(block);
     if (*motion_ >= 1 && at_[plane_.first] && at_[plane_.second]) {
       bool const movesAcross = at_[plane_.across] && target[plane_.across] != at_[plane_.across];
       Cut(block, {*target[plane_.first], *target[plane_.second]}, movesAcross);
@@ -235,12 +215,15 @@ class Machine {
              FormatShort(atEnd) + " at its end");
     }
     if (AreEqual(from, to)) {
-      for (Piece const& half : MakeCircle(from, center, atStart, isCounterClockwise)) {
-        pieces_.push_back(half);
-      }
+      for (Piece const& half : MakeCircle(from, center, atStart, isCounterClockwise)) AddArc(half);
     } else {
-      pieces_.push_back(MakeArc(from, to, center, (atStart + atEnd) / 2.0, isCounterClockwise));
+      AddArc(MakeArc(from, to, center, (atStart + atEnd) / 2.0, isCounterClockwise));
     }
+  }
+
+  void AddArc(Piece const& arc) {
+    if (arcs_ == ArcUse::Refuse) RefuseArc(arc, {path_, line_});
+    pieces_.push_back(arc);
   }
 
   XY CenterByOffset(GCodeBlock const& block, XY const& from) const {
@@ -270,12 +253,13 @@ class Machine {
   }
 
   std::string path_;
+  ArcUse arcs_;
   std::size_t line_ = 0;
   std::vector<Piece> pieces_;
   std::string units_;
   std::optional<int> motion_;
-  Plane plane_ = kPlaneXY;
-  Place at_;
+  MachinePlane plane_ = kPlaneXY;
+  MachinePlace at_;
   bool isDwell_ = false;      ///< the words of this block say how long to wait
   bool isElsewhere_ = false;  ///< the words of this block are coordinates of the machine
   bool takesP_ = false;
@@ -286,8 +270,8 @@ class Machine {
 
 }  // namespace
 
-ContourFile ParseGCode(std::string_view text, std::string const& path) {
-  Machine machine(path);
+ContourFile ParseGCode(std::string_view text, std::string const& path, ArcUse arcs) {
+  Machine machine(path, arcs);
   Lines lines(text);
   std::string_view line;
   while (lines.Next(&line)) {

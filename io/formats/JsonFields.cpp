@@ -7,7 +7,6 @@
 #include "io/formats/JsonPlace.h"
 #include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
-#include "vorn/io/Failure.h"
 #include "vorn/io/Messages.h"
 
 namespace Vorn::IO {
@@ -72,10 +71,10 @@ nlohmann::json ParsedJson(std::string_view text, std::string const& path) {
   }
 }
 
-void JsonField::Refuse(std::string const& message) const {
+void JsonField::Refuse(std::string const& message, Remedy help) const {
   throw Failure(FailureKind::File,
                 PlaceIn(source_.text, OffsetInJson(source_.text, name_), source_.file),
-                name_.empty() ? message : name_ + ": " + message);
+                name_.empty() ? message : name_ + ": " + message, help);
 }
 
 bool JsonField::Has(char const* key) const {

@@ -6,6 +6,8 @@
 #include <string_view>
 #include <utility>
 
+#include "vorn/io/Failure.h"
+
 /// What the readers of JSON documents have in common.
 namespace Vorn::IO {
 
@@ -28,7 +30,7 @@ class JsonField {
       : value_(value), name_(std::move(name)), source_(source) {}
 
   /// Ends the reading with a message about this value that names its line and column.
-  [[noreturn]] void Refuse(std::string const& message) const;
+  [[noreturn]] void Refuse(std::string const& message, Remedy help = Remedy::None) const;
 
   /// Whether the value is an object that holds something other than null under the key.
   bool Has(char const* key) const;

@@ -65,11 +65,15 @@ Piece LineOf(Field const& element) {
   return line;
 }
 
-Piece PieceOf(Field const& element) {
+Piece PieceOf(Field const& element, ArcUse arcs) {
   Field const kind = element["kind"];
   std::string const word = kind.Word();
   if (word == "line") return LineOf(element);
-  if (word == "arc") return ArcOf(element);
+  if (word == "arc") {
+    Piece const arc = ArcOf(element);
+    if (arcs == ArcUse::Refuse) element.Refuse(DescribeArc(arc), Remedy::FlattenCurves);
+    return arc;
+  }
   kind.Refuse(Quoted(word) + " is neither line nor arc");
 }
 
@@ -121,7 +125,7 @@ std::string ToJson(ContourFile const& contour) {
   return document.dump(2, ' ', false, OrderedJson::error_handler_t::replace) + "\n";
 }
 
-ContourFile ParseJsonPieces(std::string_view text, std::string const& path) {
+ContourFile ParseJsonPieces(std::string_view text, std::string const& path, ArcUse arcs) {
   nlohmann::json const value = ParsedJson(text, path);
   JsonSource const source = {path, text};
   Field const document(value, "", source);
@@ -132,7 +136,7 @@ ContourFile ParseJsonPieces(std::string_view text, std::string const& path) {
   contour.units = UnitsOf(document);
   Field const elements = document["elements"];
   for (std::size_t i = 0; i < elements.Count(); ++i) {
-    contour.pieces.push_back(PieceOf(elements.Item(i)));
+    contour.pieces.push_back(PieceOf(elements.Item(i), arcs));
   }
   contour.isClosed =
       document.Has("closed") ? document["closed"].Truth() : ReturnsToStart(contour.pieces);

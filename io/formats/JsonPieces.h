@@ -6,6 +6,7 @@
 #include <string_view>
 
 #include "vorn/io/ContourFile.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 
@@ -23,6 +24,7 @@ std::string ToJson(ContourFile const& contour);
 /// missing.
 /// @throws Failure (FailureKind::File) naming the file and the path of the bad field, or line and
 ///         column where the text is no JSON.
-ContourFile ParseJsonPieces(std::string_view text, std::string const& path);
+ContourFile ParseJsonPieces(std::string_view text, std::string const& path,
+                            ArcUse arcs = ArcUse::Keep);
 
 }  // namespace Vorn::IO

@@ -20,10 +20,6 @@ namespace {
 /// Pieces that follow each other.
 using Run = std::vector<Piece>;
 
-std::string PlaceText(XY const& at) {
-  return "(" + FormatShort(at.x) + ", " + FormatShort(at.y) + ")";
-}
-
 /// The pieces in runs without a gap; one that is back at its start ends.
 std::vector<Run> RunsOf(std::vector<Piece> const& pieces) {
   double const tolerance = JointTolerance(pieces);
@@ -96,12 +92,8 @@ class Taker {
 
   void TakeArc(Piece const& arc, std::string const& path, std::vector<XY>* places) {
     std::size_t const before = places->size();
-    if (!flattening_.tolerance) {
-      throw Failure(FailureKind::File, {path},
-                    "an arc from " + PlaceText(arc.start) + " to " + PlaceText(arc.end),
-                    Remedy::FlattenCurves);
-    }
-    if (!AppendChords(arc, *flattening_.tolerance, flattening_.chordsLeft, places)) {
+    // Without a tolerance the reader has refused them where they stand in the file.
+    if (!AppendChords(arc, flattening_.tolerance.value_or(0.0), flattening_.chordsLeft, places)) {
       RefuseFile(path, "arcs flattened so finely have more than " + std::to_string(kMostChords) +
                            " chords");
     }
@@ -132,8 +124,9 @@ std::vector<PointFile> ParsePointOutlines(std::string_view text, std::string con
   if (asksForColumn) {
     throw Failure(FailureKind::BadArgument, {InputName(path)}, "is no table that has columns");
   }
+  ArcUse const arcs = reading.flattening ? ArcUse::Keep : ArcUse::Refuse;
   ContourFile const contour =
-      ParseContour(text, InputName(path), ReadOptions{reading.format, reading.flattening});
+      ParseContour(text, InputName(path), ReadOptions{reading.format, reading.flattening, arcs});
   return Taker(contour, reading).Take();
 }
 

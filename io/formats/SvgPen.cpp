@@ -4,6 +4,7 @@
 #include <cmath>
 #include <numbers>
 
+#include "io/formats/Text.h"
 #include "io/pieces/Shapes.h"
 
 namespace Vorn::IO {
@@ -110,7 +111,9 @@ void SvgPen::ArcTo(SvgArc const& arc, XY const& to) {
 void SvgPen::CircleTo(SvgArc const& arc, XY const& to) {
   double const bulge = BulgeOver(Distance(at_, to), arc.rx, arc.isLarge);
   bool const isCounterClockwise = arc.isSweep == (map_.Determinant() > 0.0);
-  Add(MakeBulge(map_(at_), map_(to), isCounterClockwise ? bulge : -bulge));
+  Piece const piece = MakeBulge(map_(at_), map_(to), isCounterClockwise ? bulge : -bulge);
+  if (outcome_.arcs == ArcUse::Refuse) element_.Refuse(DescribeArc(piece), Remedy::FlattenCurves);
+  Add(piece);
 }
 
 void SvgPen::EllipseTo(SvgArc const& arc, XY const& to) {

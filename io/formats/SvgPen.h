@@ -5,6 +5,7 @@
 #include "io/formats/Affine.h"
 #include "io/formats/Xml.h"
 #include "io/pieces/Flattening.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 
@@ -12,6 +13,7 @@ namespace Vorn::IO {
 struct SvgOutcome {
   std::vector<Piece> pieces;
   Flattening flattening;
+  ArcUse arcs = ArcUse::Keep;  ///< what becomes of arcs of circles
 };
 
 /// An arc of SVG: half axes, the turn of the first one against x, and which of the four there are.

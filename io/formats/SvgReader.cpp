@@ -113,7 +113,7 @@ void DrawShape(XmlElement const& element, SvgPen* pen) {
 /// Goes through the elements with the transforms of those around them.
 class Reader final : public XmlVisitor {
  public:
-  explicit Reader(std::optional<double> flattening) { outcome_.flattening.tolerance = flattening; }
+  explicit Reader(ReadOptions const& options) : outcome_{{}, {options.flattening}, options.arcs} {}
 
   void Begin(XmlElement const& element) override {
     ++depth_;
@@ -162,9 +162,8 @@ class Reader final : public XmlVisitor {
 
 }  // namespace
 
-ContourFile ParseSvg(std::string_view text, std::string const& path,
-                     std::optional<double> flattening) {
-  Reader reader(flattening);
+ContourFile ParseSvg(std::string_view text, std::string const& path, ReadOptions const& options) {
+  Reader reader(options);
   WalkXml(text, path, &reader);
   return reader.Contour();
 }

@@ -41,6 +41,17 @@ void RefuseLine(std::string const& path, std::size_t line, std::string const& me
   throw Failure(FailureKind::File, {path, line}, message);
 }
 
+std::string DescribeArc(Piece const& arc) {
+  auto const text = [](XY const& at) {
+    return "(" + FormatShort(at.x) + ", " + FormatShort(at.y) + ")";
+  };
+  return "an arc from " + text(arc.start) + " to " + text(arc.end);
+}
+
+void RefuseArc(Piece const& arc, Place const& place) {
+  throw Failure(FailureKind::File, place, DescribeArc(arc), Remedy::FlattenCurves);
+}
+
 double RequireNumber(std::string_view text, std::string const& what, std::string const& path,
                      std::size_t line) {
   std::optional<double> const value = ParseNumber(text);

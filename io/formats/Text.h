@@ -6,6 +6,7 @@
 
 #include "io/base/TextLines.h"
 #include "vorn/io/Failure.h"
+#include "vorn/io/Pieces.h"
 
 /// What the readers of contour files have in common.
 namespace Vorn::IO {
@@ -32,6 +33,13 @@ class Lines {
 
 /// The same about one line.
 [[noreturn]] void RefuseLine(std::string const& path, std::size_t line, std::string const& message);
+
+/// Ends the reading at an arc where points are wanted: "an arc from (0, 0) to (2, 0)". What would
+/// help is a tolerance for its chords.
+[[noreturn]] void RefuseArc(Piece const& arc, Place const& place);
+
+/// What is said of such an arc.
+std::string DescribeArc(Piece const& arc);
 
 /// The coordinate that the text is. `what` names it: "start_x".
 /// @throws Failure (FailureKind::File) naming file, line and text when it is none that can be used.

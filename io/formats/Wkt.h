@@ -4,6 +4,7 @@
 #include <string_view>
 
 #include "vorn/io/ContourFile.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 
@@ -16,6 +17,6 @@ std::string ToWkt(ContourFile const& contour);
 /// Reads what ToWkt writes, MULTILINESTRING, POLYGON, CURVEPOLYGON and MULTIPOLYGON:
 /// every ring of a polygon is a closed outline.
 /// @throws Failure (FailureKind::File) naming file, line, column and offending text.
-ContourFile ParseWkt(std::string_view text, std::string const& path);
+ContourFile ParseWkt(std::string_view text, std::string const& path, ArcUse arcs = ArcUse::Keep);
 
 }  // namespace Vorn::IO

@@ -27,7 +27,8 @@ std::optional<Piece> ThroughPoints(XY const& start, XY const& middle, XY const& 
 
 class Reader {
  public:
-  Reader(std::string_view text, std::string path) : text_(text), path_(std::move(path)) {}
+  Reader(std::string_view text, std::string path, ArcUse arcs)
+      : text_(text), path_(std::move(path)), arcs_(arcs) {}
 
   bool HadHeights() const { return hadHeights_; }
 
@@ -244,12 +245,18 @@ class Reader {
       if (!arc) {
         RefuseList("the middle point of an arc lies in a row with its ends, but not between them");
       }
-      pieces_.push_back(*arc);
-      return;
+      return AddArc(*arc);
     }
     if (AreEqual(start, middle)) RefuseList("the three points of an arc are one");
-    pieces_.push_back(MakeBulge(start, middle, 1.0));
-    pieces_.push_back(MakeBulge(middle, end, 1.0));
+    AddArc(MakeBulge(start, middle, 1.0));
+    AddArc(MakeBulge(middle, end, 1.0));
+  }
+
+  /// Three points in a row are a line.
+  void AddArc(Piece const& arc) {
+    bool const isRefused = arc.IsArc() && arcs_ == ArcUse::Refuse;
+    if (isRefused) RefuseArc(arc, PlaceIn(text_, at_, path_));
+    pieces_.push_back(arc);
   }
 
   [[noreturn]] void RefuseList(std::string const& message) {
@@ -258,6 +265,7 @@ class Reader {
 
   std::string_view text_;
   std::string path_;
+  ArcUse arcs_;
   std::size_t at_ = 0;
   bool hadHeights_ = false;
   std::vector<Piece> pieces_;
@@ -265,9 +273,9 @@ class Reader {
 
 }  // namespace
 
-ContourFile ParseWkt(std::string_view text, std::string const& path) {
+ContourFile ParseWkt(std::string_view text, std::string const& path, ArcUse arcs) {
   ContourFile contour;
-  Reader reader(text, path);
+  Reader reader(text, path, arcs);
   contour.pieces = reader.Read();
   contour.hadHeights = reader.HadHeights();
   contour.isClosed = ReturnsToStart(contour.pieces);

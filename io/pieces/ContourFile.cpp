@@ -6,6 +6,7 @@
 
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Numbers.h"
+#include "vorn/io/Outlines.h"
 
 namespace Vorn::IO {
 
@@ -61,7 +62,6 @@ double JointTolerance(std::vector<Piece> const& pieces) {
 
 bool ReturnsToStart(std::vector<Piece> const& pieces) {
   if (pieces.empty()) return false;
-  if (pieces.empty()) return false;
   return Distance(pieces.back().end, pieces.front().start) <= JointTolerance(pieces);
 }
 
@@ -75,16 +75,59 @@ std::vector<ContourFile> RunsOf(ContourFile const& contour) {
   return result;
 }
 
+namespace {
+
+/// Pieces of a contour that follow each other: from `first` up to but not including `end`.
+struct Stretch {
+  std::size_t first = 0;
+  std::size_t end = 0;
+  bool isClosed = false;  ///< its end is its start
+};
+
+/// The contour cut where its pieces are too far apart to be chained.
+std::vector<Stretch> StretchesOf(std::vector<Piece> const& pieces) {
+  double const tolerance = ChainTolerance(pieces);
+  auto const meet = [&](std::size_t before, std::size_t after) {
+    return Distance(pieces[before].end, pieces[after].start) <= tolerance;
+  };
+  std::vector<Stretch> stretches;
+  std::size_t first = 0;
+  for (std::size_t end = 1; end <= pieces.size(); ++end) {
+    if (end < pieces.size() && meet(end - 1, end)) continue;
+    stretches.push_back({first, end, meet(end - 1, first)});
+    first = end;
+  }
+  return stretches;
+}
+
+/// For each piece whether an outline that is closed by itself ends with it or begins behind it, so
+/// that the way from there to the next piece is no gap.
+std::vector<bool> EndsOfOutlines(ContourFile const& contour) {
+  std::vector<bool> ends(contour.pieces.size(), false);
+  std::vector<Stretch> const stretches = StretchesOf(contour.pieces);
+  auto const isClosed = [](Stretch const& stretch) { return stretch.isClosed; };
+  // One that says that it is closed, but is not made of outlines that are, is one with its gaps.
+  if (contour.isClosed && !std::all_of(stretches.begin(), stretches.end(), isClosed)) return ends;
+  for (std::size_t i = 0; i < stretches.size() && stretches.size() > 1; ++i) {
+    Stretch const& next = stretches[(i + 1) % stretches.size()];
+    ends[stretches[i].end - 1] = stretches[i].isClosed || next.isClosed;
+  }
+  return ends;
+}
+
+}  // namespace
+
 std::vector<Gap> FindGaps(ContourFile const& contour) {
   std::vector<Gap> gaps;
   std::vector<Piece> const& pieces = contour.pieces;
+  std::vector<bool> const endsOutline = EndsOfOutlines(contour);
   double const tolerance = JointTolerance(pieces);
   for (std::size_t i = 0; i < pieces.size(); ++i) {
     bool const isLast = i + 1 == pieces.size();
     if (isLast && !contour.isClosed) break;
     std::size_t const next = isLast ? 0 : i + 1;
     double const size = Distance(pieces[i].end, pieces[next].start);
-    if (size > tolerance) gaps.push_back({i, next, size});
+    if (size > tolerance && !endsOutline[i]) gaps.push_back({i, next, size});
   }
   return gaps;
 }

@@ -36,6 +36,7 @@ ContourFile Joined(std::vector<ContourFile> const& outlines) {
 
 double ChainTolerance(std::vector<Piece> const& pieces) {
   constexpr double kPartOfSize = 1e-6;
+  if (pieces.empty()) return 0.0;
   Extent const extent = ExtentOf(pieces);
   double const size = std::max(extent.high.x - extent.low.x, extent.high.y - extent.low.y);
   return std::max(kPartOfSize * size, JointTolerance(pieces));

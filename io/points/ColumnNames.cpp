@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <array>
 
+#include "io/base/Encoding.h"
 #include "io/base/Fields.h"
 #include "io/base/Words.h"
 #include "vorn/io/Messages.h"
@@ -191,7 +192,8 @@ std::optional<PointColumns> ByAxes(std::vector<ColumnName> const& names) {
 }  // namespace
 
 ColumnName ReadColumnName(std::string_view field) {
-  std::string_view name = Trimmed(Unquoted(field));
+  std::string const text = Utf8FromEither(Unquoted(field));
+  std::string_view name = Trimmed(text);
   ColumnName column;
   column.unit = TakeUnit(&name);
   column.kind = name == "#" ? ColumnKind::Other : KindOf(WordsOf(name));
@@ -199,7 +201,7 @@ ColumnName ReadColumnName(std::string_view field) {
 }
 
 bool IsUnit(std::string_view field) {
-  return Holds(kUnits, LowerCase(WithoutBrackets(Trimmed(Unquoted(field)))));
+  return Holds(kUnits, LowerCase(WithoutBrackets(Trimmed(Utf8FromEither(Unquoted(field))))));
 }
 
 std::optional<PointColumns> FindPointColumns(std::vector<ColumnName> const& names,

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <iterator>
 
+#include "io/base/Encoding.h"
 #include "io/base/Fields.h"
 #include "io/base/Words.h"
 #include "io/points/ColumnNames.h"
@@ -18,7 +19,9 @@ using Use = ToleranceColumn::Use;
 constexpr std::size_t kMostNamesInMessage = 8;
 constexpr std::size_t kLongestColumnNumber = 9;
 
-std::string LowerName(std::string_view field) { return LowerCase(Trimmed(Unquoted(field))); }
+std::string LowerName(std::string_view field) {
+  return LowerCase(Trimmed(Utf8FromEither(Unquoted(field))));
+}
 
 /// The index of the column with this number, counted from 1; nothing for other text.
 std::optional<std::size_t> IndexOfNumber(std::string_view text) {

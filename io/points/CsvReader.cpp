@@ -3,6 +3,7 @@
 #include <istream>
 #include <utility>
 
+#include "io/base/Encoding.h"
 #include "io/base/Fields.h"
 #include "io/base/TextLines.h"
 #include "io/base/Words.h"
@@ -21,7 +22,6 @@ namespace Vorn::IO {
 namespace {
 
 constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
-constexpr std::string_view kUtf16Marks[] = {"\xFF\xFE", "\xFE\xFF"};
 constexpr std::size_t kShortestLine = 4;  // 1,2 and its end
 
 /// A million columns fit; taking a longer line apart would take many times its memory.
@@ -37,9 +37,6 @@ std::string_view TakeWord(std::string_view* text) {
 }
 
 void RefuseOtherThanText(std::string_view text, CsvPlace const& place) {
-  for (std::string_view const mark : kUtf16Marks) {
-    if (text.substr(0, mark.size()) == mark) place.Refuse("is UTF-16 text; save it as UTF-8");
-  }
   std::size_t const zero = text.find('\0');
   if (zero == std::string_view::npos) return;
   place.Refuse("is not text: byte " + std::to_string(zero) + " is zero");
@@ -52,7 +49,9 @@ class Parser {
     file_.path = place_.Path();
   }
 
-  PointFile Parse(std::string_view text) {
+  PointFile Parse(std::string_view bytes) {
+    std::optional<std::string> const decoded = Utf8FromUtf16(bytes);
+    std::string_view text = decoded ? *decoded : bytes;
     if (text.substr(0, kUtf8Mark.size()) == kUtf8Mark) text.remove_prefix(kUtf8Mark.size());
     RefuseOtherThanText(text, place_);
     ReservePoints(text);
@@ -87,9 +86,15 @@ class Parser {
     if (comment != std::string_view::npos && file_.points.empty()) {
       ParseComment(whole.substr(comment));
     }
-    if (Trimmed(line).empty() || place_.Line() <= table_.first) return;
+    if (place_.Line() <= table_.first) return ParsePreamble(Trimmed(line));
+    if (Trimmed(line).empty() || (file_.points.empty() && IsRule(line))) return;
     if (isUnitLineNext_) return ParseUnits(line);
     columns_.Count() == 0 ? ParseFirstLine(Trimmed(line)) : ParseLineOfData(line);
+  }
+
+  /// A line ahead of the table: "Units: mm", "Einheit;mm". A comment goes before it.
+  void ParsePreamble(std::string_view line) {
+    if (file_.units.empty()) file_.units = Printable(UnitInPreamble(line));
   }
 
   /// The header, or the first line of data where there is none.
@@ -134,6 +139,8 @@ class Parser {
     if (separator_ == '\t' && !columns_.Fit(fields_)) {
       SplitFields(Trimmed(line), separator_, &fields_);
     }
+    // Separators at the end of the lines of data, but not of the header.
+    while (fields_.size() > columns_.Count() && fields_.back().empty()) fields_.pop_back();
     ParsePoint();
   }
 

@@ -155,15 +155,13 @@ std::vector<WordOption> const kWordOptions = {
     {"--end", kThatWrite, "m2, m30, none"},
 };
 
-TEST(OptionValues, WordsAreThoseOfAListInSmallLetters) {
+TEST(OptionValues, WordsAreThoseOfAList) {
   for (WordOption const& option : kWordOptions) {
     std::string const first = option.words.substr(0, option.words.find(','));
-    std::string large = first;
-    large[0] = static_cast<char>(large[0] - 'a' + 'A');
     for (std::string const& command : option.commands) {
       // A second --to would be one too many for the line that has one.
       if (option.name == std::string("--to")) continue;
-      for (std::string const& bad : {std::string("best"), first + "x", large}) {
+      for (std::string const& bad : {std::string("best"), first + "x"}) {
         EXPECT_EQ(Complaint(command, {std::string(option.name) + "=" + bad}),
                   std::string(option.name) + ": '" + bad + "' is none of " + option.words)
             << command;
@@ -178,13 +176,23 @@ TEST(OptionValues, WordsAreThoseOfAListInSmallLetters) {
             "Run 'contour convert --help' for the usage.\n");
 }
 
-TEST(OptionValues, EveryWordOfAListIsTaken) {
+/// The words of a list as they stand there, and each once more in capital letters.
+std::vector<std::string> InBothCases(std::string const& list) {
+  std::vector<std::string> words;
+  for (std::size_t at = 0; at != std::string::npos;) {
+    std::size_t const end = list.find(", ", at);
+    words.push_back(list.substr(at, end == std::string::npos ? end : end - at));
+    words.push_back(words.back());
+    for (char& c : words.back()) c = static_cast<char>(c >= 'a' && c <= 'z' ? c - 'a' + 'A' : c);
+    at = end == std::string::npos ? end : end + 2;
+  }
+  return words;
+}
+
+TEST(OptionValues, EveryWordOfAListIsTakenInSmallAndCapitalLetters) {
   for (WordOption const& option : kWordOptions) {
     for (std::string const& command : option.commands) {
-      for (std::size_t at = 0; at != std::string::npos;) {
-        std::size_t const end = option.words.find(", ", at);
-        std::string const word = option.words.substr(at, end == std::string::npos ? end : end - at);
-        at = end == std::string::npos ? end : end + 2;
+      for (std::string const& word : InBothCases(option.words)) {
         Words words = {kLines.at(command)};
         words.resize(command == "check" ? 3 : 2);
         if (command == "simplify") words.push_back("--drop-close");
@@ -202,6 +210,18 @@ TEST(OptionValues, EveryWordOfAListIsTaken) {
             << command << " " << option.name << word;
       }
     }
+  }
+}
+
+TEST(OptionValues, AFormatMayBeNamedByAnyEndingOfItsFiles) {
+  for (std::string const word : {"nc", "NC", "ngc", "gcode", "GCode"}) {
+    EXPECT_EQ(RunInProcess({"fit", "no.csv", "--to", word}).code, ExitCode::File) << word;
+    EXPECT_EQ(RunInProcess({"convert", "no.json", "--to", word}).code, ExitCode::File) << word;
+    EXPECT_EQ(RunInProcess({"check", "no.csv", "no", "--from", word}).code, ExitCode::File) << word;
+    EXPECT_EQ(RunInProcess({"info", "no", "--points-from", word}).code, ExitCode::File) << word;
+  }
+  for (std::string const word : {"htm", "HTM"}) {
+    EXPECT_EQ(RunInProcess({"plot", "no.csv", "--to", word}).code, ExitCode::File) << word;
   }
 }
 

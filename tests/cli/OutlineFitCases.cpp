@@ -87,8 +87,8 @@ TEST_F(OutlineFit, ArcsBecomePointsWhenAskedFor) {
         "0\nSECTION\n2\nENTITIES\n0\nLWPOLYLINE\n8\n0\n90\n4\n70\n1\n10\n0\n20\n0\n10\n20\n20\n0\n"
         "42\n1\n10\n20\n20\n10\n10\n0\n20\n10\n42\n1\n0\nENDSEC\n0\nEOF\n");
   ExpectRefusal("fit slot.dxf -t 0.01", 3,
-                "slot.dxf: an arc from (20, 0) to (20, 10); --flatten T takes chords of arcs and "
-                "curves");
+                "slot.dxf:5: entity 1 (LWPOLYLINE): an arc from (20, 0) to (20, 10); --flatten T "
+                "takes chords of arcs and curves");
   Ended const ended = Run("fit slot.dxf -t 0.01 --flatten 0.002 -o slot.json");
   EXPECT_EQ(ended.code, 0) << ended.err;
   EXPECT_EQ(Run("check slot.dxf slot.json -t 0.01 --flatten 0.0001").code, 0);

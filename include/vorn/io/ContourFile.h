@@ -37,7 +37,8 @@ struct Gap {
 };
 
 /// The places where neighbours are further apart than rounding explains (see JointTolerance): in
-/// the order of the contour, that of the seam last.
+/// the order of the contour, that of the seam last. Where an outline that is closed by itself ends
+/// or begins, the next one lies elsewhere, which is no gap.
 VORN_IO_EXPORT std::vector<Gap> FindGaps(ContourFile const& contour);
 
 /// How far apart two ends may lie that are meant to be one point: 1e-9 of the extent, which nine

@@ -50,6 +50,8 @@ struct VORN_IO_EXPORT Drawing {
   std::size_t ArcCount() const;
   /// The contour ends where it starts.
   bool IsClosed() const;
+  /// @throws Failure (FailureKind::BadArgument) when there are neither points nor pieces.
+  void RequireContent() const;
   /// Index of the point with the largest deviation, over its tolerance where all have one. Only if
   /// something is measured.
   std::size_t Worst() const;
@@ -68,6 +70,8 @@ VORN_IO_EXPORT Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece
 /// "tolerance 0.02 mm", "tolerance 0.01 to 0.03 mm"; nothing without tolerances.
 VORN_IO_EXPORT std::string DescribeTolerance(Drawing const& drawing);
 
+/// All of the following refuse a drawing of nothing, see Drawing::RequireContent.
+///
 /// A page of A4 across: the contour true to scale with deviations and tolerance magnified, below it
 /// the deviations along the contour.
 VORN_IO_EXPORT std::string ToSvg(Drawing const& drawing);

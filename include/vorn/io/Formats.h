@@ -63,10 +63,17 @@ struct WriteOptions {
 VORN_IO_EXPORT std::string ToText(ContourFile const& contour, Format format,
                                   WriteOptions const& options);
 
+/// What becomes of the arcs of circles in a file.
+enum class ArcUse {
+  Keep,   ///< they are pieces of the contour
+  Refuse  ///< points are wanted, so the first arc ends the reading with its place in the file
+};
+
 /// How a file with a contour is read.
 struct ReadOptions {
   std::optional<Format> format;      ///< nothing: the ending of the name tells, or the content
   std::optional<double> flattening;  ///< how far chords may be from curves; nothing: none are made
+  ArcUse arcs = ArcUse::Keep;        ///< what becomes of arcs of circles
 };
 
 /// Reads a contour from JSON, CSV, DXF, G-code, WKT, GeoJSON or SVG; "-" is `in`. Without `format`

@@ -9,7 +9,7 @@
 namespace Vorn::IO {
 
 /// How far apart the ends of two pieces may lie that are chained: 1e-6 of the size of the drawing,
-/// so that files with six digits pass.
+/// so that files with six digits pass. Zero without pieces.
 VORN_IO_EXPORT double ChainTolerance(std::vector<Piece> const& pieces);
 
 /// The outlines in a file, in the order of their first pieces. Pieces are chained by their ends,

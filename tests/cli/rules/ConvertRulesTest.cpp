@@ -63,6 +63,27 @@ TEST(ConvertRules, WktHasTheKindThatThePiecesNeed) {
             "MULTICURVE (LINESTRING (0 0, 1 0), LINESTRING (2 0, 3 0))\n");
 }
 
+using ConvertRulesWithFiles = InFolder;
+
+TEST_F(ConvertRulesWithFiles, APolygonWithHolesIsClosedAndHasNoGap) {
+  std::string const file = PathOf("out.dxf");
+  for (std::string const polygon :
+       {"POLYGON ((0 0, 9 0, 9 9, 0 9, 0 0), (3 3, 6 3, 6 6, 3 6, 3 3))",
+        R"({"type": "Polygon", "coordinates": [[[0, 0], [9, 0], [9, 9], [0, 9], [0, 0]],
+                                              [[3, 3], [6, 3], [6, 6], [3, 6], [3, 3]]]})"}) {
+    RunResult const run = Converted(polygon, {"-o", file});
+    EXPECT_EQ(run.code, ExitCode::Ok);
+    EXPECT_EQ(run.err, "");
+    EXPECT_NE(run.out.find("pieces      8 pieces: 8 lines, 0 arcs; 2 closed outlines\n"),
+              std::string::npos)
+        << run.out;
+  }
+  RunResult const mixed =
+      Converted("MULTILINESTRING ((0 0, 9 0, 9 9, 0 0), (20 0, 21 0))", {"-o", file});
+  EXPECT_NE(mixed.out.find("; 1 closed outline, 1 open outline\n"), std::string::npos) << mixed.out;
+  EXPECT_EQ(mixed.err, "");
+}
+
 TEST(ConvertRules, GCodeCutsPiecesAndMovesOverGaps) {
   EXPECT_EQ(Text(kHook, {"--to", "gcode", "--feed", "250"}),
             "G21\nG17 G90 G91.1\nG0 X0.0000 Y0.0000\nG1 X4.0000 Y0.0000 F250\n"

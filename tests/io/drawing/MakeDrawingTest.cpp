@@ -2,7 +2,10 @@
 
 #include <cmath>
 
+#include "vorn/io/ContourFile.h"
 #include "vorn/io/Drawing.h"
+#include "vorn/io/Failure.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::IO {
 namespace {
@@ -28,6 +31,28 @@ TEST(MakeDrawing, APlaceThatIsNoneIsOutside) {
   Drawing const drawing =
       MakeDrawing({{0, 0, 1}, {std::nan(""), 0, 1}, {2, 0, 1}}, {MakeLine({0, 0}, {5, 0})});
   EXPECT_EQ(drawing.verdict, Verdict::OutsideTolerance);
+}
+
+TEST(Drawn, NothingIsRefused) {
+  for (Drawing const& nothing : {DrawingOf(ContourFile{}), MakeDrawing({}, {}), Drawing{}}) {
+    for (Format const format : {Format::Svg, Format::Png, Format::Html}) {
+      try {
+        Drawn(nothing, format);
+        FAIL() << NameOf(format);
+      } catch (Failure const& failure) {
+        EXPECT_EQ(failure.Kind(), FailureKind::BadArgument);
+        EXPECT_EQ(failure.Message(), "there is nothing to draw: no points and no pieces");
+      }
+    }
+  }
+}
+
+TEST(Drawn, OnePointOrOnePieceIsEnough) {
+  for (Format const format : {Format::Svg, Format::Png, Format::Html}) {
+    EXPECT_FALSE(Drawn(MakeDrawing({{1, 2, 0}}, {}), format).empty());
+    EXPECT_FALSE(Drawn(MakeDrawing({}, {MakeLine({0, 0}, {1, 0})}), format).empty());
+    EXPECT_FALSE(Drawn(MakeDrawing({{1, 2, 0}, {1, 2, 0}}, {}), format).empty()) << "no extent";
+  }
 }
 
 TEST(DescribeTolerance, TellsOneOrARangeWithUnits) {

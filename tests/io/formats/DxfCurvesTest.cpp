@@ -23,7 +23,7 @@ std::string Drawing(std::string text) {
 }
 
 std::vector<Piece> Read(std::string const& entities, std::optional<double> flattening) {
-  return ParseDxf(Drawing(entities), "p.dxf", flattening).pieces;
+  return ParseDxf(Drawing(entities), "p.dxf", ReadOptions{{}, flattening}).pieces;
 }
 
 std::string Complaint(std::string const& entities) {

@@ -103,9 +103,37 @@ TEST(ParsePointOutlines, DensePointsOfAPolylineStayInOrder) {
   }
 }
 
+TEST(ParsePointOutlines, EveryFormatNamesThePlaceOfAnArc) {
+  auto const complaint = [](std::string const& text, std::string const& path) {
+    return Refusal([&] { Parse(text, path); });
+  };
+  EXPECT_EQ(complaint("G21\nG0 X1 Y0\nG1 X4\nG3 X2 Y2 I-2 J0\n", "p.nc"),
+            "p.nc:4: an arc from (4, 0) to (2, 2)");
+  EXPECT_EQ(complaint("G21\nG0 X1 Y0\nG3 I-1\n", "p.nc"), "p.nc:3: an arc from (1, 0) to (-1, 0)")
+      << "a full circle";
+  EXPECT_EQ(
+      complaint(Dxf("0 LINE 8 0 10 0 20 0 11 4 21 0 0 ARC 8 0 10 0 20 0 40 2 50 0 51 90"), "p.dxf"),
+      "p.dxf:17: entity 2 (ARC): an arc from (2, 0) to (0, 2)");
+  EXPECT_EQ(
+      complaint(Dxf("0 LWPOLYLINE 8 0 90 3 70 0 10 0 20 0 10 4 20 0 42 1 10 4 20 2"), "p.dxf"),
+      "p.dxf:5: entity 1 (LWPOLYLINE): an arc from (4, 0) to (4, 2)");
+  EXPECT_EQ(complaint("COMPOUNDCURVE ((0 0, 1 0),\n  CIRCULARSTRING (1 0, 2 1, 3 0))", "p.wkt"),
+            "p.wkt:2:33: an arc from (1, 0) to (3, 0)");
+  EXPECT_EQ(complaint("<svg>\n <path d='M0 0H1A1 1 0 0 1 3 0'/></svg>", "p.svg"),
+            "p.svg:2:2: path: an arc from (1, 0) to (3, 0)");
+  EXPECT_EQ(complaint("{\"schemaVersion\": 1, \"elements\": [\n"
+                      " {\"kind\": \"line\", \"start\": {\"x\": 0, \"y\": 0}, "
+                      "\"end\": {\"x\": 1, \"y\": 0}},\n"
+                      " {\"kind\": \"arc\", \"start\": {\"x\": 1, \"y\": 0}, "
+                      "\"end\": {\"x\": 3, \"y\": 0}, \"center\": {\"x\": 2, \"y\": 0}, "
+                      "\"radius\": 1, \"direction\": \"ccw\"}]}",
+                      "p.json"),
+            "p.json:3:2: elements[1]: an arc from (1, 0) to (3, 0)");
+}
+
 TEST(ParsePointOutlines, ArcsAreRefusedUnlessFlattened) {
   std::string const text = "CIRCULARSTRING (1 0, 0 1, -1 0)";
-  EXPECT_EQ(Refusal([&] { Parse(text, "p.wkt"); }), "p.wkt: an arc from (1, 0) to (-1, 0)");
+  EXPECT_EQ(Refusal([&] { Parse(text, "p.wkt"); }), "p.wkt:1:32: an arc from (1, 0) to (-1, 0)");
   PointReading reading;
   reading.flattening = 0.01;
   std::vector<PointFile> const files = Parse(text, "p.wkt", reading);

@@ -121,6 +121,36 @@ TEST(FindGaps, LooksAtTheSeamOfAClosedContourOnly) {
   EXPECT_EQ(gaps[0].size, 5.0) << "3, 4, 5";
 }
 
+std::vector<Piece> Square(double low, double high) {
+  return {MakeLine({low, low}, {high, low}), MakeLine({high, low}, {high, high}),
+          MakeLine({high, high}, {low, high}), MakeLine({low, high}, {low, low})};
+}
+
+std::vector<Piece> Together(std::vector<Piece> pieces, std::vector<Piece> const& more) {
+  pieces.insert(pieces.end(), more.begin(), more.end());
+  return pieces;
+}
+
+TEST(FindGaps, OutlinesThatAreClosedByThemselvesHaveNoneBetweenThem) {
+  EXPECT_TRUE(FindGaps(Way(Together(Square(0, 9), Square(3, 6)))).empty());
+  EXPECT_TRUE(FindGaps(Way(Together(Square(0, 9), Square(3, 6)), true)).empty());
+  std::vector<Piece> const mixed = Together(Square(0, 9), {MakeLine({20, 0}, {30, 0})});
+  EXPECT_TRUE(FindGaps(Way(mixed)).empty()) << "an open one beside a closed one";
+}
+
+TEST(FindGaps, OfOpenRunsBesideAClosedOutlineAreTold) {
+  std::vector<Gap> const gaps = FindGaps(
+      Way(Together(Square(0, 9), {MakeLine({20, 0}, {30, 0}), MakeLine({31, 0}, {40, 0})})));
+  ASSERT_EQ(gaps.size(), 1u);
+  EXPECT_EQ(gaps[0].before, 4u);
+  EXPECT_EQ(gaps[0].size, 1.0);
+}
+
+TEST(FindGaps, AClosedContourThatIsNotMadeOfClosedOutlinesHasThemAll) {
+  std::vector<Piece> const mixed = Together(Square(0, 9), {MakeLine({20, 0}, {30, 0})});
+  EXPECT_EQ(FindGaps(Way(mixed, true)).size(), 2u);
+}
+
 TEST(FindGaps, NothingHasNone) {
   EXPECT_TRUE(FindGaps(Way({}, false)).empty());
   EXPECT_TRUE(FindGaps(Way({}, true)).empty());

@@ -140,7 +140,6 @@ INSTANTIATE_TEST_SUITE_P(
                 "p.csv:1:5: w is not a finite number: 'inf'"},
         BadText{"NegativeToleranceInComment", "# tolerance -1\n1,2\n3,4\n",
                 "p.csv:1:13: tolerance in the comment must be a finite number above 0"},
-        BadText{"Utf16", "\xFF\xFEx", "p.csv: is UTF-16 text; save it as UTF-8"},
         BadText{"ControlCharacters", "1,2\n\x01\x02,4\n", "p.csv:2:1: x is not a number: '\?\?'"},
         BadText{"LongText", "1,2\n0123456789x0123456789x0123456789x0123456789x,4\n",
                 "p.csv:2:1: x is not a number: '0123456789x0123456789x0123456789x0123456...'"}),
