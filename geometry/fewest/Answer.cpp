@@ -22,7 +22,7 @@ Answer Restore(Shift const& shift, Chain const& chain, std::vector<BuiltPiece> c
     bool const isSegment = elem.type == GeometryUtils::ElemType::Segment;
     BuiltPiece const restored =
         isSegment ? BuildSegment(start, end)
-                  : BuildArc(start, end, shift.Restore(elem.center), elem.direction);
+                  : BuildArcNear(start, end, shift.Restore(elem.center), elem.direction);
     answer.contour.push_back(restored.elem);
     answer.ranges.push_back({chain.pieces[k].first, chain.pieces[k].end - 1});
   }

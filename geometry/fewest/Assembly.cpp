@@ -79,17 +79,43 @@ BuiltPiece BuildArc(Point const& start, Point const& end, Point const& centre, d
   return {start, arc};
 }
 
-BuiltPiece BuildAlong(Circle const& circle, Point const& start, Point const& end) {
-  Point const chord = Minus(end, start);
-  double const length = Length(chord);
-  if (!(std::fabs(circle.a) * length * kFlattest > 1.0)) return BuildSegment(start, end);
-  Point const middle{0.5 * (start.x + end.x), 0.5 * (start.y + end.y)};
-  Point const normal{-chord.y / length, chord.x / length};
-  Place const gradient = GradientAt(circle, {middle.x, middle.y});
+namespace {
+
+/// The middle of a chord and the unit vector to the left of it; 0 for a chord of no length.
+struct Bisector {
+  Point middle;
+  Point normal;
+
+  Bisector(Point const& start, Point const& end)
+      : middle{0.5 * (start.x + end.x), 0.5 * (start.y + end.y)} {
+    Point const chord = Minus(end, start);
+    double const length = Length(chord);
+    if (length > 0.0) normal = {-chord.y / length, chord.x / length};
+  }
+  /// The place on it at a height above the chord.
+  Point At(double height) const {
+    return {middle.x + height * normal.x, middle.y + height * normal.y};
+  }
+};
+
+}  // namespace
+
+BuiltPiece BuildArcNear(Point const& start, Point const& end, Point const& centre,
+                        double direction) {
+  Bisector const bisector(start, end);
+  double const height = Dot(Minus(centre, bisector.middle), bisector.normal);
+  bool const hasChord = bisector.normal.x != 0.0 || bisector.normal.y != 0.0;
+  return BuildArc(start, end, hasChord ? bisector.At(height) : centre, direction);
+}
+
+BuiltPiece BuildAlong(PlacedCircle const& circle, Point const& start, Point const& end) {
+  double const length = Length(Minus(end, start));
+  if (!(std::fabs(circle.about.a) * length * kFlattest > 1.0)) return BuildSegment(start, end);
+  Bisector const bisector(start, end);
+  Place const gradient = GradientAt(circle, {bisector.middle.x, bisector.middle.y});
   // The centre is where the gradient vanishes: at middle - gradient / (2 a).
-  double const height = -(gradient.x * normal.x + gradient.y * normal.y) / (2.0 * circle.a);
-  Point const centre{middle.x + height * normal.x, middle.y + height * normal.y};
-  return BuildArc(start, end, centre, circle.a > 0.0 ? -1.0 : 1.0);
+  double const height = -Dot({gradient.x, gradient.y}, bisector.normal) / (2.0 * circle.about.a);
+  return BuildArc(start, end, bisector.At(height), circle.about.a > 0.0 ? -1.0 : 1.0);
 }
 
 double DistanceToPiece(BuiltPiece const& piece, WPoint const& p) {
@@ -113,11 +139,11 @@ PieceDeviation MeasurePiece(Path const& path, BuiltPiece const& piece, std::int3
 
 namespace {
 
-Point Nearest(Circle const& circle, WPoint const& p) {
+Point Nearest(PlacedCircle const& circle, WPoint const& p) {
   Place const at{p.x, p.y};
   Place const gradient = GradientAt(circle, at);
   double const length = std::sqrt(gradient.x * gradient.x + gradient.y * gradient.y);
-  double const distance = DistanceOf(circle.a, ValueAt(circle, at));
+  double const distance = DistanceOf(circle.about.a, ValueAt(circle, at));
   if (!(length > 0.0)) return {p.x, p.y};
   return {p.x - distance * gradient.x / length, p.y - distance * gradient.y / length};
 }
@@ -149,7 +175,7 @@ namespace {
 /// allows beside the deviation that it has.
 void DrawBack(Path const& path, ChainPiece const& piece, Point* start, Point* end) {
   auto const drawn = [&](Point const& at, WPoint const& p, double sense) {
-    double const e = DistanceOf(piece.circle.a, ValueAt(piece.circle, {p.x, p.y})) / p.w;
+    double const e = DistanceOf(piece.circle.about.a, ValueAt(piece.circle, {p.x, p.y})) / p.w;
     double const room = e * e < 1.0 ? 0.5 * p.w * std::sqrt(1.0 - e * e) : 0.0;
     Place const gradient = GradientAt(piece.circle, {at.x, at.y});
     Point const moved{at.x + sense * room * gradient.y, at.y - sense * room * gradient.x};
@@ -171,8 +197,11 @@ constexpr double kNearFullTurn = 6.0;
 
 /// The angle that the points of a piece turn about its centre.
 double TurnOf(Path const& path, ChainPiece const& piece) {
-  Turn turn(piece.circle);
-  for (std::int32_t i = piece.first; i < piece.end; ++i) turn.Add({path.At(i).x, path.At(i).y});
+  Turn turn(piece.circle.about);
+  Place const& origin = piece.circle.origin;
+  for (std::int32_t i = piece.first; i < piece.end; ++i) {
+    turn.Add({path.At(i).x - origin.x, path.At(i).y - origin.y});
+  }
   return turn.Angle();
 }
 
@@ -198,7 +227,7 @@ std::vector<BuiltPiece> BuildPieces(Path const& path, Chain const& chain) {
     }
     BuiltPiece built = BuildSegment(start, end);
     // Of a line rounding may leave an arc far flatter than what is asked for.
-    bool const isFlat = 4.0 * std::fabs(piece.circle.a) * path.limits.largestRadius < 1.0;
+    bool const isFlat = 4.0 * std::fabs(piece.circle.about.a) * path.limits.largestRadius < 1.0;
     if (!isFlat && MeasurePiece(path, built, piece.first, piece.end).value > 1.0) {
       built = BuildAlong(piece.circle, start, end);
     }

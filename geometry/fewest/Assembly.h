@@ -22,9 +22,14 @@ BuiltPiece BuildSegment(GeometryUtils::Point const& start, GeometryUtils::Point 
 BuiltPiece BuildArc(GeometryUtils::Point const& start, GeometryUtils::Point const& end,
                     GeometryUtils::Point const& centre, double direction);
 
+/// The arc between two points about the place nearest to a centre that is as far from either: the
+/// rounding of places far from the origin may have moved all three.
+BuiltPiece BuildArcNear(GeometryUtils::Point const& start, GeometryUtils::Point const& end,
+                        GeometryUtils::Point const& centre, double direction);
+
 /// The arc between two points that lies along a circle; the segment when the circle is too flat to
 /// have a centre. The centre is moved onto the bisector of the ends, so that both lie on the arc.
-BuiltPiece BuildAlong(Circle const& circle, GeometryUtils::Point const& start,
+BuiltPiece BuildAlong(PlacedCircle const& circle, GeometryUtils::Point const& start,
                       GeometryUtils::Point const& end);
 
 /// Distance of a point from a piece itself, its ends included.

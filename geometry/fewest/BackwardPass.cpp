@@ -47,7 +47,7 @@ class BackwardPass {
     std::int32_t const first = link.opening.First();
     std::int32_t const last = end.isFree ? path_.Count() : end.gate.split;
     search_.MoveTo(first, last);
-    RunFit fit = search_.FindStraight(link.opening, end);
+    PieceFit fit = search_.FindStraight(link.opening, end);
     if (!fit.isFound || fit.ratio > 1.0) fit = search_.FindBest(link.opening, end, StartFor(k));
     if (!fit.isFound || fit.ratio > kWholeTolerance) return false;
     chain_.pieces[k] = {first, last, fit.circle, fit.ratio};
@@ -68,18 +68,19 @@ class BackwardPass {
   }
 
   /// Between two pieces that end on both sides of a joint there is one that ends there.
-  RunFit StartFor(std::size_t k) const {
+  PieceFit StartFor(std::size_t k) const {
     if (k + 1 == links_.size()) return {links_[k].guess, 0.0, false};
     Link const& next = links_[k + 1];
     Fewest::Place const joint = PlaceOn(chain_.gates[k], chain_.offsets[k]);
     double const low = ValueAt(next.atLow, joint);
     double const high = ValueAt(next.atHigh, joint);
     double const share = low != high ? low / (low - high) : 0.5;
-    Circle const circle = Between(next.atLow, next.atHigh, std::clamp(share, 0.0, 1.0));
+    // Both come from one interval, so their coefficients are about one origin.
+    Circle const circle = Between(next.atLow.about, next.atHigh.about, std::clamp(share, 0.0, 1.0));
     double const form = Form(circle, circle);
     if (!(form > 0.0)) return {links_[k].guess, 0.0, false};
     double const ratio = 1.0 / std::sqrt(form);
-    return {Scaled(circle, ratio), std::max(ratio, 1.0), true};
+    return {{Scaled(circle, ratio), next.atLow.origin}, std::max(ratio, 1.0), true};
   }
 
   Path const& path_;

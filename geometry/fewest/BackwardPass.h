@@ -15,7 +15,7 @@ struct ChainPiece {
   std::int32_t first = 0;
   std::int32_t end = 0;
   /// A normalised circle through both joints.
-  Circle circle;
+  PlacedCircle circle;
   /// Largest deviation in units of the tolerance, over the circle.
   double ratio = 0.0;
 };
@@ -31,10 +31,10 @@ struct Chain {
 struct Link {
   Opening opening;
   /// A circle that covers the points of the piece.
-  Circle guess;
+  PlacedCircle guess;
   /// The pieces before it that end at the ends of the opening.
-  Circle atLow;
-  Circle atHigh;
+  PlacedCircle atLow;
+  PlacedCircle atHigh;
 };
 
 /// A ratio that counts as 1: the tolerances of the search are smaller than the true ones by more.

@@ -14,8 +14,8 @@ constexpr double kRoom = 0.9;
 
 /// The circles of the points before and behind a gap.
 struct Neighbours {
-  RunFit before;
-  RunFit behind;
+  PieceFit before;
+  PieceFit behind;
 
   double Larger() const { return std::max(before.ratio, behind.ratio); }
 };
@@ -31,7 +31,7 @@ class Balancer {
     for (std::size_t k = chain.gates.size(); k-- > 0;) Move(k);
     for (ChainPiece& piece : chain.pieces) {
       search_.MoveTo(piece.first, piece.end);
-      RunFit const fit = search_.FitAlone(piece.first, piece.end);
+      PieceFit const fit = search_.FitAlone(piece.first, piece.end);
       if (!fit.isFound) continue;
       balanced_.leastShare = std::max(balanced_.leastShare, fit.ratio);
       piece.circle = fit.circle;

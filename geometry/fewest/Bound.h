@@ -18,7 +18,7 @@ struct Cover {
   /// The first point of each run.
   std::vector<std::int32_t> starts;
   /// A normalised circle or line that covers the last run, unless this has three points or fewer.
-  Circle last;
+  PlacedCircle last;
 };
 
 /// Covers the points one run after the other; each end is proven. `tell` hears how many points are

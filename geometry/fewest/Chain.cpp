@@ -11,8 +11,8 @@ namespace {
 struct State {
   Opening opening;
   /// The pieces before it that end at the ends of the opening.
-  Circle atLow;
-  Circle atHigh;
+  PlacedCircle atLow;
+  PlacedCircle atHigh;
   std::int32_t previous = -1;  ///< position in the level before
   Reach reach;
 };
@@ -116,15 +116,15 @@ class ChainSearch {
   bool MakeCornerGate(Level const& level, std::int32_t split, Gate* gate) {
     State const* from = BestFor(level, split);
     if (from == nullptr) return false;
-    RunFit const behind =
+    PieceFit const behind =
         path_.limits.looksFar ? search_.FitLongestAlone(split) : FitShortlyBehind(split);
     if (!behind.isFound || behind.ratio > 1.0) return false;
     return CornerGate(path_, split, BeforeCorner(*from, split), behind.circle, gate);
   }
 
   /// The circle of the points that follow a gap.
-  RunFit FitShortlyBehind(std::int32_t split) {
-    RunFit behind;
+  PieceFit FitShortlyBehind(std::int32_t split) {
+    PieceFit behind;
     for (std::int32_t length = kPointsBehind * StrideFrom(path_, split);;) {
       std::int32_t const end = std::min(split + length, path_.Count());
       if (end - split < 2) break;
@@ -138,9 +138,9 @@ class ChainSearch {
   /// The circle of a piece that ends before a gap. Noise near the tolerance leaves both circles of
   /// a corner hardly any room, so that the gate has to pass within a small share of the tolerance
   /// of their crossing: then the smallest largest ratio counts, not only that it is below 1.
-  Circle BeforeCorner(State const& from, std::int32_t split) {
+  PlacedCircle BeforeCorner(State const& from, std::int32_t split) {
     if (!path_.limits.looksFar) return from.reach.circle;
-    RunFit const best = search_.FindBestUpTo(from.opening, split, {from.reach.circle, 1.0, true});
+    PieceFit const best = search_.FindBestUpTo(from.opening, split, {from.reach.circle, 1.0, true});
     return best.isFound ? best.circle : from.reach.circle;
   }
 
@@ -198,8 +198,8 @@ class ChainSearch {
     search_.MoveTo(last.front().opening.First(), path_.Count());
     for (std::size_t i = 0; i < last.size(); ++i) {
       if (last[i].reach.end < path_.Count()) continue;
-      RunFit const fit = search_.FindBest(last[i].opening, path_.finish,
-                                          {last[i].reach.circle, 1.0, path_.finish.isFree});
+      PieceFit const fit = search_.FindBest(last[i].opening, path_.finish,
+                                            {last[i].reach.circle, 1.0, path_.finish.isFree});
       if (fit.isFound && fit.ratio <= kWholeTolerance && (at < 0 || fit.ratio < least)) {
         least = fit.ratio;
         at = static_cast<std::int32_t>(i);

@@ -39,6 +39,14 @@ struct Place {
   double y = 0.0;
 };
 
+/// A normalised circle in the coordinates of the path, with coefficients about an origin near its
+/// points. About an origin that is s away d is of the order of a s^2, and its rounding exceeds what
+/// small tolerances on long paths leave.
+struct PlacedCircle {
+  Circle about;
+  Place origin;
+};
+
 /// The line from one place to another; a line along x for places that coincide.
 inline Circle LineThrough(Place const& p, Place const& q) {
   double const dx = q.x - p.x;
@@ -58,6 +66,21 @@ inline double ValueAt(Circle const& c, Place const& p) {
 /// Gradient of f at a place: the left normal of the path there, of length 1 on a normalised circle.
 inline Place GradientAt(Circle const& c, Place const& p) {
   return {2.0 * c.a * p.x + c.bx, 2.0 * c.a * p.y + c.by};
+}
+
+/// The placed circle times a factor: the same curve.
+inline PlacedCircle Scaled(PlacedCircle const& c, double factor) {
+  return {Scaled(c.about, factor), c.origin};
+}
+
+/// f of a placed circle at a place of the path.
+inline double ValueAt(PlacedCircle const& c, Place const& p) {
+  return ValueAt(c.about, Place{p.x - c.origin.x, p.y - c.origin.y});
+}
+
+/// The gradient of a placed circle at a place of the path.
+inline Place GradientAt(PlacedCircle const& c, Place const& p) {
+  return GradientAt(c.about, Place{p.x - c.origin.x, p.y - c.origin.y});
 }
 
 /// Signed distance of a place with value f from a normalised circle of coefficient a, without the

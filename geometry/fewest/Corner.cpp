@@ -18,7 +18,7 @@ constexpr int kMostSteps = 20;
 double Cross(Place const& a, Place const& b) { return a.x * b.y - a.y * b.x; }
 
 /// The crossing of two circles near a place, by Newton's method.
-bool FindMeeting(Circle const& one, Circle const& other, Place start, Place* meeting) {
+bool FindMeeting(PlacedCircle const& one, PlacedCircle const& other, Place start, Place* meeting) {
   for (int i = 0; i < kMostSteps; ++i) {
     double const f = ValueAt(one, start);
     double const g = ValueAt(other, start);
@@ -37,8 +37,8 @@ bool FindMeeting(Circle const& one, Circle const& other, Place start, Place* mee
 
 }  // namespace
 
-bool CornerGate(Path const& path, std::int32_t split, Circle const& before, Circle const& behind,
-                Gate* gate) {
+bool CornerGate(Path const& path, std::int32_t split, PlacedCircle const& before,
+                PlacedCircle const& behind, Gate* gate) {
   Gate const middle = MiddleGate(path, split, before);
   double const sine = Cross(GradientAt(before, middle.origin), GradientAt(behind, middle.origin));
   if (!(std::fabs(sine) > kLeastSine)) return false;

@@ -11,7 +11,7 @@ namespace Vorn::Fewest {
 /// The gate at the corner where the circle of the points before a gap crosses that of the points
 /// behind it, along their bisector. A joint has to lie near that crossing, which may be far from
 /// the points. False where the two run on smoothly or cross elsewhere.
-bool CornerGate(Path const& path, std::int32_t split, Circle const& before, Circle const& behind,
-                Gate* gate);
+bool CornerGate(Path const& path, std::int32_t split, PlacedCircle const& before,
+                PlacedCircle const& behind, Gate* gate);
 
 }  // namespace Vorn::Fewest

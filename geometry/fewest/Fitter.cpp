@@ -56,7 +56,7 @@ class Fitter {
         progress_(task.progress) {}
 
   /// Whether one piece along a circle that covers all points keeps every promise.
-  bool RunAsOne(Circle const& covering, Answer* answer, Promises::Report* report) const {
+  bool RunAsOne(PlacedCircle const& covering, Answer* answer, Promises::Report* report) const {
     for (Chain const& chain : MakeOnePiece(path_, covering)) {
       if (KeepsCentred(path_, 0, chain, answer, report)) return true;
       RoundEnds(Tightest(points_).w, answer);
@@ -248,7 +248,8 @@ class Fitter {
 
 }  // namespace
 
-bool FindContour(FitTask task, Circle const* covering, Answer* answer, Promises::Report* report) {
+bool FindContour(FitTask task, PlacedCircle const* covering, Answer* answer,
+                 Promises::Report* report) {
   Fitter fitter(std::move(task));
   if (covering != nullptr && fitter.RunAsOne(*covering, answer, report)) return true;
   return fitter.Run(answer, report);

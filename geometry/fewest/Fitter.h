@@ -37,6 +37,7 @@ struct FitTask {
 /// The first contour found that keeps every promise, with what was measured on it; false when there
 /// is none. `covering` is a circle that covers all points, which is then tried first; null for
 /// none.
-bool FindContour(FitTask task, Circle const* covering, Answer* answer, Promises::Report* report);
+bool FindContour(FitTask task, PlacedCircle const* covering, Answer* answer,
+                 Promises::Report* report);
 
 }  // namespace Vorn::Fewest

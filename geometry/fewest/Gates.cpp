@@ -21,4 +21,10 @@ bool FindCrossing(Circle const& circle, Gate const& gate, double* offset) {
   return true;
 }
 
+bool FindCrossing(PlacedCircle const& circle, Gate const& gate, double* offset) {
+  Gate near = gate;
+  near.origin = {gate.origin.x - circle.origin.x, gate.origin.y - circle.origin.y};
+  return FindCrossing(circle.about, near, offset);
+}
+
 }  // namespace Vorn::Fewest

@@ -41,6 +41,9 @@ inline Place PlaceOn(Gate const& gate, double offset) {
 /// Offset at which a circle crosses a gate, in the coordinates of both; false when it does not.
 bool FindCrossing(Circle const& circle, Gate const& gate, double* offset);
 
+/// The same for a circle of the path.
+bool FindCrossing(PlacedCircle const& circle, Gate const& gate, double* offset);
+
 /// A gate with the offsets at which the piece before can end.
 struct Opening {
   Gate gate;

@@ -27,7 +27,7 @@ class FreeRun {
 
   /// The circle that covers the run found last, in the coordinates of the points. Runs of three
   /// points or fewer are covered without one.
-  Circle Covering() const { return LocalFrame().Convert(frame_, circle_); }
+  PlacedCircle Covering() const { return frame_.FromLocal(circle_); }
 
  private:
   /// Moves the local coordinates to a start and empties the programme but for the limits of radii.

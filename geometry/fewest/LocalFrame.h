@@ -28,20 +28,23 @@ struct LocalFrame {
   Place ToLocal(Place const& p) const { return {(p.x - originX) * scale, (p.y - originY) * scale}; }
   /// A place in the coordinates of the path.
   Place FromLocal(Place const& p) const { return {p.x / scale + originX, p.y / scale + originY}; }
-  /// A normalised circle of another frame in this one.
-  Circle Convert(LocalFrame const& other, Circle const& c) const {
-    // With p' = (p + shift) factor in the other frame, f / factor is the value in units of this
-    // one.
-    double const factor = other.scale / scale;
-    double const shiftX = (originX - other.originX) * scale;
-    double const shiftY = (originY - other.originY) * scale;
+  /// A normalised circle in local coordinates.
+  Circle ToLocal(PlacedCircle const& placed) const {
+    // With p / scale + shift for a place p, f scale is the value in local units.
+    Circle const& c = placed.about;
+    double const shiftX = (originX - placed.origin.x) * scale;
+    double const shiftY = (originY - placed.origin.y) * scale;
     Circle moved;
-    moved.a = c.a * factor;
+    moved.a = c.a / scale;
     moved.bx = c.bx + 2.0 * moved.a * shiftX;
     moved.by = c.by + 2.0 * moved.a * shiftY;
-    moved.d = c.d / factor + c.bx * shiftX + c.by * shiftY +
-              moved.a * (shiftX * shiftX + shiftY * shiftY);
+    moved.d =
+        c.d * scale + c.bx * shiftX + c.by * shiftY + moved.a * (shiftX * shiftX + shiftY * shiftY);
     return moved;
+  }
+  /// A normalised local circle in the coordinates of the path. Exact.
+  PlacedCircle FromLocal(Circle const& c) const {
+    return {{c.a * scale, c.bx, c.by, c.d / scale}, {originX, originY}};
   }
 };
 

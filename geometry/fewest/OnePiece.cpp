@@ -7,7 +7,7 @@ namespace Vorn::Fewest {
 namespace {
 
 /// The circle with the sign with which the points run along it.
-Circle AlongPath(Path const& path, Circle const& circle) {
+PlacedCircle AlongPath(Path const& path, PlacedCircle const& circle) {
   double advance = 0.0;
   for (std::int32_t i = 1; i < path.Count(); ++i) {
     WPoint const& p = path.At(i - 1);
@@ -18,7 +18,7 @@ Circle AlongPath(Path const& path, Circle const& circle) {
   return advance < 0.0 ? Scaled(circle, -1.0) : circle;
 }
 
-Chain ChainOf(Path const& path, Circle const& circle, double ratio) {
+Chain ChainOf(Path const& path, PlacedCircle const& circle, double ratio) {
   Chain chain;
   chain.pieces.push_back({0, path.Count(), AlongPath(path, circle), ratio});
   return chain;
@@ -26,13 +26,13 @@ Chain ChainOf(Path const& path, Circle const& circle, double ratio) {
 
 }  // namespace
 
-std::vector<Chain> MakeOnePiece(Path const& path, Circle const& covering) {
+std::vector<Chain> MakeOnePiece(Path const& path, PlacedCircle const& covering) {
   constexpr double kWholeShare = 1.0;
   PieceSearch search(path, kWholeShare);
   search.MoveTo(0, path.Count());
   std::vector<Chain> chains;
-  Circle const along = AlongPath(path, covering);
-  RunFit const best = search.FindBest(path.start, path.finish, {along, 1.0, false});
+  PlacedCircle const along = AlongPath(path, covering);
+  PieceFit const best = search.FindBest(path.start, path.finish, {along, 1.0, false});
   if (best.isFound) chains.push_back(ChainOf(path, best.circle, best.ratio));
   chains.push_back(ChainOf(path, along, 1.0));
   return chains;

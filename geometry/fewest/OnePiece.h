@@ -11,6 +11,6 @@ namespace Vorn::Fewest {
 /// Chains of one piece for an open path that `covering` passes within tolerance, the one of the
 /// smallest largest ratio first. The whole tolerances count, so that points exactly at theirs are
 /// covered; what the chains promise has to be measured.
-std::vector<Chain> MakeOnePiece(Path const& path, Circle const& covering);
+std::vector<Chain> MakeOnePiece(Path const& path, PlacedCircle const& covering);
 
 }  // namespace Vorn::Fewest

@@ -45,7 +45,7 @@ std::int32_t StrideFrom(Path const& path, std::int32_t point) {
   return i - point;
 }
 
-Gate MiddleGate(Path const& path, std::int32_t split, Circle const& before) {
+Gate MiddleGate(Path const& path, std::int32_t split, PlacedCircle const& before) {
   WPoint const& last = path.At(split - 1);
   WPoint const& first = path.At(split);
   Gate gate;

@@ -44,7 +44,7 @@ std::int32_t StrideFrom(Path const& path, std::int32_t point);
 
 /// The gate in the middle of the gap before point `split`, square to the path, which is that of
 /// `before`, the piece before it, where the points are too dense to tell.
-Gate MiddleGate(Path const& path, std::int32_t split, Circle const& before);
+Gate MiddleGate(Path const& path, std::int32_t split, PlacedCircle const& before);
 
 /// Unit vector to the left of the way from one point to another; 0 for coinciding points.
 Place LeftNormal(WPoint const& from, WPoint const& to);

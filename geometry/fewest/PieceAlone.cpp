@@ -13,28 +13,24 @@ constexpr std::int32_t kFirstStrides = 16;
 
 }  // namespace
 
-RunFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
+PieceFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
   UseRows(first, last);
   Simplex simplex(slack_);
   Basis basis;
-  RunFit fit = FitRun(programme_,
-                      {LineThrough(PlaceOf(frame_.ToLocal(path_.At(first))),
-                                   PlaceOf(frame_.ToLocal(path_.At(last - 1)))),
-                       0.0, false},
-                      false, &simplex, &basis);
-  if (fit.isFound) fit.circle = FromLocal(fit.circle);
-  return fit;
+  Circle const chord = LineThrough(PlaceOf(frame_.ToLocal(path_.At(first))),
+                                   PlaceOf(frame_.ToLocal(path_.At(last - 1))));
+  return FromLocal(FitRun(programme_, {chord, 0.0, false}, false, &simplex, &basis));
 }
 
-RunFit PieceSearch::FitLongestAlone(std::int32_t first) {
+PieceFit PieceSearch::FitLongestAlone(std::int32_t first) {
   std::int32_t const count = path_.Count();
   std::int32_t good = first + 2;
   std::int32_t bad = count + 1;
   std::int32_t target = first + kFirstStrides * StrideFrom(path_, first);
-  RunFit longest;
+  PieceFit longest;
   while (good + 1 < bad && good < count) {
     target = std::clamp(target, good + 1, std::min(bad - 1, count));
-    RunFit const fit = FitAlone(first, target);
+    PieceFit const fit = FitAlone(first, target);
     if (fit.isFound && fit.ratio <= 1.0) {
       good = target;
       longest = fit;

@@ -41,13 +41,13 @@ RunFit StepWithin(RunFit const& from, Circle const& to) {
 
 }  // namespace
 
-Interval PieceSearch::FindInterval(Opening const& from, Gate const& to, Circle const& known) {
+Interval PieceSearch::FindInterval(Opening const& from, Gate const& to, PlacedCircle const& known) {
   BeginProgramme(from, to.split);
   Opening const end{to, to.least, to.greatest, false};
   AddOpening(end);
   std::int32_t const first = from.First();
   Ends const ends{&from, &end, first, to.split};
-  RunFit const inner = Fit({ToLocal(known), 0.0, false}, false, ends);
+  RunFit const inner = Fit({frame_.ToLocal(known), 0.0, false}, false, ends);
   if (!inner.isFound || inner.ratio > 1.0) return {};
   bool const isBent = std::fabs(inner.circle.a) >= kStepShare * Flattest();
   if (Flattest() > 0.0 && isBent && !KeepBent(inner.circle)) return {};
@@ -57,7 +57,7 @@ Interval PieceSearch::FindInterval(Opening const& from, Gate const& to, Circle c
   Extreme const high = FindExtreme(ends, inner, false);
   if (!low.isFound || !high.isFound || low.offset > high.offset) return {};
   return {std::max(low.offset, to.least), std::min(high.offset, to.greatest), true,
-          FromLocal(low.circle), FromLocal(high.circle)};
+          frame_.FromLocal(low.circle), frame_.FromLocal(high.circle)};
 }
 
 PieceSearch::Extreme PieceSearch::FindExtreme(Ends const& ends, RunFit const& inner, bool isLow) {

@@ -39,14 +39,6 @@ void PieceSearch::SetShare(double share) {
   columns_.Clear();
 }
 
-Circle PieceSearch::ToLocal(Circle const& circle) const {
-  return frame_.Convert(LocalFrame(), circle);
-}
-
-Circle PieceSearch::FromLocal(Circle const& circle) const {
-  return LocalFrame().Convert(frame_, circle);
-}
-
 void PieceSearch::MoveTo(std::int32_t first, std::int32_t last) {
   columns_.Clear();
   columnsFirst_ = first;
@@ -216,7 +208,7 @@ RunFit PieceSearch::FirstFit(Opening const& from, std::int32_t end) {
   return best;
 }
 
-Reach PieceSearch::FindFirstReach(Opening const& from) {
+PieceSearch::LocalReach PieceSearch::FindFirstReach(Opening const& from) {
   std::int32_t const first = from.First();
   std::int32_t const stride = StrideFrom(path_, first);
   std::int32_t const longest = std::min(first + kShortRun * stride, path_.Count());
@@ -229,10 +221,9 @@ Reach PieceSearch::FindFirstReach(Opening const& from) {
 }
 
 Reach PieceSearch::FindReach(Opening const& from, std::int32_t expected) {
-  Reach reach = FindFirstReach(from);
+  LocalReach reach = FindFirstReach(from);
   if (reach.canGrow) Grow(from, expected, &reach);
-  reach.circle = FromLocal(reach.circle);
-  return reach;
+  return {reach.end, frame_.FromLocal(reach.circle)};
 }
 
 Reach PieceSearch::FindReachBeyond(Opening const& from, Reach const& rival) {
@@ -242,15 +233,14 @@ Reach PieceSearch::FindReachBeyond(Opening const& from, Reach const& rival) {
   }
   BeginProgramme(from, rival.end);
   Ends const ends{&from, nullptr, first, rival.end};
-  RunFit const fit = Fit({ToLocal(rival.circle), 0.0, false}, true, ends);
-  if (!fit.isFound || fit.ratio > 1.0) return {rival.end - 1, rival.circle, false};
-  Reach reach{rival.end, fit.circle, true};
+  RunFit const fit = Fit({frame_.ToLocal(rival.circle), 0.0, false}, true, ends);
+  if (!fit.isFound || fit.ratio > 1.0) return {rival.end - 1, rival.circle};
+  LocalReach reach{rival.end, fit.circle, true};
   Grow(from, rival.end + 1, &reach);
-  reach.circle = FromLocal(reach.circle);
-  return reach;
+  return {reach.end, frame_.FromLocal(reach.circle)};
 }
 
-void PieceSearch::Grow(Opening const& from, std::int32_t expected, Reach* reach) {
+void PieceSearch::Grow(Opening const& from, std::int32_t expected, LocalReach* reach) {
   std::int32_t const first = from.First();
   std::int32_t const count = path_.Count();
   std::int32_t bad = count + 1;
@@ -273,22 +263,20 @@ void PieceSearch::Grow(Opening const& from, std::int32_t expected, Reach* reach)
   }
 }
 
-RunFit PieceSearch::FindBest(Opening const& from, Opening const& to, RunFit const& start) {
+PieceFit PieceSearch::FindBest(Opening const& from, Opening const& to, PieceFit const& start) {
   std::int32_t const end = to.isFree ? path_.Count() : to.gate.split;
   BeginProgramme(from, end);
   AddOpening(to);
   return FitFrom(start, {&from, &to, from.First(), end});
 }
 
-RunFit PieceSearch::FindBestUpTo(Opening const& from, std::int32_t end, RunFit const& start) {
+PieceFit PieceSearch::FindBestUpTo(Opening const& from, std::int32_t end, PieceFit const& start) {
   BeginProgramme(from, end);
   return FitFrom(start, {&from, nullptr, from.First(), end});
 }
 
-RunFit PieceSearch::FitFrom(RunFit const& start, Ends const& ends) {
-  RunFit fit = Fit({ToLocal(start.circle), start.ratio, start.isFound}, false, ends);
-  if (fit.isFound) fit.circle = FromLocal(fit.circle);
-  return fit;
+PieceFit PieceSearch::FitFrom(PieceFit const& start, Ends const& ends) {
+  return FromLocal(Fit({frame_.ToLocal(start.circle), start.ratio, start.isFound}, false, ends));
 }
 
 }  // namespace Vorn::Fewest

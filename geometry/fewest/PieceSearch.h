@@ -19,10 +19,15 @@ namespace Vorn::Fewest {
 struct Reach {
   /// One past the last point covered.
   std::int32_t end = 0;
-  /// A circle that covers them, in the coordinates of the path.
-  Circle circle;
-  /// Whether more points may be covered than are.
-  bool canGrow = false;
+  /// A circle that covers them.
+  PlacedCircle circle;
+};
+
+/// A circle of the path and how it meets what is asked of it, as in RunFit.
+struct PieceFit {
+  PlacedCircle circle;
+  double ratio = 0.0;
+  bool isFound = false;
 };
 
 /// Offsets at which a piece can end on a gate.
@@ -30,9 +35,9 @@ struct Interval {
   double low = 0.0;
   double high = 0.0;
   bool isFound = false;
-  /// The pieces that end there.
-  Circle atLow;
-  Circle atHigh;
+  /// The pieces that end there, about one origin.
+  PlacedCircle atLow;
+  PlacedCircle atHigh;
 };
 
 /// Where the piece behind a gate may start when the one before ends within an interval.
@@ -63,27 +68,27 @@ class PieceSearch {
 
   /// The offsets at which a piece from an opening can end on a gate; `known` is a circle that
   /// covers the points before it.
-  Interval FindInterval(Opening const& from, Gate const& to, Circle const& known);
+  Interval FindInterval(Opening const& from, Gate const& to, PlacedCircle const& known);
 
   /// The piece of the smallest largest ratio between two openings; a free opening stands for the
   /// end of the path.
   /// `start` is a circle to begin with; isFound when it is a piece of its ratio.
-  RunFit FindBest(Opening const& from, Opening const& to, RunFit const& start);
+  PieceFit FindBest(Opening const& from, Opening const& to, PieceFit const& start);
 
   /// The same among straight pieces; not found where there is none within tolerance, and where all
   /// pieces are straight anyway.
-  RunFit FindStraight(Opening const& from, Opening const& to);
+  PieceFit FindStraight(Opening const& from, Opening const& to);
 
   /// The same as FindBest where the piece may end anywhere behind its last point, the one before
   /// `end`.
-  RunFit FindBestUpTo(Opening const& from, std::int32_t end, RunFit const& start);
+  PieceFit FindBestUpTo(Opening const& from, std::int32_t end, PieceFit const& start);
 
   /// The circle of the smallest largest ratio through some points alone; its guess is their chord.
-  RunFit FitAlone(std::int32_t first, std::int32_t last);
+  PieceFit FitAlone(std::int32_t first, std::int32_t last);
 
   /// The same for the longest run from a point on that a circle was found for; not found where two
   /// points are left or fewer.
-  RunFit FitLongestAlone(std::int32_t first);
+  PieceFit FitLongestAlone(std::int32_t first);
 
  private:
   /// Has the rows of the points [first, last) in the columns; moves the local coordinates where
@@ -130,21 +135,27 @@ class PieceSearch {
   RunFit FitAnyRadius(RunFit const& start, bool isTest, Ends const& ends);
   /// The rules in the local coordinates of now.
   PieceRules Rules() { return {path_, frame_, share_, &programme_}; }
-  /// The longest run of few points, each length begun anew from several chords. The circle is in
-  /// local coordinates.
-  Reach FindFirstReach(Opening const& from);
-  /// Lengthens a reach by doubling steps and then by bisection; the circle is in local coordinates.
-  void Grow(Opening const& from, std::int32_t expected, Reach* reach);
+  /// A reach in local coordinates.
+  struct LocalReach {
+    std::int32_t end = 0;
+    Circle circle;
+    /// Whether more points may be covered than are.
+    bool canGrow = false;
+  };
+  /// The longest run of few points, each length begun anew from several chords.
+  LocalReach FindFirstReach(Opening const& from);
+  /// Lengthens a reach by doubling steps and then by bisection.
+  void Grow(Opening const& from, std::int32_t expected, LocalReach* reach);
   /// The fit of the programme for a start in the coordinates of the path, and in these.
-  RunFit FitFrom(RunFit const& start, Ends const& ends);
+  PieceFit FitFrom(PieceFit const& start, Ends const& ends);
+  /// A fit of the programme in the coordinates of the path.
+  PieceFit FromLocal(RunFit const& fit) const {
+    return {frame_.FromLocal(fit.circle), fit.ratio, fit.isFound};
+  }
+
   /// The best of fits that begin with chords to points ever further ahead; ends with the first that
   /// covers all points.
   RunFit FirstFit(Opening const& from, std::int32_t end);
-  /// A normalised circle of the path in local coordinates.
-  Circle ToLocal(Circle const& circle) const;
-  /// A normalised local circle in the coordinates of the path.
-  Circle FromLocal(Circle const& circle) const;
-
   Path const& path_;
   double share_;
   double slack_ = 0.0;

@@ -62,7 +62,7 @@ CutPath CutAt(Path const& path, Seam const& seam) {
 
 /// Where the input ends: in the middle of the way from the last point to the first, or at the
 /// first where they coincide.
-Seam SeamAtEnds(Path const& path, Circle const& circle) {
+Seam SeamAtEnds(Path const& path, PlacedCircle const& circle) {
   WPoint const& last = path.points.back();
   WPoint const& first = path.points.front();
   Place const middle{0.5 * (first.x + last.x), 0.5 * (first.y + last.y)};
@@ -100,7 +100,7 @@ std::vector<CutPath> CutAtJoints(Path const& path, Chain const& open, std::size_
 namespace {
 
 /// A full circle as two halves, where one circle covers all points; empty where it does not.
-Chain FollowHalves(CutPath const& cut, double share, Circle const& circle) {
+Chain FollowHalves(CutPath const& cut, double share, PlacedCircle const& circle) {
   std::int32_t const count = cut.path.Count();
   std::int32_t const half = count / 2;
   if (half < 1) return {};

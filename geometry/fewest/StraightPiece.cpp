@@ -29,7 +29,7 @@ bool IsClearlyBent(Path const& path, std::int32_t first, std::int32_t end) {
 
 }  // namespace
 
-RunFit PieceSearch::FindStraight(Opening const& from, Opening const& to) {
+PieceFit PieceSearch::FindStraight(Opening const& from, Opening const& to) {
   if (path_.limits.segmentsOnly) return {};
   std::int32_t const first = from.First();
   std::int32_t const end = to.isFree ? path_.Count() : to.gate.split;
@@ -42,10 +42,8 @@ RunFit PieceSearch::FindStraight(Opening const& from, Opening const& to) {
                               ? Place{path_.At(point).x, path_.At(point).y}
                               : PlaceOn(opening.gate, 0.5 * (opening.low + opening.high)));
   };
-  RunFit fit = FitAnyRadius({LineThrough(endOf(from, first), endOf(to, end - 1)), 0.0, false},
-                            false, {&from, &to, first, end});
-  if (fit.isFound) fit.circle = FromLocal(fit.circle);
-  return fit;
+  Circle const chord = LineThrough(endOf(from, first), endOf(to, end - 1));
+  return FromLocal(FitAnyRadius({chord, 0.0, false}, false, {&from, &to, first, end}));
 }
 
 }  // namespace Vorn::Fewest

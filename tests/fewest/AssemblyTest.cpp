@@ -51,19 +51,32 @@ TEST(DistanceToPiece, OfAnArcOfMoreThanHalfATurnLeavesOutTheGap) {
 }
 
 TEST(BuildAlong, CircleWithoutCurvatureGivesASegment) {
-  Circle const line{0.0, 0.0, 1.0, 0.0};
+  PlacedCircle const line{{0.0, 0.0, 1.0, 0.0}, {0.0, 0.0}};
   EXPECT_EQ(BuildAlong(line, {0, 0}, {4, 0}).elem.type, GeometryUtils::ElemType::Segment);
 }
 
 TEST(BuildAlong, CentreLiesOnTheBisectorOfTheEnds) {
   // a (x^2 + y^2) - r / 2 with a = 1 / (2 r), r = 5: the circle about the origin.
-  Circle const circle{0.1, 0.0, 0.0, -2.5};
+  PlacedCircle const circle{{0.1, 0.0, 0.0, -2.5}, {0.0, 0.0}};
   BuiltPiece const arc = BuildAlong(circle, {5, 0}, {0, 5});
   ASSERT_EQ(arc.elem.type, GeometryUtils::ElemType::Arc);
   EXPECT_NEAR(arc.elem.center.x, 0.0, 1e-14);
   EXPECT_NEAR(arc.elem.center.y, 0.0, 1e-14);
   EXPECT_NEAR(arc.elem.radius, 5.0, 1e-14);
   EXPECT_EQ(std::fabs(arc.elem.direction), 1.0);
+}
+
+TEST(BuildArcNear, MovesTheCentreToTheSameDistanceFromBothEnds) {
+  BuiltPiece const arc = BuildArcNear({5, 0}, {0, 5}, {0.5, -0.5}, 1.0);
+  EXPECT_NEAR(arc.elem.center.x, 0.0, 1e-15);
+  EXPECT_NEAR(arc.elem.center.y, 0.0, 1e-15);
+  EXPECT_NEAR(arc.elem.radius, 5.0, 1e-15);
+}
+
+TEST(BuildArcNear, KeepsTheCentreOfEndsThatCoincide) {
+  BuiltPiece const arc = BuildArcNear({5, 0}, {5, 0}, {1, 2}, 1.0);
+  EXPECT_EQ(arc.elem.center.x, 1.0);
+  EXPECT_EQ(arc.elem.center.y, 2.0);
 }
 
 TEST(BuildArc, LengthsWhoseSquaresAreNoDoublesHaveARadius) {

@@ -37,8 +37,8 @@ TEST(ReversedChain, TwiceIsTheChainItself) {
   for (std::size_t k = 0; k < chain.pieces.size(); ++k) {
     EXPECT_EQ(twice.pieces[k].first, chain.pieces[k].first);
     EXPECT_EQ(twice.pieces[k].end, chain.pieces[k].end);
-    EXPECT_EQ(twice.pieces[k].circle.d, chain.pieces[k].circle.d);
-    EXPECT_EQ(twice.pieces[k].circle.a, chain.pieces[k].circle.a);
+    EXPECT_EQ(twice.pieces[k].circle.about.d, chain.pieces[k].circle.about.d);
+    EXPECT_EQ(twice.pieces[k].circle.about.a, chain.pieces[k].circle.about.a);
   }
   for (std::size_t k = 0; k < chain.gates.size(); ++k) {
     EXPECT_EQ(twice.gates[k].split, chain.gates[k].split);
@@ -60,7 +60,8 @@ TEST(ReversedChain, HasItsJointsOnBothCirclesAndCoversTheReversedPoints) {
     covered = piece.end;
     for (std::int32_t i = piece.first; i < piece.end; ++i) {
       WPoint const& p = back.At(i);
-      EXPECT_LE(std::fabs(DistanceOf(piece.circle.a, ValueAt(piece.circle, {p.x, p.y}))), p.w);
+      EXPECT_LE(std::fabs(DistanceOf(piece.circle.about.a, ValueAt(piece.circle, {p.x, p.y}))),
+                p.w);
     }
     if (k + 1 == chain.pieces.size()) break;
     Place const joint = PlaceOn(chain.gates[k], chain.offsets[k]);

@@ -88,6 +88,20 @@ TEST(FewestPiecesInvariants, MovingByAHundredMillionTolerancesKeepsTheNumber) {
   }
 }
 
+// Pieces far from the start of the path have as many digits as those near it. Each length is up to
+// 5e8 times the tolerance.
+TEST(FewestPiecesInvariants, PiecesFarFromTheStartKeepTheNumber) {
+  for (double const length : {1e5, 1e6, 1e7}) {
+    for (ProfileStyle const style : {ProfileStyle::Smooth, ProfileStyle::Mixed}) {
+      SCOPED_TRACE(testing::Message() << "length " << length);
+      Scan scan = MakeProfileBehindALongLine(1, style, length);
+      EXPECT_EQ(PieceCount(FitKept(scan)), 16);
+      std::reverse(scan.begin(), scan.end());
+      EXPECT_EQ(PieceCount(FitKept(scan)), 16);
+    }
+  }
+}
+
 TEST(FewestPiecesInvariants, PowersOfTwoScaleTheBits) {
   for (Scan const& scan : Profiles(400)) {
     FewestResult const result = FitKept(scan);

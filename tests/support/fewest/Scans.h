@@ -127,6 +127,18 @@ inline Scan MakeNoisyProfile(std::uint64_t seed, ProfileStyle style, std::int32_
   return SampleWithNormalNoise(&random, pieces, count, 0.02, noise);
 }
 
+/// The same with its first line lengthened backwards: points far apart up to `length` before it.
+inline Scan MakeProfileBehindALongLine(std::uint64_t seed, ProfileStyle style, double length) {
+  constexpr std::int32_t kPointsOnLine = 40;
+  Scan scan;
+  for (std::int32_t i = 0; i < kPointsOnLine; ++i) {
+    scan.push_back({-length * (kPointsOnLine - i) / kPointsOnLine, 0.0, 0.02});
+  }
+  Scan const profile = MakeNoisyProfile(seed, style, 1, 1000, 0.45);
+  scan.insert(scan.end(), profile.begin(), profile.end());
+  return scan;
+}
+
 /// One arc of 270 degrees, radius 50, tolerance 0.02.
 inline Scan MakeNoisyArc(std::uint64_t seed, std::int32_t count, double noise) {
   RandomGeometry random(seed);
