@@ -1,11 +1,11 @@
 // The readers of contours and points on any bytes: an answer or a failure that says where.
 #include <array>
-#include <cmath>
 #include <cstdint>
 #include <string>
 
 #include "Input.h"
 #include "Require.h"
+#include "Texts.h"
 #include "vorn/io/ContourFile.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Formats.h"
@@ -16,23 +16,6 @@ namespace {
 
 constexpr std::array kFormats = {IO::Format::Json, IO::Format::Csv, IO::Format::Dxf,
                                  IO::Format::GCode, IO::Format::Wkt};
-
-bool IsFinite(IO::XY const& p) { return std::isfinite(p.x) && std::isfinite(p.y); }
-
-void RequireSound(IO::ContourFile const& contour) {
-  Require(!contour.pieces.empty(), "a contour that was read has pieces");
-  for (IO::Piece const& piece : contour.pieces) {
-    Require(IsFinite(piece.start) && IsFinite(piece.end), "ends are finite");
-    Require(!piece.IsArc() || (IsFinite(piece.center) && piece.radius > 0.0),
-            "arcs have a centre and a radius");
-  }
-}
-
-void RequirePlace(IO::Failure const& failure) {
-  Require(failure.Kind() == IO::FailureKind::File, "bad text is the file's fault");
-  Require(failure.Where().file == "f", "the failure names the file");
-  Require(!failure.Message().empty(), "the failure says what is wrong");
-}
 
 }  // namespace
 }  // namespace Vorn::Fuzz

@@ -118,6 +118,8 @@ void SvgPen::CircleTo(SvgArc const& arc, XY const& to) {
 
 void SvgPen::EllipseTo(SvgArc const& arc, XY const& to) {
   EllipseArc const local = EllipseThrough(at_, to, arc);
+  // A half axis whose square is zero, beside the way between the ends.
+  if (!std::isfinite(local.to)) element_.Refuse("an arc has a half axis that is too short");
   EllipseArc const mapped = {map_(local.center), map_.OfDirection(local.first),
                              map_.OfDirection(local.second), local.from, local.to};
   std::vector<BezierCurve> curves = CurvesOf(mapped);

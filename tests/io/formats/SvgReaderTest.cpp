@@ -255,6 +255,8 @@ TEST(ParseSvg, NamesPlaceAndElement) {
             "p.svg:2:1: path: '1e200', character 9 of an attribute, is too large");
   EXPECT_EQ(PathComplaint("M 0 0 A 1 1 0 2 0 1 1"),
             "p.svg:2:1: path: '2', character 15 of an attribute, is neither 0 nor 1");
+  EXPECT_EQ(PathComplaint("M 0 0 A 1e-200 1 0 0 1 2 0"),
+            "p.svg:2:1: path: an arc has a half axis that is too short");
   EXPECT_EQ(Complaint("<polyline points='0 0 1'/>"),
             "p.svg:2:1: polyline: the last of its points has no y");
   EXPECT_EQ(Complaint("<line x2='5mm'/>"),
