@@ -33,8 +33,9 @@ def _without(command, *unwanted):
     return [word for word in command if word not in unwanted]
 
 
-def _without_cache(words):
-    """The compiler and its options, without what runs it through the compiler cache."""
+def without_launcher(words):
+    """The words of a compilation without the compiler cache ahead of them, which CMake may call
+    with variables of its own: "cmake -E env NAME=VALUE ccache c++ ..."."""
     names = [pathlib.Path(word).name for word in words]
     return words[names.index("ccache") + 1:] if "ccache" in names else words
 
@@ -51,8 +52,10 @@ class Build:
     def make(self, jobs):
         if not (self.folder / "build.ninja").exists():
             run_quietly(["cmake", "--preset", self.preset, "-B", str(self.folder),
-                         "-DVORN_BUILD_PYTHON=OFF", "-DVORN_BUILD_BENCHMARKS=OFF",
-                         "-DVORN_BUILD_IO=OFF", "-DVORN_BUILD_CLI=OFF", "-DVORN_BUILD_FUZZ=OFF",
+                         # Objects are compiled by themselves, each with what it includes.
+                         "-DCMAKE_DISABLE_PRECOMPILE_HEADERS=ON", "-DVORN_BUILD_PYTHON=OFF",
+                         "-DVORN_BUILD_BENCHMARKS=OFF", "-DVORN_BUILD_IO=OFF",
+                         "-DVORN_BUILD_CLI=OFF", "-DVORN_BUILD_FUZZ=OFF",
                          "-DVORN_BUILD_EXAMPLES=OFF"], cwd=ROOT)
         run_quietly(["cmake", "--build", str(self.folder), "--parallel", str(jobs), "--target",
                      "GeometryUtils", *PROGRAMS])
@@ -63,7 +66,7 @@ class Build:
         """How each object is compiled: object, relative to the build folder -> words."""
         self.commands = {}
         for entry in json.loads((self.folder / "compile_commands.json").read_text()):
-            words = _without_cache(shlex.split(entry["command"]))
+            words = without_launcher(shlex.split(entry["command"]))
             self.commands[words[words.index("-o") + 1]] = words
         self.core_objects = [name for name in self.commands if "/GeometryUtils.dir/" in name]
         self.test_objects = {
