@@ -90,7 +90,7 @@ TEST(ErrorOfGetArea, OfAFlatPolylineIsBoundedByItsProducts) {
 /// A lens of two arcs between two points: their own terms as above, and of the sweep, below a turn,
 /// 1.1e-14 of the square of the radius.
 TEST(ErrorOfGetArea, OfArcsIsBoundedByTheirTermsAndRadii) {
-  ForEachCase(3, Worst("GetArea(contour), two arcs", 32.0), [](Inputs& in, Worst* worst) {
+  ForEachCase(3, Worst("GetArea(contour), two arcs", 16.0), [](Inputs& in, Worst* worst) {
     auto& random = in.Random();
     Point const centre = in.Point();
     double const radius = in.Positive();
@@ -217,7 +217,7 @@ struct TwoTriangles {
 /// Measured, not derived: the largest of some millions of cases and half as much again.
 TEST(ErrorOfGetOverlapping, IsBoundedByTheCoordinatesInGeneralPosition) {
   ForEachCase(
-      4, Worst("GetOverlapping, area, of the largest square", 16.0), [](Inputs& in, Worst* worst) {
+      4, Worst("GetOverlapping, area, of the largest square", 8.0), [](Inputs& in, Worst* worst) {
         TwoTriangles const both(&in);
         if (!both.AreInGeneralPosition()) return;
         std::vector<Triangle> common;
@@ -234,7 +234,7 @@ TEST(ErrorOfGetOverlapping, IsBoundedByTheCoordinatesInGeneralPosition) {
 /// cases and half as much again.
 TEST(ErrorOfLinearEquationSystemSolve, LeavesAResidueOfFewEps) {
   constexpr int kMost = 6;
-  ForEachCase(5, Worst("LinearEquationSystemSolve, residue of a row", 16.0),
+  ForEachCase(5, Worst("LinearEquationSystemSolve, residue of a row", 2.0),
               [](Inputs& in, Worst* worst) {
                 int const n = in.Random().Integer(1, kMost);
                 std::vector<double> matrix(static_cast<std::size_t>(n * n));

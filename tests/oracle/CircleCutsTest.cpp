@@ -166,7 +166,7 @@ constexpr double kFrom = 0.0;
 constexpr double kTo = -1e-9;
 
 TEST(ErrorOfGetCircleArcAndCircleArcIntersection, IsBoundedByTheChord) {
-  ForEachCase(5, Worst("GetCircleArcAndCircleArcIntersection", 4.0), [](Inputs& in, Worst* worst) {
+  ForEachCase(5, Worst("GetCircleArcAndCircleArcIntersection", 2.0), [](Inputs& in, Worst* worst) {
     TwoCircles const c(&in);
     RealPoint const between = Exact(c.second) - Exact(c.first);
     Real const distance = Length(between);

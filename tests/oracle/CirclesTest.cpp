@@ -60,7 +60,7 @@ struct ThreePoints {
 };
 
 /// Measured, not derived: the largest of some millions of cases and half as much again.
-constexpr double kCentre = 6.0;
+constexpr double kCentre = 2.0;
 
 void NoteCircle(ThreePoints const& points, RealPoint const& centre, double radius, Worst* worst) {
   worst->Note(Length(centre - points.Centre()), points.Unit());

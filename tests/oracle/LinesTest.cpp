@@ -170,7 +170,7 @@ TEST(ErrorOfGetLineSegmentsIntersection, IsAWrongAnswerOnlyWithinRounding) {
 /// The crossing of two lines, the second one of coefficients that are off by 1u and 2u: measured,
 /// the largest of some millions of cases and half as much again.
 TEST(ErrorOfGetLineAndSegmentIntersection, IsBoundedByItsProductsOverTheDeterminant) {
-  ForEachCase(6, Worst("GetLineAndSegmentIntersection", 3.0), [](Inputs& in, Worst* worst) {
+  ForEachCase(6, Worst("GetLineAndSegmentIntersection", 2.0), [](Inputs& in, Worst* worst) {
     RealLine const line{in.Coordinate(), in.Coordinate(), in.Coordinate()};
     Point const p = in.Point();
     Point const q = in.Point();

@@ -2,6 +2,8 @@
 // the bound that it must keep.
 #pragma once
 
+#include <algorithm>
+#include <cmath>
 #include <cstdint>
 #include <cstdio>
 #include <cstdlib>
@@ -37,7 +39,7 @@ class Worst {
     ++count_;
     if (error.Sign() == 0) return;
     double const units = (Abs(error) / (Real(kEps) * unit)).ToDouble();
-    if (!(units <= worst_)) worst_ = units;
+    worst_ = std::isnan(units) ? std::numeric_limits<double>::infinity() : std::max(worst_, units);
   }
 
   /// To be called at the end: prints the largest error.
