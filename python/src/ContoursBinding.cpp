@@ -34,7 +34,7 @@ Measured Measure(PieceRows const& rows, py::object const& points) {
   measured.pieces = PiecesFrom(rows);
   measured.points = PointsFrom(points, py::none()).points;
   if (measured.pieces.empty()) Raise({ErrorCode::Failed, "the contour has no pieces", {}});
-  RequireUsable({measured.points, false});
+  RequireUsable(measured.points, false);
   if (measured.points.empty()) return measured;
   py::gil_scoped_release const unlocked;
   measured.deviations = IO::Remeasure(measured.points, measured.pieces).points;

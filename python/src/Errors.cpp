@@ -3,7 +3,12 @@
 #include <pybind11/pybind11.h>
 #include <pybind11/stl.h>
 
+#include <string>
+#include <utility>
+
 #include "vorn/io/FitReport.h"
+#include "vorn/io/Numbers.h"
+#include "vorn/io/Spacing.h"
 
 namespace py = pybind11;
 
@@ -38,6 +43,31 @@ ErrorCode CodeOf(IO::FailureKind kind) {
   return ErrorCode::Failed;
 }
 
+/// Two lengths with so many digits that they do not read as the same if they are not.
+std::pair<std::string, std::string> TextsOf(double a, double b) {
+  constexpr int kUsualDigits = 6;
+  constexpr int kMostDigits = 17;
+  int digits = kUsualDigits;
+  while (digits < kMostDigits && a != b &&
+         IO::FormatShort(a, digits) == IO::FormatShort(b, digits)) {
+    ++digits;
+  }
+  return {IO::FormatShort(a, digits), IO::FormatShort(b, digits)};
+}
+
+/// The message of the library names points by what the file calls them, and the options of the
+/// program; here points come as numbers.
+std::string DescribeTooClose(IO::ClosePair const& pair) {
+  std::string const points =
+      "points " + std::to_string(pair.first) + " and " + std::to_string(pair.second);
+  if (!(pair.needed > 0.0)) {
+    return points + " lie in one place, so no tolerance follows from their spacing; leave one out";
+  }
+  auto const [distance, needed] = TextsOf(pair.distance, pair.needed);
+  return points + " are " + distance + " apart, which must be more than " + needed +
+         " for their tolerances; the strategy \"fewest\" takes points of any density";
+}
+
 }  // namespace
 
 void Raise(Problem const& problem) {
@@ -55,6 +85,13 @@ void Raise(IO::Failure const& failure) {
   Raise({CodeOf(failure.Kind()), failure.what(), {}});
 }
 
+void Raise(IO::SpacingFailure const& failure) {
+  IO::ClosePair const& pair = failure.Neighbours().pair;
+  RaiseInstance(ErrorsModule().attr("PointsTooCloseError")(
+      DescribeTooClose(pair), static_cast<std::int32_t>(ErrorCode::PointsTooClose),
+      py::make_tuple(pair.first, pair.second), pair.distance, pair.needed));
+}
+
 void RequireOk(ErrorCode code, char const* operation) {
   if (code == ErrorCode::Ok) return;
   std::string const why =
@@ -66,18 +103,30 @@ void RequireSuccess(bool succeeded, char const* operation) {
   if (!succeeded) RequireOk(ErrorCode::Failed, operation);
 }
 
+namespace {
+
+/// Makes the exception of Python that of the interpreter.
+template <typename Thrown>
+void Restore(Thrown const& failure) {
+  try {
+    Raise(failure);
+  } catch (py::error_already_set& error) {
+    error.restore();
+  }
+}
+
+}  // namespace
+
 void RegisterErrors() {
   // By value, because that is the type of a translator.
   // NOLINTNEXTLINE(performance-unnecessary-value-param)
   py::register_local_exception_translator([](std::exception_ptr thrown) {
     try {
       if (thrown) std::rethrow_exception(thrown);
+    } catch (IO::SpacingFailure const& failure) {
+      Restore(failure);
     } catch (IO::Failure const& failure) {
-      try {
-        Raise(failure);
-      } catch (py::error_already_set& error) {
-        error.restore();
-      }
+      Restore(failure);
     }
   });
 }

@@ -7,6 +7,7 @@
 
 #include "vorn/Types.h"
 #include "vorn/io/Failure.h"
+#include "vorn/io/SpacingFailure.h"
 
 namespace Vorn::Python {
 
@@ -22,6 +23,9 @@ struct Problem {
 
 /// The same for a failure of the library above the core.
 [[noreturn]] void Raise(IO::Failure const& failure);
+
+/// The same for neighbours that are too close, with both distances.
+[[noreturn]] void Raise(IO::SpacingFailure const& failure);
 
 /// Throws, for the operation named, unless the code is Ok.
 void RequireOk(ErrorCode code, char const* operation);

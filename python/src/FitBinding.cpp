@@ -7,12 +7,18 @@
 
 #include "Bindings.h"
 #include "Errors.h"
+#include "Fit.h"
 #include "FitOptions.h"
+#include "NoFit.h"
 #include "PieceRow.h"
 #include "Points.h"
 #include "Progress.h"
+#include "vorn/io/Closure.h"
+#include "vorn/io/FineTolerances.h"
 #include "vorn/io/FitContour.h"
+#include "vorn/io/Numbers.h"
 #include "vorn/io/SpacingFailure.h"
+#include "vorn/io/Tolerances.h"
 
 namespace py = pybind11;
 
@@ -62,35 +68,60 @@ py::tuple FactsOf(IO::FitReport const& report) {
                         IO::NameOf(report.strategy));
 }
 
-void RequireFittable(PointsInput const& input) {
-  if (!input.hasTolerances) {
+void RequireFittable(IO::PointFile const& file, IO::FitChoice const& choice) {
+  if (!file.hasTolerances && !choice.tolerance.cap) {
     Raise({ErrorCode::Failed,
            "the points have no tolerances: say tol=, or give them a column w",
            {}});
   }
-  if (input.points.size() < 2) {
+  if (file.points.size() < 2) {
     Raise({ErrorCode::Failed, "a contour needs at least two points", {}});
   }
-  RequireUsable(input);
+  RequireUsable(file.points, file.hasTolerances);
 }
 
-/// What the caller handed over; the points are copied from there.
-struct Call {
-  py::object const& points;
-  py::object const& tolerance;
-  IO::FitChoice choice;
-};
+IO::PointFile FileOf(FitCall const& call) {
+  PointsInput input = PointsFrom(call.points, call.tolerance);
+  IO::PointFile file;
+  file.hasTolerances = input.hasTolerances;
+  file.points = std::move(input.points);
+  file.units = call.units;
+  return file;
+}
 
-/// The message of the library names points by what the file calls them; here they come as numbers.
-[[noreturn]] void RaiseTooClose(IO::ClosePair const& pair) {
-  std::string const message =
-      "points " + std::to_string(pair.first) + " and " + std::to_string(pair.second) + " are " +
-      std::string(py::repr(py::float_(pair.distance))) + " apart, which must be more than " +
-      std::string(py::repr(py::float_(pair.needed))) +
-      " for their tolerances; the strategy \"fewest\" takes points of any density";
-  Raise({ErrorCode::PointsTooClose,
-         message,
-         {static_cast<std::int64_t>(pair.first), static_cast<std::int64_t>(pair.second)}});
+[[noreturn]] void RaiseNoFit(FitCall const& call, IO::FitChoice const& choice,
+                             IO::Failure const& failure) {
+  IO::PointFile file = FileOf(call);
+  IO::AssignTolerances(choice.tolerance, &file,
+                       IO::FindClosure(file.points, choice.closed).isClosed);
+  py::object const untold = py::none();
+  Progress signals(untold);
+  Problem problem = {ErrorCode::NoFit, failure.Message(), {}};
+  {
+    py::gil_scoped_release const unlocked;
+    problem = ExplainNoFit(std::move(problem), file.points, choice, &signals);
+  }
+  Raise(problem);
+}
+
+void WarnOfFineTolerance(IO::PointFile const& file, IO::FineTolerance const& fine) {
+  std::string const message = "the tolerance of point " + std::to_string(fine.point) + ", " +
+                              IO::FormatShort(file.points[fine.point].w) + ", is less than " +
+                              IO::FormatShort(IO::kFineTolerance) +
+                              " of the extent of the points, " + IO::FormatShort(fine.extent) +
+                              ": the fit may take minutes; \"fewest\" does not";
+  py::gil_scoped_acquire const lock;
+  // The caller of vorn.fit is two frames up.
+  if (PyErr_WarnEx(PyExc_UserWarning, message.c_str(), 2) != 0) throw py::error_already_set();
+}
+
+IO::FitChoice ChoiceFrom(FitCall const& call) {
+  IO::FitChoice choice = FitChoiceFrom(call.options);
+  choice.warnOfFineTolerance = &WarnOfFineTolerance;
+  if (choice.tolerance.cap && !call.tolerance.is_none()) {
+    throw py::type_error("tol and tolerance_per_point cannot both be said");
+  }
+  return choice;
 }
 
 IO::FitReport FitUnlocked(IO::PointFile file, IO::FitChoice const& choice, Progress* progress) {
@@ -98,35 +129,37 @@ IO::FitReport FitUnlocked(IO::PointFile file, IO::FitChoice const& choice, Progr
   return IO::FitContour(std::move(file), choice, progress);
 }
 
-IO::FitReport FitPoints(Call const& call, Progress* progress) {
-  PointsInput input = PointsFrom(call.points, call.tolerance);
-  RequireFittable(input);
-  IO::PointFile file;
-  file.points = std::move(input.points);
-  file.hasTolerances = true;
+}  // namespace
+
+IO::FitReport FitOf(FitCall const& call) {
+  Progress progress(call.progress);
+  IO::FitChoice const choice = ChoiceFrom(call);
+  IO::PointFile file = FileOf(call);
+  RequireFittable(file, choice);
   try {
-    return FitUnlocked(std::move(file), call.choice, progress);
+    return FitUnlocked(std::move(file), choice, &progress);
   } catch (IO::SpacingFailure const& failure) {
-    RaiseTooClose(failure.Neighbours().pair);
+    Raise(failure);
   } catch (IO::Failure const& failure) {
+    if (failure.Kind() == IO::FailureKind::NoFit) RaiseNoFit(call, choice, failure);
     Raise(failure);
   }
 }
 
-py::tuple Fit(py::object const& points, py::object const& tolerance, py::dict const& options,
-              py::object const& progress) {
-  Progress sink(progress);
-  IO::FitReport const report = FitPoints({points, tolerance, FitChoiceFrom(options)}, &sink);
+py::tuple PartsOf(IO::FitReport const& report) {
   return py::make_tuple(RowsOf(report.pieces, CoveredBy(report)), report.closure.isClosed,
                         FactsOf(report));
 }
 
-}  // namespace
-
 void BindFit(py::module_& module) {
-  module.def("fit", &Fit, py::arg("points"), py::arg("tol"), py::arg("options"),
-             py::arg("progress"),
-             "Fits points: the rows of the pieces, whether they are closed, and the facts.");
+  module.def(
+      "fit",
+      [](py::object const& points, py::object const& tolerance, py::dict const& options,
+         py::object const& progress) {
+        return PartsOf(FitOf({points, tolerance, options, progress, ""}));
+      },
+      py::arg("points"), py::arg("tol"), py::arg("options"), py::arg("progress"),
+      "Fits points: the rows of the pieces, whether they are closed, and the facts.");
 }
 
 }  // namespace Vorn::Python

@@ -20,18 +20,6 @@ IO::Strategy StrategyFrom(py::handle given) {
                               "strategy", given);
 }
 
-IO::ClosedChoice ClosedFrom(py::handle given) {
-  bool const isOfNumPy = py::isinstance(given, py::module_::import("numpy").attr("bool_"));
-  if (py::isinstance<py::bool_>(given) || isOfNumPy) {
-    return py::bool_(py::reinterpret_borrow<py::object>(given)) ? IO::ClosedChoice::Yes
-                                                                : IO::ClosedChoice::No;
-  }
-  return Chosen<IO::ClosedChoice>({{"auto", IO::ClosedChoice::Auto},
-                                   {"yes", IO::ClosedChoice::Yes},
-                                   {"no", IO::ClosedChoice::No}},
-                                  "closed", given);
-}
-
 FewestPieces::Effort EffortFrom(py::handle given) {
   return Chosen<FewestPieces::Effort>({{"quick", FewestPieces::Effort::Quick},
                                        {"wide", FewestPieces::Effort::Wide},
@@ -53,6 +41,8 @@ Takers<FitChoice> const& FitTakers() {
       {"strategy", [](py::handle g, FitChoice* c) { c->strategy = StrategyFrom(g); }},
       {"closed", [](py::handle g, FitChoice* c) { c->closed = ClosedFrom(g); }},
       {"start", [](py::handle g, FitChoice* c) { c->start = g.cast<std::size_t>(); }},
+      {"tolerance_per_point",
+       [](py::handle g, FitChoice* c) { c->tolerance.cap = AboveZero(g, "tolerance_per_point"); }},
       {"effort", [](py::handle g, FitChoice* c) { c->fewest.effort = EffortFrom(g); }},
       {"centre", Into(&Options::centre)},
       {"segments_only", Into(&Options::segmentsOnly)},
@@ -65,6 +55,18 @@ Takers<FitChoice> const& FitTakers() {
 }
 
 }  // namespace
+
+IO::ClosedChoice ClosedFrom(py::handle given) {
+  bool const isOfNumPy = py::isinstance(given, py::module_::import("numpy").attr("bool_"));
+  if (py::isinstance<py::bool_>(given) || isOfNumPy) {
+    return py::bool_(py::reinterpret_borrow<py::object>(given)) ? IO::ClosedChoice::Yes
+                                                                : IO::ClosedChoice::No;
+  }
+  return Chosen<IO::ClosedChoice>({{"auto", IO::ClosedChoice::Auto},
+                                   {"yes", IO::ClosedChoice::Yes},
+                                   {"no", IO::ClosedChoice::No}},
+                                  "closed", given);
+}
 
 FitChoice FitChoiceFrom(py::dict const& keywords) { return Taken(FitTakers(), keywords); }
 

@@ -2,6 +2,7 @@
 
 #include <pybind11/pybind11.h>
 
+#include <cmath>
 #include <functional>
 #include <map>
 #include <string>
@@ -21,6 +22,14 @@ Value Chosen(std::map<std::string, Value> const& words, char const* name, pybind
   std::string known;
   for (auto const& entry : words) known += (known.empty() ? "" : ", ") + entry.first;
   throw pybind11::value_error(std::string(name) + " is '" + word + "'; it must be one of " + known);
+}
+
+/// A number that must be finite and above 0.
+inline double AboveZero(pybind11::handle given, char const* name) {
+  auto const value = given.cast<double>();
+  if (value > 0.0 && std::isfinite(value)) return value;
+  throw pybind11::value_error(std::string(name) + " must be a number above 0, not " +
+                              std::string(pybind11::repr(given)));
 }
 
 /// Takes one value; None leaves the usual one.

@@ -34,5 +34,8 @@ PYBIND11_MODULE(_core, module) {
   BindContours(module);
   BindFormats(module);
   BindDrawings(module);
+  BindThinning(module);
+  BindOutlines(module);
+  BindReports(module);
   BindGeometry(module.def_submodule("geometry"));
 }

@@ -5,6 +5,7 @@
 #include <string>
 
 #include "Errors.h"
+#include "Numbers.h"
 
 namespace py = pybind11;
 
@@ -32,25 +33,10 @@ py::array ViewOf(std::vector<WPoint>* points, Columns const& columns) {
   return {py::dtype::of<double>(), shape, strides, data, py::none()};
 }
 
-py::object AsArray(py::object const& points) {
-  return py::module_::import("numpy").attr("asarray")(points);
-}
-
-/// What is masked has no value, which an array of the same numbers would not tell.
-void RefuseMasked(py::object const& source) {
-  if (py::module_::import("numpy").attr("ma").attr("is_masked")(source).cast<bool>()) {
-    throw py::value_error("some values are masked; leave those points out");
-  }
-}
-
-/// NumPy converts and walks the strides; it refuses what does not become a number, and shapes that
-/// do not fit. Objects are taken where each of them is a number.
-void Copy(py::object const& source, std::vector<WPoint>* points, Columns const& columns) {
+/// NumPy converts and walks the strides; it refuses shapes that do not fit.
+void Copy(py::array const& numbers, std::vector<WPoint>* points, Columns const& columns) {
   if (points->empty()) return;
-  RefuseMasked(source);
-  py::array const array = AsArray(source);
-  char const* const casting = array.dtype().kind() == 'O' ? "unsafe" : "same_kind";
-  py::module_::import("numpy").attr("copyto")(ViewOf(points, columns), array, casting);
+  py::module_::import("numpy").attr("copyto")(ViewOf(points, columns), numbers, "same_kind");
 }
 
 bool IsFrame(py::object const& points) {
@@ -65,15 +51,15 @@ PointsInput FromFrame(py::object const& frame) {
   }
   PointsInput input;
   input.points.resize(py::len(frame));
-  Copy(frame["x"], &input.points, {0});
-  Copy(frame["y"], &input.points, {1});
+  Copy(NumbersFrom(frame["x"], "x"), &input.points, {0});
+  Copy(NumbersFrom(frame["y"], "y"), &input.points, {1});
   input.hasTolerances = frame.attr("columns").contains("w");
-  if (input.hasTolerances) Copy(frame["w"], &input.points, {2});
+  if (input.hasTolerances) Copy(NumbersFrom(frame["w"], "w"), &input.points, {2});
   return input;
 }
 
 PointsInput FromArray(py::object const& points) {
-  py::array const array = AsArray(points);
+  py::array const array = NumbersFrom(points, "points");
   py::ssize_t const width = array.ndim() == 2 ? array.shape(1) : 0;
   if (width != 2 && width != kLengthOfPoint) {
     throw py::value_error("points must have the shape (n, 2) or (n, 3), not " +
@@ -81,7 +67,7 @@ PointsInput FromArray(py::object const& points) {
   }
   PointsInput input;
   input.points.resize(static_cast<std::size_t>(array.shape(0)));
-  Copy(points, &input.points, {0, width});
+  Copy(array, &input.points, {0, width});
   input.hasTolerances = width == kLengthOfPoint;
   return input;
 }
@@ -97,17 +83,31 @@ PointsInput FromArray(py::object const& points) {
 PointsInput PointsFrom(py::object const& points, py::object const& tolerance) {
   PointsInput input = IsFrame(points) ? FromFrame(points) : FromArray(points);
   if (!tolerance.is_none()) {
-    Copy(tolerance, &input.points, {2});
+    Copy(NumbersFrom(tolerance, "tolerances"), &input.points, {2});
     input.hasTolerances = true;
   }
   return input;
 }
 
-void RequireUsable(PointsInput const& input) {
-  for (std::size_t i = 0; i < input.points.size(); ++i) {
-    WPoint const& point = input.points[i];
+py::array_t<double> ArrayOf(PointsInput const& input) {
+  auto const count = static_cast<py::ssize_t>(input.points.size());
+  py::array_t<double> array({count, input.hasTolerances ? kLengthOfPoint : py::ssize_t{2}});
+  double* out = array.mutable_data();
+  for (WPoint const& point : input.points) {
+    *out++ = point.x;
+    *out++ = point.y;
+    if (input.hasTolerances) *out++ = point.w;
+  }
+  return array;
+}
+
+void RequireUsable(PointsInput const& input) { RequireUsable(input.points, input.hasTolerances); }
+
+void RequireUsable(std::vector<WPoint> const& points, bool haveTolerances) {
+  for (std::size_t i = 0; i < points.size(); ++i) {
+    WPoint const& point = points[i];
     if (!std::isfinite(point.x) || !std::isfinite(point.y)) Refuse(i, "x or y is not finite");
-    if (!input.hasTolerances) continue;
+    if (!haveTolerances) continue;
     if (!(point.w > 0.0) || !std::isfinite(point.w)) {
       Refuse(i, "the tolerance is not a number above 0");
     }

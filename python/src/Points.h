@@ -19,8 +19,14 @@ struct PointsInput {
 /// `tolerance` is None, a number or one for each point, and goes before what the points bring.
 PointsInput PointsFrom(pybind11::object const& points, pybind11::object const& tolerance);
 
+/// The points as an array: (n, 3), or (n, 2) for points without tolerances.
+pybind11::array_t<double> ArrayOf(PointsInput const& input);
+
 /// Throws a ContourError naming the first point that has a coordinate that is not finite or a
 /// tolerance that is not above 0 and finite.
+void RequireUsable(std::vector<WPoint> const& points, bool haveTolerances);
+
+/// The same.
 void RequireUsable(PointsInput const& input);
 
 }  // namespace Vorn::Python

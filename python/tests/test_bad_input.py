@@ -3,6 +3,7 @@ never a crash or a wrong answer."""
 
 import decimal
 import math
+import os
 
 import numpy as np
 import pytest
@@ -14,6 +15,14 @@ NAN, INF = math.nan, math.inf
 CORNER = np.array([(0, 0), (1, 0), (2, 0), (3, 0), (3, 1), (3, 2), (3, 3)], dtype=float)
 LINE = vorn.Contour.starting_at((0, 0)).append_line((3, 0))
 
+
+def plotted(points):
+    matplotlib = pytest.importorskip("matplotlib")
+    matplotlib.use("Agg")
+    figure = pytest.importorskip("matplotlib.figure").Figure()
+    return vorn.plot(LINE, points=points, ax=figure.gca())
+
+
 USES = {
     "fit": lambda points: vorn.fit(points, tol=0.01),
     "deviations": LINE.deviations,
@@ -22,6 +31,9 @@ USES = {
     "to_svg": LINE.to_svg,
     "to_html": LINE.to_html,
     "to_png": LINE.to_png,
+    "plot": plotted,
+    "write_points": lambda points: vorn.write_points(os.devnull, points) or "written",
+    "tolerance_per_point": lambda points: vorn.tolerance_per_point(points, cap=0.01),
     "create_fitting_curve": lambda points: g.create_fitting_curve(
         np.column_stack((points, np.full(len(points), 0.01)))),
 }
@@ -34,6 +46,67 @@ def use(request):
 
 def masked(points):
     return np.ma.masked_array(points, mask=np.arange(points.size).reshape(points.shape) == 4)
+
+
+@pytest.mark.parametrize("spoil, given", [
+    (lambda p: p.astype(str), "texts"),
+    (lambda p: p.astype(complex), "complex numbers"),
+    (lambda p: p.astype("datetime64[s]"), "dates or times"),
+    (lambda p: p.view([("x", float), ("y", float)])[:, 0], "records"),
+    (lambda p: np.where(p == 3, "3", p.astype(object)), "value 6 is '3' of type str"),
+    (lambda p: np.where(p == 3, None, p.astype(object)), "value 6 is None of type NoneType"),
+    (lambda p: np.where(p == 3, 3j, p.astype(object)), "value 6 is 3j of type complex")])
+@pytest.mark.parametrize("name", sorted(set(USES) - {"create_fitting_curve"}))
+def test_the_error_tells_what_was_given(name, spoil, given):
+    with pytest.raises(TypeError, match=given):
+        USES[name](spoil(CORNER))
+
+
+BATCHES = {
+    "line_deviations": lambda p: g.line_deviations([0, 1, 0], p),
+    "line_segments_intersections": lambda p: g.line_segments_intersections(
+        np.resize(p, (3, 4)), np.resize(p, (3, 4))),
+    "lines_intersections": lambda p: g.lines_intersections(np.resize(p, (3, 4))),
+    "are_points_valid_to_fit": lambda p: g.are_points_valid_to_fit(np.resize(p, (4, 3))),
+    "polygon_areas": lambda p: g.polygon_areas(p, [7]),
+    "natural_angle_to_azimuth_rad": lambda p: g.natural_angle_to_azimuth_rad(p),
+    "natural_angle_to_tangential_azimuth_rad":
+        lambda p: g.natural_angle_to_tangential_azimuth_rad(p, True),
+    "get_natural_angle": lambda p: g.get_natural_angle(p, 1.0),
+    "get_outside_max": g.get_outside_max,
+    "get_outside_min": g.get_outside_min,
+    "get_area": lambda p: g.get_area(p.ravel(), [12]),
+    "check_poly_self_intersection": lambda p: g.check_poly_self_intersection(p.ravel(), [12]),
+    "linear_equation_system_solve": lambda p: g.linear_equation_system_solve(p[:2], [1, 2]),
+    "right-hand side": lambda p: g.linear_equation_system_solve(np.eye(7), p[:, 0]),
+    "Matrix": lambda p: g.Matrix(p.ravel()[:9]),
+    "mxv": lambda p: g.Matrix().mxv(p.ravel()[:3]),
+}
+
+
+@pytest.mark.parametrize("name", BATCHES)
+def test_operations_on_arrays_refuse_what_fits_refuse(name):
+    assert BATCHES[name](CORNER + 1.0) is not None
+    for wrong in (CORNER.astype(str), CORNER.astype(complex), CORNER.astype("timedelta64[s]"),
+                  np.where(CORNER == 0, None, CORNER.astype(object))):
+        with pytest.raises(TypeError):
+            BATCHES[name](wrong)
+
+
+@pytest.mark.parametrize("name", set(BATCHES) - {
+    "line_segments_intersections", "lines_intersections", "are_points_valid_to_fit"})
+def test_operations_on_arrays_refuse_masked_values(name):
+    cut = np.ma.masked_array(CORNER + 1.0, mask=CORNER == 0)
+    with pytest.raises(ValueError, match="masked"):
+        BATCHES[name](cut)
+
+
+@pytest.mark.parametrize("call", [
+    lambda m: g.line_segments_intersections(m(4), np.eye(4)), lambda m: g.lines_intersections(m(4)),
+    lambda m: g.are_points_valid_to_fit(m(3))])
+def test_rows_with_masked_values_are_refused(call):
+    with pytest.raises(ValueError, match="masked"):
+        call(lambda width: np.ma.masked_array(np.ones((4, width)), mask=np.eye(4)[:, :width]))
 
 
 @pytest.mark.parametrize("name, spoil", {
@@ -66,7 +139,8 @@ def test_a_place_that_is_not_finite_is_named(name, value):
     assert caught.value.indices == (4,)
 
 
-@pytest.mark.parametrize("name", ["fit", "deviations", "signed deviations", "nearest", "to_svg"])
+@pytest.mark.parametrize("name", ["fit", "deviations", "signed deviations", "nearest", "to_svg",
+                                  "plot", "write_points", "tolerance_per_point"])
 def test_masked_points_are_refused(name):
     with pytest.raises(ValueError, match="masked"):
         USES[name](masked(CORNER))
@@ -99,8 +173,10 @@ def test_columns_of_a_frame_may_be_of_any_number_type():
         assert vorn.fit(other, tol=0.01) == expected
     holes = frame.convert_dtypes()
     holes.loc[3, "y"] = pandas.NA
-    with pytest.raises((TypeError, ValueError)):
+    with pytest.raises(TypeError, match="y: value 3 is <NA> of type NAType"):
         vorn.fit(holes, tol=0.01)
+    with pytest.raises(TypeError, match="value 7 is <NA>"):
+        vorn.fit(holes.to_numpy(), tol=0.01)
 
 
 @pytest.mark.parametrize("scale", [1e100, 1e-100])

@@ -1,8 +1,11 @@
 """Contours as values: pieces, measures, edits, files."""
 
 import dataclasses
+import json
 import math
 import pickle
+import re
+import struct
 
 import numpy as np
 import pytest
@@ -155,9 +158,83 @@ def test_text_brings_back_the_shape(slot, name, allowed):
     assert again.area == pytest.approx(slot.area, abs=10 * allowed)
 
 
+def test_geojson_holds_chords(slot):
+    for chord in (0.1, 0.001):
+        document = json.loads(slot.to_geojson(chords=chord))
+        assert '"Polygon"' in json.dumps(document)
+        again = vorn.Contour.from_geojson(slot.to_geojson(chords=chord))
+        assert again.is_closed and not again.as_arrays()["is_arc"].any()
+        assert 0 < slot.deviations(again.sample(1)).max() + again.deviations(
+            slot.sample(1e-4)).max() <= chord * (1 + 1e-9)
+    with pytest.raises(vorn.ContourError):
+        slot.to_text("geojson")
+    for wrong in (0, -1, math.nan):
+        with pytest.raises(ValueError):
+            slot.to_geojson(chords=wrong)
+
+
+def test_plain_svg_is_the_contour(slot, tmp_path):
+    inches = vorn.Contour(slot, units="inch")
+    again = vorn.Contour.from_svg(inches.to_plain_svg())
+    assert again.area == pytest.approx(inches.area) and again.length == pytest.approx(inches.length)
+    assert again.as_arrays()["is_arc"].tolist() == [False, True, True, False, True, True]
+    assert re.search(r'width="[0-9.]+in"', inches.to_plain_svg())
+    inches.save(tmp_path / "plain.svg", plain=True)
+    assert (tmp_path / "plain.svg").read_text() == inches.to_plain_svg()
+    inches.save(tmp_path / "drawing.svg", plain=False)
+    assert (tmp_path / "drawing.svg").read_text() == inches.to_svg()
+    with pytest.raises(vorn.ContourError):
+        slot.to_text("svg")
+
+
+def test_curves_become_chords_where_that_is_said():
+    text = '<svg xmlns="http://www.w3.org/2000/svg"><path d="M0 0 C0 1 1 1 1 0"/></svg>'
+    with pytest.raises(vorn.FileError):
+        vorn.Contour.from_svg(text)
+    assert len(vorn.Contour.from_svg(text, flatten=0.1)) < len(
+        vorn.Contour.from_svg(text, flatten=0.001))
+    with pytest.raises(ValueError):
+        vorn.Contour.from_svg(text, flatten=0)
+
+
+def test_dxf_has_versions(slot):
+    millimetres = vorn.Contour(slot, units="mm")
+    new = millimetres.to_dxf(dxf_version="r2000")
+    assert "AC1015" in new and "LWPOLYLINE" in new and "$INSUNITS" in new
+    assert "AC1009" in millimetres.to_dxf() and "LWPOLYLINE" not in millimetres.to_dxf()
+    assert vorn.Contour.from_dxf(new).area == pytest.approx(slot.area)
+    with pytest.raises(ValueError):
+        slot.to_dxf(dxf_version="r14")
+
+
+def test_digits_follow_from_the_points(slot):
+    points = slot.sample(0.1)
+    fine = vorn.Contour.from_gcode(slot.shifted(1 / 3, 1 / 7).to_text(
+        "gcode", points=points + (1 / 3, 1 / 7), tol=1e-9))
+    assert fine.deviations(points + (1 / 3, 1 / 7)).max() <= 1e-9
+    coarse = vorn.Contour.from_gcode(slot.shifted(1 / 3, 1 / 7).to_gcode())
+    assert coarse.deviations(points + (1 / 3, 1 / 7)).max() > 1e-9
+    by_tolerance = slot.shifted(1 / 3, 1 / 7).to_gcode(tolerance=1e-9)
+    assert len(by_tolerance) > len(slot.shifted(1 / 3, 1 / 7).to_gcode())
+    with pytest.raises(ValueError, match="tolerances"):
+        slot.to_text("gcode", points=points)
+
+
+def test_what_reading_leaves_out_is_warned_of():
+    with pytest.warns(UserWarning, match="left out 1 piece without length") as told:
+        contour = vorn.Contour.from_wkt("LINESTRING (0 0, 1 0, 1 0, 2 0)")
+    assert len(contour) == 2 and len(told) == 1
+    with pytest.warns(UserWarning, match="beside x and y"):
+        vorn.Contour.from_wkt("LINESTRING Z (0 0 5, 1 0 6)")
+
+
 def test_gcode_takes_options(slot):
     text = slot.to_gcode(feed=600, radius_words=True, end="M30")
     assert "F600" in text and "R1" in text and "M30" in text
+    text = slot.to_gcode(plane="xz", decimals=1, header="(begin {pieces})", footer="(end)")
+    assert "G18" in text and "(begin 4)" in text and "(end)" in text
+    text = slot.to_gcode(safe_height=5.0, cut_height=-1.0, plunge_feed=70.0, feed=600.0)
+    assert "Z5" in text and "Z-1" in text and "F70" in text
     with pytest.raises(TypeError):
         slot.to_gcode(speed=1)
     with pytest.raises(ValueError):
@@ -172,11 +249,18 @@ def test_a_text_that_holds_no_contour_is_refused():
         vorn.Contour.from_text("", "svg")
 
 
-@pytest.mark.parametrize("ending", ["json", "csv", "dxf", "wkt", "nc"])
+@pytest.mark.parametrize("ending", ["json", "csv", "dxf", "wkt", "nc", "geojson"])
 def test_files_come_back(slot, tmp_path, ending):
     path = tmp_path / f"slot.{ending}"
-    slot.save(path)
-    assert len(vorn.Contour.read(path)) == 4
+    slot.save(path, **({"chords": 0.01} if ending == "geojson" else {}))
+    again = vorn.Contour.read(path)
+    assert len(again) == 4 or ending == "geojson"
+    assert again.area == pytest.approx(slot.area, rel=0.02)
+
+
+def png_size(picture):
+    """From the header of the picture."""
+    return struct.unpack(">II", picture[16:24])
 
 
 def test_drawings(slot, tmp_path):
@@ -185,6 +269,20 @@ def test_drawings(slot, tmp_path):
     assert "<html" in slot.to_html(points, tol=0.1)
     assert slot.to_png().startswith(b"\x89PNG")
     assert "Slot &lt;1&gt;" in slot.to_svg(points, tol=0.1, title="Slot <1>")
+    assert "Jones" in slot.to_html(points, tol=0.1, fields={"operator": "Jones"})
+    assert png_size(slot.to_png(width=321))[0] == 321
+    small, large = (png_size(slot.to_png(dpi=dpi)) for dpi in (50, 100))
+    assert large == pytest.approx(np.multiply(small, 2), abs=1)
+    for wrong in ({"dpi": 0}, {"width": 0}, {"dpi": math.nan}):
+        with pytest.raises(ValueError):
+            slot.to_png(**wrong)
+    with pytest.raises(vorn.ContourError):
+        slot.to_png(dpi=1e9)
+    with pytest.raises(ValueError):
+        slot.to_html(fields={"": "x"})
+    for wrong in ({"dpi": 100}, {"width": 100}, {"fields": {"operator": "Jones"}}):
+        with pytest.raises(TypeError):
+            slot.to_svg(**wrong)
     slot.save(tmp_path / "slot.svg", points=points, tol=0.1, magnify=10)
     assert (tmp_path / "slot.svg").stat().st_size > 1000
     with pytest.raises(ValueError):
@@ -235,6 +333,7 @@ def test_errors_come_back_from_pickles(corner):
     again = pickle.loads(pickle.dumps(caught.value))
     assert type(again) is vorn.PointsTooCloseError
     assert (str(again), again.code, again.indices) == (str(caught.value), 20, (3, 4))
+    assert (again.distance, again.needed) == (caught.value.distance, caught.value.needed)
     place = vorn.FileError("a.csv:3:7: no", "a.csv", 3, 7)
     again = pickle.loads(pickle.dumps(place))
     assert (str(again), again.path, again.line, again.column) == ("a.csv:3:7: no", "a.csv", 3, 7)

@@ -2,6 +2,7 @@
 
 import threading
 import _thread
+import warnings
 
 import numpy as np
 import pytest
@@ -137,6 +138,22 @@ def test_points_too_close_are_named(corner):
         vorn.fit(corner, tol=0.01, strategy="mixed")
     assert caught.value.indices == (3, 4)
     assert caught.value.code is vorn.ErrorCode.POINTS_TOO_CLOSE
+    assert (caught.value.distance, caught.value.needed) == (0.02, 1.5 * (0.01 + 0.01))
+
+
+def test_distances_of_points_too_close_read_well(corner):
+    def message(points, tol):
+        with pytest.raises(vorn.PointsTooCloseError) as caught:
+            vorn.fit(points, tol=tol, strategy="mixed")
+        return str(caught.value)
+
+    assert message([(0, 0), (0.1, 0), (2, 0)], 0.1).startswith(
+        "points 0 and 1 are 0.1 apart, which must be more than 0.3 for their tolerances;")
+    assert "are 0.2999999 apart, which must be more than 0.3 " in message(
+        [(0, 0), (0.2999999, 0), (2, 0)], 0.1)
+    with pytest.raises(vorn.PointsTooCloseError, match="lie in one place") as caught:
+        vorn.fit([(0, 0), (1, 0), (1, 0)], tolerance_per_point=0.1)
+    assert caught.value.indices == (1, 2)
 
 
 @pytest.mark.parametrize("closing", [[], [(10, 0, 1e-6)]])
@@ -149,10 +166,43 @@ def test_points_too_close_across_the_seam_are_named(circle, closing):
     assert "--" not in str(caught.value)
 
 
-def test_points_without_an_arc_have_no_fit(corner):
-    with pytest.raises(vorn.ContourError) as caught:
+def test_points_that_are_no_arc_name_the_worst(corner):
+    with pytest.raises(vorn.NoFitError, match="no single arc") as caught:
         vorn.fit(corner, tol=0.0001, strategy="arc")
-    assert caught.value.code is not vorn.ErrorCode.OK
+    error = caught.value
+    # By hand: the circle of least squares of a corner of equal legs passes its middle point worst.
+    assert error.code is vorn.ErrorCode.NO_FIT and error.indices == (3,)
+    assert "point 3 is " in str(error) and "code" not in str(error)
+    zigzag = [(0, 0), (1, 1), (2, 0), (3, 1), (4, 0)]
+    with pytest.raises(vorn.NoFitError, match="no single arc"):
+        vorn.fit(zigzag, tolerance_per_point=0.01, strategy="arc")
+
+
+def test_the_first_point_without_a_shape_is_named(shared):
+    points = vorn.read_points(shared / "rail_worn_low.csv")[:, :2]
+    with pytest.raises(vorn.NoFitError, match="not with point 56;") as caught:
+        vorn.fit(points, tol=0.025, strategy="cells")
+    assert caught.value.indices == (56,)
+    assert len(vorn.fit(points[:56], tol=0.025, strategy="cells", closed=False)) > 0
+    with pytest.raises(vorn.NoFitError):
+        vorn.fit(points[:57], tol=0.025, strategy="cells", closed=False)
+
+
+def test_points_in_one_place_have_no_fit():
+    with pytest.raises(vorn.NoFitError, match="all points coincide within their tolerances"):
+        vorn.fit([(1, 1), (1, 1.001)], tol=0.01, strategy="fewest")
+
+
+def test_a_tolerance_that_takes_long_is_warned_of():
+    points = np.column_stack((np.arange(20.0), np.zeros(20)))
+    with pytest.warns(UserWarning, match="tolerance of point 0, 1e-09, is less than 1e-08") as told:
+        vorn.fit(points, tol=1e-9, strategy="mixed")
+    assert told[0].filename == __file__
+    with warnings.catch_warnings():
+        warnings.simplefilter("error")
+        vorn.fit(points, tol=1e-9, strategy="fewest")
+        with pytest.raises(UserWarning):
+            vorn.fit(points, tol=1e-9, strategy="mixed")
 
 
 def test_progress_rises_to_its_end(examples):

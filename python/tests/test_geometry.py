@@ -2,7 +2,6 @@
 
 import math
 import pickle
-import re
 
 import numpy as np
 import pytest
@@ -11,22 +10,6 @@ from vorn import geometry as g
 
 NAN = math.nan
 SQUARE = [g.Elem.segment(p) for p in [(0, 0), (0, 2), (2, 2), (2, 0), (0, 0)]]
-
-
-def snake(name):
-    return re.sub(r"(?<=[a-z0-9])(?=[A-Z])", "_", name).lower()
-
-
-def test_every_public_operation_is_there():
-    operations = """
-        GetNaturalAngle NaturalAngleToAzimuthRad NaturalAngleToTangentialAzimuthRad GetArcLength
-        GetArcAngleRad GetDeviation GetSignedDeviation IsPointValidToFit GetCircle
-        GetLineSegmentsIntersection AddSegm AddArc RemoveElem ReplaceElem GetElemPoint ShiftElem
-        SplitElem DeleteFittingCurve CheckPolySelfIntersection GetArea GetPermissibleRect
-        GetLinePolygon GetCirclePolygon CreateFittingCurve LinearEquationSystemSolve GetOutsideMax
-        GetOutsideMin GetLinesIntersection""".split()
-    assert [name for name in map(snake, operations) if name not in g.__all__] == []
-    assert "calc_normalized_3d_vectors" in g.__all__
 
 
 def test_angles():

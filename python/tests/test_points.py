@@ -1,6 +1,9 @@
 """What fit and read_points take as points."""
 
 import collections
+import copy
+import pickle
+import subprocess
 
 import numpy as np
 import pytest
@@ -82,7 +85,7 @@ def test_a_frame_needs_no_pandas(corner):
     ([1, 2, 3], 0.1, ValueError),
     ([("a", "b"), ("c", "d")], 0.1, (TypeError, ValueError)),
     ([(1j, 0), (1, 0)], 0.1, TypeError),
-    (None, 0.1, ValueError),
+    (None, 0.1, TypeError),
     ([(0, 0), (1, 0)], None, vorn.ContourError),
     ([(0, 0), (1, 0)], 0, vorn.ContourError),
     ([(0, 0), (1, 0)], -1, vorn.ContourError),
@@ -137,6 +140,104 @@ def test_an_error_in_a_file_names_the_place(tmp_path):
 def test_a_missing_file_is_an_os_error(tmp_path):
     with pytest.raises(OSError, match="no.csv"):
         vorn.read_points(tmp_path / "no.csv")
+
+
+def test_points_know_their_unit(tmp_path):
+    path = tmp_path / "scan.csv"
+    path.write_text("X [mm];Z [mm]\n0;1\n2;3\n4;5,5\n")
+    points = vorn.read_points(path)
+    assert isinstance(points, np.ndarray) and points.units == "mm"
+    for part in (points[1:], points[:, 0], points.copy(), pickle.loads(pickle.dumps(points)),
+                 copy.deepcopy(points), points.T):
+        assert part.units == "mm" and np.array_equal(points[1:], np.asarray(points)[1:])
+    for computed in (points * 2, points + points, np.hypot(*points.T), points.max(axis=0)):
+        assert type(computed) is np.ndarray
+    assert isinstance(points.max(), float) and not isinstance(points.max(), np.ndarray)
+    contour = vorn.fit(points, tol=0.01)
+    assert contour.units == "mm"
+    assert vorn.fit(points, tol=0.01, units="inch").units == "inch"
+    assert contour == vorn.fit(np.asarray(points), tol=0.01)
+    assert vorn.fit(np.asarray(points), tol=0.01).units == ""
+    result, = vorn.fit_many([path], tol=0.01)
+    assert result.contour.units == "mm"
+    assert "(mm)" in contour.to_svg() or "mm" in contour.to_svg()
+    assert vorn.Contour.from_json(contour.to_json()).units == "mm"
+
+
+def test_other_units_attributes_are_not_taken_for_one():
+    class Quantities(np.ndarray):
+        units = object()
+
+    points = np.array([(0.0, 0), (1, 0)]).view(Quantities)
+    assert vorn.fit(points, tol=0.1).units == ""
+
+
+def test_a_column_of_tolerances_has_any_name(tmp_path):
+    path = tmp_path / "scan.csv"
+    path.write_text("x,y,w,limit\n0,1,9,0.5\n2,3,9,0.25\n")
+    assert vorn.read_points(path, tolerance_column="limit")[:, 2].tolist() == [0.5, 0.25]
+    assert vorn.read_points(path, tolerance_column="4")[:, 2].tolist() == [0.5, 0.25]
+    with pytest.raises(vorn.FileError):
+        vorn.read_points(path, tolerance_column="no such")
+    with pytest.raises(TypeError):
+        vorn.read_points(path, colour="red")
+
+
+def test_drawings_are_points_as_well(tmp_path):
+    two = tmp_path / "two.wkt"
+    two.write_text("MULTILINESTRING ((0 0, 1 0, 2 0), (5 5, 6 5))")
+    assert [part.tolist() for part in vorn.read_outlines(two)] == [
+        [[0, 0], [1, 0], [2, 0]], [[5, 5], [6, 5]]]
+    with pytest.raises(vorn.FileError, match="holds 2 outlines"):
+        vorn.read_points(two)
+    bend = tmp_path / "bend.txt"
+    bend.write_text("CIRCULARSTRING (0 0, 1 1, 2 0)")
+    with pytest.raises(vorn.FileError):
+        vorn.read_points(bend, format="wkt")
+    points = vorn.read_points(bend, format="wkt", flatten=0.01)
+    assert len(points) > 5 and np.abs(np.hypot(points[:, 0] - 1, points[:, 1]) - 1).max() < 1e-12
+    for wrong in ({"format": "word"}, {"flatten": 0}, {"flatten": float("nan")}):
+        with pytest.raises(ValueError):
+            vorn.read_points(bend, **wrong)
+
+
+def test_written_points_come_back_in_every_bit(tmp_path, program):
+    path = tmp_path / "scan.csv"
+    points = np.random.default_rng(3).normal(size=(50, 3)) * 10.0 ** np.arange(-20, 30)[:, None]
+    points[:, 2] = np.abs(points[:, 2])
+    vorn.write_points(path, points, units="mm")
+    again = vorn.read_points(path)
+    assert np.array_equal(again, points) and again.units == "mm"
+    vorn.write_points(path, again[:, :2])
+    assert vorn.read_points(path).shape == (50, 2) and vorn.read_points(path).units == "mm"
+    vorn.write_points(path, points[:, :2], tol=0.25)
+    assert vorn.read_points(path)[:, 2].tolist() == [0.25] * 50
+    assert subprocess.run([program, "info", path], capture_output=True, check=False).returncode == 0
+    with pytest.raises(vorn.ContourError, match="point 1"):
+        vorn.write_points(path, [(0, 0), (0, np.nan)])
+
+
+def test_tolerances_follow_the_spacing(corner, program, tmp_path):
+    steps = np.array([(0, 0), (1, 0), (1.5, 0), (4, 0), (4, 2)], dtype=float)
+    assert vorn.tolerance_per_point(steps, cap=0.2) == pytest.approx([0.2, 0.15, 0.15, 0.2, 0.2])
+    closed = vorn.tolerance_per_point(steps + [(0, 0)] * 5, cap=9.0, closed=True)
+    assert closed == pytest.approx([0.3, 0.15, 0.15, 0.6, 0.6])
+    assert vorn.fit(steps, tolerance_per_point=0.2) == vorn.fit(
+        steps, tol=vorn.tolerance_per_point(steps, cap=0.2))
+    path, out = tmp_path / "steps.csv", tmp_path / "steps.json"
+    vorn.write_points(path, steps)
+    subprocess.run([program, "fit", path, "--tolerance-per-point", "0.2", "-o", out], check=True,
+                   capture_output=True)
+    assert vorn.Contour.read(out) == vorn.fit(steps, tolerance_per_point=0.2)
+    with pytest.raises(TypeError, match="both"):
+        vorn.fit(steps, tol=0.1, tolerance_per_point=0.2)
+    for cap in (0, -1, np.nan, np.inf):
+        with pytest.raises(ValueError):
+            vorn.fit(steps, tolerance_per_point=cap)
+        with pytest.raises(ValueError):
+            vorn.tolerance_per_point(steps, cap)
+    with pytest.raises(vorn.PointsTooCloseError):
+        vorn.tolerance_per_point([(0, 0), (0, 0), (1, 0)], cap=1)
 
 
 @pytest.mark.parametrize("columns", ["x", "x,x", "1,2,3,4", ","])

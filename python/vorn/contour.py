@@ -12,6 +12,7 @@ from vorn.contour_edits import ContourEdits
 from vorn.contour_facts import ContourFacts
 from vorn.contour_files import ContourFiles
 from vorn.contour_measures import ContourMeasures, Nearest
+from vorn.contour_outlines import ContourOutlines
 from vorn.contour_rows import FitFacts
 from vorn.pieces import Piece, Place, piece_of, row_of
 
@@ -22,7 +23,8 @@ _DEFINING = ("start_x", "start_y", "end_x", "end_y", "center_x", "center_y", "ra
              "ccw")
 
 
-class Contour(ContourFacts, ContourMeasures, ContourEdits, ContourFiles, Sequence[Piece]):
+class Contour(ContourFacts, ContourMeasures, ContourEdits, ContourOutlines, ContourFiles,
+              Sequence[Piece]):
     """Lines and arcs that follow each other: an immutable sequence of `Line` and `Arc` values.
 
     `vorn.fit` makes contours from points, `Contour.read` reads them from files, and

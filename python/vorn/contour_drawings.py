@@ -2,12 +2,28 @@
 
 from __future__ import annotations
 
-from typing import Any, Optional
+from types import MappingProxyType
+from typing import Any, Mapping, Optional
 
 import numpy.typing as npt
 
 from vorn import _core
 from vorn.contour_rows import ContourRows
+from vorn.errors import ContourError
+
+
+def drawn(drawing: _core.Drawing, format: str, title: str = "contour",
+          magnify: Optional[float] = None, fields: Mapping[str, str] = MappingProxyType({}),
+          dpi: Optional[float] = None, width: Optional[int] = None) -> bytes:
+    """The drawing in this style."""
+    if format != "png" and (dpi is not None or width is not None):
+        raise TypeError("dpi and width are for PNG")
+    if format != "html" and fields:
+        raise TypeError("fields are for HTML")
+    drawing.title = title
+    drawing.magnify = magnify
+    drawing.fields = list(fields.items())
+    return drawing.draw(format, dpi, width)
 
 
 class ContourDrawings(ContourRows):
@@ -48,11 +64,11 @@ class ContourDrawings(ContourRows):
     def to_html(self, points: Optional[npt.ArrayLike] = None,
                 tol: Optional[npt.ArrayLike] = None, **style: Any) -> str:
         """The drawing as one page that pans, zooms and tells about the point under the cursor;
-        parameters and errors as for `to_svg`.
+        parameters and errors as for `to_svg`, and `fields` is a dict of what stands at the head.
 
         >>> from vorn import Contour
         >>> "<title>A line" in Contour.starting_at((0, 0)).append_line((4, 0)).to_html(
-        ...     title="A line")
+        ...     title="A line", fields={"operator": "Jones"})
         True
         """
         return self._drawn("html", points, tol, **style).decode()
@@ -61,6 +77,9 @@ class ContourDrawings(ContourRows):
                tol: Optional[npt.ArrayLike] = None, **style: Any) -> bytes:
         """The drawing as a picture; parameters and errors as for `to_svg`.
 
+        `dpi` tells how many pixels an inch of the page has, 150 if not said, or `width` how many
+        pixels the picture is wide. What is too large to be drawn is a ContourError.
+
         >>> from vorn import Contour
         >>> Contour.starting_at((0, 0)).append_line((4, 0)).to_png()[1:4]
         b'PNG'
@@ -68,11 +87,11 @@ class ContourDrawings(ContourRows):
         return self._drawn("png", points, tol, **style)
 
     def _drawn(self, format: str, points: Optional[npt.ArrayLike], tol: Optional[npt.ArrayLike],
-               title: str = "contour", magnify: Optional[float] = None) -> bytes:
-        drawing = _core.Drawing(self._rows, self._closed, self._units, points, tol)
-        drawing.title = title
-        drawing.magnify = magnify
-        return drawing.draw(format)
+               **style: Any) -> bytes:
+        if not len(self._rows):
+            raise ContourError("the contour has no pieces")
+        return drawn(_core.Drawing(self._rows, self._closed, self._units, points, tol), format,
+                     **style)
 
     def _repr_html_(self) -> str:
         """What a notebook shows."""

@@ -3,7 +3,11 @@
 from __future__ import annotations
 
 import os
-from typing import Any, Optional, Type, TypeVar, Union
+import warnings
+from typing import Any, List, Optional, Type, TypeVar, Union
+
+import numpy as np
+import numpy.typing as npt
 
 from vorn import _core
 from vorn.contour_drawings import ContourDrawings
@@ -16,22 +20,29 @@ class ContourFiles(ContourDrawings):
 
     __slots__ = ()
 
-    def to_text(self, format: str, **options: Any) -> str:
+    def to_text(self, format: str, points: Optional[npt.ArrayLike] = None,
+                tol: Optional[npt.ArrayLike] = None, **options: Any) -> str:
         """The contour as the text of a file.
 
         Parameters
         ----------
-        format : "json", "csv", "dxf", "gcode" or "wkt"
+        format : "json", "csv", "dxf", "gcode", "wkt", "geojson" or, with plain=True, "svg"
+        points, tol : optional
+            Measured points and their tolerances, as for `vorn.fit`: digits and chords, where these
+            are not said, become so fine that the text keeps every point within its tolerance if the
+            contour does.
         **options
-            Of "dxf": entities (LINE and ARC in place of one polyline). Of "gcode": feed, decimals,
-            tolerance, end ("M2", "M30", "none"), plane ("xy", "xz"), radius_words, safe_height,
-            cut_height, plunge_feed, header, footer. Lengths are in the unit of the points, feeds in
-            that unit a minute.
+            Of "dxf": dxf_version ("r12" or "r2000": units and layers of holes), entities (LINE and
+            ARC in place of one polyline). Of "geojson": chords (how far they may be from arcs). Of
+            "svg": plain (lines and arcs in their true size for a cutter, not a drawing). Of
+            "gcode": feed, decimals, tolerance (the digits follow from it), end ("M2", "M30",
+            "none"), plane ("xy", "xz"), radius_words, safe_height, cut_height, plunge_feed, header,
+            footer. Lengths are in the unit of the points, feeds in that unit a minute.
 
         Raises
         ------
         ContourError
-            The format cannot say what the contour needs.
+            The format cannot say what the contour needs, or a point is not finite.
         ValueError, TypeError
             There is no such format or option.
 
@@ -41,24 +52,33 @@ class ContourFiles(ContourDrawings):
         >>> Contour.starting_at((0, 0)).append_line((1, 0)).to_text("wkt")
         'LINESTRING (0 0, 1 0)\\n'
         """
-        return _core.to_text(self._rows, self._closed, self._units, format, options)
+        return _core.to_text(self._rows, self._closed, self._units, format, options, points, tol)
 
     @classmethod
-    def from_text(cls: Type[_Contour], text: str, format: str) -> _Contour:
+    def from_text(cls: Type[_Contour], text: str, format: str,
+                  flatten: Optional[float] = None) -> _Contour:
         """The contour that such a text holds.
 
         Parameters
         ----------
         text : str
         format : str
-            As for `to_text`.
+            As for `to_text`; of "svg" every shape is read.
+        flatten : float, optional
+            How far chords may be from the curves of DXF and SVG that are no arcs, in their unit;
+            these are refused if not said.
 
         Raises
         ------
         FileError
             The text holds no contour; `line` and `column` tell where that shows.
         ValueError
-            There is no such format.
+            There is no such format, or flatten is not above 0.
+
+        Warns
+        -----
+        UserWarning
+            Pieces without length were left out, or further coordinates beside x and y.
 
         Examples
         --------
@@ -66,7 +86,7 @@ class ContourFiles(ContourDrawings):
         >>> Contour.from_text("LINESTRING (0 0, 3 4)", "wkt").length
         5.0
         """
-        return cls._of(*_core.from_text(text, format))
+        return cls._read(*_core.from_text(text, format, flatten))
 
     def to_json(self) -> str:
         """The contour as JSON, every double with all its digits. Raises ContourError as `to_text`.
@@ -110,26 +130,26 @@ class ContourFiles(ContourDrawings):
         """
         return cls.from_text(text, "csv")
 
-    def to_dxf(self, entities: bool = False) -> str:
-        """The contour as DXF: one polyline, or LINE and ARC entities. Raises ContourError as
-        `to_text`.
+    def to_dxf(self, entities: bool = False, dxf_version: str = "r12") -> str:
+        """The contour as DXF: one polyline, or LINE and ARC entities, in the version "r12" or
+        "r2000". Raises ContourError as `to_text`.
 
         >>> from vorn import Contour
         >>> line = Contour.starting_at((0, 0)).append_line((1, 0))
         >>> "POLYLINE" in line.to_dxf(), "POLYLINE" in line.to_dxf(entities=True)
         (True, False)
         """
-        return self.to_text("dxf", entities=entities)
+        return self.to_text("dxf", entities=entities, dxf_version=dxf_version)
 
     @classmethod
-    def from_dxf(cls: Type[_Contour], text: str) -> _Contour:
-        """The contour that a DXF text holds. Raises FileError where it holds none.
+    def from_dxf(cls: Type[_Contour], text: str, flatten: Optional[float] = None) -> _Contour:
+        """The contour that a DXF text holds; flatten and errors are those of `from_text`.
 
         >>> from vorn import Contour
         >>> Contour.from_dxf(Contour.starting_at((0, 0)).append_line((3, 4)).to_dxf()).length
         5.0
         """
-        return cls.from_text(text, "dxf")
+        return cls.from_text(text, "dxf", flatten)
 
     def to_wkt(self) -> str:
         """The contour as well-known text. Raises ContourError as `to_text`.
@@ -169,6 +189,52 @@ class ContourFiles(ContourDrawings):
         """
         return cls.from_text(text, "gcode")
 
+    def to_geojson(self, chords: float) -> str:
+        """The contour as GeoJSON, whose coordinates are those of the contour, not of the globe:
+        Polygons of closed outlines with their holes, LineStrings of others. Chords leave arcs by no
+        more than `chords`, in the unit of the points. Raises ContourError as `to_text`.
+
+        >>> from vorn import Contour
+        >>> "LineString" in Contour.starting_at((0, 0)).append_line((1, 0)).to_geojson(chords=0.1)
+        True
+        """
+        return self.to_text("geojson", chords=chords)
+
+    @classmethod
+    def from_geojson(cls: Type[_Contour], text: str) -> _Contour:
+        """The contour that a GeoJSON text holds. Raises FileError where it holds none.
+
+        >>> from vorn import Contour
+        >>> contour = Contour.starting_at((0, 0)).append_line((3, 4))
+        >>> Contour.from_geojson(contour.to_geojson(chords=0.1)) == contour
+        True
+        """
+        return cls.from_text(text, "geojson")
+
+    def to_plain_svg(self) -> str:
+        """The contour as SVG for a cutter: a path of lines and true arcs for each outline, in its
+        true size where the unit is mm or inch. `to_svg` makes a drawing. Raises ContourError as
+        `to_text`.
+
+        >>> from vorn import Contour
+        >>> contour = Contour.starting_at((0, 0), units="mm").append_line((3, 4))
+        >>> Contour.from_svg(contour.to_plain_svg()).length
+        5.0
+        """
+        return self.to_text("svg", plain=True)
+
+    @classmethod
+    def from_svg(cls: Type[_Contour], text: str, flatten: Optional[float] = None) -> _Contour:
+        """The contour that the shapes of an SVG text make, turned up; flatten and errors are those
+        of `from_text`.
+
+        >>> from vorn import Contour
+        >>> text = '<svg xmlns="http://www.w3.org/2000/svg"><path d="M0 0 L3 4"/></svg>'
+        >>> Contour.from_svg(text).length
+        5.0
+        """
+        return cls.from_text(text, "svg", flatten)
+
     def save(self, path: Union[str, "os.PathLike[str]"], **options: Any) -> None:
         """Writes a file in the format that its ending names. The file is written whole or not at
         all.
@@ -176,9 +242,10 @@ class ContourFiles(ContourDrawings):
         Parameters
         ----------
         path : path-like
-            Ends in json, csv, dxf, nc, gcode, wkt, svg, html or png.
+            Ends in json, csv, dxf, nc, gcode, wkt, geojson, svg, html or png.
         **options
-            Those of `to_text` or `to_svg`.
+            Those of `to_text` for what holds the contour, which "svg" does with plain=True; those
+            of `to_svg` and `to_png` for drawings.
 
         Raises
         ------
@@ -201,7 +268,8 @@ class ContourFiles(ContourDrawings):
         format = _core.format_of(name)
         if format is None:
             raise ValueError(f"the ending of '{name}' names no format")
-        if format in ("svg", "html", "png"):
+        if format in ("html", "png") or (format == "svg" and not options.get("plain")):
+            options.pop("plain", None)
             points = options.pop("points", None)
             contents = self._drawn(format, points, options.pop("tol", None), **options)
         else:
@@ -210,19 +278,23 @@ class ContourFiles(ContourDrawings):
 
     @classmethod
     def read(cls: Type[_Contour], path: Union[str, "os.PathLike[str]"],
-             format: Optional[str] = None) -> _Contour:
+             format: Optional[str] = None, flatten: Optional[float] = None) -> _Contour:
         """Reads a contour from a file of any format that holds one.
 
         Parameters
         ----------
         path : path-like
         format : str, optional
-            As for `to_text`; if not said, the ending or the content of the file tells.
+            As for `from_text`; if not said, the ending or the content of the file tells.
+        flatten : float, optional
+            As for `from_text`.
 
         Raises
         ------
         FileError
             The file cannot be read or holds no contour; `line` and `column` tell where that shows.
+        ValueError
+            As for `from_text`, which also tells of warnings.
 
         Examples
         --------
@@ -233,4 +305,11 @@ class ContourFiles(ContourDrawings):
         ...     Contour.read(file.name).length
         5.0
         """
-        return cls._of(*_core.from_file(os.fspath(path), format))
+        return cls._read(*_core.from_file(os.fspath(path), format, flatten))
+
+    @classmethod
+    def _read(cls: Type[_Contour], rows: npt.NDArray[np.void], closed: bool, units: str,
+              notes: List[str]) -> _Contour:
+        for note in notes:
+            warnings.warn(note, stacklevel=3)
+        return cls._of(rows, closed, units)

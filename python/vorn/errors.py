@@ -3,7 +3,7 @@
 from __future__ import annotations
 
 import enum
-from typing import Sequence
+from typing import Any, Dict, Optional, Sequence, Type
 
 __all__ = ["ContourError", "ErrorCode", "FileError", "NoFitError", "PointsTooCloseError",
            "SelfIntersectionError", "error_for"]
@@ -55,7 +55,7 @@ class ContourError(ValueError):
         self.code = ErrorCode(code)
         self.indices = tuple(indices)
 
-    def __reduce__(self) -> tuple[type, tuple[str, int, tuple[int, ...]]]:
+    def __reduce__(self) -> tuple[type, tuple[Any, ...]]:
         return type(self), (str(self), int(self.code), self.indices)
 
 
@@ -65,24 +65,48 @@ class PointsTooCloseError(ContourError):
     The strategies "mixed" and "cells" need neighbours more than 1.5 times the sum of their
     tolerances apart. The strategy "fewest" does not.
 
+    Attributes
+    ----------
+    distance : float or None
+        How far the two are apart, in the unit of the points, with all digits; None where only the
+        core was asked.
+    needed : float or None
+        What the distance must be above.
+
+    Examples
+    --------
     >>> import vorn
     >>> try:
     ...     vorn.fit([(0, 0), (0.1, 0), (2, 0)], tol=0.1, strategy="mixed")
     ... except vorn.PointsTooCloseError as error:
-    ...     print(error.indices)
-    (0, 1)
+    ...     print(error, error.indices, error.needed)  # doctest: +ELLIPSIS
+    points 0 and 1 are 0.1 apart, which must be more than 0.3 for ... (0, 1) 0.30000000000000004
     """
+
+    def __init__(self, message: str, code: int = ErrorCode.POINTS_TOO_CLOSE,
+                 indices: Sequence[int] = (), distance: Optional[float] = None,
+                 needed: Optional[float] = None) -> None:
+        super().__init__(message, code, indices)
+        self.distance = distance
+        self.needed = needed
+
+    def __reduce__(self) -> tuple[type, tuple[Any, ...]]:
+        return type(self), (str(self), int(self.code), self.indices, self.distance, self.needed)
 
 
 class NoFitError(ContourError):
     """The points have no contour within their tolerances.
 
+    The message says what happened, and `indices` names the point where: the one furthest out of its
+    tolerance from the best single arc, or the first that no lines and arcs take in.
+
     >>> import vorn
     >>> try:
     ...     vorn.fit([(0, 0), (1, 1), (2, 0), (3, 1), (4, 0)], tol=0.01, strategy="arc")
     ... except vorn.NoFitError as error:
-    ...     print("no single arc")
-    no single arc
+    ...     print(str(error).partition(";")[0])
+    no single arc passes the points within their tolerances: point 2 is 0.701 from the circle of \
+least squares, 70.1 times its tolerance
     """
 
 
@@ -130,13 +154,14 @@ class FileError(ContourError, OSError):
     def __str__(self) -> str:
         return str(self.args[0])
 
-    def __reduce__(self) -> tuple[type, tuple[str, str, int, int]]:  # type: ignore[override]
+    def __reduce__(self) -> tuple[type, tuple[Any, ...]]:
         return type(self), (str(self), self.path, self.line, self.column)
 
 
-_TYPES = {ErrorCode.POINTS_TOO_CLOSE: PointsTooCloseError,
-          ErrorCode.NO_FIT: NoFitError,
-          ErrorCode.SELF_INTERSECTION: SelfIntersectionError}
+_TYPES: Dict[int, Type[ContourError]] = {
+    ErrorCode.POINTS_TOO_CLOSE: PointsTooCloseError,
+    ErrorCode.NO_FIT: NoFitError,
+    ErrorCode.SELF_INTERSECTION: SelfIntersectionError}
 
 
 def error_for(message: str, code: int, indices: Sequence[int] = ()) -> ContourError:

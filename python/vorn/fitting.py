@@ -2,16 +2,15 @@
 
 from __future__ import annotations
 
-import os
 from typing import Any, Callable, Optional, Tuple, Union
 
-import numpy as np
 import numpy.typing as npt
 
 from vorn import _core
 from vorn.contour import Contour, fitted
+from vorn.points import units_of
 
-__all__ = ["fit", "read_points"]
+__all__ = ["fit"]
 
 #: Told the percentage that is done; or a tqdm bar, or tqdm itself.
 Progress = Union[Callable[[int], Any], Any]
@@ -19,7 +18,7 @@ Progress = Union[Callable[[int], Any], Any]
 
 def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str] = None,
         closed: Union[str, bool] = "auto", progress: Optional[Progress] = None,
-        **options: Any) -> Contour:
+        units: Optional[str] = None, **options: Any) -> Contour:
     """A contour of lines and arcs that passes every point within its tolerance.
 
     Parameters
@@ -27,7 +26,7 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
     points : array-like
         In the order of the path: (n, 2) with x and y, (n, 3) with x, y and tolerance, of any number
         type and strides, masked nowhere, or a frame with the columns x, y and perhaps w (the
-        tolerance). They are copied once.
+        tolerance). They are copied once. What `read_points` answers brings its unit along.
     tol : float or (n,) array-like, optional
         How far the contour may pass from the points, in their unit; goes before the tolerances that
         the points bring.
@@ -40,6 +39,11 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
     progress : callable, optional
         Called with the percentage that is done, never falling. A tqdm bar does as well, and so
         does ``tqdm.tqdm`` itself. What it raises comes out of the fit.
+    units : str, optional
+        The unit of the points, for files and drawings; that which they bring if not said.
+    tolerance_per_point : float, optional
+        In place of `tol`: the smaller of this cap and 0.3 times the distance to the nearer
+        neighbour, see `vorn.tolerance_per_point`.
     start : int, optional
         Where a closed contour is cut open, as a position in the points; not for "fewest".
     effort : "quick", "wide" or "full", optional
@@ -67,9 +71,19 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
     PointsTooCloseError
         Two neighbours are too close for their tolerances; for "mixed" and "cells".
     NoFitError
-        There is no contour within the tolerances.
+        There is no contour within the tolerances; the message tells at which point.
     ContourError
         The points have no tolerances, or a value that is none, or are too few.
+    TypeError
+        The points or an option are of a type that cannot be used: texts, complex numbers, missing
+        values and so on, or there is no such option.
+    ValueError
+        The points have another shape, some are masked, or an option is none of its words.
+
+    Warns
+    -----
+    UserWarning
+        A tolerance is so small beside the extent of the points that the fit may take minutes.
 
     Notes
     -----
@@ -85,43 +99,10 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
     options.update(strategy=strategy, closed=closed)
     report, close = _reporter(progress)
     try:
-        return fitted(*_core.fit(points, tol, options, report))
+        return fitted(*_core.fit(points, tol, options, report),
+                      units=units_of(points) if units is None else units)
     finally:
         close()
-
-
-def read_points(path: Union[str, "os.PathLike[str]"],
-                columns: str = "") -> npt.NDArray[np.float64]:
-    """Reads points from a file of text, as the program ``contour`` reads them.
-
-    Parameters
-    ----------
-    path : path-like
-        Lines of ``x,y`` or ``x,y,w`` with any usual separator, header and comments. "-" is the
-        standard input.
-    columns : str, optional
-        "x,y" or "x,y,w" as names of the header or numbers counted from 1; found if not said.
-
-    Returns
-    -------
-    (n, 3) array
-        With tolerances, from a column w or a comment ``# tolerance T``; (n, 2) without them.
-
-    Raises
-    ------
-    FileError
-        The file cannot be read, or a line of it is wrong: `line` and `column` tell which.
-
-    Examples
-    --------
-    >>> import tempfile
-    >>> with tempfile.NamedTemporaryFile("w+", suffix=".csv") as file:
-    ...     print("x;y\\n0,5;1\\n2;3", file=file, flush=True)
-    ...     read_points(file.name)
-    array([[0.5, 1. ],
-           [2. , 3. ]])
-    """
-    return _core.read_points(os.fspath(path), columns)[0]
 
 
 def _nothing() -> None:

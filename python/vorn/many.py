@@ -12,7 +12,8 @@ from typing import Any, Callable, Deque, Dict, Iterable, Iterator, List, NamedTu
 import numpy.typing as npt
 
 from vorn.contour import Contour
-from vorn.fitting import fit, read_points
+from vorn.fitting import fit
+from vorn.points import read_points
 
 __all__ = ["FitResult", "fit_many"]
 

@@ -7,6 +7,7 @@ from typing import Any, Optional
 import numpy as np
 import numpy.typing as npt
 
+from vorn import _core
 from vorn.contour import Contour
 from vorn.pieces import Arc
 
@@ -66,7 +67,7 @@ def plot(contour: Contour, points: Optional[npt.ArrayLike] = None,
 
         ax = matplotlib.pyplot.gca()
     if points is not None:
-        _draw_points(ax, contour, np.asarray(points, dtype=float), tol, magnify)
+        _draw_points(ax, contour, _core.numbers(points, "points"), tol, magnify)
     _draw_pieces(ax, contour)
     ax.set_aspect("equal")
     if contour.units:
@@ -103,6 +104,7 @@ def _draw_points(ax: Any, contour: Contour, points: npt.NDArray[np.float64],
     feet = contour.nearest(points)
     points = points[:, :2]
     away = points - feet.places
+    tol = None if tol is None else _core.numbers(tol, "tolerances")
     _require_above_zero("tol", tol)
     _require_above_zero("magnify", magnify)
     if magnify is None:

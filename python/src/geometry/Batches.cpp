@@ -1,9 +1,8 @@
-#include <pybind11/numpy.h>
-
 #include <algorithm>
 #include <limits>
 #include <string>
 
+#include "../Numbers.h"
 #include "Values.h"
 #include "vorn/MathUtils.h"
 
@@ -12,8 +11,6 @@ namespace py = pybind11;
 namespace Vorn::Python {
 
 namespace {
-
-using Numbers = py::array_t<double, py::array::c_style | py::array::forcecast>;
 
 constexpr double kNone = std::numeric_limits<double>::quiet_NaN();
 

@@ -5,6 +5,7 @@
 #include <tuple>
 
 #include "../Errors.h"
+#include "../Numbers.h"
 #include "Values.h"
 
 namespace py = pybind11;
@@ -63,8 +64,12 @@ std::pair<SegmentsRelPosition, std::optional<Place>> SegmentsIntersection(Segmen
 }
 
 void BindAngles(py::module_& module) {
-  module.def("get_natural_angle", py::vectorize(&GeometryUtils::GetNaturalAngle), py::arg("dy"),
-             py::arg("dx"), R"(
+  module.def(
+      "get_natural_angle",
+      [](Numbers const& dy, Numbers const& dx) {
+        return py::vectorize(&GeometryUtils::GetNaturalAngle)(dy, dx);
+      },
+      py::arg("dy"), py::arg("dx"), R"(
 Polar angle of a displacement in an image, whose y axis points down.
 
 Takes numbers or arrays; answers radians in [-pi, pi].
@@ -72,8 +77,12 @@ Takes numbers or arrays; answers radians in [-pi, pi].
 >>> round(float(get_natural_angle(-1.0, 0.0)), 6)
 1.570796
 )");
-  module.def("natural_angle_to_azimuth_rad",
-             py::vectorize(&GeometryUtils::NaturalAngleToAzimuthRad), py::arg("angle"), R"(
+  module.def(
+      "natural_angle_to_azimuth_rad",
+      [](Numbers const& angle) {
+        return py::vectorize(&GeometryUtils::NaturalAngleToAzimuthRad)(angle);
+      },
+      py::arg("angle"), R"(
 Azimuth, clockwise from the positive y axis, of a polar angle.
 
 Takes numbers or arrays in radians; answers radians, pi / 2 - angle wrapped once.
@@ -81,9 +90,12 @@ Takes numbers or arrays in radians; answers radians, pi / 2 - angle wrapped once
 >>> round(float(natural_angle_to_azimuth_rad(0.0)), 6)
 1.570796
 )");
-  module.def("natural_angle_to_tangential_azimuth_rad",
-             py::vectorize(&GeometryUtils::NaturalAngleToTangentialAzimuthRad), py::arg("angle"),
-             py::arg("flag"), R"(
+  module.def(
+      "natural_angle_to_tangential_azimuth_rad",
+      [](Numbers const& angle, py::array_t<bool> const& flag) {
+        return py::vectorize(&GeometryUtils::NaturalAngleToTangentialAzimuthRad)(angle, flag);
+      },
+      py::arg("angle"), py::arg("flag"), R"(
 Azimuth of the tangent that belongs to a polar angle.
 
 Takes numbers or arrays in radians; answers pi - angle where flag is true, else the angle negated

@@ -1,10 +1,10 @@
-#include <pybind11/numpy.h>
 #include <pybind11/operators.h>
 
 #include <algorithm>
 #include <cstring>
 
 #include "../Errors.h"
+#include "../Numbers.h"
 #include "Values.h"
 #include "vorn/Matrix.h"
 
@@ -13,8 +13,6 @@ namespace py = pybind11;
 namespace Vorn::Python {
 
 namespace {
-
-using Numbers = py::array_t<double, py::array::c_style | py::array::forcecast>;
 
 constexpr py::ssize_t kOrder = 3;
 constexpr py::ssize_t kElements = 9;

@@ -1,8 +1,7 @@
-#include <pybind11/numpy.h>
-
 #include <string>
 
 #include "../Errors.h"
+#include "../Numbers.h"
 #include "Values.h"
 #include "vorn/MathUtils.h"
 
@@ -11,8 +10,6 @@ namespace py = pybind11;
 namespace Vorn::Python {
 
 namespace {
-
-using Numbers = py::array_t<double, py::array::c_style | py::array::forcecast>;
 
 std::vector<double> VectorOf(Numbers const& numbers) {
   return {numbers.data(), numbers.data() + numbers.size()};
@@ -48,14 +45,20 @@ Place LinesIntersection(double k1, double m1, double k2, double m2) {
 }
 
 void BindRounding(py::module_& module) {
-  module.def("get_outside_max", py::vectorize(&MathUtils::GetOutsideMax), py::arg("value"), R"(
+  module.def(
+      "get_outside_max",
+      [](Numbers const& value) { return py::vectorize(&MathUtils::GetOutsideMax)(value); },
+      py::arg("value"), R"(
 The smallest whole number that is not below the value, for numbers or arrays; -2147483648 where that
 does not fit 32 bits.
 
 >>> int(get_outside_max(1.2))
 2
 )");
-  module.def("get_outside_min", py::vectorize(&MathUtils::GetOutsideMin), py::arg("value"), R"(
+  module.def(
+      "get_outside_min",
+      [](Numbers const& value) { return py::vectorize(&MathUtils::GetOutsideMin)(value); },
+      py::arg("value"), R"(
 The largest whole number that is not above the value, for numbers or arrays; -2147483648 where that
 does not fit 32 bits.
 

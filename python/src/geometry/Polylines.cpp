@@ -1,6 +1,5 @@
-#include <pybind11/numpy.h>
-
 #include "../Errors.h"
+#include "../Numbers.h"
 #include "Values.h"
 
 namespace py = pybind11;
@@ -9,10 +8,9 @@ namespace Vorn::Python {
 
 namespace {
 
-using Coords = py::array_t<double, py::array::c_style | py::array::forcecast>;
 using Indices = std::vector<std::int32_t>;
 
-std::vector<double> VectorOf(Coords const& coords) {
+std::vector<double> VectorOf(Numbers const& coords) {
   return {coords.data(), coords.data() + coords.size()};
 }
 
@@ -23,7 +21,7 @@ bool ContourMeetsItself(Elems const& contour) {
   return false;
 }
 
-bool PolylineMeetsItself(Coords const& coords, Indices const& indices) {
+bool PolylineMeetsItself(Numbers const& coords, Indices const& indices) {
   std::vector<double> vertices = VectorOf(coords);
   bool found = false;
   RequireOk(GeometryUtils::CheckPolySelfIntersection(vertices, indices, &found),
@@ -37,7 +35,7 @@ double AreaOfContour(Elems const& contour) {
   return area;
 }
 
-double AreaOfPolyline(Coords const& coords, Indices const& indices) {
+double AreaOfPolyline(Numbers const& coords, Indices const& indices) {
   double area = 0.0;
   RequireOk(GeometryUtils::GetArea(VectorOf(coords), indices, &area), "get_area");
   return area;
