@@ -136,7 +136,7 @@ class Drawing {
   }
 
   std::string NumberText() {
-    constexpr std::array kOdd = {"1e-12", ".5", "-.25e1", "1e9", "0", "-0", "1e-300", "3E2"};
+    constexpr std::array kOdd = {"1e-12", ".5", "-.25e1", "1e4", "0", "-0", "1e-300", "3E2"};
     std::uint8_t const odd = input_.Byte();
     if (odd < kOdd.size()) return kOdd[odd];
     char text[40];

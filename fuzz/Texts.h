@@ -19,7 +19,7 @@ namespace Vorn::Fuzz {
 inline constexpr std::array kWords = {
     "nan",  "-inf", "1e999",       "-0",  "1e-320",  "",         "[",    "]",      "{",
     "}",    "\"",   ",",           ";",   "(",       ")",        "\\u0", "VERTEX", "SEQEND",
-    "null", "\xff", "99999999999", "G91", "G2",      "EMPTY",    "<g>",  "</g>",   "1e150",
+    "null", "\xff", "99999999999", "G91", "G2",      "EMPTY",    "<g>",  "</g>",   "1e5",
     "z",    "A",    "1e-9",        "\n",  "Feature", "matrix(0)"};
 
 /// One to eight lines and arcs on the grid, each from the end of the one before.

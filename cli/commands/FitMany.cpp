@@ -15,6 +15,7 @@
 #include <utility>
 
 #include "cli/base/Advice.h"
+#include "cli/base/Handover.h"
 #include "cli/commands/Outputs.h"
 #include "cli/texts/Relative.h"
 #include "vorn/io/FitSummary.h"
@@ -243,29 +244,40 @@ ExitCode RunFitMany(FitMany const& many, Console const& console) {
                                     static_cast<std::size_t>(jobs));
   tbb::task_arena arena(jobs);
   Listing listing(many, console);
+  std::vector<std::unique_ptr<Outcome>> outcomes(many.paths.size());
   std::size_t next = 0;
+  Handover taken;
+  Handover done;
   auto const take = [&](tbb::flow_control& control) {
-    if (next == many.paths.size()) control.stop();
-    return next++;
+    taken.Take();
+    std::size_t const i = next++;
+    taken.Give();
+    if (i == many.paths.size()) control.stop();
+    return i;
   };
   auto const fit = [&](std::size_t i) {
     std::string const& path = many.paths[i];
-    return std::make_shared<Outcome>(Guarded(path, [&] { return FitFile(many, path); }));
+    outcomes[i] = std::make_unique<Outcome>(Guarded(path, [&] { return FitFile(many, path); }));
+    done.Give();
+    return i;
   };
-  auto const finish = [&](std::shared_ptr<Outcome> const& outcome) {
-    std::string const path = outcome->path;
-    listing.Add(Guarded(path, [&] { return Written(std::move(*outcome), console); }));
+  auto const finish = [&](std::size_t i) {
+    done.Take();
+    Outcome outcome = std::move(*outcomes[i]);
+    outcomes[i].reset();
+    listing.Add(Guarded(many.paths[i], [&] { return Written(std::move(outcome), console); }));
+    done.Give();
   };
   // Some more files on the way than threads, for a slow one not to hold up the others.
   std::size_t const onTheWay = 4 * static_cast<std::size_t>(jobs);
   arena.execute([&] {
+    using tbb::filter_mode;
     tbb::parallel_pipeline(
-        onTheWay, tbb::make_filter<void, std::size_t>(tbb::filter_mode::serial_in_order, take) &
-                      tbb::make_filter<std::size_t, std::shared_ptr<Outcome>>(
-                          tbb::filter_mode::parallel, fit) &
-                      tbb::make_filter<std::shared_ptr<Outcome>, void>(
-                          tbb::filter_mode::serial_in_order, finish));
+        onTheWay, tbb::make_filter<void, std::size_t>(filter_mode::serial_in_order, take) &
+                      tbb::make_filter<std::size_t, std::size_t>(filter_mode::parallel, fit) &
+                      tbb::make_filter<std::size_t, void>(filter_mode::serial_in_order, finish));
   });
+  done.Take();
   return listing.Finish();
 }
 
