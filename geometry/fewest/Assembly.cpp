@@ -88,7 +88,10 @@ struct Bisector {
 
   Bisector(Point const& start, Point const& end)
       : middle{0.5 * (start.x + end.x), 0.5 * (start.y + end.y)} {
-    Point const chord = Minus(end, start);
+    Point chord = Minus(end, start);
+    // Scaled, since the squares of very small or very large lengths are no doubles.
+    double const scale = ScaleOf(std::max(std::fabs(chord.x), std::fabs(chord.y)));
+    chord = {chord.x * scale, chord.y * scale};
     double const length = Length(chord);
     if (length > 0.0) normal = {-chord.y / length, chord.x / length};
   }

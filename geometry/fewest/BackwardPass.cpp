@@ -42,7 +42,7 @@ class BackwardPass {
     Link const& link = links_[k];
     Opening end = path_.finish;
     if (k + 1 < links_.size()) {
-      end = {chain_.gates[k], chain_.offsets[k], chain_.offsets[k], false};
+      end = EndAt(chain_.gates[k], chain_.offsets[k]);
     }
     std::int32_t const first = link.opening.First();
     std::int32_t const last = end.isFree ? path_.Count() : end.gate.split;

@@ -23,18 +23,17 @@ struct Neighbours {
 class Balancer {
  public:
   Balancer(Path const& path, Chain const& chain)
-      : path_(path), search_(path, 1.0), balanced_{chain, 0.0} {}
+      : path_(path), search_(path, 1.0), balanced_(chain) {}
 
-  BalancedChain Run() {
-    Chain& chain = balanced_.chain;
+  Chain Run() {
     // From the last gate on: there the piece behind begins too late, but ends where it has to.
-    for (std::size_t k = chain.gates.size(); k-- > 0;) Move(k);
-    for (ChainPiece& piece : chain.pieces) {
+    for (std::size_t k = balanced_.gates.size(); k-- > 0;) Move(k);
+    for (ChainPiece& piece : balanced_.pieces) {
       search_.MoveTo(piece.first, piece.end);
       PieceFit const fit = search_.FitAlone(piece.first, piece.end);
       if (!fit.isFound) continue;
-      balanced_.leastShare = std::max(balanced_.leastShare, fit.ratio);
       piece.circle = fit.circle;
+      piece.ratio = fit.ratio;
     }
     return std::move(balanced_);
   }
@@ -45,8 +44,8 @@ class Balancer {
   }
 
   void Move(std::size_t k) {
-    ChainPiece& before = balanced_.chain.pieces[k];
-    ChainPiece& behind = balanced_.chain.pieces[k + 1];
+    ChainPiece& before = balanced_.pieces[k];
+    ChainPiece& behind = balanced_.pieces[k + 1];
     std::int32_t low = before.first + (before.end - before.first + 1) / 2;
     std::int32_t high = before.end;
     search_.MoveTo(before.first, behind.end);
@@ -68,21 +67,38 @@ class Balancer {
     }
     if (split <= before.first || split >= behind.end || best.Larger() > kRoom) return;
     Gate gate;
-    if (!CornerGate(path_, split, best.before.circle, best.behind.circle, &gate)) {
+    if (CornerGate(path_, split, best.before.circle, best.behind.circle, &gate)) {
+      gate.split = split = SplitAt(gate, before.first, behind.end);
+    } else {
       gate = MiddleGate(path_, split, best.before.circle);
     }
-    balanced_.chain.gates[k] = gate;
+    balanced_.gates[k] = gate;
     before.end = split;
     behind.first = split;
   }
 
+  /// The first point behind a corner in space: one that lies near it may deviate little from either
+  /// piece, but lies beside only one of them.
+  std::int32_t SplitAt(Gate const& gate, std::int32_t first, std::int32_t end) const {
+    std::int32_t split = gate.split;
+    if (gate.isCusp) return split;
+    auto const isBehind = [&](std::int32_t point) {
+      WPoint const& p = path_.At(point);
+      // The path runs to the right of the gate's direction.
+      return gate.across.y * (p.x - gate.origin.x) > gate.across.x * (p.y - gate.origin.y);
+    };
+    while (split > first + 1 && isBehind(split - 1)) --split;
+    while (split < end - 1 && !isBehind(split)) ++split;
+    return split;
+  }
+
   Path const& path_;
   PieceSearch search_;
-  BalancedChain balanced_;
+  Chain balanced_;
 };
 
 }  // namespace
 
-BalancedChain Balance(Path const& path, Chain const& chain) { return Balancer(path, chain).Run(); }
+Chain Balance(Path const& path, Chain const& chain) { return Balancer(path, chain).Run(); }
 
 }  // namespace Vorn::Fewest

@@ -14,9 +14,16 @@ class GateFollower {
  public:
   /// `safe` is null where there are no other gates.
   GateFollower(Path const& path, double share, Chain known, Chain const* safe)
-      : path_(path), search_(path, share), known_(std::move(known)), safe_(safe) {}
+      : path_(path), search_(path, share), share_(share), known_(std::move(known)), safe_(safe) {}
 
   Chain Run() {
+    Chain chain = Follow();
+    for (ChainPiece& piece : chain.pieces) piece.ratio *= share_;
+    return chain;
+  }
+
+ private:
+  Chain Follow() {
     std::size_t const last = known_.pieces.size() - 1;
     Link first;
     first.opening = path_.start;
@@ -34,7 +41,6 @@ class GateFollower {
     return PlacePieces(path_, std::move(links_), &search_);
   }
 
- private:
   /// Adds the link behind the next gate; false when no piece reaches it.
   bool Advance() {
     std::size_t const k = links_.size() - 1;
@@ -73,6 +79,7 @@ class GateFollower {
 
   Path const& path_;
   PieceSearch search_;
+  double share_;
   Chain known_;
   Chain const* safe_;
   std::vector<Link> links_;

@@ -56,4 +56,13 @@ struct Opening {
   std::int32_t First() const { return isFree ? 0 : gate.split; }
 };
 
+/// The one offset of a gate at which the piece before it ends.
+inline Opening EndAt(Gate const& gate, double offset) { return {gate, offset, offset, false}; }
+
+/// The same as the piece behind it starts there.
+inline Opening StartAt(Gate const& gate, double offset) {
+  double const seen = gate.isCusp ? -offset : offset;
+  return {SeenFromBehind(gate), seen, seen, false};
+}
+
 }  // namespace Vorn::Fewest

@@ -43,7 +43,9 @@ PieceFit PieceSearch::FindStraight(Opening const& from, Opening const& to) {
                               : PlaceOn(opening.gate, 0.5 * (opening.low + opening.high)));
   };
   Circle const chord = LineThrough(endOf(from, first), endOf(to, end - 1));
-  return FromLocal(FitAnyRadius({chord, 0.0, false}, false, {&from, &to, first, end}));
+  RunFit fit = FitAnyRadius({chord, 0.0, false}, false, {&from, &to, first, end});
+  fit.circle.a = 0.0;  // but for rounding it is
+  return FromLocal(fit);
 }
 
 }  // namespace Vorn::Fewest

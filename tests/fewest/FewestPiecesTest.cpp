@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <limits>
@@ -7,6 +8,7 @@
 #include "gtest/gtest.h"
 #include "support/fewest/FewestCalls.h"
 #include "support/fewest/Motions.h"
+#include "support/fewest/PromiseChecker.h"
 #include "support/fewest/Scans.h"
 #include "vorn/FewestPieces.h"
 
@@ -401,6 +403,56 @@ TEST(FewestPiecesProgress, WhatItThrowsEndsTheCallAndTouchesNothing) {
     FewestResult untouched = Untouchable();
     EXPECT_THROW(FewestPieces::Fit(scan, {}, &untouched, &stopper, 100), Stopper::Stopped);
     ExpectSameResult(untouched, Untouchable());
+  }
+}
+
+// --- Centring ------------------------------------------------------------------------------------
+
+/// The largest share of its tolerance by which a point is off each piece.
+std::vector<double> RatiosOfPieces(Scan const& scan, FewestResult const& result) {
+  std::vector<double> ratios;
+  for (std::size_t k = 0; k < result.ranges.size(); ++k) {
+    Checker::Piece const piece(Checker::ToVec(result.contour[k].end), result.contour[k + 1]);
+    double largest = 0.0;
+    for (std::int32_t i = result.ranges[k].first; i <= result.ranges[k].last; ++i) {
+      WPoint const& p = scan[static_cast<std::size_t>(i)];
+      largest = std::fmax(largest, static_cast<double>(piece.Distance(Checker::ToVec(p)) / p.w));
+    }
+    ratios.push_back(largest);
+  }
+  return ratios;
+}
+
+TEST(FewestPiecesFit, CentringBringsBackTheTrueLines) {
+  for (ProfileStyle const style :
+       {ProfileStyle::Smooth, ProfileStyle::Corners, ProfileStyle::Mixed}) {
+    FewestResult const result = FitKept(MakeNoisyProfile(1, style, 1, 1000, 0.45));
+    EXPECT_EQ(PieceCount(result), 16);
+    EXPECT_EQ(ArcCount(result), 8);
+    EXPECT_LE(result.largestDeviation, 0.9);
+  }
+}
+
+// One point that needs nearly all of its tolerance keeps its piece and the joints beside it, and
+// none of the others.
+TEST(FewestPiecesFit, ATightPlaceLeavesThePiecesFarFromItCentred) {
+  Scan scan = MakeNoisyProfile(1, ProfileStyle::Corners, 1, 1000, 0.2);
+  auto const before = RatiosOfPieces(scan, FitKept(scan));
+  // The middle of the third line, moved across it.
+  std::size_t const at = 400;
+  double const dx = scan[at + 8].x - scan[at - 8].x;
+  double const dy = scan[at + 8].y - scan[at - 8].y;
+  double const off = 1.7 * scan[at].w / std::hypot(dx, dy);
+  scan[at].x -= off * dy;
+  scan[at].y += off * dx;
+  FewestResult const result = FitKept(scan);
+  auto const after = RatiosOfPieces(scan, result);
+  ASSERT_EQ(after.size(), before.size());
+  EXPECT_GT(*std::max_element(after.begin(), after.end()), 0.7);
+  for (std::size_t k = 0; k < after.size(); ++k) {
+    if (result.ranges[k].last + 200 < 400 || result.ranges[k].first - 200 > 400) {
+      EXPECT_NEAR(after[k], before[k], 0.1) << "piece " << k;
+    }
   }
 }
 
