@@ -87,6 +87,7 @@ ExitCode RunMany(FitOptions const& options, Console const& console) {
 ExitCode Run(FitOptions const& options, Console const& console) {
   RequireWritable(options.Written());
   std::vector<PointFile> outlines = ReadPointOutlinesInput(options.points, console);
+  ReportDroppedHeights(outlines.front(), console);
   if (outlines.size() > 1) return RunFitOutlines(options, std::move(outlines), console);
   FitReport report = FitWithProgress(options, std::move(outlines.front()), console);
   std::vector<FittedFile> const files = FilesOf(options, report);

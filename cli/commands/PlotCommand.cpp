@@ -142,11 +142,13 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
   }
   ContourFile contour;
   if (!options.contour.empty()) contour = ReadDrawnContour(options, console);
+  std::string const gaps = DescribeGaps(contour);
   Drawing drawing = MakeDrawing(std::move(file.points), std::move(contour.pieces));
   drawing.units = file.units.empty() ? contour.units : file.units;
   drawing.title = NameOfFile(options.points.path);
   drawing.facts = {DescribeTolerance(drawing)};
   if (!options.contour.empty()) drawing.facts.push_back("contour " + NameOfFile(options.contour));
+  if (!gaps.empty()) drawing.facts.push_back(gaps);
   drawing.magnify = options.magnify;
   drawing.head = options.head;
   return drawing;

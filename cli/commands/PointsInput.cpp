@@ -1,5 +1,6 @@
 #include "cli/commands/PointsInput.h"
 
+#include <ostream>
 #include <utility>
 
 #include "cli/commands/CommonOptions.h"
@@ -109,6 +110,13 @@ std::vector<PointFile> ReadPointOutlinesInput(PointsInput const& input, Console 
   return ChosenOutlines(input, ReadPointOutlines(input.path, console.in, ReadingOf(input)));
 }
 
+void ReportDroppedHeights(PointFile const& outline, Console const& console) {
+  if (!outline.hadHeights) return;
+  std::string const path =
+      outline.path.substr(0, outline.path.size() - OutlineSuffix(outline.outline).size());
+  console.err << "contour: " << path << ": dropped the coordinates beside x and y\n";
+}
+
 void RequireOneOutline(PointsInput const& input, std::size_t count) {
   if (count < 2) return;
   throw Failure(FailureKind::BadArgument, {InputName(input.path)},
@@ -118,11 +126,13 @@ void RequireOneOutline(PointsInput const& input, std::size_t count) {
 PointFile ReadPointsInput(PointsInput const& input, Console const& console) {
   std::vector<PointFile> outlines = ReadPointOutlinesInput(input, console);
   RequireOneOutline(input, outlines.size());
+  ReportDroppedHeights(outlines.front(), console);
   return std::move(outlines.front());
 }
 
 PointFile ReadAllPointsInput(PointsInput const& input, Console const& console) {
   std::vector<PointFile> outlines = ReadPointOutlinesInput(input, console);
+  ReportDroppedHeights(outlines.front(), console);
   return outlines.size() == 1 ? std::move(outlines.front()) : Joined(outlines);
 }
 

@@ -45,6 +45,9 @@ void AddClosedChoice(Command& command, ClosedChoice* choice);
 ///         outlines.
 std::vector<PointFile> ReadPointOutlinesInput(PointsInput const& input, Console const& console);
 
+/// Says on the standard error that coordinates beside x and y were dropped, if they were.
+void ReportDroppedHeights(PointFile const& outline, Console const& console);
+
 /// @throws Failure (FailureKind::BadArgument) unless the file has one outline, or one was chosen.
 void RequireOneOutline(PointsInput const& input, std::size_t count);
 

@@ -233,6 +233,7 @@ ExitCode Run(Options const& options, Console const& console) {
   RequireWritable(options.Written());
   std::string const text = ReadTextFile(options.points.path, console.in);
   Thinned const thinned = Thin(options, text);
+  ReportDroppedHeights(thinned.file, console);
   PointFile const& file = thinned.file;
   std::vector<std::size_t> const dropped = Others(thinned.kept, file.points.size());
   bool const staysText = !file.lines.empty() && !options.doAverage;

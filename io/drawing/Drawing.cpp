@@ -90,6 +90,8 @@ Drawing DrawingOf(ContourFile const& contour) {
                       ? kStandardInputName
                       : std::filesystem::path(contour.path).filename().string();
   drawing.units = contour.units;
+  std::string const gaps = DescribeGaps(contour);
+  if (!gaps.empty()) drawing.facts.push_back(gaps);
   return drawing;
 }
 
@@ -106,6 +108,18 @@ Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece> pieces) {
   }
   drawing.deviations = std::move(measured.points);
   return drawing;
+}
+
+std::string DescribeGaps(ContourFile const& contour) {
+  std::vector<Gap> const gaps = FindGaps(contour);
+  if (gaps.empty()) return "";
+  Gap const& widest = *std::max_element(gaps.begin(), gaps.end(),
+                                        [](Gap const& a, Gap const& b) { return a.size < b.size; });
+  std::string const units = contour.units.empty() ? "" : " " + contour.units;
+  std::string const text = "GAP of " + FormatShort(widest.size) + units + " between pieces " +
+                           std::to_string(widest.before + 1) + " and " +
+                           std::to_string(widest.after + 1);
+  return gaps.size() == 1 ? text : text + ", the widest of " + std::to_string(gaps.size());
 }
 
 std::string Drawn(Drawing const& drawing, Format format, PngSize const& size) {

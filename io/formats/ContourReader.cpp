@@ -2,6 +2,7 @@
 #include "io/formats/Dxf.h"
 #include "io/formats/GCode.h"
 #include "io/formats/JsonPieces.h"
+#include "io/formats/ReadingMemory.h"
 #include "io/formats/Svg.h"
 #include "io/formats/Text.h"
 #include "io/formats/Wkt.h"
@@ -25,22 +26,10 @@ void RefuseEmpty(std::string_view text, std::string const& path) {
   if (text.find_first_not_of(" \t\r\n") == std::string_view::npos) RefuseFile(path, "is empty");
 }
 
-constexpr std::size_t kMebibyte = std::size_t{1} << 20;
-
-/// How long the text of a contour may be. A point takes as little as four bytes of these formats
-/// and up to 67 times as much memory, as measured for a line string of GeoJSON of a digit a
-/// coordinate: some 2 GB at the limit. An entity of DXF is much longer. SVG has a limit of its own.
-std::size_t LargestText(Format format) {
-  constexpr std::size_t kTerse = 32 * kMebibyte;
-  constexpr std::size_t kWordy = 256 * kMebibyte;
-  return format == Format::Dxf || format == Format::Svg ? kWordy : kTerse;
-}
-
 void RefuseTooLarge(std::string_view text, std::string const& path, Format format) {
-  std::size_t const largest = LargestText(format);
-  if (text.size() <= largest) return;
-  RefuseFile(path, "is too large: more than " + std::to_string(largest / kMebibyte) + " MiB of " +
-                       NameOf(format));
+  if (MemoryToRead(text, format) <= kLargestMemory) return;
+  RefuseFile(path, "is too large: to read this " + NameOf(format) +
+                       " would take more than 1 GiB of memory");
 }
 
 Format RecognisedFormat(std::string_view text, std::string const& path) {

@@ -72,8 +72,10 @@ class Reader {
     }
   }
 
-  static XY PointAt(Field const& point) {
+  /// A contour lies in a plane: further coordinates are dropped.
+  XY PointAt(Field const& point) {
     if (point.Count() < 2) point.Refuse("is no place but " + point.Text());
+    contour_.hadHeights = contour_.hadHeights || point.Count() > 2;
     return {point.Item(0).Number(), point.Item(1).Number()};
   }
 

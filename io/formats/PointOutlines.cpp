@@ -72,6 +72,7 @@ class Taker {
       file.outline = outlines.size() > 1 ? i + 1 : 0;
       file.path = contour_.path + OutlineSuffix(file.outline);
       file.units = contour_.units;
+      file.hadHeights = contour_.hadHeights;
       file.points = PointsOf(outlines[i], file.path);
       files.push_back(std::move(file));
     }

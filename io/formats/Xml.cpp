@@ -16,8 +16,8 @@ namespace {
 /// Drawings are some ten levels deep. The parser and the readers keep something for each.
 constexpr std::size_t kDeepest = 1000;
 
-/// A drawing of ten million points, which take some 3 GB as pieces.
-constexpr std::size_t kLargestText = std::size_t{64} << 20;
+/// The parser counts bytes in 32 bits.
+constexpr std::size_t kLargestText = std::size_t{1} << 30;
 constexpr char kBehindNamespace = '\n';
 
 std::string_view LocalName(char const* name) {

@@ -1,10 +1,12 @@
 #include "io/pieces/Chains.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <deque>
-#include <map>
+#include <numeric>
 #include <optional>
+#include <tuple>
 #include <utility>
 
 namespace Vorn::IO {
@@ -23,10 +25,15 @@ class EndIndex {
  public:
   EndIndex(std::vector<Ends> const& all, double tolerance)
       : all_(all), tolerance_(tolerance), isUsed_(all.size(), false) {
+    entries_.reserve(2 * all.size());
     for (std::size_t i = 0; i < all.size(); ++i) {
-      ends_.emplace(CellOf(all[i].start), End{i, true});
-      ends_.emplace(CellOf(all[i].end), End{i, false});
+      entries_.push_back({CellOf(all[i].start), true, i});
+      entries_.push_back({CellOf(all[i].end), false, i});
     }
+    std::sort(entries_.begin(), entries_.end());
+    // One more stands for the end of the list.
+    next_.resize(entries_.size() + 1);
+    std::iota(next_.begin(), next_.end(), std::size_t{0});
   }
 
   bool IsUsed(std::size_t index) const { return isUsed_[index]; }
@@ -34,20 +41,28 @@ class EndIndex {
 
   /// The end of an unused one at the place: of the first such, its start before its end if
   /// `wantsStart`.
-  std::optional<End> Find(XY const& place, bool wantsStart) const {
-    std::optional<End> best;
-    Cell const middle = CellOf(place);
-    for (std::int64_t i = -1; i <= 1; ++i) {
-      for (std::int64_t k = -1; k <= 1; ++k) {
-        auto const [begin, end] = ends_.equal_range({middle.first + i, middle.second + k});
-        for (auto at = begin; at != end; ++at) Consider(at->second, place, wantsStart, &best);
-      }
+  std::optional<End> Find(XY const& place, bool wantsStart) {
+    for (bool const isStart : {wantsStart, !wantsStart}) {
+      std::optional<std::size_t> const index = FindKind(place, isStart);
+      if (index) return End{*index, isStart};
     }
-    return best;
+    return {};
   }
 
  private:
   using Cell = std::pair<std::int64_t, std::int64_t>;
+
+  /// An end, in the order of cells, starts before ends, the first before the later ones.
+  struct Entry {
+    Cell cell;
+    bool isStart = true;
+    std::size_t index = 0;
+
+    bool operator<(Entry const& other) const {
+      return std::tuple(cell, !isStart, index) <
+             std::tuple(other.cell, !other.isStart, other.index);
+    }
+  };
 
   Cell CellOf(XY const& place) const { return {NumberOf(place.x), NumberOf(place.y)}; }
 
@@ -59,17 +74,51 @@ class EndIndex {
     return std::fabs(number) < kFurthest ? static_cast<std::int64_t>(number) : 0;
   }
 
-  void Consider(End const& end, XY const& place, bool wantsStart, std::optional<End>* best) const {
-    XY const& at = end.isStart ? all_[end.index].start : all_[end.index].end;
-    if (isUsed_[end.index] || !(Distance(at, place) <= tolerance_)) return;
-    auto const rank = [&](End const& e) { return std::pair(e.isStart != wantsStart, e.index); };
-    if (!*best || rank(end) < rank(**best)) *best = end;
+  /// The first unused one of which a start, or an end, lies at the place.
+  std::optional<std::size_t> FindKind(XY const& place, bool isStart) {
+    std::optional<std::size_t> best;
+    Cell const middle = CellOf(place);
+    for (std::int64_t i = -1; i <= 1; ++i) {
+      for (std::int64_t k = -1; k <= 1; ++k) {
+        Entry const first = {{middle.first + i, middle.second + k}, isStart, 0};
+        std::optional<std::size_t> const index = FindInCell(first, place);
+        if (index && (!best || *index < *best)) best = index;
+      }
+    }
+    return best;
+  }
+
+  std::optional<std::size_t> FindInCell(Entry const& first, XY const& place) {
+    auto const begin = std::lower_bound(entries_.begin(), entries_.end(), first);
+    for (std::size_t at = UnusedFrom(static_cast<std::size_t>(begin - entries_.begin()));
+         at < entries_.size(); at = UnusedFrom(at + 1)) {
+      Entry const& entry = entries_[at];
+      if (entry.cell != first.cell || entry.isStart != first.isStart) return {};
+      Ends const& ends = all_[entry.index];
+      if (Distance(entry.isStart ? ends.start : ends.end, place) <= tolerance_) return entry.index;
+    }
+    return {};
+  }
+
+  /// The first entry from here on that is not used. Ways over used ones are shortened, so that ends
+  /// that crowd in one place are not gone over again and again.
+  std::size_t UnusedFrom(std::size_t at) {
+    std::size_t unused = at;
+    while (unused < entries_.size() && isUsed_[entries_[unused].index]) {
+      unused = std::max(unused + 1, next_[unused]);
+    }
+    for (std::size_t next = at; next < unused; at = next) {
+      next = std::max(at + 1, next_[at]);
+      next_[at] = unused;
+    }
+    return unused;
   }
 
   std::vector<Ends> const& all_;
   double tolerance_;
   std::vector<bool> isUsed_;
-  std::multimap<Cell, End> ends_;
+  std::vector<Entry> entries_;     ///< sorted
+  std::vector<std::size_t> next_;  ///< where to look on behind a used entry, or the entry itself
 };
 
 /// Grows one chain.

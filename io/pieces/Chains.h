@@ -27,7 +27,8 @@ struct LinkChain {
 
 /// Chains by their ends, whatever their order and sense: each begins with the first that is in no
 /// other yet and grows at both ends until it is closed. Of several that go on, the first counts.
-/// O(n log n) when ends do not crowd within the tolerance, which must be above 0.
+/// The tolerance must be above 0. O(n log n), also for ends in one place; only ends that share a
+/// cell of the tolerance without being within it of each other cost more.
 std::vector<LinkChain> ChainsOf(std::vector<Ends> const& all, double tolerance);
 
 }  // namespace Vorn::IO

@@ -80,7 +80,12 @@ TEST_F(Program, HeightsOfAFileAreToldAsDropped) {
   Write("p.wkt", "LINESTRING Z (0 0 1, 3 4 1)");
   Ended const ended = Run("convert p.wkt -o p.json");
   EXPECT_EQ(ended.code, 0);
-  EXPECT_EQ(ended.err, "contour: p.wkt: dropped the coordinates beside x and y\n");
+  std::string const told = "contour: p.wkt: dropped the coordinates beside x and y\n";
+  EXPECT_EQ(ended.err, told);
+  for (char const* line : {"fit p.wkt -t 0.1", "info p.wkt", "check p.wkt p.json -t 0.1",
+                           "plot p.wkt -o p.svg", "simplify p.wkt --spacing 1 -o p.csv"}) {
+    EXPECT_TRUE(Run(line).err.starts_with(told)) << line;
+  }
 }
 
 }  // namespace

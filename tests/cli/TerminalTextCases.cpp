@@ -25,26 +25,29 @@ std::string MemoryLimit(int megabytes) {
   return "ulimit -v " + std::to_string(megabytes * 1000) + ";";
 }
 
-// Each as a single line, or lines, of a point in a few bytes, a little above the limit.
+// Each as a single line, or lines, of a point in a few bytes, a little above what 1 GiB holds.
 TEST_F(Program, LargeContoursAreRefusedInLittleMemory) {
   struct Large {
     char const* name;
     char const* head;
     char const* unit;
     char const* format;
+    std::size_t units;
   };
   for (Large const& large :
-       {Large{"a.json", "{\"schemaVersion\":1,\"elements\":[", "{},", "json"},
-        Large{"a.geojson", "{\"type\":\"LineString\",\"coordinates\":[", "[0,1],[1,0],", "geojson"},
-        Large{"a.wkt", "LINESTRING (", "0 1,1 0,", "wkt"},
-        Large{"a.nc", "G1 X0 Y0\nG1 ", "X1 Y1\nX0\n", "gcode"}}) {
+       {Large{"a.json", "{\"schemaVersion\":1,\"elements\":[", "{},", "json", 8300000},
+        Large{"a.geojson", "{\"type\":\"LineString\",\"coordinates\":[", "[0,1],[1,0],", "geojson",
+              1390000},
+        Large{"a.wkt", "LINESTRING (", "0 1,1 0,", "wkt", 1710000},
+        Large{"a.nc", "G1 X0 Y0\nG1 ", "X1 Y1\nX0\n", "gcode", 1710000}}) {
     std::string text = large.head;
-    while (text.size() <= std::size_t{33} << 20) text += large.unit;
+    for (std::size_t i = 0; i < large.units; ++i) text += large.unit;
     Write(large.name, text);
-    std::string const wanted = "is too large: more than 32 MiB of " + std::string(large.format);
+    std::string const wanted = "is too large: to read this " + std::string(large.format) +
+                               " would take more than 1 GiB of memory";
     for (std::string const& line :
          {"area " + std::string(large.name), "info " + std::string(large.name)}) {
-      Ended const ended = Run(line, MemoryLimit(700));
+      Ended const ended = Run(line, MemoryLimit(400));
       EXPECT_EQ(ended.code, 3) << line;
       EXPECT_NE(ended.err.find(wanted), std::string::npos) << ended.err;
     }

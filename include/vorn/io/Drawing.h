@@ -70,6 +70,10 @@ VORN_IO_EXPORT Drawing MakeDrawing(std::vector<WPoint> points, std::vector<Piece
 /// "tolerance 0.02 mm", "tolerance 0.01 to 0.03 mm"; nothing without tolerances.
 VORN_IO_EXPORT std::string DescribeTolerance(Drawing const& drawing);
 
+/// "GAP of 0.5 mm between pieces 3 and 4, the widest of 2" for the facts of a drawing; nothing
+/// where the pieces meet, see FindGaps.
+VORN_IO_EXPORT std::string DescribeGaps(ContourFile const& contour);
+
 /// All of the following refuse a drawing of nothing, see Drawing::RequireContent.
 ///
 /// A page of A4 across: the contour true to scale with deviations and tolerance magnified, below it

@@ -50,8 +50,9 @@ struct VORN_IO_EXPORT PointFile {
   bool hasTolerances = false;         ///< a column gave every point's `w`
   std::string toleranceColumn = "w";  ///< which one that was, as it was asked for
   std::optional<double> tolerance;    ///< of a comment `# tolerance T`
-  std::string units;    ///< of a comment `# units mm`, else of the header; may be empty
-  std::string columns;  ///< which ones hold the points, in words: "1 (x) and 2 (y)"
+  std::string units;        ///< of a comment `# units mm`, else of the header; may be empty
+  std::string columns;      ///< which ones hold the points, in words: "1 (x) and 2 (y)"
+  bool hadHeights = false;  ///< not of a table: coordinates beside x and y were dropped
 
   /// "point 4 (line 6)", points counted from 0 as the library does; without lines
   /// "point 4 at (1.5, 2)", of no file "point 4".

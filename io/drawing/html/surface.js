@@ -13,7 +13,8 @@ export class Surface {
     this.paint = paint;
     this.isScheduled = false;
     this.resolution = 0;
-    new ResizeObserver(() => this.schedule()).observe(canvas);
+    // At once: until the next frame the old picture would be seen stretched to the new size.
+    new ResizeObserver(() => this.draw()).observe(canvas);
   }
 
   schedule() {

@@ -33,6 +33,20 @@ TEST(MakeDrawing, APlaceThatIsNoneIsOutside) {
   EXPECT_EQ(drawing.verdict, Verdict::OutsideTolerance);
 }
 
+TEST(DescribeGaps, NamesTheWidestAndHowManyThereAre) {
+  ContourFile contour;
+  contour.pieces = {MakeLine({0, 0}, {5, 0}), MakeLine({5, 1}, {5, 5}), MakeLine({5, 5}, {2, 0})};
+  EXPECT_EQ(DescribeGaps(contour), "GAP of 1 between pieces 1 and 2");
+  contour.units = "mm";
+  contour.isClosed = true;
+  EXPECT_EQ(DescribeGaps(contour), "GAP of 2 mm between pieces 3 and 1, the widest of 2");
+  for (Format const format : {Format::Svg, Format::Html}) {
+    EXPECT_NE(Drawn(DrawingOf(contour), format).find("GAP of 2 mm between"), std::string::npos);
+  }
+  contour.pieces = {MakeLine({0, 0}, {5, 0}), MakeLine({5, 0}, {0, 0})};
+  EXPECT_EQ(DescribeGaps(contour), "");
+}
+
 TEST(Drawn, NothingIsRefused) {
   for (Drawing const& nothing : {DrawingOf(ContourFile{}), MakeDrawing({}, {}), Drawing{}}) {
     for (Format const format : {Format::Svg, Format::Png, Format::Html}) {

@@ -76,5 +76,15 @@ TEST(ParseGeoJson, RefusesDeepNesting) {
   EXPECT_EQ(Complaint(text), "p.geojson:1:99: is nested deeper than 64 brackets");
 }
 
+TEST(ParseGeoJson, TellsOfDroppedHeights) {
+  auto const hadHeights = [](std::string const& places) {
+    return ParseContour(R"({"type":"LineString","coordinates":)" + places + "}", "p.geojson")
+        .hadHeights;
+  };
+  EXPECT_TRUE(hadHeights("[[0,0,5],[1,0,5]]"));
+  EXPECT_TRUE(hadHeights("[[0,0],[1,0,5]]"));
+  EXPECT_FALSE(hadHeights("[[0,0],[1,0]]"));
+}
+
 }  // namespace
 }  // namespace Vorn::IO

@@ -68,6 +68,19 @@ TEST(ChainsOf, GrowsAtTheStartOnlyWhenTheEndIsDone) {
   EXPECT_EQ(Signed(chains[0]), (std::vector<int>{4, -2, 1, 3}));
 }
 
+TEST(ChainsOf, RaysFromOnePlaceArePairedInTheirOrder) {
+  // Looking at every end of the place for every ray would take minutes.
+  constexpr int kRays = 200000;
+  std::vector<Ends> rays;
+  for (int i = 0; i < kRays; ++i) rays.push_back({{0, 0}, {10.0 * (i + 1), 0}});
+  auto const chains = ChainsOf(rays, 0.1);
+  ASSERT_EQ(chains.size(), kRays / 2u);
+  for (std::size_t i = 0; i < chains.size(); ++i) {
+    int const first = static_cast<int>(2 * i) + 1;
+    ASSERT_EQ(Signed(chains[i]), (std::vector<int>{-(first + 1), first})) << i;
+  }
+}
+
 TEST(ChainsOf, StopsWhereItIsClosed) {
   // A square, and a line that hangs on its first corner.
   auto const chains = ChainsOf(
