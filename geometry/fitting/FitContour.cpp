@@ -1,6 +1,10 @@
 #include "geometry/fitting/FitContour.h"
 
 #include <algorithm>
+#include <cstddef>
+#include <cstdint>
+#include <limits>
+#include <vector>
 
 #include "geometry/contours/Elements.h"
 #include "geometry/elementary/Deviations.h"
@@ -25,10 +29,16 @@ CurveResult JoinTwoPoints(CurveTask const& task) {
   return {ErrorCode::Ok, Deviation{0.0, -1}};
 }
 
+/// Whether there are two points at least, and no more than their indices count.
+bool AreCountable(std::vector<WPoint> const& points) {
+  constexpr std::size_t kMost = std::numeric_limits<std::int32_t>::max();
+  return points.size() >= 2 && points.size() <= kMost;
+}
+
 }  // namespace
 
 CurveResult FitContour(CurveTask const& task, Strategy strategy) {
-  if (task.points.size() < 2) return {ErrorCode::Failed, std::nullopt};
+  if (!AreCountable(task.points)) return {ErrorCode::Failed, std::nullopt};
   // A single arc is found by least squares as well, which bears points close together.
   if (strategy == Strategy::SingleArc) return FitSingleArc(task);
   if (!AreNeighboursFarEnoughApart(task.points)) return {ErrorCode::PointsTooClose, std::nullopt};
