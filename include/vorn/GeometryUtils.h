@@ -32,6 +32,15 @@ namespace Vorn {
 /// - A tolerance cell is a vector of triangles; (P, Q, Q) stands for a segment, (P, P, P) for a
 ///   point.
 ///
+/// Errors
+/// - Those of elementary operations stand with them, in eps. A value that is rounded once is off by
+///   half an eps of itself at most. Where terms cancel, a bound is one of the terms: the result may
+///   have no digit of its own left.
+/// - They hold for coordinates whose squares and products neither overflow nor underflow. Bounds
+///   called measured are half as large again, or more, as the largest error of 200,000 cases of
+///   each operation, degenerate and ill-conditioned ones among them, beside numbers of 512 bits;
+///   the others are derived, and no case broke them.
+///
 /// Contracts that hold for every member unless it says otherwise
 /// - Pointers must not be null.
 /// - Outputs are written only on success; on failure they keep what they held.
@@ -189,6 +198,7 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in] dy displacement along the downward axis
   /// @param[in] dx displacement to the right
   /// @return atan2(-dy, dx): the counter-clockwise angle as seen on the screen, in [-pi, pi]
+  /// @note Error: that of atan2 of the C library, below 1 eps of the angle on Debian 12.
   static double GetNaturalAngle(double dy, double dx);
 
   /// Azimuth (clockwise from the positive y axis, north = 0) of a natural angle
@@ -199,6 +209,7 @@ class VORN_EXPORT GeometryUtils {
   ///         (-3*pi/2, pi/2 + 2*pi]
   /// @note Deliberate: one correction only. An angle <= -3*pi/2 gives 2*pi or more, one above
   ///       pi/2 + 2*pi a negative value.
+  /// @note Error: 1e-14 at most, mostly from the constants that are cut short.
   static double NaturalAngleToAzimuthRad(double angle);
 
   /// Azimuth of the tangent that belongs to a natural angle.
@@ -208,6 +219,7 @@ class VORN_EXPORT GeometryUtils {
   ///            it is positive.
   /// @return the azimuth; with flag false and an angle of 0 it is -0.0
   /// @note Deliberate: only one of the two branches wraps.
+  /// @note Error: 1e-14 at most, as above.
   static double NaturalAngleToTangentialAzimuthRad(double angle, bool flag);
 
   /// Length of an arc.
@@ -219,6 +231,7 @@ class VORN_EXPORT GeometryUtils {
   ///         except for a sweep of less than 7e-15 across the seam
   /// @note One wrap by 2*pi at most. Since 2*pi is cut short, a sweep across the seam comes out too
   ///       small by 7e-15 at most: the least ones below 0. O(1).
+  /// @note Error: 1 eps of the length away from the seam, 1e-14 of the radius across it.
   static double GetArcLength(Arc const& arc);
 
   /// Sweep of an arc.
@@ -226,6 +239,7 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in] arc as for GetArcLength
   /// @return GetArcLength divided by the radius, in [0, 2*pi) with the same exception; 0.0 when the
   ///         radius is tiny, zero or negative
+  /// @note Error: 1.5 eps of the sweep away from the seam, 1e-14 across it.
   static double GetArcAngleRad(Arc const& arc);
 
   /// Distance of the point (x, y) from the line a*x + b*y + c = 0.
@@ -235,6 +249,8 @@ class VORN_EXPORT GeometryUtils {
   /// @param[out] dev   the distance, >= 0
   /// @return false, dev untouched, when sqrt(a*a + b*b) is tiny
   /// @note A not-a-number is not rejected: dev becomes one. O(1).
+  /// @note Error: at most 3 eps of (|a*x| + |b*y| + |c|) / sqrt(a*a + b*b). Near the line, where
+  ///       the terms cancel, that may be all of dev.
   static bool GetDeviation(double a, double b, double c, double x, double y, double* dev);
 
   /// Signed distance of the point (x, y) from the line a*x + b*y + c = 0.
@@ -246,6 +262,7 @@ class VORN_EXPORT GeometryUtils {
   /// @return false, dev untouched, when sqrt(a*a + b*b) is tiny
   /// @note Property: for c != 0, negating a, b and c changes nothing; for c = 0 it flips the sign.
   ///       O(1).
+  /// @note Error: as for GetDeviation of a line.
   static bool GetSignedDeviation(double a, double b, double c, double x, double y, double* dev);
 
   /// Distance of a third point from the line through two others, from squared lengths alone.
@@ -257,6 +274,8 @@ class VORN_EXPORT GeometryUtils {
   ///       it may round to a negative value; dev is then a not-a-number and the answer still true.
   ///       Callers must count that as the worst case, not as 0. For the same reason the result is
   ///       only good to about 1e-8 of the distance between points 1 and 3. O(1).
+  /// @note Error: with s the sum of the squared distances of the three points from each other and b
+  ///       that of points 1 and 2, the square of dev is off by at most 19 eps of s*s / (4*b).
   static bool GetDeviation(double const* coords, double* dev);
 
   /// Whether two measured points are far enough apart to be neighbours in a fit: strictly farther
@@ -265,6 +284,7 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in] a,b the points; their order does not matter
   /// @return true when (1.5 * (a.w + b.w))^2 < squared distance; also true when a not-a-number is
   ///         involved
+  /// @note Error: the answer can be wrong only where both sides agree to 4.5 eps.
   static bool IsPointValidToFit(WPoint const& a, WPoint const& b);
   /// @}
 
@@ -290,6 +310,8 @@ class VORN_EXPORT GeometryUtils {
   /// @note Deliberate: the asymmetry of pa, pb, pc between the two cases. On failure circle, and
   ///       for different tolerances pa, pb and pc as well, may already be written; ccw is not.
   ///       O(1).
+  /// @note Error: for equal tolerances that of the circle through the three points, see GetCircle
+  ///       below, and 1 eps of the tolerance.
   static bool GetCircle(WPoint const& a, WPoint const& b, WPoint const& c, WPoint* circle,
                         Point* pa, Point* pb, Point* pc, bool* ccw);
   /// @}
@@ -311,6 +333,11 @@ class VORN_EXPORT GeometryUtils {
   ///       constants happen to agree are Collinear though they lie apart: (7,-16)-(-16,7) and
   ///       (-7,-16)-(-16,-7). Segments whose bounding boxes do not meet are Disjoint, parallel or
   ///       not. Absolute thresholds; O(1).
+  /// @note Error: with D the cross product of the segments and P the sum of the magnitudes of all
+  ///       products of coordinate differences that it and the two parameters are made of, x is off
+  ///       by at most 4 eps of P * |x2 - x1| / |D| + |x|, y likewise. Whether they intersect can be
+  ///       wrong only where the crossing is nearer to an end than 4.3 eps of P / |D| of the
+  ///       segment. Both hold where |D| is more than 16 eps of its own products.
   static SegmentsRelPosition GetLineSegmentsIntersection(double x1, double y1, double x2, double y2,
                                                          double x3, double y3, double x4, double y4,
                                                          double* x, double* y);
@@ -420,6 +447,9 @@ class VORN_EXPORT GeometryUtils {
   ///         or an unknown type; Ok with area written otherwise
   /// @note Each arc adds its two chords to the centre and the sector between them. The check, then
   ///       O(n) for the sum.
+  /// @note Error: for n segments at most (n + 3) / 4 eps of the sum of |(x2 - x1) * (y2 + y1)|; two
+  ///       arcs of a circle of radius r about (x, y) are off by at most 16 eps of r * (2*r +
+  ///       max(|x|, |y|)), measured.
   static ErrorCode GetArea(std::vector<Elem> const& contour, double* area);
 
   /// Signed area of a flat polyline.
@@ -437,6 +467,7 @@ class VORN_EXPORT GeometryUtils {
   /// @note Deliberate: within a run of records the sum advances by one double, not by a record, and
   ///       the direction is not read. Its result is an area only for runs of plain vertices.
   ///       O(size of coords).
+  /// @note Error: for n plain vertices at most (n + 2) / 4 eps of the sum of |x2*y1| + |x1*y2|.
   static ErrorCode GetArea(std::vector<double> const& coords,
                            std::vector<std::int32_t> const& indices, double* area);
 
@@ -561,8 +592,8 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in]     maxPercent     percentage that means "all done", normally 100
   /// @return
   /// - Ok: see the note on what that does and does not promise
-  /// - Failed: null contour, fewer than 2 points (3 with SingleArc), an unknown strategy with more
-  ///   than 2 points, or a step that failed inside
+  /// - Failed: null contour, fewer than 2 points (3 with SingleArc) or more than an std::int32_t
+  ///   counts, an unknown strategy with more than 2 points, or a step that failed inside
   /// - PointsTooClose: two consecutive points fail IsPointValidToFit; not tested with SingleArc
   /// - NoFit: no circle within the tolerances
   /// - the code of an inner step, with MixedCells and SingleArc
@@ -612,12 +643,14 @@ class VORN_EXPORT GeometryUtils {
   ///         as a - b lies within one turn, ends aside
   /// @note Deliberate: the ends swap. A difference of exactly pi comes back as -pi, one of -pi as
   ///       pi.
+  /// @note Error: 1e-14 at most.
   static double SubtrAng(double a, double b);
 
   /// Squared distance of two points.
   ///
   /// @param[in] p,q the points
   /// @return (p.y - q.y)^2 + (p.x - q.x)^2, added in this order
+  /// @note Error: 2 eps of the result at most.
   static double GetDist2(Point const& p, Point const& q);
 
   /// The line through two points.
@@ -628,6 +661,7 @@ class VORN_EXPORT GeometryUtils {
   ///             normal (a, b) is the direction turned by a quarter: for the x axis run to the
   ///             right it points up.
   /// @return false when the points differ by no more than a tiny amount in both coordinates
+  /// @note Error: a and b are rounded once; c is off by at most 1 eps of |x1*y2| + |y1*x2|.
   static bool GetLineParameters(double x1, double y1, double x2, double y2, double* a, double* b,
                                 double* c);
 
@@ -636,6 +670,7 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in]  a,b,c the given line; c is not used
   /// @param[in]  p     the point
   /// @param[out] na,nb,nc the perpendicular: b, -a, a*p.y - b*p.x
+  /// @note Error: nb and na are exact; nc is off by at most 1 eps of |a*p.y| + |b*p.x|.
   static void GetNormal(double a, double b, double c, Point const& p, double* na, double* nb,
                         double* nc);
 
@@ -660,6 +695,9 @@ class VORN_EXPORT GeometryUtils {
   /// @return Failed only when x1 = x2 = x3 exactly
   /// @note Deliberate: other collinear points answer Ok with a huge or non-finite centre, since the
   ///       solver does not check its last pivot. Test the sense first (IsCcw). O(1).
+  /// @note Error: with m the largest distance of a point from the origin, c that of the centre, and
+  ///       s the square of the longest side over twice the area of the triangle, centre and radius
+  ///       are off by at most 2 eps of s * (m + c), measured up to s = 1e12.
   static ErrorCode GetCircle(double x1, double y1, double x2, double y2, double x3, double y3,
                              double* cx, double* cy, double* r);
 
@@ -669,6 +707,7 @@ class VORN_EXPORT GeometryUtils {
   /// @param[out] center centre
   /// @param[out] radius mean of the three distances from the centre
   /// @return false only when a.x = b.x = c.x exactly; other collinear points as above
+  /// @note Error: as above.
   static bool GetCircle(Point const& a, Point const& b, Point const& c, Point* center,
                         double* radius);
 
@@ -677,6 +716,8 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in]  a,b,c the points in order
   /// @param[out] ccw   true for counter-clockwise (negative triangle area)
   /// @return Failed, ccw untouched, when the triangle area is exactly 0.0
+  /// @note Error: can be wrong only where twice the area is below 2 eps of the sum of the six
+  ///       products |x*y'|; exact for whole numbers below 2^25.
   static ErrorCode IsCcw(Point const& a, Point const& b, Point const& c, bool* ccw);
   /// @}
 
@@ -691,6 +732,8 @@ class VORN_EXPORT GeometryUtils {
   /// @return Parallel, outputs untouched, when the magnitude of a1*b2 - b1*a2 is below the smallest
   ///         normal double (strictly), coincident lines included; Intersecting otherwise. Never
   ///         another value.
+  /// @note Error: where det = a1*b2 - b1*a2 is more than 16 eps of its products p = |a1*b2| +
+  ///       |b1*a2|, x is off by at most 1.6 eps of (|b1*c2| + |c1*b2| + |x|*p) / |det|, y likewise.
   static SegmentsRelPosition GetLinesIntersection(double a1, double b1, double c1, double a2,
                                                   double b2, double c2, double* x, double* y);
 
@@ -701,6 +744,8 @@ class VORN_EXPORT GeometryUtils {
   /// @param[out] x,y         the crossing
   /// @return false for a degenerate segment, a parallel one, or a crossing outside the segment's
   ///         bounding box (bounds included)
+  /// @note Error: that of the crossing of the line with the one through the ends, of which c is
+  ///       |x1*y2| + |y1*x2| for this purpose, with 2 eps in place of 1.6, measured.
   static bool GetLineAndSegmentIntersection(double a, double b, double c, double x1, double y1,
                                             double x2, double y2, double* x, double* y);
 
@@ -712,6 +757,7 @@ class VORN_EXPORT GeometryUtils {
   ///         is not above eps
   /// @note Deliberate: the threshold is eps here, while GetLineSegmentsIntersection uses the
   ///       smallest normal double.
+  /// @note Error: as for GetLineSegmentsIntersection, where the cross product is above 1e-15.
   static bool AreLineSegmentsIntersect(double x1, double y1, double x2, double y2, double x3,
                                        double y3, double x4, double y4);
 
@@ -721,6 +767,7 @@ class VORN_EXPORT GeometryUtils {
   /// @param[in]  p     the point
   /// @param[out] foot  its foot
   /// @return false when a*a + b*b is below the smallest normal double
+  /// @note Error: each coordinate is off by at most 4 eps of |c| / sqrt(a*a + b*b) + |p.x| + |p.y|.
   static bool GetNearestPointOnLine(double a, double b, double c, Point const& p, Point* foot);
   /// @}
 
@@ -739,6 +786,11 @@ class VORN_EXPORT GeometryUtils {
   /// @param[out] bx,by       second point
   /// @return 0, 1 or 2; a discriminant not above eps counts as one touching point. 0 for a segment
   ///         of zero length.
+  /// @note Error: with f the distance of (x1, y1) from the centre and h half the chord that the
+  ///       line has in the circle, a point is off by at most 4 eps of (f*f + r*r) / h and of the
+  ///       largest coordinates of the start and the centre, measured; the number of points can be
+  ///       wrong only by points that are so near to an end. Nearer to a tangent than h*h = 64 eps
+  ///       of f*f + r*r, nothing is said.
   static int GetLineSegmentAndCircleIntersection(double x1, double y1, double x2, double y2,
                                                  double cx, double cy, double r, double* ax,
                                                  double* ay, double* bx, double* by);
@@ -752,6 +804,9 @@ class VORN_EXPORT GeometryUtils {
   ///             |a| > |b|)
   /// @param[out] bx,by   second point
   /// @return 0, 1 (tangent) or 2; 0 when the line is degenerate or farther from the centre than r
+  /// @note Error: with h half the chord and g the largest coordinate of the centre plus the
+  ///       distance of the origin from the line, a point is off by at most 24 eps of r * (r + g) /
+  ///       h + g, measured where h*h is above 64 eps of r * (r + g).
   static int GetLineAndCircleIntersection(double a, double b, double c, double cx, double cy,
                                           double r, double* ax, double* ay, double* bx, double* by);
 
@@ -763,6 +818,8 @@ class VORN_EXPORT GeometryUtils {
   /// @param[out] ax,ay       first point: of two, the one nearer to (x2, y2)
   /// @param[out] bx,by       second point
   /// @return 0, 1 or 2; -1 when the two angles are equal
+  /// @note Error: that of the points on the full circle; a point that lies as near to an end of the
+  ///       range may be missing or there.
   static int GetLineSegmentAndCircleArcIntersection(double x1, double y1, double x2, double y2,
                                                     double cx, double cy, double r, double d,
                                                     double startAngle, double endAngle, double* ax,
@@ -779,6 +836,10 @@ class VORN_EXPORT GeometryUtils {
   /// @param[out] bx,by second point
   /// @return 0, 1 or 2; -1 when a radius is <= 0. Coincident circles give 0.
   /// @note A half chord not above eps counts as one touching point.
+  /// @note Error: with R the larger radius, d the distance of the centres and h half the common
+  ///       chord, a point is off by at most 2 eps of R/h * (r1*r1 + r2*r2 + d*d) / d and of the
+  ///       largest coordinates of the centres, measured where h*h is above 64 eps of R * (r1*r1 +
+  ///       r2*r2 + d*d) / d.
   static int GetCircleArcAndCircleArcIntersection(double cx1, double cy1, double r1, double d1,
                                                   double startAngle1, double endAngle1, double cx2,
                                                   double cy2, double r2, double d2,
@@ -794,6 +855,7 @@ class VORN_EXPORT GeometryUtils {
   /// @note Deliberate: the projection is found on the segment from the centre to twice the distance
   ///       of p, hence the limit. It keeps points near the centre, whose direction says nothing,
   ///       out.
+  /// @note Error: at most 4 eps of the largest coordinate of the centre plus the radius, measured.
   static bool GetNearestPointOnCircle(Point const& center, double radius, Point const& p,
                                       Point* nearest);
   /// @}
@@ -875,6 +937,7 @@ class VORN_EXPORT GeometryUtils {
   ///
   /// @param[in] triangle the triangle
   /// @return positive for vertices that run clockwise in a y-up frame
+  /// @note Error: at most 1 eps of the sum of the six products |x*y'|.
   static double GetArea(Triangle const& triangle);
 
   /// Whether a triangle has an area.
@@ -935,6 +998,12 @@ class VORN_EXPORT GeometryUtils {
   ///         when there is no common polygon; OverlapFailed when a vertex has no defined status,
   ///         the containment is inconsistent or the polygon cannot be divided
   /// @note Deliberate: a triangle that lies inside the other is appended three times. O(1).
+  /// @note Error: in general position - both triangles turn the same way, no vertex of one is on
+  ///       the line of a side of the other, no sides are parallel, each by more than 16 eps of the
+  ///       squared coordinates - twice the area of the common part is off by at most 8 eps of the
+  ///       square of the largest coordinate, measured. Elsewhere parts may be missing: of triangles
+  ///       that turn opposite ways, or where a vertex is on a side; and where parallel sides have
+  ///       equal line constants, points outside both may come in (see GetLineSegmentsIntersection).
   static OverlappingStatus GetOverlapping(Triangle const& first, Triangle const& second,
                                           std::vector<Triangle>* result);
 

@@ -111,7 +111,7 @@ TEST(ErrorOfGetLineSegmentAndCircleIntersection, IsAWrongNumberOnlyWithinRoundin
 }
 
 TEST(ErrorOfGetLineAndCircleIntersection, IsBoundedByTheChord) {
-  ForEachCase(3, Worst("GetLineAndCircleIntersection", 16.0), [](Inputs& in, Worst* worst) {
+  ForEachCase(3, Worst("GetLineAndCircleIntersection", 24.0), [](Inputs& in, Worst* worst) {
     CircleAndSegment const s(&in);
     double a = 0.0;
     double b = 0.0;
