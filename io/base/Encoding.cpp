@@ -19,7 +19,13 @@ constexpr std::uint32_t kMarkBits = 0xC0;
 constexpr std::uint32_t kMark = 0x80;
 constexpr std::uint32_t kCodeBits = 0x3F;
 constexpr std::uint32_t kFirstCodeBits = 0x7F;
+constexpr int kBitsPerByte = 6;
+/// Shifted by the number of bytes behind it, the lower eight bits are the mark of a first byte: as
+/// many ones as the character has bytes, and a zero.
+constexpr std::uint32_t kLeadingOnes = 0xFF80;
 
+/// The least code that takes three bytes.
+constexpr std::uint32_t kFirstCodeOfThree = 0x800;
 constexpr std::uint32_t kLargestCode = 0x10FFFF;
 
 constexpr std::string_view kLittleEndianMark = "\xFF\xFE";
@@ -42,19 +48,10 @@ std::size_t LengthFrom(unsigned char first) {
 
 void AppendUtf8(std::uint32_t code, std::string* text) {
   auto const append = [text](std::uint32_t byte) { text->push_back(static_cast<char>(byte)); };
-  auto const appendRest = [&](int shift) { append(kMark | (code >> shift & kCodeBits)); };
   if (code < kEndOfSingle) return append(code);
-  if (code < 0x800) {
-    append(0xC0 | code >> 6);
-  } else if (code < kFirstPairedCode) {
-    append(0xE0 | code >> 12);
-    appendRest(6);
-  } else {
-    append(0xF0 | code >> 18);
-    appendRest(12);
-    appendRest(6);
-  }
-  appendRest(0);
+  int const bytesBehind = code < kFirstCodeOfThree ? 1 : code < kFirstPairedCode ? 2 : 3;
+  append((kLeadingOnes >> bytesBehind) | code >> (kBitsPerByte * bytesBehind));
+  for (int i = bytesBehind; i-- > 0;) append(kMark | (code >> (kBitsPerByte * i) & kCodeBits));
 }
 
 /// The units of a text behind its mark.
@@ -101,10 +98,11 @@ Utf8Character FirstCharacter(std::string_view text) {
   std::uint32_t code = byte(0) & (kFirstCodeBits >> length);
   for (std::size_t i = 1; i < length; ++i) {
     if ((byte(i) & kMarkBits) != kMark) return {};
-    code = code << 6 | (byte(i) & kCodeBits);
+    code = code << kBitsPerByte | (byte(i) & kCodeBits);
   }
-  constexpr std::array<std::uint32_t, 5> kLeast = {0, 0, 0x80, 0x800, 0x10000};
-  bool const isSurrogate = code >= 0xD800 && code < 0xE000;
+  constexpr std::array<std::uint32_t, 5> kLeast = {0, 0, kEndOfSingle, kFirstCodeOfThree,
+                                                   kFirstPairedCode};
+  bool const isSurrogate = code >= kFirstOfPair && code < kEndOfPairs;
   if (code < kLeast.at(length) || code > kLargestCode || isSurrogate) return {};
   return {length, code};
 }

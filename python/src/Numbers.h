@@ -26,16 +26,17 @@ struct Numbers : pybind11::array_t<double, pybind11::array::c_style | pybind11::
 
 namespace pybind11::detail {
 
-/// Converts arguments and results.
+/// Converts arguments and results; the names of its members are given.
 template <>
 struct type_caster<Vorn::Python::Numbers> {
   PYBIND11_TYPE_CASTER(Vorn::Python::Numbers, const_name("numpy.ndarray[numpy.float64]"));
 
-  bool load(handle given, bool) {
+  bool load(handle given, bool) {  // NOLINT(readability-identifier-naming)
     value = Vorn::Python::NumbersFrom(reinterpret_borrow<object>(given), "the numbers");
     return true;
   }
 
+  // NOLINTNEXTLINE(readability-identifier-naming)
   static handle cast(Vorn::Python::Numbers const& numbers, return_value_policy, handle) {
     return numbers.inc_ref();
   }
