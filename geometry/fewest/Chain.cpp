@@ -1,6 +1,8 @@
 #include "geometry/fewest/Chain.h"
 
 #include <algorithm>
+#include <utility>
+#include <vector>
 
 #include "geometry/fewest/Corner.h"
 
@@ -59,6 +61,7 @@ class ChainSearch {
       Level next = MakeStates(level, before, farthest);
       if (next.empty() || (farthest <= before && path_.finish.isFree)) return {};
       if (levels_.size() > path_.points.size() + 2) return {};
+      KeepOrigins(&level, &next);
       expected = farthest + std::max(4, farthest - before);
       before = farthest;
       levels_.push_back(std::move(next));
@@ -66,6 +69,23 @@ class ChainSearch {
   }
 
  private:
+  /// Drops the states of a level from which no state of the next one comes: most of the memory.
+  static void KeepOrigins(Level* level, Level* next) {
+    constexpr std::int32_t kDropped = -1;
+    std::vector<std::int32_t> positions(level->size(), kDropped);
+    Level kept;
+    for (State& state : *next) {
+      std::int32_t& position = positions[static_cast<std::size_t>(state.previous)];
+      if (position == kDropped) {
+        position = static_cast<std::int32_t>(kept.size());
+        kept.push_back((*level)[static_cast<std::size_t>(state.previous)]);
+      }
+      state.previous = position;
+    }
+    kept.shrink_to_fit();
+    *level = std::move(kept);
+  }
+
   Level MakeStates(Level const& level, std::int32_t before, std::int32_t farthest) {
     Level next;
     std::int32_t const half = std::max(before + 1, farthest - (farthest - before) / 2 - 1);
