@@ -4,6 +4,7 @@ import collections
 import copy
 import pickle
 import subprocess
+import tracemalloc
 
 import numpy as np
 import pytest
@@ -47,6 +48,21 @@ def test_every_number_type_gives_the_same(corner, dtype):
 ])
 def test_every_layout_gives_the_same(corner, strided):
     assert vorn.fit(strided(corner), tol=0.01) == vorn.fit(corner, tol=0.01)
+
+
+@pytest.mark.parametrize("convert", [
+    lambda p: p, lambda p: p.astype(np.float32), np.asfortranarray, lambda p: p[::-1],
+    lambda p: np.repeat(p, 2, axis=0)[::2], lambda p: p.astype(np.int64)])
+def test_points_are_copied_once(convert):
+    """Into the memory of the library: NumPy makes no array of the size of the points."""
+    points = convert(np.column_stack((np.arange(50_000.0), np.zeros(50_000))))
+    tracemalloc.start()
+    try:
+        contour = vorn.fit(points, tol=0.01, strategy="fewest", closed=False)
+        peak = tracemalloc.get_traced_memory()[1]
+    finally:
+        tracemalloc.stop()
+    assert len(contour) == 1 and peak < points.nbytes / 4
 
 
 def test_points_are_not_changed(corner):
