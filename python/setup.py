@@ -2,12 +2,15 @@
 
 pip wheel --no-build-isolation --no-deps python/
 
-needs no network. The libraries are built into the extension, so the wheel needs nothing of this
-project beside it, only librsvg of the system for its drawings.
+needs no network. What the variable CMAKE_ARGS holds goes to CMake as well. The libraries are built
+into the extension, so the wheel needs nothing of this project beside it, only librsvg of the system
+for its drawings.
 """
 
+import os
 import pathlib
 import re
+import shlex
 import shutil
 import subprocess
 import sys
@@ -36,7 +39,8 @@ class BuildWithCMake(build_ext):
         folder = pathlib.Path(self.build_temp).resolve()
         generator = ["-G", "Ninja"] if shutil.which("ninja") else []
         self.run_command_line("cmake", "-S", ROOT, "-B", folder, *generator,
-                              *(f"-D{name}={value}" for name, value in self.OPTIONS.items()))
+                              *(f"-D{name}={value}" for name, value in self.OPTIONS.items()),
+                              *shlex.split(os.environ.get("CMAKE_ARGS", "")))
         self.run_command_line("cmake", "--build", folder, "--target", "vorn_core", "--parallel")
         built, = (folder / "python" / "vorn").glob("_core.*.so")
         target = pathlib.Path(self.get_ext_fullpath(extension.name))

@@ -1,5 +1,6 @@
 """Fitting: strategies, closing, progress, failures."""
 
+import signal
 import threading
 import _thread
 import warnings
@@ -261,7 +262,16 @@ def test_what_progress_raises_comes_out(examples, error):
     assert len(vorn.fit(points)) > 0
 
 
-def test_an_interruption_ends_a_fit(examples):
+@pytest.fixture
+def keyboard():
+    """Interruptions as a terminal brings them; a job in the background may have been told to
+    ignore them."""
+    before = signal.signal(signal.SIGINT, signal.default_int_handler)
+    yield
+    signal.signal(signal.SIGINT, before)
+
+
+def test_an_interruption_ends_a_fit(keyboard):
     t = np.arange(20000.0)
     wave = np.column_stack((t, 50 * np.sin(t / 300)))
     timer = threading.Timer(0.2, _thread.interrupt_main)
