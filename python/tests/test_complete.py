@@ -84,7 +84,7 @@ IO_NAMES = {
     "Contour.bounds": "ExtentOf",
     "Contour.departure": "DepartureOf",
     "Contour.deviations": "Remeasure DistanceTo Distance",
-    "Contour.gaps": "FindGaps JointTolerance",
+    "Contour.gaps": "FindGaps DescribeGaps JointTolerance",
     "Contour.intersections": "IntersectionsOf SelfIntersectionsOf",
     "Contour.is_closed": "IsClosed ReturnsToStart",
     "Contour.nearest": "FootOn",
