@@ -22,8 +22,8 @@ struct Neighbours {
 
 class Balancer {
  public:
-  Balancer(Path const& path, Chain const& chain)
-      : path_(path), search_(path, 1.0), balanced_(chain) {}
+  Balancer(Path const& path, Chain chain)
+      : path_(path), search_(path, 1.0), balanced_(std::move(chain)) {}
 
   Chain Run() {
     // From the last gate on: there the piece behind begins too late, but ends where it has to.

@@ -76,9 +76,12 @@ class Centring {
     std::vector<PieceFit> fits;
     for (std::size_t k = 0; k < Count(); ++k) fits.push_back(FitBetweenJoints(k));
     for (std::size_t k = 0; k < Count(); ++k) {
+      ChainPiece& piece = chain_.pieces[k];
+      piece.ratio = kNotPlaced;
       bool const isPlaced = fits[k].isFound && fits[k].ratio <= 1.0;
-      if (isPlaced) chain_.pieces[k].circle = fits[k].circle;
-      chain_.pieces[k].ratio = isPlaced ? fits[k].ratio : kNotPlaced;
+      if (!isPlaced) continue;
+      piece.circle = fits[k].circle;
+      piece.ratio = fits[k].ratio;
     }
   }
 
