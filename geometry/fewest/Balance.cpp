@@ -1,6 +1,7 @@
 #include "geometry/fewest/Balance.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "geometry/fewest/Corner.h"
 

@@ -45,7 +45,8 @@ bool IsSecondPointOnFirst(SegmentPair const& s) {
 
 }  // namespace
 
-Meeting IntersectParallel(SegmentPair const& s) {
+Meeting IntersectParallel(Segment const& first, Segment const& second) {
+  SegmentPair const s(first, second);
   if (IsFirstPointOnSecond(s)) return MeetAt(s.x1, s.y1);
   if (IsSecondPointOnFirst(s)) return MeetAt(s.x3, s.y3);
 

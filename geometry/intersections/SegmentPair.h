@@ -91,14 +91,18 @@ struct Meeting {
 };
 
 /// How two segments lie whose determinant counts as zero: parallel ones and those of no length.
-Meeting IntersectParallel(SegmentPair const& pair);
+Meeting IntersectParallel(Segment const& first, Segment const& second);
 
 /// How two segments lie to each other, ends included. See
 /// GeometryUtils::GetLineSegmentsIntersection for what counts as parallel.
 inline Meeting Intersect(SegmentPair const& pair) {
   if (pair.AreBoxesApart()) return {};
   double const det = pair.Determinant();
-  if (!(std::fabs(det) > Numeric::kZero)) return IntersectParallel(pair);
+  if (!(std::fabs(det) > Numeric::kZero)) {
+    // The segments made anew, not the pair: whose address is taken leaves the registers at once.
+    return IntersectParallel({{pair.x1, pair.y1}, {pair.x2, pair.y2}},
+                             {{pair.x3, pair.y3}, {pair.x4, pair.y4}});
+  }
   double const s = pair.ScaledParameter1();
   double const u = pair.ScaledParameter2();
   if (!AreParametersInRange(s, u, det)) return {};
