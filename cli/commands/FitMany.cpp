@@ -17,6 +17,7 @@
 #include "cli/base/Advice.h"
 #include "cli/base/Handover.h"
 #include "cli/commands/Outputs.h"
+#include "cli/commands/PointsInput.h"
 #include "cli/texts/Relative.h"
 #include "vorn/io/FitSummary.h"
 #include "vorn/io/Formats.h"
@@ -36,6 +37,7 @@ struct Outcome {
   std::string path;
   ExitCode code = ExitCode::Ok;
   std::string verdict;
+  std::string dropped;  ///< what was not taken from the file, for standard error; may be empty
   std::string message;  ///< for standard error; empty when all is well
   bool isFitted = false;
   std::size_t points = 0;
@@ -89,6 +91,7 @@ Outcome FitFile(FitMany const& many, std::string const& path) {
   Outcome outcome;
   outcome.path = path;
   outcome.isFitted = true;
+  outcome.dropped = DroppedHeightsText(report.file);
   outcome.points = report.file.points.size();
   outcome.pieces = report.pieces.size();
   outcome.bound = report.fit.fewestPossible;
@@ -151,7 +154,9 @@ class Listing {
       Print(outcome.path, {"-", "-", "-", "-"}, outcome.verdict);
     }
     if (!many_.summary.empty()) rows_.push_back(RowOf(outcome));
-    if (!outcome.message.empty()) console_.err << "contour: " << outcome.message << '\n';
+    for (std::string const& text : {outcome.dropped, outcome.message}) {
+      if (!text.empty()) console_.err << "contour: " << text << '\n';
+    }
     ++counts_[outcome.isFitted ? outcome.verdict : "failed"];
     if (Severity(outcome.code) > Severity(worst_)) worst_ = outcome.code;
   }

@@ -110,11 +110,15 @@ std::vector<PointFile> ReadPointOutlinesInput(PointsInput const& input, Console 
   return ChosenOutlines(input, ReadPointOutlines(input.path, console.in, ReadingOf(input)));
 }
 
+std::string DroppedHeightsText(PointFile const& outline) {
+  if (!outline.hadHeights) return "";
+  return outline.path.substr(0, outline.path.size() - OutlineSuffix(outline.outline).size()) +
+         ": dropped the coordinates beside x and y";
+}
+
 void ReportDroppedHeights(PointFile const& outline, Console const& console) {
-  if (!outline.hadHeights) return;
-  std::string const path =
-      outline.path.substr(0, outline.path.size() - OutlineSuffix(outline.outline).size());
-  console.err << "contour: " << path << ": dropped the coordinates beside x and y\n";
+  std::string const text = DroppedHeightsText(outline);
+  if (!text.empty()) console.err << "contour: " << text << '\n';
 }
 
 void RequireOneOutline(PointsInput const& input, std::size_t count) {

@@ -45,7 +45,10 @@ void AddClosedChoice(Command& command, ClosedChoice* choice);
 ///         outlines.
 std::vector<PointFile> ReadPointOutlinesInput(PointsInput const& input, Console const& console);
 
-/// Says on the standard error that coordinates beside x and y were dropped, if they were.
+/// "scan.wkt: dropped the coordinates beside x and y"; empty when there were none.
+std::string DroppedHeightsText(PointFile const& outline);
+
+/// Says it on the standard error, if there is anything to say.
 void ReportDroppedHeights(PointFile const& outline, Console const& console);
 
 /// @throws Failure (FailureKind::BadArgument) unless the file has one outline, or one was chosen.

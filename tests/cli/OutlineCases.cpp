@@ -88,5 +88,13 @@ TEST_F(Program, HeightsOfAFileAreToldAsDropped) {
   }
 }
 
+TEST_F(Program, HeightsOfEachOfManyFilesAreToldAsDropped) {
+  Write("flat.wkt", "LINESTRING (0 0, 3 4)");
+  Write("p.wkt", "LINESTRING Z (0 0 1, 3 4 1)");
+  Ended const ended = Run("fit flat.wkt p.wkt -t 0.1 --out-dir out");
+  EXPECT_EQ(ended.code, 0);
+  EXPECT_EQ(ended.err, "contour: p.wkt: dropped the coordinates beside x and y\n");
+}
+
 }  // namespace
 }  // namespace Vorn::Cli::Testing
