@@ -40,14 +40,16 @@ inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
 /// - Every point lies within its tolerance of the piece that covers it, ends of the piece included.
 /// - Each piece starts exactly where the one before ends; a closed contour ends exactly where it
 ///   begins.
-/// - The points come in order along their piece, up to their tolerances.
+/// - The points come in order along their piece: none lies farther behind an earlier one than 1.65
+///   times the sum of their tolerances, as noise in dense scans makes them.
 /// - No piece crosses itself or another one where the straight path through the points does not by
 ///   more than the tolerances.
 /// - No arc is a full turn: a full circle comes as two arcs.
 ///
 /// Where it falls short
 /// - A path that runs several times along itself, as a circle scanned twice around, may take many
-///   more pieces than the bound: each lap has to stay on its side of the others.
+///   more pieces than the bound, or have no answer (NoFit): each lap has to stay on its side of the
+///   others.
 /// - Where largestRadius is below radii of the part, short pieces stand for its arcs; all of them
 ///   may be segments though some arcs would save a few. The bound takes no account of
 ///   largestRadius.
