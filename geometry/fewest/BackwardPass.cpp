@@ -46,8 +46,6 @@ class BackwardPass {
     }
     std::int32_t const first = link.opening.First();
     std::int32_t const last = end.isFree ? path_.Count() : end.gate.split;
-    // A piece of no points at the end of a stretch has no place to be measured from.
-    if (first >= path_.Count() || last < 1) return false;
     search_.MoveTo(first, last);
     PieceFit fit = search_.FindStraight(link.opening, end);
     if (!fit.isFound || fit.ratio > 1.0) fit = search_.FindBest(link.opening, end, StartFor(k));

@@ -124,6 +124,7 @@ class Centring {
   }
 
   bool MendStretch(Stretch const& stretch) {
+    if (!HasOuterPoints(chain_, stretch)) return false;
     Path const path = PathOf(path_, chain_, stretch);
     Chain const known = PartOf(chain_, stretch);
     Chain found = FollowGates(path, kWholeShare, known);
@@ -190,6 +191,7 @@ class Centring {
 
   /// Bisects the share of the tolerances that a stretch needs; no line is given up.
   void Bisect(Stretch const& stretch) {
+    if (!HasOuterPoints(chain_, stretch)) return;
     double bad = LargestAlone(stretch);
     Path const path = PathOf(path_, chain_, stretch);
     Chain best = PartOf(chain_, stretch);

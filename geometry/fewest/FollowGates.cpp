@@ -45,7 +45,6 @@ class GateFollower {
   bool Advance() {
     std::size_t const k = links_.size() - 1;
     Link& link = links_.back();
-    if (link.opening.First() >= path_.Count()) return false;
     link.guess = known_.pieces[k].circle;
     Gate const& gate = known_.gates[k];
     search_.MoveTo(link.opening.First(), gate.split);

@@ -7,6 +7,7 @@
 #include "geometry/fewest/Circle.h"
 #include "geometry/fewest/Gates.h"
 #include "geometry/fewest/Limits.h"
+#include "math/Assert.h"
 #include "vorn/Types.h"
 
 /// The measured points as a path.
@@ -28,7 +29,10 @@ struct Path {
   /// How many points there are.
   std::int32_t Count() const { return static_cast<std::int32_t>(points.size()); }
   /// The point of an index in [0, Count()).
-  WPoint const& At(std::int32_t i) const { return points[static_cast<std::size_t>(i)]; }
+  WPoint const& At(std::int32_t i) const {
+    VORN_ASSERT(0 <= i && i < Count());
+    return points[static_cast<std::size_t>(i)];
+  }
 };
 
 /// Distance of two points.

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+#include "math/Assert.h"
+
 namespace Vorn::Fewest {
 
 namespace {
@@ -24,7 +26,14 @@ Stretch Stretch::Widened(std::size_t count) const {
   return {first - std::min(first, more), std::min(count, end + more)};
 }
 
+bool HasOuterPoints(Chain const& chain, Stretch const& stretch) {
+  ChainPiece const& first = chain.pieces[stretch.first];
+  ChainPiece const& last = chain.pieces[stretch.end - 1];
+  return first.first < first.end && last.first < last.end;
+}
+
 Path PathOf(Path const& path, Chain const& chain, Stretch const& stretch) {
+  VORN_ASSERT(HasOuterPoints(chain, stretch));
   std::int32_t const first = chain.pieces[stretch.first].first;
   std::int32_t const end = chain.pieces[stretch.end - 1].end;
   Path part;

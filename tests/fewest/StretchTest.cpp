@@ -31,6 +31,16 @@ Chain StraightChain(std::int32_t pieces) {
   return chain;
 }
 
+TEST(HasOuterPoints, AsksOnlyThePiecesAtItsEnds) {
+  Chain chain = StraightChain(5);
+  EXPECT_TRUE(HasOuterPoints(chain, {1, 4}));
+  chain.pieces[2].end = chain.pieces[2].first;
+  EXPECT_TRUE(HasOuterPoints(chain, {1, 4}));
+  EXPECT_FALSE(HasOuterPoints(chain, {1, 3}));
+  EXPECT_FALSE(HasOuterPoints(chain, {2, 4}));
+  EXPECT_FALSE(HasOuterPoints(chain, {2, 3}));
+}
+
 TEST(PathOf, BeginsAndEndsAtTheJointsBesideTheStretch) {
   Path const part = PathOf(StraightPath(5), StraightChain(5), {1, 4});
   ASSERT_EQ(part.Count(), 30);
