@@ -12,6 +12,7 @@
 #include "Require.h"
 #include "vorn/io/ContourFile.h"
 #include "vorn/io/Failure.h"
+#include "vorn/io/Formats.h"
 
 namespace Vorn::Fuzz {
 
@@ -91,6 +92,15 @@ inline void RequirePlace(IO::Failure const& failure) {
   Require(failure.Kind() == IO::FailureKind::File, "bad text is the file's fault");
   Require(failure.Where().file.starts_with("f"), "the failure names the file");
   Require(!failure.Message().empty(), "the failure says what is wrong");
+}
+
+/// What the reader of contours does with any text: a sound contour, or a failure with its place.
+inline void TryAnyText(std::string const& text, IO::Format format) {
+  try {
+    RequireSound(IO::ParseContour(text, "f", format));
+  } catch (IO::Failure const& failure) {
+    RequirePlace(failure);
+  }
 }
 
 }  // namespace Vorn::Fuzz

@@ -124,26 +124,29 @@ def test_everything_above_the_core_is_there():
     assert all(resolve(name) is not None for name in IO_NAMES)
 
 
+#: Options that several commands have.
+POINTS_FROM = "--tolerance-column --columns --points-from --flatten"
+WRITING = """--dxf-entities --dxf-version --svg-plain --chords --feed --gcode-decimals --r-words
+             --plane --end --header --footer --safe-height --cut-height --plunge-feed"""
+
 #: The options of the commands, by what says the same in Python.
 OPTIONS = {
     "fit": {
         "fit": """--tolerance --tolerance-per-point --units --strategy --effort
                   --largest-step --min-radius --max-radius --between --closed
                   --start --quiet""",
-        "read_points": "--tolerance-column --columns --points-from --flatten",
+        "read_points": POINTS_FROM,
         "read_outlines": "--outline",
         "fit_many": "--jobs",
         "summary": "--summary",
         "report": "--field --no-time --digits",
         "Contour.save": "--output --to --out-dir --json --svg",
-        "Contour.to_text": """--dxf-entities --dxf-version --svg-plain --chords --feed
-                              --gcode-decimals --r-words --plane --end --header --footer
-                              --safe-height --cut-height --plunge-feed""",
+        "Contour.to_text": WRITING,
     },
     "check": {
         "check": "--tolerance --units --closed --all",
         "tolerance_per_point": "--tolerance-per-point",
-        "read_points": "--tolerance-column --columns --points-from --flatten",
+        "read_points": POINTS_FROM,
         "Contour.read": "--from",
         "Contour.outlines": "--outline",
         "CheckReport.to_csv": "--table",
@@ -152,7 +155,7 @@ OPTIONS = {
     "info": {
         "info": "--tolerance --units --closed --json",
         "tolerance_per_point": "--tolerance-per-point",
-        "read_points": "--tolerance-column --columns --points-from --flatten",
+        "read_points": POINTS_FROM,
         "read_outlines": "--outline",
     },
     "plot": {
@@ -160,7 +163,7 @@ OPTIONS = {
         "Contour.to_html": "--field",
         "Contour.to_png": "--dpi --width",
         "tolerance_per_point": "--tolerance-per-point",
-        "read_points": "--tolerance-column --columns --points-from --flatten",
+        "read_points": POINTS_FROM,
         "Contour.outlines": "--outline",
     },
     "convert": {
@@ -169,9 +172,7 @@ OPTIONS = {
         "Contour.outlines": "--outline",
         "Contour.save": "--output --to",
         "Contour.departure": "--tolerance",
-        "Contour.to_text": """--dxf-entities --dxf-version --svg-plain --chords --feed
-                              --gcode-decimals --r-words --plane --end --header --footer
-                              --safe-height --cut-height --plunge-feed""",
+        "Contour.to_text": WRITING,
     },
     "area": {
         "measure_areas": "--close",
@@ -191,7 +192,7 @@ OPTIONS = {
     "simplify": {
         "simplify": """--tolerance --tolerance-per-point --units --closed --drop-close --spacing
                        --average --outliers""",
-        "read_points": "--tolerance-column --columns --points-from --flatten",
+        "read_points": POINTS_FROM,
         "read_outlines": "--outline",
         "write_points": "--output",
         "Simplified.dropped": "--dropped",

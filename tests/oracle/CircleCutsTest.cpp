@@ -61,23 +61,41 @@ struct CircleAndSegment {
 
 Real LargestOf(RealPoint const& p) { return Larger(Abs(p.x), Abs(p.y)); }
 
+/// Where the line of a segment cuts a circle, and what rounding does to it.
+struct Cuts {
+  explicit Cuts(CircleAndSegment const& s)
+      : chord(s.Circle(), Exact(s.p), s.Along()),
+        first(Exact(s.p) + (chord.middle - chord.step) * s.Along()),
+        second(Exact(s.p) + (chord.middle + chord.step) * s.Along()),
+        squares(Dot(Exact(s.p) - Exact(s.centre), Exact(s.p) - Exact(s.centre)) +
+                Square(Real(s.radius))),
+        coordinates(LargestOf(Exact(s.p)) + LargestOf(Exact(s.centre))) {}
+
+  /// The square of half a chord below which its sign may be one of rounding.
+  Real Doubtful() const { return Real(64.0 * kEps) * squares; }
+  /// What the error of a common point is measured in.
+  Real Unit() const { return squares / Sqrt(Abs(chord.half2)) + coordinates; }
+  /// The distance of a point from the nearer common one.
+  Real ErrorOf(Point const& found) const { return FromNearer(Exact(found), first, second); }
+
+  Chord chord;
+  RealPoint first;
+  RealPoint second;
+  Real squares;
+  Real coordinates;
+};
+
 TEST(ErrorOfGetLineSegmentAndCircleIntersection, IsBoundedByTheChord) {
   ForEachCase(1, Worst("GetLineSegmentAndCircleIntersection", 4.0), [](Inputs& in, Worst* worst) {
     CircleAndSegment const s(&in);
-    Chord const chord(s.Circle(), Exact(s.p), s.Along());
-    RealPoint const from = Exact(s.p) - Exact(s.centre);
-    Real const squares = Dot(from, from) + Square(Real(s.radius));
-    if (chord.half2 < Real(64.0 * kEps) * squares) return;
+    Cuts const cuts(s);
+    if (cuts.chord.half2 < cuts.Doubtful()) return;
     Point found[2];
     int const count = GeometryUtils::GetLineSegmentAndCircleIntersection(
         s.p.x, s.p.y, s.q.x, s.q.y, s.centre.x, s.centre.y, s.radius, &found[0].x, &found[0].y,
         &found[1].x, &found[1].y);
-    RealPoint const first = Exact(s.p) + (chord.middle - chord.step) * s.Along();
-    RealPoint const second = Exact(s.p) + (chord.middle + chord.step) * s.Along();
-    Real const unit =
-        squares / Sqrt(chord.half2) + LargestOf(Exact(s.p)) + LargestOf(Exact(s.centre));
-    for (int i = 0; i < count; ++i) worst->Note(FromNearer(Exact(found[i]), first, second), unit);
-    if (count == 0) worst->Note(0.0, unit);
+    for (int i = 0; i < count; ++i) worst->Note(cuts.ErrorOf(found[i]), cuts.Unit());
+    if (count == 0) worst->Note(0.0, cuts.Unit());
   });
 }
 
@@ -86,11 +104,9 @@ TEST(ErrorOfGetLineSegmentAndCircleIntersection, IsAWrongNumberOnlyWithinRoundin
   ForEachCase(2, Worst("GetLineSegmentAndCircleIntersection, wrong number", 4.0),
               [](Inputs& in, Worst* worst) {
                 CircleAndSegment const s(&in);
-                Chord const chord(s.Circle(), Exact(s.p), s.Along());
-                RealPoint const from = Exact(s.p) - Exact(s.centre);
-                Real const squares = Dot(from, from) + Square(Real(s.radius));
-                if (Abs(chord.half2) < Real(64.0 * kEps) * squares ||
-                    Dot(s.Along(), s.Along()) < Real(1e-6))
+                Cuts const cuts(s);
+                Chord const& chord = cuts.chord;
+                if (Abs(chord.half2) < cuts.Doubtful() || Dot(s.Along(), s.Along()) < Real(1e-6))
                   return;
                 Point found[2];
                 int const count = GeometryUtils::GetLineSegmentAndCircleIntersection(
@@ -104,9 +120,7 @@ TEST(ErrorOfGetLineSegmentAndCircleIntersection, IsAWrongNumberOnlyWithinRoundin
                     nearest = Smaller(nearest, Smaller(Abs(t), Abs(Real(1.0) - t)));
                   }
                 }
-                Real const unit = squares / Sqrt(Abs(chord.half2)) + LargestOf(Exact(s.p)) +
-                                  LargestOf(Exact(s.centre));
-                worst->Note(count == exact ? Real(0.0) : nearest * Length(s.Along()), unit);
+                worst->Note(count == exact ? Real(0.0) : nearest * Length(s.Along()), cuts.Unit());
               });
 }
 
@@ -195,26 +209,17 @@ TEST(ErrorOfGetCircleArcAndCircleArcIntersection, IsBoundedByTheChord) {
 }
 
 TEST(ErrorOfGetLineSegmentAndCircleArcIntersection, IsThatOfTheCircle) {
-  ForEachCase(
-      6, Worst("GetLineSegmentAndCircleArcIntersection", 4.0), [](Inputs& in, Worst* worst) {
-        CircleAndSegment const s(&in);
-        Chord const chord(s.Circle(), Exact(s.p), s.Along());
-        RealPoint const from = Exact(s.p) - Exact(s.centre);
-        Real const squares = Dot(from, from) + Square(Real(s.radius));
-        if (chord.half2 < Real(64.0 * kEps) * squares) return;
-        Point found[2];
-        int const count = GeometryUtils::GetLineSegmentAndCircleArcIntersection(
-            s.p.x, s.p.y, s.q.x, s.q.y, s.centre.x, s.centre.y, s.radius, 1.0, kFrom, kTo,
-            &found[0].x, &found[0].y, &found[1].x, &found[1].y);
-        Real const unit =
-            squares / Sqrt(chord.half2) + LargestOf(Exact(s.p)) + LargestOf(Exact(s.centre));
-        for (int i = 0; i < count; ++i) {
-          worst->Note(
-              FromNearer(Exact(found[i]), Exact(s.p) + (chord.middle - chord.step) * s.Along(),
-                         Exact(s.p) + (chord.middle + chord.step) * s.Along()),
-              unit);
-        }
-      });
+  ForEachCase(6, Worst("GetLineSegmentAndCircleArcIntersection", 4.0),
+              [](Inputs& in, Worst* worst) {
+                CircleAndSegment const s(&in);
+                Cuts const cuts(s);
+                if (cuts.chord.half2 < cuts.Doubtful()) return;
+                Point found[2];
+                int const count = GeometryUtils::GetLineSegmentAndCircleArcIntersection(
+                    s.p.x, s.p.y, s.q.x, s.q.y, s.centre.x, s.centre.y, s.radius, 1.0, kFrom, kTo,
+                    &found[0].x, &found[0].y, &found[1].x, &found[1].y);
+                for (int i = 0; i < count; ++i) worst->Note(cuts.ErrorOf(found[i]), cuts.Unit());
+              });
 }
 
 }  // namespace
