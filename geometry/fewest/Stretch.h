@@ -19,8 +19,8 @@ struct Stretch {
   Stretch Widened(std::size_t count) const;
 };
 
-/// Whether both outer pieces of a stretch cover points. Where one does not, the stretch has no first
-/// or no last point to be searched from, and PathOf must not be asked for it.
+/// Whether both outer pieces of a stretch cover points. Where one does not, the stretch has no
+/// first or no last point to be searched from, and PathOf must not be asked for it.
 bool HasOuterPoints(Chain const& chain, Stretch const& stretch);
 
 /// The points of a stretch as a path from joint to joint.
