@@ -124,9 +124,7 @@ void AddOptions(Command& command, Options* options) {
   command
       .AddTexts("CONTOUR", &options->paths, "FILE", "Files with contours; - is the standard input")
       .Require();
-  Option const from =
-      AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-                &options->from, "Read the contours as this");
+  Option const from = AddContourFormat(command, &options->from, "Read the contours as this");
   Option const points = command
                             .AddFlag("--points", &options->arePoints,
                                      "The files hold points; measure the polygon through them")

@@ -120,8 +120,7 @@ void AddOptions(Command& command, Options* options) {
                "File with the contour; - is the standard input")
       .Require();
   AddClosedChoice(command, &options->closed);
-  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-            &options->from, "Read the contour as this");
+  AddContourFormat(command, &options->from, "Read the contour as this");
   AddOutline(command, &options->outline);
   command.AddOutput(
       "--table", &options->table,

@@ -98,4 +98,9 @@ Option AddFormat(Command& command, std::string const& name, std::vector<std::str
   return command.AddChecked(name, OneOf(names, FormatName), take, "NAME", help);
 }
 
+Option AddContourFormat(Command& command, std::optional<Format>* from, std::string const& help) {
+  return AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
+                   from, help);
+}
+
 }  // namespace Vorn::Cli

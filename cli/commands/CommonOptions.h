@@ -41,6 +41,9 @@ Option AddWord(Command& command, std::string const& name, std::vector<std::strin
 Option AddFormat(Command& command, std::string const& name, std::vector<std::string> const& names,
                  std::optional<Format>* format, std::string const& help);
 
+/// Adds --from, which says as what contours are read.
+Option AddContourFormat(Command& command, std::optional<Format>* from, std::string const& help);
+
 /// An option whose value is one of a few names, each standing for a value.
 template <typename Value>
 Option AddChoice(Command& command, std::string const& name, Value* value,

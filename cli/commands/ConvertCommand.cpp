@@ -177,8 +177,7 @@ void AddOptions(Command& command, Options* options) {
   AddOutputFiles(command, "contour",
                  {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg", "png", "html"},
                  &options->outputs);
-  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-            &options->from, "Read the input as this");
+  AddContourFormat(command, &options->from, "Read the input as this");
   command.AddText("--units", &options->units, "NAME",
                   "The units of the coordinates, for example mm; goes before what the file says");
   AddOutline(command, &options->outline);

@@ -96,8 +96,7 @@ void AddOptions(Command& command, Options* options) {
       .Require();
   command.AddText("B", &options->b, "FILE",
                   "File with another contour; without it, A meets itself");
-  AddFormat(command, "--from", {"json", "csv", "dxf", "gcode", "wkt", "geojson", "svg"},
-            &options->from, "Read the contours as this");
+  AddContourFormat(command, &options->from, "Read the contours as this");
   AddOutline(command, &options->outline);
   AddOutline(command, &options->outlineB, "--outline-b");
   AddFlatten(command, &options->flattening);
