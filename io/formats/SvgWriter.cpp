@@ -11,7 +11,7 @@ namespace Vorn::IO {
 
 namespace {
 
-constexpr double kWidestArc = 2.0 * std::numbers::pi / 3.0;
+constexpr double kWidestPathArc = 2.0 * std::numbers::pi / 3.0;
 
 /// A tenth of a millimetre: thin enough for a cutter to take it for a line to follow.
 constexpr double kLineWidth = 0.1;
@@ -38,7 +38,8 @@ std::string StepOf(Piece const& piece) {
 
 std::string PathOf(ContourFile const& run) {
   std::string data = "M " + Written(run.pieces.front().start);
-  for (Piece const& piece : WithoutArcsBeyond(kWidestArc, run.pieces)) data += " " + StepOf(piece);
+  for (Piece const& piece : WithoutArcsBeyond(kWidestPathArc, run.pieces))
+    data += " " + StepOf(piece);
   return R"(<path d=")" + data + (run.isClosed ? " Z" : "") + "\"/>\n";
 }
 

@@ -42,8 +42,8 @@ struct Row {
   }
   /// Two numbers at least, beside names or times.
   bool MayBeData() const {
-    constexpr std::ptrdiff_t kFewest = 2;
-    return std::count(areNumbers.begin(), areNumbers.end(), true) >= kFewest;
+    constexpr std::ptrdiff_t kFewestNumbers = 2;
+    return std::count(areNumbers.begin(), areNumbers.end(), true) >= kFewestNumbers;
   }
   bool HasNumbers() const { return std::any_of(fields.begin(), fields.end(), LooksLikeNumber); }
   bool BeginsWithText() const { return fields.empty() || !LooksLikeNumber(fields.front()); }

@@ -31,9 +31,9 @@ TEST_F(Program, TheAreaOfTwoCirclesHasTheHoleTakenOff) {
       ended.out.find("ring.dxf: 2 outlines, 1 hole\narea        285.8849315, holes taken off"),
       std::string::npos)
       << ended.out;
-  auto const json = nlohmann::json::parse(Run("area ring.dxf --json").out);
-  EXPECT_NEAR(json.at("netArea").get<double>(), 91.0 * std::numbers::pi, 1e-10);
-  EXPECT_EQ(json.at("contours").at(1).at("isHole"), true);
+  auto const document = nlohmann::json::parse(Run("area ring.dxf --json").out);
+  EXPECT_NEAR(document.at("netArea").get<double>(), 91.0 * std::numbers::pi, 1e-10);
+  EXPECT_EQ(document.at("contours").at(1).at("isHole"), true);
   auto const one = nlohmann::json::parse(Run("area ring.dxf --json --outline 2").out);
   EXPECT_NEAR(one.at("netArea").get<double>(), 9.0 * std::numbers::pi, 1e-12);
 }
@@ -41,9 +41,9 @@ TEST_F(Program, TheAreaOfTwoCirclesHasTheHoleTakenOff) {
 TEST_F(Program, UnsortedLinesAreChained) {
   Write("square.dxf",
         Drawing(Line(0, 0, 10, 0) + Line(10, 10, 0, 10) + Line(10, 0, 10, 10) + Line(0, 10, 0, 0)));
-  auto const json = nlohmann::json::parse(Run("area square.dxf --json").out);
-  EXPECT_EQ(json.at("netArea"), 100.0);
-  EXPECT_TRUE(json.at("contours").at(0).at("gaps").empty());
+  auto const document = nlohmann::json::parse(Run("area square.dxf --json").out);
+  EXPECT_EQ(document.at("netArea"), 100.0);
+  EXPECT_TRUE(document.at("contours").at(0).at("gaps").empty());
   Ended const ended = Run("convert square.dxf -o square.json");
   EXPECT_EQ(ended.err, "");
   EXPECT_EQ(nlohmann::json::parse(Contents(folder_ / "square.json")).at("closed"), true);
@@ -52,8 +52,8 @@ TEST_F(Program, UnsortedLinesAreChained) {
 TEST_F(Program, OneOutlineCanBeChosen) {
   Write("two.dxf", Drawing(Circle(0, 1) + Circle(10, 2)));
   EXPECT_EQ(Run("convert two.dxf -o one.json --outline 2").code, 0);
-  auto const json = nlohmann::json::parse(Contents(folder_ / "one.json"));
-  EXPECT_EQ(json.at("elements").at(0).at("radius"), 2.0);
+  auto const document = nlohmann::json::parse(Contents(folder_ / "one.json"));
+  EXPECT_EQ(document.at("elements").at(0).at("radius"), 2.0);
   Write("p.csv", "12,0\n8,0\n");
   EXPECT_EQ(Run("check p.csv two.dxf -t 0.1 --outline 2").code, 0);
   EXPECT_EQ(Run("check p.csv two.dxf -t 0.1 --outline 1").code, 1);

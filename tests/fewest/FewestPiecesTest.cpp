@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "gtest/gtest.h"
+#include "support/Bits.h"
 #include "support/fewest/FewestCalls.h"
 #include "support/fewest/Motions.h"
 #include "support/fewest/PromiseChecker.h"
@@ -17,7 +18,6 @@
 namespace Vorn::Testing {
 namespace {
 
-constexpr double kNaN = std::numeric_limits<double>::quiet_NaN();
 constexpr double kInfinity = std::numeric_limits<double>::infinity();
 constexpr double kPi = std::numbers::pi;
 

@@ -19,8 +19,8 @@ inline PointFile Parse(std::string_view text,
 }
 
 /// The message of the refusal; empty when the text is accepted.
-inline std::string Refusal(std::string_view text,
-                           ToleranceColumn const& column = {Use::IfPresent, "w"}) {
+inline std::string TableRefusal(std::string_view text,
+                                ToleranceColumn const& column = {Use::IfPresent, "w"}) {
   try {
     Parse(text, column);
   } catch (Failure const& failure) {

@@ -27,7 +27,7 @@ bool SameRecord(CrossingPoint const& a, CrossingPoint const& b) {
   return SameBits(a.pt, b.pt) && a.side1 == b.side1 && a.side2 == b.side2;
 }
 
-std::string Describe(std::vector<CrossingPoint> const& records) {
+std::string DescribeRecords(std::vector<CrossingPoint> const& records) {
   std::ostringstream out;
   for (auto const& r : records) {
     PrintPoint(out, r.pt);
@@ -42,7 +42,7 @@ testing::AssertionResult SameRecords(std::vector<CrossingPoint> const& expected,
     return testing::AssertionSuccess();
   }
   return testing::AssertionFailure()
-         << "expected " << Describe(expected) << "but got " << Describe(actual);
+         << "expected " << DescribeRecords(expected) << "but got " << DescribeRecords(actual);
 }
 
 Triangle const kBase{{{0.0, 0.0}, {4.0, 0.0}, {0.0, 3.0}}};

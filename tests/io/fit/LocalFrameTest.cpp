@@ -132,7 +132,7 @@ struct FarContour {
 
 class FarFromTheOrigin : public testing::TestWithParam<FarContour> {};
 
-bool SameBits(double a, double b) {
+bool HaveSameBits(double a, double b) {
   return std::bit_cast<std::uint64_t>(a) == std::bit_cast<std::uint64_t>(b);
 }
 
@@ -140,17 +140,18 @@ bool SameBits(double a, double b) {
 void ExpectSamePieces(FitReport const& near, FitReport const& far, XY const& offset) {
   ASSERT_EQ(far.pieces.size(), near.pieces.size()) << "offset " << offset.x;
   EXPECT_EQ(far.verdict, near.verdict);
-  EXPECT_TRUE(SameBits(far.remeasured.Worst().relative, near.remeasured.Worst().relative));
+  EXPECT_TRUE(HaveSameBits(far.remeasured.Worst().relative, near.remeasured.Worst().relative));
   for (std::size_t i = 0; i < near.pieces.size(); ++i) {
     Piece const& a = near.pieces[i];
     Piece const& b = far.pieces[i];
     EXPECT_EQ(a.kind, b.kind) << i;
-    EXPECT_TRUE(SameBits(a.length, b.length) && SameBits(a.radius, b.radius) &&
-                SameBits(a.sweep, b.sweep) && SameBits(a.startAngle, b.startAngle))
+    EXPECT_TRUE(HaveSameBits(a.length, b.length) && HaveSameBits(a.radius, b.radius) &&
+                HaveSameBits(a.sweep, b.sweep) && HaveSameBits(a.startAngle, b.startAngle))
         << "piece " << i;
-    EXPECT_TRUE(SameBits(a.start.x + offset.x, b.start.x) &&
-                SameBits(a.start.y + offset.y, b.start.y) &&
-                SameBits(a.end.x + offset.x, b.end.x) && SameBits(a.end.y + offset.y, b.end.y))
+    EXPECT_TRUE(HaveSameBits(a.start.x + offset.x, b.start.x) &&
+                HaveSameBits(a.start.y + offset.y, b.start.y) &&
+                HaveSameBits(a.end.x + offset.x, b.end.x) &&
+                HaveSameBits(a.end.y + offset.y, b.end.y))
         << "piece " << i;
   }
 }

@@ -9,7 +9,7 @@
 #include "vorn/io/Pieces.h"
 #include "vorn/io/Points.h"
 
-namespace Vorn::IO::Testing {
+namespace Vorn::IO {
 namespace {
 
 using Vorn::Testing::RefuseEachAllocation;
@@ -55,4 +55,4 @@ TEST(PointsWithoutMemory, Throw) {
 }
 
 }  // namespace
-}  // namespace Vorn::IO::Testing
+}  // namespace Vorn::IO

@@ -12,7 +12,7 @@ using namespace FormatContours;
 using std::numbers::pi;
 
 /// "0 LINE 8 0": codes and values divided by blanks become lines.
-std::string Lines(std::string text) {
+std::string OnLines(std::string text) {
   for (char& c : text) {
     if (c == ' ') c = '\n';
   }
@@ -20,7 +20,7 @@ std::string Lines(std::string text) {
 }
 
 std::string Drawing(std::string const& entities) {
-  return Lines("0 SECTION 2 ENTITIES " + entities + " 0 ENDSEC 0 EOF");
+  return OnLines("0 SECTION 2 ENTITIES " + entities + " 0 ENDSEC 0 EOF");
 }
 
 ContourFile Read(std::string const& entities) { return ParseDxf(Drawing(entities), "p.dxf"); }
@@ -34,22 +34,22 @@ std::string const kLineToRight = "0 LINE 8 0 10 0 20 0 11 4 21 0";
 TEST(ToDxf, IsOnePolylineWithBulges) {
   std::string const text = ToDxf(Wedge());
   std::string const quarter = std::to_string(-std::tan(pi / 8)).substr(0, 8);
-  EXPECT_NE(text.find(Lines("9 $ACADVER 1 AC1009")), std::string::npos);
+  EXPECT_NE(text.find(OnLines("9 $ACADVER 1 AC1009")), std::string::npos);
   EXPECT_NE(text.find("999\nunits mm\n"), std::string::npos);
-  EXPECT_NE(text.find(Lines("9 $EXTMIN 10 0.0 20 -1.0 30 0.0 9 $EXTMAX 10 5.0 20 0.0 30 0.0")),
+  EXPECT_NE(text.find(OnLines("9 $EXTMIN 10 0.0 20 -1.0 30 0.0 9 $EXTMAX 10 5.0 20 0.0 30 0.0")),
             std::string::npos);
-  EXPECT_NE(text.find(Lines("0 POLYLINE 8 CONTOUR 66 1 10 0.0 20 0.0 30 0.0 70 1 "
-                            "0 VERTEX 8 CONTOUR 10 0.0 20 0.0 30 0.0 "
-                            "0 VERTEX 8 CONTOUR 10 4.0 20 0.0 30 0.0") +
+  EXPECT_NE(text.find(OnLines("0 POLYLINE 8 CONTOUR 66 1 10 0.0 20 0.0 30 0.0 70 1 "
+                              "0 VERTEX 8 CONTOUR 10 0.0 20 0.0 30 0.0 "
+                              "0 VERTEX 8 CONTOUR 10 4.0 20 0.0 30 0.0") +
                       "42\n" + quarter),
             std::string::npos);
-  EXPECT_TRUE(text.ends_with(Lines("0 SEQEND 8 CONTOUR 0 ENDSEC 0 EOF")));
+  EXPECT_TRUE(text.ends_with(OnLines("0 SEQEND 8 CONTOUR 0 ENDSEC 0 EOF")));
 }
 
 TEST(ToDxf, EntitiesAreLinesAndCounterClockwiseArcs) {
   std::string const text = ToDxf(Wedge(), DxfStyle::Entities);
-  EXPECT_NE(text.find(Lines("0 LINE 8 CONTOUR_LINES 10 0.0 20 0.0 30 0.0 11 4.0 21 0.0 31 0.0 "
-                            "0 ARC 8 CONTOUR_ARCS 10 4.0 20 -1.0 30 0.0 40 1.0 50 0.0 51 90.0")),
+  EXPECT_NE(text.find(OnLines("0 LINE 8 CONTOUR_LINES 10 0.0 20 0.0 30 0.0 11 4.0 21 0.0 31 0.0 "
+                              "0 ARC 8 CONTOUR_ARCS 10 4.0 20 -1.0 30 0.0 40 1.0 50 0.0 51 90.0")),
             std::string::npos)
       << text;
 }
@@ -124,15 +124,15 @@ TEST(ParseDxf, ReadsWhatIsDrawnOnTheBackOfThePlane) {
 TEST(ParseDxf, TakesUnitsFromTheHeaderWhenNoCommentSays) {
   std::string const header = "0 SECTION 2 HEADER 9 $INSUNITS 70 4 0 ENDSEC ";
   std::string const rest = "0 SECTION 2 ENTITIES " + kLineToRight + " 0 ENDSEC 0 EOF";
-  EXPECT_EQ(ParseDxf(Lines(header + rest), "p.dxf").units, "mm");
-  EXPECT_EQ(ParseDxf("999\nunits inch\n" + Lines(header + rest), "p.dxf").units, "inch");
-  EXPECT_EQ(ParseDxf(Lines(rest), "p.dxf").units, "");
+  EXPECT_EQ(ParseDxf(OnLines(header + rest), "p.dxf").units, "mm");
+  EXPECT_EQ(ParseDxf("999\nunits inch\n" + OnLines(header + rest), "p.dxf").units, "inch");
+  EXPECT_EQ(ParseDxf(OnLines(rest), "p.dxf").units, "");
 }
 
 TEST(ParseDxf, PassesOverAnnotationsBlocksAndPaperSpace) {
-  std::string const text =
-      Lines("0 SECTION 2 BLOCKS 0 SPLINE 10 0 0 ENDSEC 0 SECTION 2 ENTITIES 0 TEXT 10 0 20 0 1 x " +
-            kLineToRight + " 0 POINT 10 7 20 7 0 CIRCLE 67 1 10 0 20 0 40 1 0 ENDSEC 0 EOF");
+  std::string const text = OnLines(
+      "0 SECTION 2 BLOCKS 0 SPLINE 10 0 0 ENDSEC 0 SECTION 2 ENTITIES 0 TEXT 10 0 20 0 1 x " +
+      kLineToRight + " 0 POINT 10 7 20 7 0 CIRCLE 67 1 10 0 20 0 40 1 0 ENDSEC 0 EOF");
   EXPECT_EQ(ParseDxf(text, "p.dxf").pieces.size(), 1u);
 }
 

@@ -20,10 +20,6 @@ TEST(MakeArc, AnglesSweepAndLengthFollow) {
   EXPECT_DOUBLE_EQ(arc.length, 1.5 * pi);
 }
 
-TEST(MakeArc, EndsInOneDirectionMeanNoSweep) {
-  EXPECT_EQ(MakeArc({1, 0}, {1, 0}, {0, 0}, 1, true).sweep, 0.0);
-}
-
 TEST(MakeBulge, OneIsAHalfTurnToTheRight) {
   Piece const arc = MakeBulge({0, 0}, {2, 0}, 1.0);
   EXPECT_TRUE(arc.counterClockwise);

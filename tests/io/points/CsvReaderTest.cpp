@@ -86,7 +86,7 @@ struct BadText {
 class RefusedTexts : public testing::TestWithParam<BadText> {};
 
 TEST_P(RefusedTexts, NameFileLineAndText) {
-  EXPECT_EQ(Refusal(GetParam().text), GetParam().message);
+  EXPECT_EQ(TableRefusal(GetParam().text), GetParam().message);
 }
 
 INSTANTIATE_TEST_SUITE_P(
@@ -178,9 +178,9 @@ TEST(CsvReader, RequiredColumnIsFoundByItsNameInAnyCase) {
 }
 
 TEST(CsvReader, RequiredColumnThatIsMissingIsRefusedWithTheHeader) {
-  EXPECT_EQ(Refusal("x,y,z\n1,2,3\n3,4,5\n", {Use::Required, "tol"}),
+  EXPECT_EQ(TableRefusal("x,y,z\n1,2,3\n3,4,5\n", {Use::Required, "tol"}),
             "p.csv:1:1: no column 'tol'; the header has 'x', 'y', 'z'");
-  EXPECT_EQ(Refusal("1,2\n3,4\n", {Use::Required, "w"}),
+  EXPECT_EQ(TableRefusal("1,2\n3,4\n", {Use::Required, "w"}),
             "p.csv:1:1: no column 'w'; the file has no header");
 }
 
@@ -215,7 +215,7 @@ TEST(CsvReader, NumbersWithADecimalCommaKeepTheirExactBits) {
 
 TEST(CsvReader, CommasAndBlanksAreCommasWhereBlanksAloneMakeNoSense) {
   // Four fields and not two numbers with a decimal comma: a blank follows only some commas.
-  EXPECT_EQ(Refusal("1,5, 2,5\n"), Refusal("1,5,2,5\n").replace(8, 1, "8"));
+  EXPECT_EQ(TableRefusal("1,5, 2,5\n"), TableRefusal("1,5,2,5\n").replace(8, 1, "8"));
 }
 
 }  // namespace

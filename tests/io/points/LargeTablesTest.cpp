@@ -13,9 +13,9 @@ namespace {
 using namespace PointTables;
 
 TEST(CsvReader, BinaryFilesAreRefusedByTheirFirstZeroByte) {
-  EXPECT_EQ(Refusal(std::string_view("\x7f"
-                                     "ELF\x02\x00\x01\n1,2\n",
-                                     12)),
+  EXPECT_EQ(TableRefusal(std::string_view("\x7f"
+                                          "ELF\x02\x00\x01\n1,2\n",
+                                          12)),
             "p.csv: is not text: byte 5 is zero");
 }
 
@@ -50,13 +50,14 @@ TEST(CsvReader, DamagedFilesAreRefusedOrRead) {
 TEST(CsvReader, AMillionColumnsAreRefusedInOneLine) {
   std::string text = "1";
   for (int i = 1; i < 1'000'000; ++i) text += ",1";
-  EXPECT_EQ(Refusal(text), "p.csv:1:7: 1000000 columns without a header; expected x,y or x,y,w");
+  EXPECT_EQ(TableRefusal(text),
+            "p.csv:1:7: 1000000 columns without a header; expected x,y or x,y,w");
   std::string header = "a";
   for (int i = 1; i < 1'000'000; ++i) header += ",a";
-  EXPECT_EQ(Refusal(header + "\n" + text, {Use::Required, "t"}),
+  EXPECT_EQ(TableRefusal(header + "\n" + text, {Use::Required, "t"}),
             "p.csv:1:1: no column 't'; the header has 'a', 'a', 'a', 'a', 'a', 'a', 'a', 'a' and "
             "999992 more");
-  EXPECT_EQ(Refusal("1,2\n" + text).substr(0, 49),
+  EXPECT_EQ(TableRefusal("1,2\n" + text).substr(0, 49),
             "p.csv:2:5: expected 2 columns, found 1000000: '1,");
 }
 
