@@ -84,7 +84,7 @@ ErrorCode FitDistinct(Order const& order, Fewest::Progress* progress,
   std::size_t const bound =
       isClosed ? Fewest::LeastClosedCover(path.points, path.limits, cover) : open;
   // Three points are covered without a circle.
-  bool const isOne = bound == 1 && path.points.size() > 3;
+  bool const isOne = open == 1 && path.points.size() > 3;
   Fewest::FitTask task{order.points, order.options, shift, std::move(path), open, bound, *progress};
   Fewest::Answer answer;
   Promises::Report report;

@@ -7,6 +7,7 @@
 #include "geometry/fewest/Assembly.h"
 #include "geometry/fewest/BothWays.h"
 #include "geometry/fewest/Centring.h"
+#include "geometry/fewest/Laps.h"
 #include "geometry/fewest/OnePiece.h"
 #include "geometry/fewest/Polyline.h"
 #include "geometry/fewest/Seam.h"
@@ -55,14 +56,11 @@ class Fitter {
         bound_(task.bound),
         progress_(task.progress) {}
 
-  /// Whether one piece along a circle that covers all points keeps every promise.
+  /// Whether one piece along a circle that covers all points, or one for each lap around it, keeps
+  /// every promise.
   bool RunAsOne(PlacedCircle const& covering, Answer* answer, Promises::Report* report) const {
-    for (Chain const& chain : MakeOnePiece(path_, covering)) {
-      if (KeepsCentred(path_, 0, chain, answer, report)) return true;
-      RoundEnds(Tightest(points_).w, answer);
-      if (Measure(*answer, report)) return true;
-    }
-    return false;
+    return (!options_.closed && RunAsOnePiece(covering, answer, report)) ||
+           RunAsLaps(covering, answer, report);
   }
 
   /// The first contour found that keeps every promise; false when there is none.
@@ -89,6 +87,24 @@ class Fitter {
   }
 
  private:
+  bool RunAsOnePiece(PlacedCircle const& covering, Answer* answer, Promises::Report* report) const {
+    for (Chain const& chain : MakeOnePiece(path_, covering)) {
+      if (KeepsCentred(path_, 0, chain, answer, report)) return true;
+      RoundEnds(Tightest(points_).w, answer);
+      if (Measure(*answer, report)) return true;
+    }
+    return false;
+  }
+
+  bool RunAsLaps(PlacedCircle const& covering, Answer* answer, Promises::Report* report) const {
+    Laps const laps = WindLaps(path_, covering, options_.closed);
+    if (laps.chain.pieces.empty()) return false;
+    Path path = path_;
+    path.start = laps.start;
+    path.finish = laps.finish;
+    return Keeps(path, 0, laps.chain, answer, report);
+  }
+
   /// Tries tolerances that are a little tighter everywhere, in place of a contour that breaks a
   /// promise: another chain of as many pieces may keep them all. Leaves the answer otherwise.
   bool RunTighter(Answer* answer, Promises::Report* report) {

@@ -35,8 +35,8 @@ struct FitTask {
 };
 
 /// The first contour found that keeps every promise, with what was measured on it; false when there
-/// is none. `covering` is a circle that covers all points, which is then tried first; null for
-/// none.
+/// is none. `covering` is a circle that covers all points, along which pieces are then tried
+/// first; null for none.
 bool FindContour(FitTask task, PlacedCircle const* covering, Answer* answer,
                  Promises::Report* report);
 

@@ -6,7 +6,14 @@ namespace Vorn::Fewest {
 
 namespace {
 
-/// The circle with the sign with which the points run along it.
+Chain ChainOf(Path const& path, PlacedCircle const& circle, double ratio) {
+  Chain chain;
+  chain.pieces.push_back({0, path.Count(), AlongPath(path, circle), ratio});
+  return chain;
+}
+
+}  // namespace
+
 PlacedCircle AlongPath(Path const& path, PlacedCircle const& circle) {
   double advance = 0.0;
   for (std::int32_t i = 1; i < path.Count(); ++i) {
@@ -17,14 +24,6 @@ PlacedCircle AlongPath(Path const& path, PlacedCircle const& circle) {
   }
   return advance < 0.0 ? Scaled(circle, -1.0) : circle;
 }
-
-Chain ChainOf(Path const& path, PlacedCircle const& circle, double ratio) {
-  Chain chain;
-  chain.pieces.push_back({0, path.Count(), AlongPath(path, circle), ratio});
-  return chain;
-}
-
-}  // namespace
 
 std::vector<Chain> MakeOnePiece(Path const& path, PlacedCircle const& covering) {
   constexpr double kWholeShare = 1.0;

@@ -15,11 +15,20 @@ constexpr std::int32_t kFirstStrides = 16;
 
 PieceFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
   UseRows(first, last);
-  Simplex simplex(slack_);
-  Basis basis;
   Circle const chord = LineThrough(PlaceOf(frame_.ToLocal(path_.At(first))),
                                    PlaceOf(frame_.ToLocal(path_.At(last - 1))));
-  return FromLocal(FitRun(programme_, {chord, 0.0, false}, false, &simplex, &basis));
+  return FitRows({chord, 0.0, false});
+}
+
+PieceFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last, PieceFit const& start) {
+  UseRows(first, last);
+  return FitRows({frame_.ToLocal(start.circle), start.ratio, start.isFound});
+}
+
+PieceFit PieceSearch::FitRows(RunFit const& start) {
+  Simplex simplex(slack_);
+  Basis basis;
+  return FromLocal(FitRun(programme_, start, false, &simplex, &basis));
 }
 
 PieceFit PieceSearch::FitLongestAlone(std::int32_t first) {

@@ -86,6 +86,9 @@ class PieceSearch {
   /// The circle of the smallest largest ratio through some points alone; its guess is their chord.
   PieceFit FitAlone(std::int32_t first, std::int32_t last);
 
+  /// The same from another circle on; isFound when it is one of its ratio.
+  PieceFit FitAlone(std::int32_t first, std::int32_t last, PieceFit const& start);
+
   /// The same for the longest run from a point on that a circle was found for; not found where two
   /// points are left or fewer.
   PieceFit FitLongestAlone(std::int32_t first);
@@ -103,6 +106,8 @@ class PieceSearch {
   Sample MiddleOf(WPoint const& p, WPoint const& q) const;
   /// Begins a programme of the rows of [first, last) without conditions.
   void UseRows(std::int32_t first, std::int32_t last);
+  /// The circle of the smallest largest ratio of the rows in use.
+  PieceFit FitRows(RunFit const& start);
   /// Begins the programme of a piece from an opening over the points up to `end`: rows, limit of
   /// curvature, opening.
   void BeginProgramme(Opening const& from, std::int32_t end);

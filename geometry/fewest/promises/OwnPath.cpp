@@ -13,7 +13,7 @@ namespace {
 using Point = GeometryUtils::Point;
 
 /// How many times all points may be looked at, and how many more looks short paths have.
-constexpr std::int64_t kRounds = 64;
+constexpr std::int64_t kRounds = 512;
 constexpr std::int64_t kLeastBudget = 1 << 20;
 
 Point At(WPoint const& p) { return {p.x, p.y}; }
