@@ -98,9 +98,10 @@ void AddPoints(Scene const& scene, Legend* legend) {
 
 void AddTolerance(Scene const& scene, Legend* legend) {
   if (!scene.drawing.HasTolerances()) return;
-  legend->AddShape(
-      "M-7-5h14v10h-14z", "fill=\"" + kBandColor + "\" stroke=\"" + kBandEdgeColor + "\"",
-      scene.IsBandVisible() ? "tolerance" + Times(scene) : "tolerance (above: too thin to show)");
+  legend->AddShape("M-7-5h14v10h-14z",
+                   "fill=\"" + kBandColor + "\" stroke=\"" + kBandEdgeColor + "\"",
+                   scene.IsBandVisible() ? "tolerance" + Times(scene)
+                                         : "tolerance (on the contour: too thin to show)");
 }
 
 /// A round length, as long as it is on the page.

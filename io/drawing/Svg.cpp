@@ -1,3 +1,6 @@
+#include <algorithm>
+#include <utility>
+
 #include "io/drawing/Legend.h"
 #include "io/drawing/Scene.h"
 #include "io/drawing/Style.h"
@@ -18,6 +21,7 @@ constexpr double kPageWidth = 1123.0;
 constexpr double kPageHeight = 794.0;
 constexpr double kLeft = 78.0;
 constexpr double kRight = 34.0;
+constexpr double kFullWidth = kPageWidth - kLeft - kRight;
 constexpr double kContourTop = 92.0;
 constexpr double kPageBottom = kPageHeight - 54.0;
 
@@ -27,6 +31,19 @@ constexpr double kBetweenFrames = 104.0;
 constexpr double kLeastDiagram = 150.0;
 constexpr double kMostDiagram = 300.0;
 constexpr double kLegendHeight = 66.0;
+
+/// A contour so many times as high as it is wide has the diagram beside it instead of below, and
+/// one line for the legend at the bottom of the page. Both frames end where the other numbers of
+/// the diagram and its title still fit above that line.
+constexpr double kLeastTall = 1.5;
+constexpr double kTallTop = 108.0;
+constexpr double kTallBottom = 720.0;
+constexpr double kTallLegend = 776.0;
+constexpr double kLeastTallWidth = 340.0;
+constexpr double kMostTallWidth = 480.0;
+constexpr double kLabelWidth = 90.0;     ///< of a piece, to either side of the contour
+constexpr double kBesideFrames = 78.0;   ///< for the numbers of the diagram
+constexpr double kNarrowHeading = 26.0;  ///< the heading of a narrow diagram takes two lines
 
 constexpr char const* kStyle =
     "<style>text { font-family: 'DejaVu Sans', Verdana, Arial, sans-serif; } "
@@ -75,37 +92,64 @@ std::string Title(Drawing const& drawing) {
               Judgement(drawing));
 }
 
-Scene SceneOf(Drawing const& drawing) {
-  double const width = kPageWidth - kLeft - kRight;
-  double const room = kPageBottom - kContourTop;
-  if (!drawing.IsMeasured()) {
-    double const height = room - kLegendHeight + 20.0;
-    return MakeScene(drawing, {kLeft, kContourTop, width, height}, height);
-  }
-  double const least = room - kBetweenFrames - kMostDiagram;
-  return MakeScene(drawing, {kLeft, kContourTop, width, least},
-                   room - kBetweenFrames - kLeastDiagram);
+/// Where contour, legend and diagram go on the page.
+struct Page {
+  Scene scene;
+  double legendAt = 0.0;  ///< the line that the words of the legend stand on
+  Rect diagram;           ///< only where something is measured
+};
+
+/// A contour without points, or points without a contour, has the page for itself.
+Page PageAlone(Drawing const& drawing) {
+  double const height = kPageBottom - kContourTop - kLegendHeight + 20.0;
+  Scene scene = MakeScene(drawing, {kLeft, kContourTop, kFullWidth, height}, height);
+  double const legendAt = scene.view.Frame().Bottom() + kLegendDrop;
+  return {std::move(scene), legendAt, {}};
 }
 
-std::string Diagram(Scene const& scene) {
-  if (!scene.IsMeasured()) return "";
-  double const top = scene.view.Frame().Bottom() + kBetweenFrames;
-  return DeviationPlot(scene, {kLeft, top, scene.view.Frame().width, kPageBottom - top});
+/// The diagram below the contour.
+Page PageBelow(Drawing const& drawing) {
+  double const room = kPageBottom - kContourTop - kBetweenFrames;
+  Scene scene = MakeScene(drawing, {kLeft, kContourTop, kFullWidth, room - kMostDiagram},
+                          room - kLeastDiagram);
+  double const bottom = scene.view.Frame().Bottom();
+  double const top = bottom + kBetweenFrames;
+  return {std::move(scene), bottom + kLegendDrop, {kLeft, top, kFullWidth, kPageBottom - top}};
+}
+
+/// The diagram to the right of a tall contour, which has the height of the page.
+Page PageBeside(Drawing const& drawing, Box const& box) {
+  double const height = kTallBottom - kTallTop;
+  double const needed = height * box.Width() / box.Height() + 2.0 * kLabelWidth;
+  double const width = std::clamp(needed, kLeastTallWidth, kMostTallWidth);
+  Scene scene = MakeScene(drawing, {kLeft, kTallTop, width, height}, height);
+  double const left = kLeft + width + kBesideFrames;
+  double const top = kTallTop + kNarrowHeading;
+  return {std::move(scene), kTallLegend, {left, top, kLeft + kFullWidth - left, kTallBottom - top}};
+}
+
+Page PageOf(Drawing const& drawing) {
+  if (!drawing.IsMeasured()) return PageAlone(drawing);
+  Box const box = BoxAround(drawing);
+  return box.Height() >= kLeastTall * box.Width() ? PageBeside(drawing, box) : PageBelow(drawing);
+}
+
+std::string Diagram(Page const& page) {
+  return page.scene.IsMeasured() ? DeviationPlot(page.scene, page.diagram) : "";
 }
 
 }  // namespace
 
 std::string ToSvg(Drawing const& drawing) {
   drawing.RequireContent();
-  Scene const scene = SceneOf(drawing);
+  Page const page = PageOf(drawing);
   return "<?xml version=\"1.0\" encoding=\"UTF-8\"?>\n"
          "<svg xmlns=\"http://www.w3.org/2000/svg\" width=\"297mm\" height=\"210mm\" "
          "viewBox=\"0 0 " +
          Px(kPageWidth) + " " + Px(kPageHeight) + "\">\n" + kStyle +
          "<rect x=\"-9\" y=\"-9\" width=\"110%\" height=\"110%\" fill=\"white\"/>\n<g fill=\"" +
-         kTextColor + "\">\n" + Title(drawing) + ContourPlot(scene) +
-         LegendRow(scene, scene.view.Frame().Bottom() + kLegendDrop) + Diagram(scene) +
-         "</g>\n</svg>\n";
+         kTextColor + "\">\n" + Title(drawing) + ContourPlot(page.scene) +
+         LegendRow(page.scene, page.legendAt) + Diagram(page) + "</g>\n</svg>\n";
 }
 
 }  // namespace Vorn::IO

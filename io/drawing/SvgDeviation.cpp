@@ -19,6 +19,10 @@ constexpr double kDigitWidth = 7.0;
 constexpr double kLeastStemGap = 3.0;
 constexpr double kDeviationCell = 1.0;
 
+/// Less does not hold the title and the note side by side.
+constexpr double kLeastWideHeading = 900.0;
+constexpr double kHeadingLine = 16.0;
+
 /// Maps lengths along the contour and deviations into the frame.
 class Chart {
  public:
@@ -188,15 +192,24 @@ std::string LargestText(Scene const& scene, Chart const& chart) {
   return ": largest " + value + " at point " + std::to_string(point);
 }
 
+/// "Deviation [mm]", shorter where there is less room.
+std::string Title(Chart const& chart, std::string const& units, bool isNarrow) {
+  if (!chart.IsRelative()) return "Deviation" + units;
+  return isNarrow ? "Deviation in tolerances" : "Deviation as a multiple of the point's tolerance";
+}
+
+/// The title, and what else the reader has to know: behind it, or between it and a narrow diagram.
 std::string Heading(Scene const& scene, Chart const& chart) {
   Rect const& frame = chart.Frame();
+  bool const isNarrow = frame.width < kLeastWideHeading;
   std::string const units = scene.drawing.units.empty() ? "" : " [" + scene.drawing.units + "]";
-  std::string const title =
-      chart.IsRelative() ? "Deviation as a multiple of the point's tolerance" : "Deviation" + units;
-  return Text({frame.left, frame.top - kStripHeight - 7.0}, "font-size=\"12\" font-weight=\"bold\"",
-              title + LargestText(scene, chart)) +
-         Text({frame.Right(), frame.top - kStripHeight - 7.0},
-              "font-size=\"11\" text-anchor=\"end\"",
+  double const line = frame.top - kStripHeight - 7.0;
+  Pixel const noteAt{isNarrow ? frame.left : frame.Right(), line};
+  std::string const anchor = isNarrow ? "start" : "end";
+  return Text({frame.left, isNarrow ? line - kHeadingLine : line},
+              "font-size=\"12\" font-weight=\"bold\"",
+              Title(chart, units, isNarrow) + LargestText(scene, chart)) +
+         Text(noteAt, "font-size=\"11\" text-anchor=\"" + anchor + "\"",
               "positive: to the left of the direction of travel; strip: pieces by kind") +
          Text({frame.left + 0.5 * frame.width, frame.Bottom() + 31.0},
               "font-size=\"11\" text-anchor=\"middle\"", "length along the contour" + units);

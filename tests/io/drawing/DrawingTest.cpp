@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <regex>
+#include <vector>
 
 #include "io/Contours.h"
 #include "io/Picture.h"
@@ -127,6 +128,44 @@ TEST(ToSvg, AxesTellTheirUnits) {
   drawing.units = "mm";
   EXPECT_NE(ToSvg(drawing).find(">x [mm]</text>"), std::string::npos);
   EXPECT_NE(ToSvg(drawing).find(">y [mm]</text>"), std::string::npos);
+}
+
+/// A line of the given size with a point near each end, measured.
+std::string LineDrawing(double width, double height) {
+  Drawing drawing =
+      MakeDrawing({{0, 0, 0.1}, {width, height, 0.1}}, {MakeLine({0, 0}, {width, height})});
+  drawing.magnify = 1.0;
+  return ToSvg(drawing);
+}
+
+/// Left side, top, width and height of the frames of contour and diagram, in pixels.
+std::vector<Rect> FramesOf(std::string const& svg) {
+  std::regex const frame(
+      "<rect x=\"([0-9.]+)\" y=\"([0-9.]+)\" width=\"([0-9.]+)\" height=\"([0-9.]+)\" "
+      "fill=\"none\"");
+  std::vector<Rect> frames;
+  for (std::sregex_iterator it(svg.begin(), svg.end(), frame), end; it != end; ++it) {
+    frames.push_back(
+        {std::stod((*it)[1]), std::stod((*it)[2]), std::stod((*it)[3]), std::stod((*it)[4])});
+  }
+  return frames;
+}
+
+TEST(ToSvg, DiagramStandsBesideATallContour) {
+  std::vector<Rect> const wide = FramesOf(LineDrawing(30.0, 20.0));
+  ASSERT_EQ(wide.size(), 2u);
+  EXPECT_GT(wide[1].top, wide[0].Bottom());
+  EXPECT_EQ(wide[1].left, wide[0].left);
+
+  for (double const width : {0.0, 1.0, 20.0}) {
+    std::vector<Rect> const tall = FramesOf(LineDrawing(width, 30.0));
+    ASSERT_EQ(tall.size(), 2u) << width;
+    EXPECT_GT(tall[1].left, tall[0].Right()) << width;
+    EXPECT_EQ(tall[1].Bottom(), tall[0].Bottom()) << width;
+    // Three quarters of the page, and as far to the right as the diagram below a wide one.
+    EXPECT_GT(tall[0].height, 590.0) << width;
+    EXPECT_EQ(tall[1].Right(), wide[1].Right()) << width;
+  }
 }
 
 TEST(ToSvg, LegendPromisesSizesOnlyWhereTheyAreWritten) {
