@@ -35,7 +35,7 @@ constexpr double kLegendHeight = 66.0;
 /// A contour so many times as high as it is wide has the diagram beside it instead of below, and
 /// one line for the legend at the bottom of the page. Both frames end where the other numbers of
 /// the diagram and its title still fit above that line.
-constexpr double kLeastTall = 1.5;
+constexpr double kLeastTall = 1.2;
 constexpr double kTallTop = 108.0;
 constexpr double kTallBottom = 720.0;
 constexpr double kTallLegend = 776.0;

@@ -59,6 +59,7 @@ describe('columnsOf', () => {
     const scene = new Scene(data);
     assert.equal(textOf(scene, 'fitted radius', 0), '280.000');
     assert.equal(textOf(scene, 'measured radius', 0), '300.000');
+    assert.equal(textOf(scene, '\u00b1', 0), '0.1230', 'as many digits as the form error');
     assert.equal(textOf(scene, 'form error', 0), '0.0100');
     assert.equal(textOf(scene, 'std. deviation', 0), '', 'not known');
     assert.equal(textOf(scene, 'turn to next', 0), '90.000\u00b0');

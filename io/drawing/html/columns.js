@@ -1,8 +1,8 @@
 // The columns of the table of the pieces.
 
-import {decimalsFor, decimalsOfRelatives, fixed, short} from './numbers.js';
+import {decimalsFor, decimalsOfRelatives, fixed} from './numbers.js';
 
-const degrees = (radians) => fixed(radians * 180 / Math.PI, 3);
+const degrees = (radians, decimals = 3) => fixed(radians * 180 / Math.PI, decimals);
 
 /** How many digits lengths have: to a hundredth of the smallest tolerance, else of the size. */
 export function lengthDecimals(scene) {
@@ -49,13 +49,12 @@ export function columnsOf(scene) {
   ];
   if (!scene.isMeasured) return columns;
   const measured = (name, text) => (piece) => known(piece.measured?.[name], text);
-  const few = (value) => short(value, 2);
   columns.push(
     column('measured radius', measured('radius', length), true),
-    column('\u00b1', measured('radiusDeviation', few)),
+    column('\u00b1', measured('radiusDeviation', finer)),
     column('measured direction', measured('direction', (angle) => `${degrees(angle)}\u00b0`)),
     column('\u00b1', measured('directionDeviation',
-                               (angle) => `${few(angle * 180 / Math.PI)}\u00b0`)),
+                               (angle) => `${degrees(angle, 4)}\u00b0`)),
     column('form error', measured('formError', finer), true),
     column('std. deviation', measured('standardDeviation', finer)),
     column('points', (piece) => String(piece.points), true),

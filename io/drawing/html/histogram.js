@@ -36,7 +36,7 @@ export function histogramMarkup(histogram, units, height) {
   return rects.join('') +
       `<line x1="${MARGINS.left}" y1="${base}" x2="${PANEL_WIDTH - MARGINS.right}" y2="${base}" ` +
       'stroke="var(--border)"/>' +
-      text(left, base + 14, 'middle', `\u2212${end}`) +
+      text(left, base + 14, 'middle', `-${end}`) +
       text(0.5 * PANEL_WIDTH, base + 14, 'middle', '0') + text(right, base + 14, 'middle', end) +
       text(0.5 * PANEL_WIDTH, base + 30, 'middle',
            isRelative ? 'multiple of the tolerance' : units);
