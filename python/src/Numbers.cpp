@@ -6,13 +6,6 @@ namespace Vorn::Python {
 
 namespace {
 
-/// What is masked has no value, which an array of the same numbers would not tell.
-void RefuseMasked(py::object const& given, std::string const& name) {
-  if (py::module_::import("numpy").attr("ma").attr("is_masked")(given).cast<bool>()) {
-    throw py::value_error(name + ": some values are masked; leave them out");
-  }
-}
-
 /// What arrays of this kind hold, in words; empty for numbers.
 std::string StrangeContent(char kind) {
   switch (kind) {
@@ -64,6 +57,12 @@ py::array FromObjects(py::array const& objects, std::string const& name) {
 }
 
 }  // namespace
+
+void RefuseMasked(py::object const& given, std::string const& name) {
+  if (py::module_::import("numpy").attr("ma").attr("is_masked")(given).cast<bool>()) {
+    throw py::value_error(name + ": some values are masked; leave them out");
+  }
+}
 
 py::array NumbersFrom(py::object const& given, std::string const& name) {
   RefuseMasked(given, name);

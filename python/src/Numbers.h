@@ -6,6 +6,10 @@
 
 namespace Vorn::Python {
 
+/// Throws a ValueError where a value is masked: it has no value, which an array of the same numbers
+/// would not tell.
+void RefuseMasked(pybind11::object const& given, std::string const& name);
+
 /// An array of bool, integers or floats, of any shape and strides, of what a caller gave: anything
 /// that numpy.asarray takes. Objects are taken where each of them is a number; their array is one
 /// of doubles then. Every function that takes numbers takes them through here.

@@ -109,6 +109,22 @@ def test_rows_with_masked_values_are_refused(call):
         call(lambda width: np.ma.masked_array(np.ones((4, width)), mask=np.eye(4)[:, :width]))
 
 
+def test_single_calls_refuse_masked_values():
+    masked = np.ma.masked
+    triple = np.ma.masked_array([1.0, 2.0, 0.1], mask=[False, True, False])
+    for call in (lambda: g.get_deviation(1.0, 0.0, masked, 2.0, 2.0),
+                 lambda: g.get_signed_deviation(1.0, 0.0, 0.0, masked, 2.0),
+                 lambda: g.add_segm([], (masked, 1.0)),
+                 lambda: g.add_segm([], np.ma.masked_array([1.0, 2.0], mask=[True, False])),
+                 lambda: g.is_point_valid_to_fit((0.0, 0.0, 0.1), triple),
+                 lambda: g.get_circle((0, 0, 0.1), (1, 1, 0.1), triple),
+                 lambda: g.get_line_segments_intersection((0, 0, 1, masked), (0, 1, 1, 0))):
+        with pytest.raises(ValueError, match="masked"):
+            call()
+    whole = np.ma.masked_array([1.0, 2.0, 0.1])
+    assert g.is_point_valid_to_fit((0.0, 0.0, 0.1), whole)
+
+
 @pytest.mark.parametrize("name, spoil", {
     "no points": lambda p: [],
     "no array": lambda p: 5,
