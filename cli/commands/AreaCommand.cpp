@@ -83,8 +83,10 @@ void RefuseOpen(ContourFile const& contour) {
 std::vector<ContourFile> ReadClosed(Options const& options, std::string const& path,
                                     Console const& console) {
   if (options.arePoints) {
-    return {PolygonThrough(
-        ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns))};
+    PointFile const file =
+        ReadPoints(path, console.in, {ToleranceColumn::Use::Ignore, ""}, options.columns);
+    ReportSkippedLines(file, console);
+    return {PolygonThrough(file)};
   }
   std::vector<ContourFile> outlines =
       ReadOutlines({path, options.from, options.outline, options.flattening}, console);

@@ -91,7 +91,7 @@ Outcome FitFile(FitMany const& many, std::string const& path) {
   Outcome outcome;
   outcome.path = path;
   outcome.isFitted = true;
-  outcome.dropped = DroppedHeightsText(report.file);
+  outcome.dropped = DroppedHeightsText(report.file) + SkippedLinesText(report.file);
   outcome.points = report.file.points.size();
   outcome.pieces = report.pieces.size();
   outcome.bound = report.fit.fewestPossible;

@@ -136,6 +136,7 @@ Drawing ReadDrawing(Options const& options, Console const& console) {
     return drawing;
   }
   PointFile file = ReadAllPointsInput(options.points, console);
+  ReportSkippedLines(file, console);
   if (IsToleranceStated(options.points.tolerance, file)) {
     bool const isClosed = FindClosure(file.points, ClosedChoice::Auto).isClosed;
     AssignTolerances(options.points.tolerance, &file, isClosed);

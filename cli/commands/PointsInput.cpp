@@ -16,9 +16,9 @@ char const* const kPointsFileText =
     R"(Points file: one point a line, x,y or x,y,w (w: the tolerance of the point), in the order of
 the contour. A header tells the columns: x and y, x and z, y and z, names that instruments write
 in English, German and French, with units in them. Where it does not tell, --columns must. Text
-ahead of the table is skipped. Fields are separated by a comma, a semicolon, a
-tab or blanks; decimal commas are read where the separator is none. What follows # or // is a
-comment; "# tolerance T" and "# units mm" are read.
+ahead of the table and a footer behind it are skipped. Fields are separated by a comma, a
+semicolon, a tab or blanks; decimal commas are read where the separator is none. What follows # or
+// is a comment; "# tolerance T" and "# units mm" are read.
 
 Points are taken from drawings and tool paths as well: the vertices of polylines and lines in DXF
 (.dxf), G-code (.nc, .gcode), WKT (.wkt), GeoJSON (.geojson, .json) and SVG (.svg). Lines are
@@ -118,6 +118,15 @@ std::string DroppedHeightsText(PointFile const& outline) {
 
 void ReportDroppedHeights(PointFile const& outline, Console const& console) {
   std::string const text = DroppedHeightsText(outline);
+  if (!text.empty()) console.err << "contour: " << text << '\n';
+}
+
+std::string SkippedLinesText(PointFile const& file) {
+  return file.skipped.empty() ? "" : file.path + ": skipped " + file.skipped;
+}
+
+void ReportSkippedLines(PointFile const& file, Console const& console) {
+  std::string const text = SkippedLinesText(file);
   if (!text.empty()) console.err << "contour: " << text << '\n';
 }
 

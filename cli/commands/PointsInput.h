@@ -51,6 +51,12 @@ std::string DroppedHeightsText(PointFile const& outline);
 /// Says it on the standard error, if there is anything to say.
 void ReportDroppedHeights(PointFile const& outline, Console const& console);
 
+/// "scan.csv: skipped lines 502 to 504 behind the table"; empty when none were.
+std::string SkippedLinesText(PointFile const& file);
+
+/// Says it on the standard error, where the command has no summary that does.
+void ReportSkippedLines(PointFile const& file, Console const& console);
+
 /// @throws Failure (FailureKind::BadArgument) unless the file has one outline, or one was chosen.
 void RequireOneOutline(PointsInput const& input, std::size_t count);
 

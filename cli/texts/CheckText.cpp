@@ -114,10 +114,11 @@ std::string ResultText(CheckReport const& report) {
 std::string Summary(CheckReport const& report) {
   std::string const& columns = report.file.columns;
   return Fact("points", std::to_string(report.file.points.size())) +
-         (columns.empty() ? "" : Fact("columns", columns)) + Fact("pieces", PiecesText(report)) +
-         Fact("tolerance", ToleranceText(report)) + DeviationFacts(report) + JointFacts(report) +
-         CrossingFacts(report) + Fact("area", AreaText(report)) +
-         Fact("result", ResultText(report));
+         (columns.empty() ? "" : Fact("columns", columns)) +
+         (report.file.skipped.empty() ? "" : Fact("skipped", report.file.skipped)) +
+         Fact("pieces", PiecesText(report)) + Fact("tolerance", ToleranceText(report)) +
+         DeviationFacts(report) + JointFacts(report) + CrossingFacts(report) +
+         Fact("area", AreaText(report)) + Fact("result", ResultText(report));
 }
 
 Row Header(CheckReport const& report) {

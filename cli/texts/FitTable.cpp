@@ -122,6 +122,7 @@ std::string ScatterOfPoints(FitReport const& report) {
 std::string Summary(FitReport const& report, std::string const& readBack) {
   return FieldsText(report) + "points      " + std::to_string(report.file.points.size()) + "\n" +
          (report.file.columns.empty() ? "" : "columns     " + report.file.columns + "\n") +
+         (report.file.skipped.empty() ? "" : Fact("skipped", report.file.skipped)) +
          "tolerance   " + ToleranceText(report) + "\n" + "strategy    " + NameOf(report.strategy) +
          "\n" + "closed      " + ClosedText(report) + "\n" + "pieces      " + PiecesText(report) +
          "\n" + "compression " + CompressionText(report) + "\n" + "reported    " +

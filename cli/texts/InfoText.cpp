@@ -42,6 +42,7 @@ void AddSize(InfoReport const& report, FactList* facts) {
   PointsBox const& box = report.info.box;
   facts->Add("points", std::to_string(report.file.points.size()));
   if (!report.file.columns.empty()) facts->Add("columns", report.file.columns);
+  if (!report.file.skipped.empty()) facts->Add("skipped", report.file.skipped);
   facts->Add("extent", "x " + Range(box.lowX, box.highX) + ", y " + Range(box.lowY, box.highY));
   facts->Add("length", FormatShort(report.info.spacing.length) + " from point to point");
 }

@@ -15,7 +15,7 @@ using Json = nlohmann::ordered_json;
 Json InputJson(FitReport const& report) {
   Json units = nullptr;
   if (!report.file.units.empty()) units = report.file.units;
-  return {
+  Json json = {
       {"file", report.file.path},
       {"points", report.file.points.size()},
       {"columns", report.file.columns},
@@ -25,6 +25,8 @@ Json InputJson(FitReport const& report) {
         {"smallest", report.SmallestTolerance()},
         {"largest", report.LargestTolerance()}}},
   };
+  if (!report.file.skipped.empty()) json["skipped"] = report.file.skipped;
+  return json;
 }
 
 Json RangeJson(std::optional<std::vector<PointRange>> const& ranges, std::size_t piece) {

@@ -11,6 +11,7 @@
 #include "io/points/CsvColumns.h"
 #include "io/points/CsvNumbers.h"
 #include "io/points/CsvPlace.h"
+#include "io/points/TableEnd.h"
 #include "io/points/TableStart.h"
 #include "vorn/io/Files.h"
 #include "vorn/io/Messages.h"
@@ -58,8 +59,13 @@ class Parser {
     table_ = FindTable(text);
     TextLines lines(text);
     while (!lines.AtEnd()) {
+      std::size_t const begin = lines.Position();
       std::string_view const line = lines.Take();
       place_.Enter(line);
+      if (IsFooterFrom(line, text.substr(begin))) {
+        SkipFooter(&lines);
+        break;
+      }
       ParseLine(line);
     }
     RefuseTooFewPoints();
@@ -90,6 +96,32 @@ class Parser {
     if (Trimmed(line).empty() || (file_.points.empty() && IsRule(line))) return;
     if (isUnitLineNext_) return ParseUnits(line);
     columns_.Count() == 0 ? ParseFirstLine(Trimmed(line)) : ParseLineOfData(line);
+  }
+
+  /// Whether no points come any more, only the footer of an instrument. Rows that begin with texts
+  /// themselves cannot be told from one.
+  bool IsFooterFrom(std::string_view line, std::string_view text) const {
+    if (file_.points.size() < 2 || !doRowsBeginWithNumbers_) return false;
+    std::string_view const words = Trimmed(line.substr(0, FindComment(line)));
+    constexpr std::string_view kNumbers = "+-.0123456789";
+    bool const mayBePoint =
+        words.empty() || (kNumbers.find(words.front()) != std::string_view::npos && !IsRule(words));
+    return !mayBePoint && IsFooter(text, {separator_, columns_.Count(), file_.points.size()});
+  }
+
+  /// Goes to the last line that is not empty, and tells which ones were skipped.
+  void SkipFooter(TextLines* lines) {
+    std::size_t const first = place_.Line();
+    std::size_t last = first;
+    while (!lines->AtEnd()) {
+      std::string_view const line = lines->Take();
+      place_.Enter(line);
+      if (!Trimmed(line).empty()) last = place_.Line();
+    }
+    file_.skipped = first == last
+                        ? "line " + std::to_string(first)
+                        : "lines " + std::to_string(first) + " to " + std::to_string(last);
+    file_.skipped += " behind the table";
   }
 
   /// A line ahead of the table: "Units: mm", "Einheit;mm". A comment goes before it.
@@ -175,6 +207,7 @@ class Parser {
       point.w = numbers_.Read(columns_.ToleranceName(), field, place_);
       if (!IsTolerance(point.w)) RefuseTolerance("tolerance " + Quoted(field), field);
     }
+    if (file_.points.empty()) doRowsBeginWithNumbers_ = LooksLikeNumber(fields_.front());
     file_.points.push_back(point);
     file_.lines.push_back(place_.Line());
   }
@@ -210,6 +243,7 @@ class Parser {
   char separator_ = ',';
   TableStart table_;
   bool isUnitLineNext_ = false;
+  bool doRowsBeginWithNumbers_ = false;
 };
 
 }  // namespace

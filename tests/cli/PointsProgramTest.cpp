@@ -44,6 +44,26 @@ TEST_F(Program, ClosePointsAreSeenDroppedFittedAndChecked) {
   EXPECT_EQ(Run("check far.csv p.dxf").code, 0) << "without a tolerance nothing is judged";
 }
 
+TEST_F(Program, EveryCommandOfPointsTellsTheFooterThatItSkipped) {
+  Write("p.csv", Corner() + "\nEnd of report\nMean: 0.02\n");
+  std::string const lines = "skipped     lines 24 to 25 behind the table\n";
+  Ended const fit = Run("fit p.csv -t 0.01 -o p.json");
+  EXPECT_NE(fit.out.find(lines), std::string::npos) << fit.out;
+  EXPECT_NE(Contents(folder_ / "p.json").find("\"skipped\": \"lines 24 to 25 behind the table\""),
+            std::string::npos);
+  for (char const* command : {"info p.csv", "check p.csv p.json"}) {
+    Ended const ended = Run(command);
+    EXPECT_NE(ended.out.find(lines), std::string::npos) << command << ": " << ended.out;
+  }
+  for (char const* command :
+       {"plot p.csv -o p.svg", "area --points p.csv --close", "fit p.csv p.csv -t 0.01 --jobs 1"}) {
+    Ended const ended = Run(command);
+    EXPECT_NE(ended.err.find("contour: p.csv: skipped lines 24 to 25 behind the table\n"),
+              std::string::npos)
+        << command << ": " << ended.err;
+  }
+}
+
 TEST_F(Program, CommandsOfPointsSayTheirUsage) {
   for (char const* command : {"info", "check", "simplify"}) {
     Ended const help = Run(std::string(command) + " --help");

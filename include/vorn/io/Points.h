@@ -53,6 +53,7 @@ struct VORN_IO_EXPORT PointFile {
   std::string units;        ///< of a comment `# units mm`, else of the header; may be empty
   std::string columns;      ///< which ones hold the points, in words: "1 (x) and 2 (y)"
   bool hadHeights = false;  ///< not of a table: coordinates beside x and y were dropped
+  std::string skipped;      ///< the footer of an instrument: "lines 502 to 504 behind the table"
 
   /// "point 4 (line 6)", points counted from 0 as the library does; without lines
   /// "point 4 at (1.5, 2)", of no file "point 4".
@@ -74,7 +75,8 @@ VORN_IO_EXPORT std::string OutlineSuffix(std::size_t outline);
 ///
 /// A first line without any number is a header, which tells the columns of the points as
 /// FindPointColumns says, and their units; a line of units alone may follow. The preamble of an
-/// instrument is skipped, see FindTable. Without a header there must be two or three columns,
+/// instrument is skipped, see FindTable, and so is its footer: text from behind a point to the end
+/// of the file that cannot be data gone wrong. Without a header there must be two or three columns,
 /// unless the choice names columns by their numbers. Empty lines and comments are skipped: what
 /// follows a `#`, and what follows a `//` at the beginning of a line or behind a blank. Line ends
 /// may be of any system; a UTF-8 byte order mark is allowed.
