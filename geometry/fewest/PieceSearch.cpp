@@ -34,11 +34,6 @@ constexpr std::int32_t kShortestForRival = 16;
 
 }  // namespace
 
-void PieceSearch::SetShare(double share) {
-  share_ = share;
-  columns_.Clear();
-}
-
 void PieceSearch::MoveTo(std::int32_t first, std::int32_t last) {
   columns_.Clear();
   columnsFirst_ = first;

@@ -53,9 +53,6 @@ class PieceSearch {
   /// Tolerances are multiplied by `share`.
   PieceSearch(Path const& path, double share) : path_(path), share_(share) {}
 
-  /// The same with another share from now on.
-  void SetShare(double share);
-
   /// Moves the local coordinates to the points [first, last), about which the next searches go.
   void MoveTo(std::int32_t first, std::int32_t last);
 
