@@ -16,7 +16,7 @@ class Exclusion {
 
   std::optional<std::vector<std::int32_t>> Find() {
     bool const isLastTooClose = ExcludeFromFirst();
-    if (isLastTooClose && !MakeRoomForLast()) return std::nullopt;
+    if (isLastTooClose) MakeRoomForLast();
     if (static_cast<std::size_t>(run_.count) - excluded_.size() < kFewestArcPoints) {
       return std::nullopt;
     }
@@ -45,15 +45,13 @@ class Exclusion {
     return AreTooClose(kept, Last());
   }
 
-  /// Excludes a point for the sake of the last one. False when that cannot leave enough points.
-  bool MakeRoomForLast() {
+  /// Excludes a point for the sake of the last one. The caller asks whether enough are left.
+  void MakeRoomForLast() {
     if (!excluded_.empty()) {
       SettleLast();
-      return true;
+    } else {
+      excluded_.push_back(Last() - 1);
     }
-    if (run_.count < kFewestArcPoints + 1) return false;
-    excluded_.push_back(Last() - 1);
-    return true;
   }
 
   /// Backwards over the gaps between runs of excluded points: a kept point stands below each. The

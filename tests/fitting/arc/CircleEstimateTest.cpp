@@ -197,6 +197,14 @@ TEST(GetEstimatedDeviationForCircle, TheLastPointIsDroppedWhenItIsCloseToTheSeco
   EXPECT_EQ(d.excluded, (Indices{1, 3, 5, 11}));
 }
 
+/// The first point lies between the next two, which are far enough from each other but too close to
+/// it: only the first and the last point stay.
+TEST(GetEstimatedDeviationForCircle, FewerThanThreePointsLeftFailWithExclusionsEmptied) {
+  Deviation expected;
+  expected.excluded.clear();
+  EXPECT_EQ(Transcribe(EstimateDeviation(OnCircle({30, 0, 60, 180}))), Transcribe(expected));
+}
+
 TEST(GetEstimatedDeviationForCircle, CoincidingPointsFailUntouched) {
   EXPECT_EQ(Transcribe(EstimateDeviation(OnCircle({0, 45, 45, 90, 180}))), Transcribe(Deviation{}));
 }
