@@ -1,5 +1,5 @@
 // Inputs at the ends of what can be passed: more points than indices count, a million points in one
-// place, coordinates whose squares are infinite.
+// place, coordinates whose squares are infinite or vanish.
 #include <sys/mman.h>
 
 #include <cmath>
@@ -133,17 +133,18 @@ TEST(AMillionPointsInOnePlace, HaveNoArea) {
 
 constexpr double kHuge = 1e300;
 
-std::vector<WPoint> HugeCorner() {
+/// Points of two lines that meet at the origin, with a hundredth of their step for a tolerance.
+std::vector<WPoint> Corner(double step) {
   std::vector<WPoint> points;
   for (int i = -5; i <= 5; ++i) {
-    points.push_back({kHuge * i, kHuge * (i < 0 ? 0.0 : 0.5 * i), 0.01 * kHuge});
+    points.push_back({step * i, step * (i < 0 ? 0.0 : 0.5 * i), 0.01 * step});
   }
   return points;
 }
 
-TEST(CoordinatesWithInfiniteSquares, EndWithAnAnswerInEveryStrategy) {
+void ExpectAnAnswerInEveryStrategy(std::vector<WPoint> const& points) {
   for (Strategy const strategy : kStrategies) {
-    FitAnswer const answer = Fit(HugeCorner(), strategy);
+    FitAnswer const answer = Fit(points, strategy);
     for (Elem const& elem : answer.contour) {
       EXPECT_TRUE(elem.type == GeometryUtils::ElemType::Segment ||
                   elem.type == GeometryUtils::ElemType::Arc);
@@ -152,14 +153,59 @@ TEST(CoordinatesWithInfiniteSquares, EndWithAnAnswerInEveryStrategy) {
   }
 }
 
-TEST(CoordinatesWithInfiniteSquares, AreFittedByTheFewest) {
+void ExpectTwoPiecesOfTheFewest(std::vector<WPoint> const& points) {
   FewestPieces::Result result;
-  ASSERT_EQ(FewestPieces::Fit(HugeCorner(), {}, &result, nullptr, 100), ErrorCode::Ok);
+  ASSERT_EQ(FewestPieces::Fit(points, {}, &result, nullptr, 100), ErrorCode::Ok);
   EXPECT_LE(result.largestDeviation, 1.0);
   EXPECT_EQ(result.fewestPossible, 2);
   for (Elem const& elem : result.contour) {
     EXPECT_TRUE(std::isfinite(elem.end.x) && std::isfinite(elem.end.y));
   }
+}
+
+TEST(CoordinatesWithInfiniteSquares, EndWithAnAnswerInEveryStrategy) {
+  ExpectAnAnswerInEveryStrategy(Corner(kHuge));
+}
+
+TEST(CoordinatesWithInfiniteSquares, AreFittedByTheFewest) {
+  ExpectTwoPiecesOfTheFewest(Corner(kHuge));
+}
+
+TEST(CoordinatesWithVanishingSquares, EndWithAnAnswerInEveryStrategy) {
+  for (double const step : {1e-160, 1e-300, 1e-310, 0x1p-1074}) {
+    SCOPED_TRACE(step);
+    ExpectAnAnswerInEveryStrategy(Corner(step));
+  }
+}
+
+TEST(CoordinatesWithVanishingSquares, AreFittedByTheFewest) {
+  ExpectTwoPiecesOfTheFewest(Corner(1e-300));
+}
+
+TEST(CoordinatesWithVanishingSquares, EndWithAnAnswerOfTheFewestWhenTheyAreDenormal) {
+  for (double const step : {1e-310, 0x1p-1074}) {
+    FewestPieces::Result result;
+    ErrorCode const code = FewestPieces::Fit(Corner(step), {}, &result, nullptr, 100);
+    EXPECT_EQ(code == ErrorCode::Ok, !result.contour.empty());
+  }
+}
+
+TEST(CoordinatesWithVanishingSquares, HaveNoAreaAndNoCrossing) {
+  constexpr double kTiny = 1e-300;
+  std::vector<Elem> contour;
+  for (auto const& [x, y] : {std::pair{0.0, 0.0}, {kTiny, 0.0}, {kTiny, kTiny}, {0.0, 0.0}}) {
+    GeometryUtils::AddSegm(&contour, {x, y});
+  }
+  double area = kSentinel;
+  ErrorCode const code = GeometryUtils::GetArea(contour, &area);
+  EXPECT_TRUE(code == ErrorCode::Ok ? area == 0.0 : SameBits(area, kSentinel)) << area;
+  double x = kSentinel;
+  double y = kSentinel;
+  SegmentsRelPosition const position = GeometryUtils::GetLineSegmentsIntersection(
+      -kTiny, -kTiny, kTiny, kTiny, -kTiny, kTiny, kTiny, -kTiny, &x, &y);
+  EXPECT_EQ(
+      position == SegmentsRelPosition::Intersecting || position == SegmentsRelPosition::Collinear,
+      !SameBits(x, kSentinel));
 }
 
 TEST(CoordinatesWithInfiniteSquares, LeaveContoursAndTheirAreasAnswered) {
