@@ -78,8 +78,8 @@ class Balancer {
     behind.first = split;
   }
 
-  /// The first point behind a corner in space: one that lies near it may deviate little from either
-  /// piece, but lies beside only one of them.
+  /// The split at which the points before a corner in space end: one that lies near it may deviate
+  /// little from either piece, but lies beside only one of them.
   std::int32_t SplitAt(Gate const& gate, std::int32_t first, std::int32_t end) const {
     std::int32_t split = gate.split;
     if (gate.isCusp) return split;
@@ -90,6 +90,13 @@ class Balancer {
     };
     while (split > first + 1 && isBehind(split - 1)) --split;
     while (split < end - 1 && !isBehind(split)) ++split;
+    std::int32_t const stride = StrideFrom(path_, split);
+    if (stride == 1) return split;
+    // Noise puts dense points in another order: as many lie before the corner as come before it.
+    std::int32_t const low = std::max(first + 1, split - stride);
+    std::int32_t const high = std::min(end - 1, split + stride);
+    split = low;
+    for (std::int32_t point = low; point < high; ++point) split += isBehind(point) ? 0 : 1;
     return split;
   }
 

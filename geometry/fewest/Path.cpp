@@ -45,6 +45,24 @@ std::int32_t StrideFrom(Path const& path, std::int32_t point) {
   return i - point;
 }
 
+namespace {
+
+/// The mean of as many points before a split as behind it, up to a quarter of a stride each.
+Place MeanAround(Path const& path, std::int32_t split) {
+  std::int32_t const quarter = std::max(1, StrideFrom(path, split) / 4);
+  std::int32_t const reach = std::min({quarter, split, path.Count() - split});
+  WPoint const& origin = path.At(split);
+  Place sum;
+  for (std::int32_t i = split - reach; i < split + reach; ++i) {
+    sum.x += path.At(i).x - origin.x;
+    sum.y += path.At(i).y - origin.y;
+  }
+  double const share = 0.5 / reach;
+  return {origin.x + share * sum.x, origin.y + share * sum.y};
+}
+
+}  // namespace
+
 Gate MiddleGate(Path const& path, std::int32_t split, PlacedCircle const& before) {
   WPoint const& last = path.At(split - 1);
   WPoint const& first = path.At(split);
@@ -57,6 +75,7 @@ Gate MiddleGate(Path const& path, std::int32_t split, PlacedCircle const& before
   if (gap > kClearlyAhead * (last.w + first.w)) {
     gate.across = LeftNormal(last, first);
   } else {
+    gate.origin = MeanAround(path, split);
     Place const normal = GradientAt(before, gate.origin);
     gate.across = BisectorGate(gate.origin, normal, normal).across;
   }

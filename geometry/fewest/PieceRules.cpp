@@ -4,6 +4,7 @@
 #include <cmath>
 #include <numbers>
 
+#include "geometry/fewest/DenseOrder.h"
 #include "geometry/fewest/Turn.h"
 
 namespace Vorn::Fewest {
@@ -25,6 +26,9 @@ constexpr double kNoiseStep = 1.65;
 /// degrees, whose sine is 0.83 of their angle.
 constexpr double kTurnToCount = 4.5;
 
+/// From so many points on the spacing of a run is looked at before its points are.
+constexpr std::int32_t kLongRun = 256;
+
 /// Share of a tolerance by which rounding may break a row.
 constexpr double kRoundingRoom = 1e-6;
 
@@ -41,7 +45,18 @@ double SquaredGradient(Circle const& circle, Place const& place) {
 
 }  // namespace
 
+std::int32_t PieceRules::FindStride(Circle const& circle, Ends const& ends) const {
+  if (ends.end - ends.first < kLongRun) return 1;
+  DenseOrder const dense(circle, spacing_.Of(ends.first, ends.end), frame_);
+  constexpr double kRoom = 1.0 - 1e-6;
+  double const largestStep = kRoom * kStepShare * path_.limits.sineOfHalfStep;
+  bool const isSure = dense.IsInOrder(kNoiseStep) && dense.HasSmallSteps(largestStep);
+  return isSure ? dense.Stride() : 1;
+}
+
 PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& ends) const {
+  std::int32_t const stride = FindStride(circle, ends);
+  if (stride > 1) return IsFullTurn(circle, ends, stride) ? Check::Hopeless : Check::Holds;
   double worst = 0.0;
   std::int32_t broken = -1;
   double length = 0.0;
@@ -73,14 +88,13 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
     here2 = there2;
   }
   // An advance is the radius times the sine of a step, so this is the turn or less.
-  if (2.0 * std::fabs(circle.a) * length > kTurnToCount && IsFullTurn(circle, ends)) {
+  if (2.0 * std::fabs(circle.a) * length > kTurnToCount && IsFullTurn(circle, ends, stride)) {
     return Check::Hopeless;
   }
   if (broken < 0) return Check::Holds;
   return programme_->Add(StepCondition(broken)) ? Check::Added : Check::Hopeless;
 }
 
-/// That a point lies no farther back along the piece than noise may put it behind the one before.
 Condition PieceRules::StepCondition(std::int32_t point) const {
   Sample const p = frame_.ToLocal(path_.At(point - 1));
   Sample const q = frame_.ToLocal(path_.At(point));
@@ -100,11 +114,13 @@ PieceRules::Check PieceRules::AddStep(double gap2, double near2) const {
   return programme_->Add(condition) ? Check::Added : Check::Hopeless;
 }
 
-bool PieceRules::IsFullTurn(Circle const& circle, Ends const& ends) const {
+bool PieceRules::IsFullTurn(Circle const& circle, Ends const& ends, std::int32_t stride) const {
   Turn turn(circle);
   if (!ends.from->isFree) turn.Add(frame_.ToLocal(ends.from->gate.origin));
-  for (std::int32_t i = ends.first; i < ends.end; ++i)
+  for (std::int32_t i = ends.first; i < ends.end - 1; i += stride) {
     turn.Add(PlaceOf(frame_.ToLocal(path_.At(i))));
+  }
+  turn.Add(PlaceOf(frame_.ToLocal(path_.At(ends.end - 1))));
   if (ends.to != nullptr && !ends.to->isFree) turn.Add(frame_.ToLocal(ends.to->gate.origin));
   // Both ends of an open path may be drawn back within the tolerances of its ends.
   bool const isWhole = ends.from->isFree && ends.end == path_.Count();

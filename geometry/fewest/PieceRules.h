@@ -8,6 +8,7 @@
 #include "geometry/fewest/LocalFrame.h"
 #include "geometry/fewest/Path.h"
 #include "geometry/fewest/Simplex.h"
+#include "geometry/fewest/Spacing.h"
 
 /// What a piece has to keep besides the tolerances of its points: their order, the greatest step
 /// between them, less than a full turn, ends beside its joints.
@@ -32,8 +33,9 @@ struct Ends {
 class PieceRules {
  public:
   /// Tolerances are multiplied by `share`. What is referred to has to outlive the rules.
-  PieceRules(Path const& path, LocalFrame const& frame, double share, Programme* programme)
-      : path_(path), frame_(frame), share_(share), programme_(programme) {}
+  PieceRules(Path const& path, LocalFrame const& frame, double share, Spacing* spacing,
+             Programme* programme)
+      : path_(path), frame_(frame), share_(share), spacing_(*spacing), programme_(programme) {}
 
   /// Holds: the circle keeps all rules. Added: it breaks one, and the programme has one condition
   /// more. Hopeless: it breaks one that no condition mends, or the programme is full.
@@ -57,8 +59,12 @@ class PieceRules {
     double gap2 = 0.0;  ///< the square of that distance
   };
 
-  /// The order of the points along the circle, the greatest step and less than a full turn.
+  /// The order of the points along the circle, the greatest step and less than a full turn. O(n),
+  /// far less where a long run is dense.
   Check AddBrokenOrder(Circle const& circle, Ends const& ends) const;
+  /// Of how many points one needs to be looked at: above 1 where the spacing of a long run tells
+  /// that its points are in order along the circle by small steps, and that so many turn little.
+  std::int32_t FindStride(Circle const& circle, Ends const& ends) const;
   /// That a point lies no farther back than noise may put it behind the one before.
   Condition StepCondition(std::int32_t point) const;
   /// Whether two points are further apart along the circle than the greatest step. Their feet on
@@ -67,8 +73,9 @@ class PieceRules {
   bool IsLargeStep(Circle const& circle, double gap2, double near2, double w) const;
   /// Bounds the curvature so that two points this far apart are within the greatest step.
   Check AddStep(double gap2, double near2) const;
-  /// Whether the points and joints of the piece turn about the centre by more than 2 pi.
-  bool IsFullTurn(Circle const& circle, Ends const& ends) const;
+  /// Whether the points and joints of the piece turn about the centre by more than 2 pi. Looks at
+  /// one point of so many, and at the last.
+  bool IsFullTurn(Circle const& circle, Ends const& ends, std::int32_t stride) const;
   /// The rules between a joint and one of the points next to it: the step between the two, and that
   /// the point does not lie beyond the joint.
   Check AddBrokenJoint(Circle const& circle, Opening const& opening, std::int32_t point) const;
@@ -82,6 +89,7 @@ class PieceRules {
   Path const& path_;
   LocalFrame const& frame_;
   double share_;
+  Spacing& spacing_;
   Programme* programme_;
 };
 

@@ -87,23 +87,10 @@ void PieceSearch::AddOpening(Opening const& opening) {
   programme_.Add({Negated(high), Condition::Kind::HalfSpace, 0.0});
 }
 
-double PieceSearch::WidestGap2(std::int32_t first, std::int32_t end) const {
-  double widest = 0.0;
-  WPoint const* last = &path_.At(first);
-  for (std::int32_t i = first + 1; i < end; ++i) {
-    WPoint const* const next = &path_.At(i);
-    double const dx = next->x - last->x;
-    double const dy = next->y - last->y;
-    double const gap = dx * dx + dy * dy;
-    widest = gap > widest ? gap : widest;
-    last = next;
-  }
-  return widest;
-}
-
 void PieceSearch::LimitCurvature(Opening const& from, std::int32_t end) {
   std::int32_t const first = from.First();
-  double const widest = std::sqrt(WidestGap2(first, end));
+  // A piece before the first point of a path covers none.
+  double const widest = first < end ? std::sqrt(spacing_.Of(first, end).widest2) : 0.0;
   double limit = kUnlimited;
   // The chord of a step of angle s on a radius r is 2 r sin(s / 2), and |a| = 1 / (2 r).
   if (widest > 0.0) limit = kStepShare * path_.limits.sineOfHalfStep / widest;

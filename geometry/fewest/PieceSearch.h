@@ -10,6 +10,7 @@
 #include "geometry/fewest/PieceRules.h"
 #include "geometry/fewest/RunTest.h"
 #include "geometry/fewest/Simplex.h"
+#include "geometry/fewest/Spacing.h"
 
 /// One piece of a chain: a circle that starts on a gate, covers a run of points and may end on
 /// another gate.
@@ -51,7 +52,7 @@ inline Opening StartOn(Gate const& gate, Interval const& interval) {
 class PieceSearch {
  public:
   /// Tolerances are multiplied by `share`.
-  PieceSearch(Path const& path, double share) : path_(path), share_(share) {}
+  PieceSearch(Path const& path, double share) : path_(path), spacing_(path), share_(share) {}
 
   /// Moves the local coordinates to the points [first, last), about which the next searches go.
   void MoveTo(std::int32_t first, std::int32_t last);
@@ -110,8 +111,6 @@ class PieceSearch {
   void BeginProgramme(Opening const& from, std::int32_t end);
   /// Asks that the piece passes between the limits of an opening; a free one asks nothing.
   void AddOpening(Opening const& opening);
-  /// The square of the largest distance between neighbours.
-  double WidestGap2(std::int32_t first, std::int32_t end) const;
   /// Asks for a radius of at least the smallest, for steps below the greatest, or for a line where
   /// only segments are wanted; the box follows from that.
   void LimitCurvature(Opening const& from, std::int32_t end);
@@ -136,7 +135,7 @@ class PieceSearch {
   /// here.
   RunFit FitAnyRadius(RunFit const& start, bool isTest, Ends const& ends);
   /// The rules in the local coordinates of now.
-  PieceRules Rules() { return {path_, frame_, share_, &programme_}; }
+  PieceRules Rules() { return {path_, frame_, share_, &spacing_, &programme_}; }
   /// A reach in local coordinates.
   struct LocalReach {
     std::int32_t end = 0;
@@ -159,6 +158,7 @@ class PieceSearch {
   /// covers all points.
   RunFit FirstFit(Opening const& from, std::int32_t end);
   Path const& path_;
+  Spacing spacing_;
   double share_;
   double slack_ = 0.0;
   LocalFrame frame_;

@@ -24,6 +24,10 @@ constexpr double kLeastPivotShare = 1e-11;
 /// has lost too many digits.
 constexpr double kResidualShare = 0.1;
 
+/// Rounding may break the rows of a basis by this much where they are badly conditioned: well below
+/// what the search leaves of the tolerances.
+constexpr double kRounded = 1e-7;
+
 /// A negative dual this close to 0 is what an exact tie leaves behind.
 constexpr double kLeastDual = 1e-300;
 
@@ -130,7 +134,7 @@ void Simplex::Solve() {
   for (std::size_t j = 0; j < 4; ++j) solution_ = Sum(solution_, limits_[j], inverse_[j]);
 }
 
-Simplex::Entry Simplex::Price(Programme const& programme, double slack) const {
+Simplex::Entry Simplex::Price(Programme const& programme, Basis const& basis, double slack) {
   Entry entry;
   double worst = slack;
   auto const offer = [&](std::int32_t id, Row const& row, double limit, double excess) {
@@ -153,18 +157,25 @@ Simplex::Entry Simplex::Price(Programme const& programme, double slack) const {
         break;
     }
   }
-  Columns::Worst const point =
-      programme.columns->FindWorst(programme.first, programme.last, solution_);
-  if (point.index >= 0 && point.value - 1.0 > worst) {
+  auto const offerPoint = [&](Columns::Worst const& point) {
+    if (point.index < 0 || !(point.value - 1.0 > worst)) return;
     Row const row = programme.columns->At(point.index);
     double const value = Apply(row, solution_);
     offer(point.index, value > 0.0 ? row : Negated(row), 1.0, point.value - 1.0);
+  };
+  if (!Candidates::ArePaying(programme)) {
+    offerPoint(programme.columns->FindWorst(programme.first, programme.last, solution_));
+    return entry;
+  }
+  offerPoint(candidates_.FindWorst(programme, solution_));
+  if (!entry.isFound || basis.Holds(entry.id)) {
+    offerPoint(candidates_.FindWorstOfAll(programme, solution_, 1.0 + slack));
   }
   return entry;
 }
 
 int Simplex::FindLeaving(Programme const& programme, Basis const& basis,
-                         std::array<double, 4> const& step, double* length) const {
+                         std::array<double, 4> const& step) const {
   double largest = 0.0;
   for (double s : step) largest = std::fabs(s) > largest ? std::fabs(s) : largest;
   int leaving = -1;
@@ -179,7 +190,6 @@ int Simplex::FindLeaving(Programme const& programme, Basis const& basis,
       least = ratio;
     }
   }
-  *length = least;
   return leaving;
 }
 
@@ -196,6 +206,20 @@ void Simplex::Exchange(int leaving, Entry const& entry, std::array<double, 4> co
   duals_[l] = theta;
   rows_[l] = entry.row;
   limits_[l] = entry.limit;
+}
+
+bool Simplex::Pivot(Programme const& programme, Entry const& entry, Basis* basis) {
+  std::array<double, 4> step;
+  for (std::size_t j = 0; j < 4; ++j) step[j] = Apply(entry.row, inverse_[j]);
+  int const leaving = FindLeaving(programme, *basis, step);
+  if (leaving < 0) return false;
+  basis->ids[static_cast<std::size_t>(leaving)] = entry.id;
+  Exchange(leaving, entry, step);
+  return true;
+}
+
+bool Simplex::Refresh(Programme const& programme, Row const& objective, Basis* basis) {
+  return InvertRows(rows_, &inverse_) && MakeDualFeasible(programme, objective, basis);
 }
 
 bool Simplex::InvertBasis(Programme const& programme, Basis const& basis, InvertedRows* inverted,
@@ -241,26 +265,21 @@ Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objecti
     double const value = Apply(objective, solution_);
     if (value < enough) return Status::Infeasible;
     double const slack = value > 1.0 ? slack_ * value : slack_;
-    Entry const entry = Price(programme, slack);
-    if (!entry.isFound) {
-      if (exchanges == 0 || IsAccurate(slack)) return Status::Optimal;
-      if (!InvertRows(rows_, &inverse_)) return Status::Stalled;
-      if (!MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
-      Solve();
+    Entry const entry = Price(programme, *basis, slack);
+    // Nothing but rounding breaks a row of the basis.
+    bool const isRounding = entry.isFound && basis->Holds(entry.id);
+    if (!entry.isFound || isRounding) {
+      if (exchanges == 0 || (!isRounding && IsAccurate(slack))) {
+        return entry.excess <= kRounded ? Status::Optimal : Status::Stalled;
+      }
+      if (!Refresh(programme, objective, basis)) return Status::Stalled;
+      solution_ = Fewest::Solve({rows_, inverse_}, limits_);
       exchanges = 0;
-      if (!Price(programme, slack).isFound) return Status::Optimal;
       continue;
     }
-    std::array<double, 4> step;
-    for (std::size_t j = 0; j < 4; ++j) step[j] = Apply(entry.row, inverse_[j]);
-    double length = 0.0;
-    int const leaving = FindLeaving(programme, *basis, step, &length);
-    if (leaving < 0) return Status::Infeasible;
-    basis->ids[static_cast<std::size_t>(leaving)] = entry.id;
-    Exchange(leaving, entry, step);
+    if (!Pivot(programme, entry, basis)) return Status::Infeasible;
     if (++exchanges >= kExchangesBeforeInversion) {
-      if (!InvertRows(rows_, &inverse_) || !MakeDualFeasible(programme, objective, basis))
-        return Status::Stalled;
+      if (!Refresh(programme, objective, basis)) return Status::Stalled;
       exchanges = 0;
     }
     Solve();

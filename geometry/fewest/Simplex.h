@@ -3,6 +3,7 @@
 #include <array>
 #include <cstdint>
 
+#include "geometry/fewest/Candidates.h"
 #include "geometry/fewest/Columns.h"
 #include "geometry/fewest/Inverse.h"
 #include "geometry/fewest/Programme.h"
@@ -62,16 +63,23 @@ class Simplex {
   bool MakeDualFeasible(Programme const& programme, Row const& objective, Basis* basis);
   /// The circle where the rows of the basis meet their limits.
   void Solve();
-  /// The row that the solution breaks most, by more than the slack; not found when there is none.
-  Entry Price(Programme const& programme, double slack) const;
+  /// A row that the solution breaks by more than the slack: the one that it breaks most, but of
+  /// long runs the worst candidate as long as one outside the basis is broken. Not found when there
+  /// is none.
+  Entry Price(Programme const& programme, Basis const& basis, double slack);
   /// The row of the basis that may leave for the entering one so that the basis stays dual
-  /// feasible, and how long the step is; -1 when the rows contradict each other.
-  int FindLeaving(Programme const& programme, Basis const& basis, std::array<double, 4> const& step,
-                  double* length) const;
+  /// feasible; -1 when the rows contradict each other.
+  int FindLeaving(Programme const& programme, Basis const& basis,
+                  std::array<double, 4> const& step) const;
+  /// Exchanges a row of the basis for an entering one; false when the rows contradict each other.
+  bool Pivot(Programme const& programme, Entry const& entry, Basis* basis);
+  /// Computes the inverse and the duals anew; false when rounding prevents it.
+  bool Refresh(Programme const& programme, Row const& objective, Basis* basis);
   /// Puts the entering row in place of the leaving one and updates inverse and duals.
   void Exchange(int leaving, Entry const& entry, std::array<double, 4> const& step);
 
   double slack_;
+  Candidates candidates_;
   std::array<Row, 4> rows_;
   std::array<double, 4> limits_;
   std::array<double, 4> duals_;

@@ -43,6 +43,46 @@ TEST(Simplex, HalfSpacesBindOnOneSideOnly) {
   EXPECT_LT(simplex.Solution().d, -100.0);
 }
 
+/// 2,001 points on the cubic of Chebyshev, which among all of its leading coefficient deviates
+/// least from 0: by 1, so that only the line y = 0 is within a tolerance of 1.
+TEST(Simplex, LongRunsHaveTheOptimumOfAllRows) {
+  Columns columns;
+  constexpr std::int32_t kHalf = 1000;
+  for (std::int32_t i = -kHalf; i <= kHalf; ++i) {
+    double const x = static_cast<double>(i) / kHalf;
+    columns.Append({x, 4.0 * x * x * x - 3.0 * x, 1.0});
+  }
+  Programme programme;
+  programme.columns = &columns;
+  programme.last = columns.Size();
+  programme.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0});
+  Simplex simplex(1e-12);
+  Basis basis;
+  ASSERT_EQ(simplex.Maximise(programme, {0.0, 0.0, 1.0, 0.0}, 0.0, &basis),
+            Simplex::Status::Optimal);
+  EXPECT_NEAR(simplex.Solution().by, 1.0, 1e-9);
+  EXPECT_NEAR(simplex.Solution().bx, 0.0, 1e-9);
+  EXPECT_NEAR(simplex.Solution().d, 0.0, 1e-9);
+}
+
+/// Far from the origin the four rows of a basis nearly depend on each other, and rounding breaks
+/// them by more than the slack.
+TEST(Simplex, RowsOfTheBasisThatRoundingBreaksAreNotExchangedForever) {
+  Columns columns;
+  for (std::int32_t i = 0; i < 40; ++i) {
+    double const x = 1.0 + 1e-4 * i;
+    columns.Append({x, 1.0 + 1e-5 * ((7 * i) % 5), 1e-4});
+  }
+  Programme programme;
+  programme.columns = &columns;
+  programme.last = columns.Size();
+  Simplex simplex(1e-15);
+  Basis basis;
+  ASSERT_EQ(simplex.Maximise(programme, {0.0, 0.0, 1.0, 0.0}, 0.0, &basis),
+            Simplex::Status::Optimal);
+  EXPECT_LE(columns.FindWorst(0, columns.Size(), simplex.Solution()).value, 1.0 + 1e-7);
+}
+
 TEST(Simplex, ContradictingEqualitiesAreInfeasible) {
   Columns columns;
   columns.Append({1.0, 0.0, 0.5});
