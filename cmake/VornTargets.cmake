@@ -95,6 +95,8 @@ function(vorn_compile_together target)
   endforeach()
   set_source_files_properties(${ARGN} PROPERTIES SKIP_UNITY_BUILD_INCLUSION ON)
   set_target_properties(${target} PROPERTIES UNITY_BUILD ON UNITY_BUILD_MODE GROUP)
+  # What one source declares shadows nothing of another when each is compiled for itself.
+  target_compile_options(${target} PRIVATE -Wno-shadow)
 endfunction()
 
 # Rebuilds after a switch of branch or a fresh clone cost seconds instead of minutes. The cache
