@@ -5,6 +5,7 @@
 #include <numbers>
 
 #include "geometry/fewest/PieceRules.h"
+#include "geometry/fewest/Spacing.h"
 
 // The rules of a piece, on points of the unit circle about the origin, counter-clockwise.
 
@@ -37,7 +38,8 @@ Answer AskOrder(Path const& path, double scale) {
   Circle const circle{-0.5 / scale, 0.0, 0.0, 0.5 * scale};
   Opening const from;
   Answer answer;
-  PieceRules const rules(path, frame, 1.0, &answer.programme);
+  Spacing spacing(path);
+  PieceRules const rules(path, frame, 1.0, &spacing, &answer.programme);
   answer.check = rules.AddBrokenOrder(circle, {&from, nullptr, 0, path.Count()});
   return answer;
 }
@@ -124,7 +126,8 @@ TEST(PieceRules, AFullProgrammeIsHopeless) {
   LocalFrame const frame{0.0, 0.0, 1.0};
   Opening const from;
   Programme programme;
-  PieceRules const rules(path, frame, 1.0, &programme);
+  Spacing spacing(path);
+  PieceRules const rules(path, frame, 1.0, &spacing, &programme);
   Ends const ends{&from, nullptr, 0, 2};
   for (int i = 0; i < Programme::kMostConditions; ++i) {
     ASSERT_EQ(rules.AddBrokenOrder({-0.5, 0.0, 0.0, 0.5}, ends), Check::Added);
