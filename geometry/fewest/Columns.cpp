@@ -102,11 +102,6 @@ void Columns::Append(Sample const& s) {
   d_.push_back(weight);
 }
 
-Row Columns::At(std::int32_t i) const {
-  auto const k = static_cast<std::size_t>(i);
-  return {a_[k], bx_[k], by_[k], d_[k]};
-}
-
 Columns::Worst Columns::FindWorst(std::int32_t first, std::int32_t last,
                                   Circle const& circle) const {
   Residuals const residuals({a_.data(), bx_.data(), by_.data(), d_.data()}, circle);

@@ -57,7 +57,10 @@ class Columns {
   /// Number of rows.
   std::int32_t Size() const { return static_cast<std::int32_t>(a_.size()); }
   /// One row.
-  Row At(std::int32_t i) const;
+  Row At(std::int32_t i) const {
+    auto const k = static_cast<std::size_t>(i);
+    return {a_[k], bx_[k], by_[k], d_[k]};
+  }
 
   /// The row that a circle breaks most.
   struct Worst {

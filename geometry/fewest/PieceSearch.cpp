@@ -89,8 +89,7 @@ void PieceSearch::AddOpening(Opening const& opening) {
 
 void PieceSearch::LimitCurvature(Opening const& from, std::int32_t end) {
   std::int32_t const first = from.First();
-  // A piece before the first point of a path covers none.
-  double const widest = first < end ? std::sqrt(spacing_.Of(first, end).widest2) : 0.0;
+  double const widest = std::sqrt(spacing_.WidestGap2(first, end));
   double limit = kUnlimited;
   // The chord of a step of angle s on a radius r is 2 r sin(s / 2), and |a| = 1 / (2 r).
   if (widest > 0.0) limit = kStepShare * path_.limits.sineOfHalfStep / widest;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <array>
+#include <cstddef>
 #include <cstdint>
 
 #include "geometry/fewest/Columns.h"
@@ -14,8 +15,12 @@ struct Basis {
   static constexpr std::int32_t kBox = -1000;
   std::array<std::int32_t, 4> ids{kBox, kBox + 1, kBox + 2, kBox + 3};
 
+  /// Whether an id is that of a side of the box.
+  static bool IsBox(std::int32_t id) { return id <= kBox + 3; }
   /// Whether a row is one of the four.
-  bool Holds(std::int32_t id) const;
+  bool Holds(std::int32_t id) const {
+    return ids[0] == id || ids[1] == id || ids[2] == id || ids[3] == id;
+  }
   /// The id of a box row that is none of the four.
   std::int32_t FreeBox() const;
 };
@@ -49,11 +54,23 @@ struct Programme {
   /// The row, the kind and the limit of a row that a basis may hold.
   Row RowOf(std::int32_t id) const;
   /// Of points and the box: a slab.
-  Condition::Kind KindOf(std::int32_t id) const;
+  Condition::Kind KindOf(std::int32_t id) const {
+    return id >= 0 || Basis::IsBox(id) ? Condition::Kind::Slab : ConditionOf(id).kind;
+  }
   /// Of points: 1.
-  double LimitOf(std::int32_t id) const;
+  double LimitOf(std::int32_t id) const {
+    if (id >= 0) return 1.0;
+    return Basis::IsBox(id) ? box : ConditionOf(id).limit;
+  }
   /// Whether there is no row of that id any more.
-  bool IsStale(std::int32_t id) const;
+  bool IsStale(std::int32_t id) const {
+    if (id >= 0) return id < first || id >= last;
+    return !Basis::IsBox(id) && -1 - id >= conditionCount;
+  }
+  /// The condition of an id that is neither that of a point nor of the box.
+  Condition const& ConditionOf(std::int32_t id) const {
+    return conditions[static_cast<std::size_t>(-1 - id)];
+  }
 };
 
 }  // namespace Vorn::Fewest

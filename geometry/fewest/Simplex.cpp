@@ -136,40 +136,30 @@ void Simplex::Solve() {
 
 Simplex::Entry Simplex::Price(Programme const& programme, Basis const& basis, double slack) {
   Entry entry;
-  double worst = slack;
-  auto const offer = [&](std::int32_t id, Row const& row, double limit, double excess) {
-    if (!(excess > worst)) return;
-    worst = excess;
-    entry = {id, row, limit, excess, true};
+  entry.excess = slack;
+  auto const offer = [&](std::int32_t id, double excess) {
+    if (!(excess > entry.excess)) return;
+    entry.id = id;
+    entry.excess = excess;
+    entry.isFound = true;
+  };
+  auto const offerPoint = [&](Columns::Worst const& point) {
+    if (point.index >= 0) offer(point.index, point.value - 1.0);
   };
   for (int k = 0; k < programme.conditionCount; ++k) {
     Condition const& condition = programme.conditions[static_cast<std::size_t>(k)];
+    if (condition.kind == Condition::Kind::Equality) continue;
     double const value = Apply(condition.row, solution_);
-    switch (condition.kind) {
-      case Condition::Kind::HalfSpace:
-        offer(-1 - k, condition.row, condition.limit, value - condition.limit);
-        break;
-      case Condition::Kind::Slab:
-        offer(-1 - k, value > 0.0 ? condition.row : Negated(condition.row), condition.limit,
-              std::fabs(value) - condition.limit);
-        break;
-      case Condition::Kind::Equality:
-        break;
-    }
+    bool const isSlab = condition.kind == Condition::Kind::Slab;
+    offer(-1 - k, (isSlab ? std::fabs(value) : value) - condition.limit);
   }
-  auto const offerPoint = [&](Columns::Worst const& point) {
-    if (point.index < 0 || !(point.value - 1.0 > worst)) return;
-    Row const row = programme.columns->At(point.index);
-    double const value = Apply(row, solution_);
-    offer(point.index, value > 0.0 ? row : Negated(row), 1.0, point.value - 1.0);
-  };
   if (!Candidates::ArePaying(programme)) {
     offerPoint(programme.columns->FindWorst(programme.first, programme.last, solution_));
-    return entry;
-  }
-  offerPoint(candidates_.FindWorst(programme, solution_));
-  if (!entry.isFound || basis.Holds(entry.id)) {
-    offerPoint(candidates_.FindWorstOfAll(programme, solution_, 1.0 + slack));
+  } else {
+    offerPoint(candidates_.FindWorst(programme, solution_));
+    if (!entry.isFound || basis.Holds(entry.id)) {
+      offerPoint(candidates_.FindWorstOfAll(programme, solution_, 1.0 + slack));
+    }
   }
   return entry;
 }
@@ -193,7 +183,7 @@ int Simplex::FindLeaving(Programme const& programme, Basis const& basis,
   return leaving;
 }
 
-void Simplex::Exchange(int leaving, Entry const& entry, std::array<double, 4> const& step) {
+void Simplex::Exchange(int leaving, std::array<double, 4> const& step) {
   auto const l = static_cast<std::size_t>(leaving);
   double const theta = duals_[l] / step[l];
   inverse_[l] = Scaled(inverse_[l], 1.0 / step[l]);
@@ -204,17 +194,22 @@ void Simplex::Exchange(int leaving, Entry const& entry, std::array<double, 4> co
     if (duals_[j] < 0.0 && duals_[j] > -kLeastDual) duals_[j] = 0.0;
   }
   duals_[l] = theta;
-  rows_[l] = entry.row;
-  limits_[l] = entry.limit;
 }
 
 bool Simplex::Pivot(Programme const& programme, Entry const& entry, Basis* basis) {
+  Row row = programme.RowOf(entry.id);
+  // Of two sides the broken one enters.
+  bool const isSlab = programme.KindOf(entry.id) == Condition::Kind::Slab;
+  if (isSlab && !(Apply(row, solution_) > 0.0)) row = Negated(row);
   std::array<double, 4> step;
-  for (std::size_t j = 0; j < 4; ++j) step[j] = Apply(entry.row, inverse_[j]);
+  for (std::size_t j = 0; j < 4; ++j) step[j] = Apply(row, inverse_[j]);
   int const leaving = FindLeaving(programme, *basis, step);
   if (leaving < 0) return false;
-  basis->ids[static_cast<std::size_t>(leaving)] = entry.id;
-  Exchange(leaving, entry, step);
+  auto const l = static_cast<std::size_t>(leaving);
+  basis->ids[l] = entry.id;
+  Exchange(leaving, step);
+  rows_[l] = row;
+  limits_[l] = programme.LimitOf(entry.id);
   return true;
 }
 
@@ -270,7 +265,7 @@ Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objecti
     bool const isRounding = entry.isFound && basis->Holds(entry.id);
     if (!entry.isFound || isRounding) {
       if (exchanges == 0 || (!isRounding && IsAccurate(slack))) {
-        return entry.excess <= kRounded ? Status::Optimal : Status::Stalled;
+        return !entry.isFound || entry.excess <= kRounded ? Status::Optimal : Status::Stalled;
       }
       if (!Refresh(programme, objective, basis)) return Status::Stalled;
       solution_ = Fewest::Solve({rows_, inverse_}, limits_);

@@ -45,8 +45,6 @@ class Simplex {
  private:
   struct Entry {
     std::int32_t id = 0;
-    Row row;
-    double limit = 0.0;
     double excess = 0.0;
     bool isFound = false;
   };
@@ -75,8 +73,8 @@ class Simplex {
   bool Pivot(Programme const& programme, Entry const& entry, Basis* basis);
   /// Computes the inverse and the duals anew; false when rounding prevents it.
   bool Refresh(Programme const& programme, Row const& objective, Basis* basis);
-  /// Puts the entering row in place of the leaving one and updates inverse and duals.
-  void Exchange(int leaving, Entry const& entry, std::array<double, 4> const& step);
+  /// Updates inverse and duals for a row that takes the place of the leaving one.
+  void Exchange(int leaving, std::array<double, 4> const& step);
 
   double slack_;
   Candidates candidates_;

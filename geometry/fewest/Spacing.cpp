@@ -52,4 +52,18 @@ RunSpacing Spacing::Of(std::int32_t first, std::int32_t end) {
   return rest < end ? Joined(spacing, Scan(rest, end, false)) : spacing;
 }
 
+double Spacing::WidestGap2(std::int32_t first, std::int32_t end) {
+  if (end - first > 2 * kBlock) return Of(first, end).widest2;
+  double widest = 0.0;
+  for (std::int32_t i = first + 1; i < end; ++i) {
+    WPoint const& p = path_.At(i - 1);
+    WPoint const& q = path_.At(i);
+    double const dx = q.x - p.x;
+    double const dy = q.y - p.y;
+    double const gap = dx * dx + dy * dy;
+    widest = gap > widest ? gap : widest;
+  }
+  return widest;
+}
+
 }  // namespace Vorn::Fewest

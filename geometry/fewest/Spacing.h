@@ -28,6 +28,8 @@ class Spacing {
   /// Of the points [first, end), one at least. O(n / kBlock + kBlock) for n points, but for blocks
   /// that are new.
   RunSpacing Of(std::int32_t first, std::int32_t end);
+  /// Only the square of the largest distance between neighbours; 0 for no points.
+  double WidestGap2(std::int32_t first, std::int32_t end);
 
  private:
   static constexpr std::int32_t kBlock = 64;

@@ -44,6 +44,7 @@ TEST(Spacing, IsThatOfTheSinglePointsOfARun) {
     auto const from = path.points.begin() + first;
     auto const to = path.points.begin() + end;
     EXPECT_EQ(run.widest2, WidestGap2(path, first, end));
+    EXPECT_EQ(spacing.WidestGap2(first, end), WidestGap2(path, first, end));
     EXPECT_EQ(run.leastTolerance, std::min_element(from, to, byW)->w);
     EXPECT_EQ(run.lowX, std::min_element(from, to, byX)->x);
     EXPECT_EQ(run.highX, std::max_element(from, to, byX)->x);
