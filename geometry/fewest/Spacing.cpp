@@ -32,7 +32,7 @@ RunSpacing Spacing::Scan(std::int32_t first, std::int32_t end, bool isBeginning)
 }
 
 RunSpacing const& Spacing::OfBlock(std::int32_t block) {
-  if (blocks_.empty()) blocks_.resize(static_cast<std::size_t>(path_.Count() / kBlock + 1));
+  if (blocks_.empty()) blocks_.resize(static_cast<std::size_t>(path_.Count() / kBlock) + 1);
   RunSpacing& spacing = blocks_[static_cast<std::size_t>(block)];
   bool const isNew = spacing.leastTolerance == 0.0;
   if (isNew) spacing = Scan(block * kBlock, (block + 1) * kBlock, block == 0);
