@@ -32,20 +32,41 @@ bool IsInBox(XY const& place, Extent const& box) {
          place.y <= box.high.y;
 }
 
+/// The closed outlines in ascending order of what `key` says of each.
+template <typename Key>
+std::vector<std::size_t> ClosedBy(std::vector<ContourFile> const& outlines, Key const& key) {
+  std::vector<std::size_t> order;
+  for (std::size_t i = 0; i < outlines.size(); ++i) {
+    if (outlines[i].isClosed) order.push_back(i);
+  }
+  std::sort(order.begin(), order.end(),
+            [&](std::size_t a, std::size_t b) { return key(a) < key(b); });
+  return order;
+}
+
 }  // namespace
 
+// Goes through the starts of the outlines from left to right and keeps the boxes that have begun
+// and not ended there, so that outlines side by side are not compared with each other.
 std::vector<std::vector<std::size_t>> ContainersOf(std::vector<ContourFile> const& outlines) {
   std::vector<Extent> boxes;
   boxes.reserve(outlines.size());
   for (ContourFile const& outline : outlines) boxes.push_back(ExtentOf(outline.pieces));
+  auto const startOf = [&](std::size_t i) -> XY { return outlines[i].pieces.front().start; };
+  auto const byBox = ClosedBy(outlines, [&](std::size_t i) { return boxes[i].low.x; });
+  auto const byStart = ClosedBy(outlines, [&](std::size_t i) { return startOf(i).x; });
   std::vector<std::vector<std::size_t>> containers(outlines.size());
-  for (std::size_t i = 0; i < outlines.size(); ++i) {
-    if (!outlines[i].isClosed) continue;
-    XY const& place = outlines[i].pieces.front().start;
-    for (std::size_t k = 0; k < outlines.size(); ++k) {
-      bool const mayBeAround = k != i && outlines[k].isClosed && IsInBox(place, boxes[k]);
+  std::vector<std::size_t> reached;
+  auto next = byBox.begin();
+  for (std::size_t const i : byStart) {
+    XY const place = startOf(i);
+    while (next != byBox.end() && boxes[*next].low.x <= place.x) reached.push_back(*next++);
+    std::erase_if(reached, [&](std::size_t k) { return boxes[k].high.x < place.x; });
+    for (std::size_t const k : reached) {
+      bool const mayBeAround = k != i && IsInBox(place, boxes[k]);
       if (mayBeAround && Encloses(outlines[k], place)) containers[i].push_back(k);
     }
+    std::sort(containers[i].begin(), containers[i].end());
   }
   return containers;
 }

@@ -32,7 +32,8 @@ TEST(MemoryToRead, IsNearWhatWasMeasured) {
        {Measured{Format::Wkt, "100.0000 0.0000,", 310},
         Measured{Format::GCode, "G1 X100.0000 Y0.0000\n", 313},
         Measured{Format::GeoJson, "[100.0000,0.0000],", 393},
-        Measured{Format::Svg, "100.0000 0.0000 ", 310},
+        Measured{Format::Svg, "100.0000 0.0000 ", 310}, Measured{Format::Svg, "h1", 327},
+        Measured{Format::Svg, R"(<rect x="3" width="1" height="1"/>)", 1237},
         Measured{Format::Dxf, "0\nLINE\n8\n0\n10\n1\n20\n2\n11\n3\n21\n4\n", 786},
         Measured{Format::Json, R"({"kind":"line","start":{"x":1,"y":2},"end":{"x":3,"y":4}},)",
                  1149}}) {

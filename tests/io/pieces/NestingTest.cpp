@@ -1,6 +1,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <chrono>
 #include <cmath>
 #include <random>
 
@@ -39,6 +40,41 @@ TEST(ContainersOf, ListsAllAroundInTheirOrder) {
   EXPECT_EQ(containers[1], Indices{});
   EXPECT_EQ(containers[2], Indices{1});
   EXPECT_EQ(containers[3], Indices{});
+}
+
+TEST(ContainersOf, AmongManySquaresFindsThoseAroundEachCorner) {
+  struct Place {
+    double x, y, half;
+  };
+  std::mt19937 random(7);
+  std::uniform_real_distribution<double> at(-10.0, 10.0);
+  std::uniform_real_distribution<double> half(0.1, 5.0);
+  std::vector<Place> places;
+  std::vector<ContourFile> squares;
+  for (int i = 0; i < 200; ++i) {
+    places.push_back({at(random), at(random), half(random)});
+    squares.push_back(Square(places.back().x, places.back().y, places.back().half));
+  }
+  auto const containers = ContainersOf(squares);
+  for (std::size_t i = 0; i < places.size(); ++i) {
+    Indices around;
+    for (std::size_t k = 0; k < places.size(); ++k) {
+      double const x = places[i].x - places[i].half - places[k].x;
+      double const y = places[i].y - places[i].half - places[k].y;
+      bool const isInside = std::fabs(x) < places[k].half && std::fabs(y) < places[k].half;
+      if (k != i && isInside) around.push_back(k);
+    }
+    EXPECT_EQ(containers[i], around) << i;
+  }
+}
+
+TEST(ContainersOf, ManySideBySideAreNotComparedWithEachOther) {
+  std::vector<ContourFile> squares;
+  for (int i = 0; i < 100'000; ++i) squares.push_back(Square(3.0 * i, 0.0, 1.0));
+  auto const begin = std::chrono::steady_clock::now();
+  EXPECT_EQ(ContainersOf(squares)[77'777], Indices{});
+  // Pair by pair 20,000 take two seconds, and the time grows with the square.
+  EXPECT_LT(std::chrono::steady_clock::now() - begin, std::chrono::seconds(10));
 }
 
 TEST(ContainersOf, OpenOnesLieInNothingAndHoldNothing) {
