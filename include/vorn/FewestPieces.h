@@ -47,11 +47,11 @@ inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
 /// - No arc is a full turn: a full circle comes as two arcs.
 ///
 /// Where it falls short
-/// - A circle scanned t times around takes the arcs that keep every one of them below 353 degrees:
-/// 3
-///   for twice around, of which the bound, 1, takes no account. Other paths that run several times
-///   along themselves may take many more pieces than the bound, or have no answer (NoFit): each lap
-///   has to stay on its side of the others.
+/// - An open scan of one circle t times around takes the arcs that keep every one of them below 353
+///   degrees: 3 for twice around, of which the bound, 1, takes no account. Closed scans of more
+///   than two laps, and other paths that run several times along themselves or cross themselves
+///   often, may take many more pieces than the bound, or have no answer (NoFit): no piece may cross
+///   another anywhere but where the points do.
 /// - Where largestRadius is below radii of the part, short pieces stand for its arcs; all of them
 ///   may be segments though some arcs would save a few. The bound takes no account of
 ///   largestRadius.
