@@ -59,7 +59,7 @@ double Departure(PieceRows const& a, PieceRows const& b) {
   return IO::DepartureOf(first, second);
 }
 
-py::object PlaceOf(std::optional<IO::XY> const& place) {
+py::object PlaceOrNone(std::optional<IO::XY> const& place) {
   if (!place) return py::none();
   return py::make_tuple(place->x, place->y);
 }
@@ -77,8 +77,9 @@ class Meetings {
   py::list Places() const {
     py::list places;
     for (IO::Intersection const& one : found_) {
-      places.append(py::make_tuple(IO::NameOf(one.kind), PlaceOf(one.at), PlaceOf(one.until),
-                                   one.a.piece, one.a.position, one.b.piece, one.b.position));
+      places.append(py::make_tuple(IO::NameOf(one.kind), PlaceOrNone(one.at),
+                                   PlaceOrNone(one.until), one.a.piece, one.a.position, one.b.piece,
+                                   one.b.position));
     }
     return places;
   }
@@ -114,7 +115,7 @@ class Areas {
   py::list Measures() const {
     py::list measures;
     for (IO::ContourArea const& one : measured_) {
-      measures.append(py::make_tuple(one.signedArea, one.perimeter, PlaceOf(one.centroid),
+      measures.append(py::make_tuple(one.signedArea, one.perimeter, PlaceOrNone(one.centroid),
                                      one.depth, one.IsHole(), one.crossesItself, one.gaps.size()));
     }
     return measures;
