@@ -38,7 +38,7 @@ struct Place {
   Beside beside = Beside::Piece;
   double along = 0.0;     ///< of the nearest point of the piece, from its start, in [0, length]
   double distance = 0.0;  ///< from the nearest point of the piece
-  double error = 0.0;     ///< by how much distance may be too small
+  double error = 0.0;     ///< by how much rounding may have changed distance
   double left = 0.0;      ///< deviation from the whole line or circle, positive on the left
 };
 

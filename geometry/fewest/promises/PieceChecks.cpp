@@ -72,8 +72,14 @@ class PointChecks {
   }
 
  private:
+  /// Exact, but only where rounding leaves it open.
+  bool IsPointWithin(Place const& place, WPoint const& p) const {
+    if (place.distance + place.error <= p.w) return true;
+    return place.distance - place.error <= p.w && IsWithin(drawn_, p, place.beside);
+  }
+
   void TakeDistance(Place const& place, WPoint const& p, std::size_t number, Report* report) {
-    bool const isWithin = place.distance + place.error <= p.w || IsWithin(drawn_, p, place.beside);
+    bool const isWithin = IsPointWithin(place, p);
     double const ratio = place.distance / p.w;
     if (!isWithin) outside_.Take(ratio, number);
     // Rounding may carry a point that lies exactly at its tolerance beyond it.
