@@ -2,23 +2,14 @@
 
 #include <string>
 
+#include "io/PointTables.h"
 #include "io/points/TableEnd.h"
-#include "vorn/io/Failure.h"
 #include "vorn/io/Points.h"
 
 namespace Vorn::IO {
 namespace {
 
-PointFile Parse(std::string const& text) { return ParsePoints(text, "p.csv", {}); }
-
-std::string Complaint(std::string const& text) {
-  try {
-    Parse(text);
-  } catch (Failure const& failure) {
-    return failure.what();
-  }
-  return "";
-}
+using namespace PointTables;
 
 TEST(IsFooter, IsTextToTheEnd) {
   TableFacts const table{';', 2, 500};
@@ -59,21 +50,21 @@ TEST(CsvReader, SkipsTheFooterOfAnInstrumentAndTellsItsLines) {
 }
 
 TEST(CsvReader, RefusesARowGoneWrongBehindPointsWithItsLine) {
-  EXPECT_EQ(Complaint("x;y\n1;2\n3;4\nEnd of report\n5;6\n"),
+  EXPECT_EQ(TableRefusal("x;y\n1;2\n3;4\nEnd of report\n5;6\n"),
             "p.csv:4:1: expected 2 columns, found 1: 'End of report'");
-  EXPECT_EQ(Complaint("x;y\n1;2\n3;4\nabc;4\n"), "p.csv:4:1: x is not a number: 'abc'");
-  EXPECT_EQ(Complaint("x;y\n1;2\n3;4\n5\n"), "p.csv:4:1: expected 2 columns, found 1: '5'");
-  EXPECT_EQ(Complaint("x;y\n1;2\n3;4\nPoints;3\n"), "p.csv:4:1: x is not a number: 'Points'");
+  EXPECT_EQ(TableRefusal("x;y\n1;2\n3;4\nabc;4\n"), "p.csv:4:1: x is not a number: 'abc'");
+  EXPECT_EQ(TableRefusal("x;y\n1;2\n3;4\n5\n"), "p.csv:4:1: expected 2 columns, found 1: '5'");
+  EXPECT_EQ(TableRefusal("x;y\n1;2\n3;4\nPoints;3\n"), "p.csv:4:1: x is not a number: 'Points'");
 }
 
 TEST(CsvReader, BehindRowsThatBeginWithTextThereIsNoFooter) {
   std::string const rows = "name;x;y\nFirst;1;2\nSecond;3;4\n";
   EXPECT_EQ(Parse(rows).points.size(), 2u);
-  EXPECT_EQ(Complaint(rows + "Third\n"), "p.csv:4:1: expected 3 columns, found 1: 'Third'");
+  EXPECT_EQ(TableRefusal(rows + "Third\n"), "p.csv:4:1: expected 3 columns, found 1: 'Third'");
 }
 
 TEST(CsvReader, OnePointAndTextAreNoTable) {
-  EXPECT_EQ(Complaint("x;y\n1;2\nEnd of report\n"),
+  EXPECT_EQ(TableRefusal("x;y\n1;2\nEnd of report\n"),
             "p.csv:3:1: expected 2 columns, found 1: 'End of report'");
 }
 

@@ -2,25 +2,14 @@
 
 #include <string>
 
+#include "io/PointTables.h"
 #include "io/points/TableStart.h"
-#include "vorn/io/Failure.h"
 #include "vorn/io/Points.h"
 
 namespace Vorn::IO {
 namespace {
 
-PointFile Parse(std::string const& text) {
-  return ParsePoints(text, "p.csv", {ToleranceColumn::Use::IfPresent, "w"});
-}
-
-std::string Complaint(std::string const& text) {
-  try {
-    Parse(text);
-  } catch (Failure const& failure) {
-    return failure.what();
-  }
-  return "";
-}
+using namespace PointTables;
 
 TEST(FindTable, BeginsAtTheHeaderOfThePoints) {
   EXPECT_EQ(FindTable("x,y\n1,2\n3,4\n").first, 0u);
@@ -104,13 +93,13 @@ TEST(CsvReader, RulesAroundTheHeaderAreNoHeader) {
   PointFile const file = Parse("Report 7\n=====\nid;x;y\n---;---;---\n1;0,5;2\n2;0,75;3\n");
   EXPECT_EQ(file.columns, "2 (x) and 3 (y)");
   EXPECT_EQ(file.points.size(), 2u);
-  EXPECT_EQ(Complaint("x;y\n1;2\n---;---\n3;4\n"), "p.csv:3:1: x is not a number: '---'");
+  EXPECT_EQ(TableRefusal("x;y\n1;2\n---;---\n3;4\n"), "p.csv:3:1: x is not a number: '---'");
 }
 
 TEST(CsvReader, ASeparatorMayEndTheLinesOfDataAlone) {
   EXPECT_EQ(Parse("x;y\n0.5;2;\n0.7;3;\n").points.size(), 2u);
   EXPECT_EQ(Parse("x,y\n0.5,2,,\n0.7,3,,\n").points.size(), 2u);
-  EXPECT_EQ(Complaint("x;y\n0.5;2;\n0.7;3;4\n"),
+  EXPECT_EQ(TableRefusal("x;y\n0.5;2;\n0.7;3;4\n"),
             "p.csv:3:7: expected 2 columns, found 3: '0.7;3;4'");
 }
 
@@ -157,13 +146,13 @@ TEST(CsvReader, TakesUnitsFromTheHeader) {
 }
 
 TEST(CsvReader, RefusesColumnsThatCannotBeTold) {
-  EXPECT_EQ(Complaint("Nr,A,B,C\n1,2,3,4\n2,3,4,5\n"),
+  EXPECT_EQ(TableRefusal("Nr,A,B,C\n1,2,3,4\n2,3,4,5\n"),
             "p.csv:1:1: cannot tell which two columns hold the points: the header has 'Nr', 'A', "
             "'B', 'C'");
-  EXPECT_EQ(Complaint("X [mm],Z [\xC2\xB5m]\n1,2\n3,4\n"),
+  EXPECT_EQ(TableRefusal("X [mm],Z [\xC2\xB5m]\n1,2\n3,4\n"),
             "p.csv:1:1: one coordinate is in 'mm', the other in '\xC2\xB5m': a contour needs one "
             "unit");
-  EXPECT_NE(Complaint("x,y,z\n1,2,3\n4,5,6\n"), "");
+  EXPECT_NE(TableRefusal("x,y,z\n1,2,3\n4,5,6\n"), "");
 }
 
 TEST(CsvReader, NumbersOfPointsAreNoCoordinates) {
