@@ -7,14 +7,20 @@
 namespace Vorn::Fewest {
 namespace {
 
+/// A programme over all rows.
+Programme Over(Columns const& columns) {
+  Programme programme;
+  programme.columns = &columns;
+  programme.last = columns.Size();
+  return programme;
+}
+
 /// Three points within a tenth of y = 0 and the line as what is to be largest.
 TEST(Simplex, SteepestLineThroughASlab) {
   Columns columns;
   columns.Append({-1.0, 0.0, 0.125});
   columns.Append({1.0, 0.0, 0.125});
-  Programme programme;
-  programme.columns = &columns;
-  programme.last = 2;
+  Programme programme = Over(columns);
   programme.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0});
   Simplex simplex(1e-12);
   Basis basis;
@@ -29,9 +35,7 @@ TEST(Simplex, HalfSpacesBindOnOneSideOnly) {
   Columns columns;
   columns.Append({1.0, 0.0, 1.0});
   columns.Append({0.0, 1.0, 1.0});
-  Programme programme;
-  programme.columns = &columns;
-  programme.last = 2;
+  Programme programme = Over(columns);
   programme.Add({{0.0, 0.0, 0.0, 1.0}, Condition::Kind::HalfSpace, 0.25});
   Simplex simplex(1e-12);
   Basis basis;
@@ -52,9 +56,7 @@ TEST(Simplex, LongRunsHaveTheOptimumOfAllRows) {
     double const x = static_cast<double>(i) / kHalf;
     columns.Append({x, 4.0 * x * x * x - 3.0 * x, 1.0});
   }
-  Programme programme;
-  programme.columns = &columns;
-  programme.last = columns.Size();
+  Programme programme = Over(columns);
   programme.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0});
   Simplex simplex(1e-12);
   Basis basis;
@@ -73,9 +75,7 @@ TEST(Simplex, RowsOfTheBasisThatRoundingBreaksAreNotExchangedForever) {
     double const x = 1.0 + 1e-4 * i;
     columns.Append({x, 1.0 + 1e-5 * ((7 * i) % 5), 1e-4});
   }
-  Programme programme;
-  programme.columns = &columns;
-  programme.last = columns.Size();
+  Programme programme = Over(columns);
   Simplex simplex(1e-15);
   Basis basis;
   ASSERT_EQ(simplex.Maximise(programme, {0.0, 0.0, 1.0, 0.0}, 0.0, &basis),
