@@ -51,8 +51,8 @@ class DenseOrder {
   Circle circle_;
   double least_;
   double widest_;
-  Place
-      low_;  ///< the gradient at the low corner of the box; each component is linear in one of x, y
+  // The gradient at two corners of the box: each component is linear in one of x and y.
+  Place low_;
   Place high_;
 };
 

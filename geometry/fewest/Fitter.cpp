@@ -56,8 +56,8 @@ class Fitter {
         bound_(task.bound),
         progress_(task.progress) {}
 
-  /// Whether one piece along a circle that covers all points, or one for each lap around it, keeps
-  /// every promise.
+  /// Whether one piece along a circle that covers all points, or arcs that go around it several
+  /// times, keep every promise.
   bool RunAsOne(PlacedCircle const& covering, Answer* answer, Promises::Report* report) const {
     return (!options_.closed && RunAsOnePiece(covering, answer, report)) ||
            RunAsLaps(covering, answer, report);

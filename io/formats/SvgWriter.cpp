@@ -38,8 +38,9 @@ std::string StepOf(Piece const& piece) {
 
 std::string PathOf(ContourFile const& run) {
   std::string data = "M " + Written(run.pieces.front().start);
-  for (Piece const& piece : WithoutArcsBeyond(kWidestPathArc, run.pieces))
+  for (Piece const& piece : WithoutArcsBeyond(kWidestPathArc, run.pieces)) {
     data += " " + StepOf(piece);
+  }
   return R"(<path d=")" + data + (run.isClosed ? " Z" : "") + "\"/>\n";
 }
 
