@@ -38,7 +38,11 @@ struct CirclePoints {
 ///
 /// Notation: D the direction of the segment, F its start seen from the centre, t the parameter
 /// along it; the points on the circle solve A t^2 + B t + C = 0.
-inline CirclePoints CutCircleBySegment(Circle const& circle, Segment const& segment) {
+///
+/// Always inline: GCC by itself calls it for arcs, and a segment against an arc takes 14 per cent
+/// longer then.
+[[gnu::always_inline]] inline CirclePoints CutCircleBySegment(Circle const& circle,
+                                                              Segment const& segment) {
   Point const& start = segment.start;
   Point const& end = segment.end;
   double const dx = end.x - start.x;

@@ -22,12 +22,10 @@ constexpr int kMostDigits = 1074;
 /// Sign, point, exponent and the end of the text.
 constexpr int kBesideDigits = 16;
 
-bool IsBlank(char c) { return c == ' ' || c == '\t' || c == '\r' || c == '\v' || c == '\f'; }
-
 bool EveryCommaHasADigitBehind(std::string_view text) {
   for (std::size_t i = 0; i < text.size(); ++i) {
     if (text[i] != ',') continue;
-    if (i + 1 == text.size() || text[i + 1] < '0' || text[i + 1] > '9') return false;
+    if (i + 1 == text.size() || !IsDigit(text[i + 1])) return false;
   }
   return true;
 }
@@ -82,12 +80,6 @@ std::string FormatExact(double value) {
   std::to_chars_result const result =
       std::to_chars(buffer.data(), buffer.data() + buffer.size(), value);
   return {buffer.data(), result.ptr};
-}
-
-std::string_view Trimmed(std::string_view text) {
-  while (!text.empty() && IsBlank(text.front())) text.remove_prefix(1);
-  while (!text.empty() && IsBlank(text.back())) text.remove_suffix(1);
-  return text;
 }
 
 std::string LowerCase(std::string_view text) {

@@ -68,7 +68,7 @@ bool LooksLikeGCode(std::string_view line) {
   constexpr std::string_view kSigns = "%(;";
   constexpr std::string_view kLetters = "gmnotsfxyz";
   if (kSigns.find(line.front()) != std::string_view::npos) return true;
-  bool const isWord = line.size() > 1 && line[1] >= '0' && line[1] <= '9';
+  bool const isWord = line.size() > 1 && IsDigit(line[1]);
   return isWord && kLetters.find(line.front()) != std::string_view::npos;
 }
 

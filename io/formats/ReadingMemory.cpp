@@ -2,6 +2,8 @@
 
 #include <array>
 
+#include "io/base/Words.h"
+
 namespace Vorn::IO {
 
 namespace {
@@ -51,7 +53,7 @@ constexpr std::size_t kForAxisWay = 175;
 /// with three, 752 for a circle with two. The letters of width and height count as ways, too.
 constexpr std::size_t kForElement = 700;
 
-bool IsOfNumber(char c) { return (c >= '0' && c <= '9') || c == '.'; }
+bool IsOfNumber(char c) { return IsDigit(c) || c == '.'; }
 
 std::size_t CountNumbers(std::string_view text) {
   std::size_t count = 0;

@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <optional>
 
+#include "io/base/Words.h"
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Messages.h"
 #include "vorn/io/Numbers.h"
@@ -13,8 +14,6 @@ namespace {
 
 constexpr std::string_view kBlanks = " \t\r\n\f";
 constexpr std::string_view kDigits = "0123456789";
-
-bool IsDigit(char c) { return kDigits.find(c) != std::string_view::npos; }
 
 }  // namespace
 

@@ -93,20 +93,26 @@ class Parser {
       ParseComment(whole.substr(comment));
     }
     if (place_.Line() <= table_.first) return ParsePreamble(Trimmed(line));
-    if (Trimmed(line).empty() || (file_.points.empty() && IsRule(line))) return;
-    if (isUnitLineNext_) return ParseUnits(line);
-    columns_.Count() == 0 ? ParseFirstLine(Trimmed(line)) : ParseLineOfData(line);
+    std::string_view const words = Trimmed(line);
+    if (words.empty() || (file_.points.empty() && IsRule(words))) return;
+    if (isUnitLineNext_) return ParseUnits(words);
+    columns_.Count() == 0 ? ParseFirstLine(words) : ParseLineOfData(line, words);
   }
 
   /// Whether no points come any more, only the footer of an instrument. Rows that begin with texts
   /// themselves cannot be told from one.
   bool IsFooterFrom(std::string_view line, std::string_view text) const {
     if (file_.points.size() < 2 || !doRowsBeginWithNumbers_) return false;
+    return !MayBePoint(line) && IsFooter(text, {separator_, columns_.Count(), file_.points.size()});
+  }
+
+  /// Whether a line begins like a number and is no rule, or holds nothing but a comment.
+  static bool MayBePoint(std::string_view line) {
+    // Most lines: no search for a comment is needed to tell.
+    if (!line.empty() && IsDigit(line.front())) return true;
     std::string_view const words = Trimmed(line.substr(0, FindComment(line)));
-    constexpr std::string_view kNumbers = "+-.0123456789";
-    bool const mayBePoint =
-        words.empty() || (kNumbers.find(words.front()) != std::string_view::npos && !IsRule(words));
-    return !mayBePoint && IsFooter(text, {separator_, columns_.Count(), file_.points.size()});
+    if (words.empty() || IsDigit(words.front())) return true;
+    return std::string_view("+-.").find(words.front()) != std::string_view::npos && !IsRule(words);
   }
 
   /// Goes to the last line that is not empty, and tells which ones were skipped.
@@ -146,7 +152,7 @@ class Parser {
   /// The line below the header, of units alone.
   void ParseUnits(std::string_view line) {
     isUnitLineNext_ = false;
-    SplitFields(Trimmed(line), FindSeparator(Trimmed(line)), &fields_);
+    SplitFields(line, FindSeparator(line), &fields_);
     if (!columns_.Fit(fields_)) return;
     auto const unit = [](std::string const& axis, std::string_view field) {
       return ReadColumnName(axis + ' ' + std::string(Unquoted(field))).unit;
@@ -164,13 +170,12 @@ class Parser {
     if (file_.units.empty()) file_.units = Printable(ofX);
   }
 
-  void ParseLineOfData(std::string_view line) {
-    if (file_.points.empty()) AdoptSeparatorOfData(Trimmed(line));
+  /// A line with the blanks at its ends, and without them.
+  void ParseLineOfData(std::string_view line, std::string_view words) {
+    if (file_.points.empty()) AdoptSeparatorOfData(words);
     // A tab at the end of a line is an empty field if the columns ask for one, and else nothing.
-    SplitFields(separator_ == '\t' ? line : Trimmed(line), separator_, &fields_);
-    if (separator_ == '\t' && !columns_.Fit(fields_)) {
-      SplitFields(Trimmed(line), separator_, &fields_);
-    }
+    SplitFields(separator_ == '\t' ? line : words, separator_, &fields_);
+    if (separator_ == '\t' && !columns_.Fit(fields_)) SplitFields(words, separator_, &fields_);
     // Separators at the end of the lines of data, but not of the header.
     while (fields_.size() > columns_.Count() && fields_.back().empty()) fields_.pop_back();
     ParsePoint();

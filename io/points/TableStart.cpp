@@ -145,7 +145,7 @@ bool LooksLikeNumber(std::string_view field) {
   if (ParseNumber(field)) return true;
   std::string_view const digits =
       field.substr(std::min(field.find_first_not_of("+-.,"), field.size()));
-  return !digits.empty() && digits.front() >= '0' && digits.front() <= '9';
+  return !digits.empty() && IsDigit(digits.front());
 }
 
 bool IsRule(std::string_view line) {

@@ -7,8 +7,9 @@ namespace Vorn::Cells {
 
 namespace {
 
-/// About half the letters of a level are parts of others, and half of the slots stay free.
-constexpr std::size_t kSlotsPerLetter = 2;
+/// Room for two parts of every letter while half of the slots stay free, so that the table seldom
+/// has to be enlarged. With 2 fits by cells took 3 to 9 per cent longer.
+constexpr std::size_t kSlotsPerLetter = 4;
 
 /// The slots are doubled when one in so many is taken.
 constexpr std::size_t kSlotsPerTaken = 2;
