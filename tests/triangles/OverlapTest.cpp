@@ -93,6 +93,16 @@ TEST(GetOverlapping, OfIdenticalTrianglesHasItsAreaWithTheSameVertexOrder) {
   }
 }
 
+TEST(GetOverlapping, OfACellThatTakesTheResultReadsWhatItHeldBefore) {
+  Cell const cell{kInner, kFar, kInner};
+  Cell expected = cell;
+  OverlapOf(kOuter, cell, &expected);
+  Cell both = cell;
+  both.shrink_to_fit();
+  EXPECT_EQ(OverlapOf(kOuter, both, &both), OverlappingStatus::Overlap);
+  EXPECT_TRUE(SameCell(expected, both));
+}
+
 TEST(GetOverlapping, LeavesTheResultWhenItFails) {
   // Found by search: four vertices lie on the other triangle by rounding, yet no sides meet.
   RandomGeometry random(4402);
