@@ -39,11 +39,13 @@ FitAnswer Fit(std::vector<WPoint> const& points, Strategy strategy) {
   return answer;
 }
 
-/// A vector of more points than there is memory for. Reading one of them ends the program.
+/// A vector of more points than there is memory for. Reading one of them ends the program, unless
+/// they are readable: then they all are zero.
 class PointsWithoutMemory {
  public:
-  explicit PointsWithoutMemory(std::size_t count) : bytes_(count * sizeof(WPoint)) {
-    begin_ = mmap(nullptr, bytes_, PROT_NONE, MAP_PRIVATE | MAP_ANONYMOUS | MAP_NORESERVE, -1, 0);
+  explicit PointsWithoutMemory(std::size_t count, int protection = PROT_NONE)
+      : bytes_(count * sizeof(WPoint)) {
+    begin_ = mmap(nullptr, bytes_, protection, MAP_PRIVATE | MAP_ANONYMOUS | MAP_NORESERVE, -1, 0);
     auto* const end = static_cast<char*>(begin_) + bytes_;
     // Three pointers: the beginning, and twice the end.
     void* const parts[] = {begin_, end, end};
@@ -87,6 +89,14 @@ TEST_P(MorePointsThanIndices, AreRefusedByEveryFitBeforeOneIsRead) {
 
 INSTANTIATE_TEST_SUITE_P(Counts, MorePointsThanIndices,
                          testing::Values((std::size_t{1} << 31U), (std::size_t{1} << 32U) + 5));
+
+TEST(AsManyPointsAsIndices, AreReadByTheFits) {
+  PointsWithoutMemory const points((std::size_t{1} << 31U) - 1, PROT_READ);
+  if (!points.IsThere()) GTEST_SKIP() << "no room for addresses";
+  // The first two end the search, so that the others need no memory.
+  EXPECT_EQ(Fit(points.Vector(), Strategy::Mixed).code, ErrorCode::PointsTooClose);
+  EXPECT_EQ(Fit(points.Vector(), Strategy::MixedCells).code, ErrorCode::PointsTooClose);
+}
 
 constexpr std::size_t kMillion = 1'000'000;
 
