@@ -33,6 +33,15 @@ TEST(Candidates, AreTheRowsAboveTheLimitAndTheFirstOfTheWorstIsTold) {
   EXPECT_EQ(candidates.FindWorst(programme, kAlongX).value, 3.0);
 }
 
+TEST(Candidates, PayFrom512RowsOn) {
+  Programme programme;
+  programme.first = 10;
+  programme.last = 521;
+  EXPECT_FALSE(Candidates::ArePaying(programme));
+  programme.last = 522;
+  EXPECT_TRUE(Candidates::ArePaying(programme));
+}
+
 TEST(Candidates, OutsideTheRunArePassedOver) {
   Columns const columns = Heights();
   Programme programme = ProgrammeOf(columns);

@@ -121,6 +121,17 @@ TEST(PieceRules, TheEndsOfAnOpenPathMayOverlapByHalfATolerance) {
   }
 }
 
+TEST(PieceRules, APointAtTheCentreIsHopeless) {
+  // No curvature lets a step from there be small.
+  Path path = OnUnitCircle({0, 90}, kTight);
+  path.points[0] = {0.0, 0.0, kTight};
+  for (double const scale : kScales) {
+    Answer const answer = AskOrder(path, scale);
+    EXPECT_EQ(answer.check, Check::Hopeless);
+    EXPECT_EQ(answer.programme.conditionCount, 0);
+  }
+}
+
 TEST(PieceRules, AFullProgrammeIsHopeless) {
   Path const path = OnUnitCircle({0, 90}, kTight);
   LocalFrame const frame{0.0, 0.0, 1.0};
