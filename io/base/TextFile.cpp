@@ -7,6 +7,7 @@
 #include <string_view>
 
 #include "io/base/Encoding.h"
+#include "io/base/TextLines.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 
@@ -17,6 +18,10 @@ namespace {
 constexpr std::size_t kMebibyte = std::size_t{1} << 20;
 
 constexpr std::size_t kFirstBlock = std::size_t{64} * 1024;
+
+/// What is read before a line without an end can be told. A multiple of the first block by a power
+/// of two, so that blocks of doubled size come to it.
+constexpr std::size_t kFirstLook = 2 * kLongestTableLine;
 
 /// Far above any measurement.
 constexpr std::size_t kLargestText = std::size_t{4} << 30;
@@ -45,11 +50,21 @@ void RefuseBinary(std::string const& path, std::string_view block, std::size_t o
   Refuse(path, "is not text: byte " + std::to_string(offset + zero) + " is zero");
 }
 
+/// Only tables of points begin with a number, and these have no such lines: what else there may be
+/// need not be read.
+void RefuseEndlessLine(std::string const& path, std::string_view text) {
+  constexpr std::string_view kNumberBegins = "+-.,0123456789";
+  bool const isTable = kNumberBegins.find(text.front()) != std::string_view::npos;
+  if (!isTable || text.find_first_of("\r\n") <= kLongestTableLine) return;
+  throw Failure(FailureKind::File, {InputName(path), 1}, kLineTooLong);
+}
+
 std::string ReadAll(std::string const& path, std::istream& in, std::size_t expected) {
   std::size_t const largest = expected == kFirstBlock ? kLargestStream : kLargestText;
   std::string text;
   std::size_t size = 0;
-  for (std::size_t room = expected; in; room = 2 * room) {
+  std::size_t room = std::min(expected, kFirstLook);
+  for (; in; room = room < expected ? expected : 2 * room) {
     if (size >= largest) {
       Refuse(path, "is too large: more than " + std::to_string(largest / kMebibyte) + " MiB");
     }
@@ -59,7 +74,9 @@ std::string ReadAll(std::string const& path, std::istream& in, std::size_t expec
     if (expected == kFirstBlock && !IsUtf16(text)) {
       RefuseBinary(path, std::string_view(text).substr(size, count), size);
     }
+    bool const isFirstLook = size < kFirstLook && size + count >= kFirstLook;
     size += count;
+    if (isFirstLook) RefuseEndlessLine(path, std::string_view(text).substr(0, size));
   }
   if (in.bad()) Refuse(path, "cannot be read");
   text.resize(size);

@@ -5,6 +5,14 @@
 
 namespace Vorn::IO {
 
+/// No table of points has longer lines: a million columns fit. Taking a longer one apart would take
+/// many times its memory.
+inline constexpr std::size_t kLongestTableLine = std::size_t{16} << 20;
+
+/// What is said of a longer one.
+inline constexpr char const* kLineTooLong =
+    "the line is longer than 16 MiB: no points file has such lines";
+
 /// Walks over the lines of a text; a line ends with LF, CR LF or CR.
 class TextLines {
  public:

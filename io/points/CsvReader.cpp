@@ -25,9 +25,6 @@ namespace {
 constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 constexpr std::size_t kShortestLine = 4;  // 1,2 and its end
 
-/// A million columns fit; taking a longer line apart would take many times its memory.
-constexpr std::size_t kLongestLine = std::size_t{16} << 20;
-
 std::string_view TakeWord(std::string_view* text) {
   *text = Trimmed(*text);
   std::size_t const end = std::min(text->find_first_of(" \t:="), text->size());
@@ -84,9 +81,7 @@ class Parser {
   }
 
   void ParseLine(std::string_view whole) {
-    if (whole.size() > kLongestLine) {
-      place_.RefuseLine("the line is longer than 16 MiB: no points file has such lines");
-    }
+    if (whole.size() > kLongestTableLine) place_.RefuseLine(kLineTooLong);
     std::size_t const comment = FindComment(whole);
     std::string_view const line = whole.substr(0, comment);
     if (comment != std::string_view::npos && file_.points.empty()) {

@@ -85,6 +85,10 @@ class Build:
             else:
                 target = line.split(":")[0]
 
+    def source_of(self, name):
+        """The file that an object is compiled from."""
+        return self.folder / self.commands[name][-1]
+
     def object_of(self, source):
         return f"CMakeFiles/GeometryUtils.dir/{source}.o"
 

@@ -162,14 +162,19 @@ TEST_F(Program, InputsWithoutEndEndInAMessage) {
   EXPECT_EQ(endless.err, "contour: standard input: is too large: more than 512 MiB\n");
 }
 
-TEST_F(Program, AnEndlessLineIsRefusedBeforeItIsTakenApart) {
+TEST_F(Program, AnEndlessLineIsRefusedBeforeItIsRead) {
+  // The program needs some 60 MB for itself, and 64 MiB while it looks.
   ASSERT_EQ(mkfifo((folder_ / "pipe").c_str(), 0600), 0);
-  Ended const ended =
-      Run("info -",
-          "(head -c 200000000 /dev/zero | tr '\\0' 1 >pipe 2>/dev/null &);" + MemoryLimit(1000),
-          "pipe");
-  EXPECT_EQ(ended.code, 3);
-  EXPECT_NE(ended.err.find(":1: the line is longer than 16 MiB"), std::string::npos) << ended.err;
+  Ended const piped = Run(
+      "info -",
+      "(head -c 400000000 /dev/zero | tr '\\0' 1 >pipe 2>/dev/null &);" + MemoryLimit(300), "pipe");
+  Ended const filed = Run("info long.csv",
+                          "head -c 400000000 /dev/zero | tr '\\0' 1 >long.csv;" + MemoryLimit(300));
+  fs::remove(folder_ / "long.csv");
+  for (Ended const& ended : {piped, filed}) {
+    EXPECT_EQ(ended.code, 3);
+    EXPECT_NE(ended.err.find(":1: the line is longer than 16 MiB"), std::string::npos) << ended.err;
+  }
 }
 
 }  // namespace

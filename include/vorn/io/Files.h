@@ -19,7 +19,8 @@ inline constexpr char const* kStandardInput = "-";
 VORN_IO_EXPORT std::string InputName(std::string const& path);
 
 /// The whole contents of a file, read in one go; those of `in` for the path `-`.
-/// @throws Failure (FailureKind::File) naming the file when it cannot be read or is a directory.
+/// @throws Failure (FailureKind::File) naming the file when it cannot be read, is a directory, or
+///         begins with a number in a line of more than 16 MiB: of such a file 32 MiB are read.
 VORN_IO_EXPORT std::string ReadTextFile(std::string const& path, std::istream& in);
 
 /// A file that appears whole or not at all: written under another name in the same folder, forced
