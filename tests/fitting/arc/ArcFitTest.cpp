@@ -225,6 +225,19 @@ TEST(GetFittingCircleO, FixedEndsInOnePlaceHaveNoBisectorAndFail) {
   EXPECT_EQ(FitArcRun<GeometryUtils>(in).code, ErrorCode::Ok);
 }
 
+TEST(GetFittingCircleO, FixedEndsInOnePlaceFail) {
+  // The cell of the centres is there, but no bisector of the ends to move the centre to.
+  ArcFitInput in = WholeRun(MakeArcPoints({-10, 0}, 10, 0, 1.5, 6, 0.5));
+  in.startFixed = true;
+  in.endFixed = true;
+  in.start = {0, 0};
+  in.end = {0, 0};
+  ArcFitOutput const out = FitArcRun<GeometryUtils>(in);
+  EXPECT_EQ(out.code, ErrorCode::Failed);
+  EXPECT_FALSE(out.cells.empty());
+  EXPECT_EQ(Transcribe(out), Transcribe(FitArcRun<ReferenceFitting>(in)));
+}
+
 TEST(GetFittingCircleO, CellsWithoutCommonPartAreNoFit) {
   std::vector<WPoint> points = MakeArcPoints({0, 0}, 10, 0, 1.5, 9, 0.02);
   points[6].x *= 1.05;
