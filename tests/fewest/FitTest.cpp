@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 #include <limits>
+#include <numbers>
 #include <stdexcept>
 
 #include "support/Profiles.h"
@@ -98,6 +99,15 @@ TEST(FewestPieces, BadOptionsFail) {
     FewestPieces::Result result;
     EXPECT_EQ(FewestPieces::Fit(LineArcLine(), options, &result, nullptr, 100), ErrorCode::Failed);
   }
+}
+
+TEST(FewestPieces, StepsMayBeHalfATurnButNoMore) {
+  FewestPieces::Options options;
+  options.largestStep = std::numbers::pi;
+  FewestPieces::Result result;
+  EXPECT_EQ(FewestPieces::Fit(LineArcLine(), options, &result, nullptr, 100), ErrorCode::Ok);
+  options.largestStep = std::nextafter(std::numbers::pi, 4.0);
+  EXPECT_EQ(FewestPieces::Fit(LineArcLine(), options, &result, nullptr, 100), ErrorCode::Failed);
 }
 
 TEST(FewestPieces, PointsThatCoincideHaveNoFit) {
