@@ -83,6 +83,8 @@ class Fitter {
     path_.limits.segmentsOnly = true;
     if (Search(1.0, answer, report)) return true;
     *answer = FollowPoints(points_, options_.closed);
+    if (Measure(*answer, report)) return true;
+    *answer = FollowEveryPoint(points_, options_.closed);
     return Measure(*answer, report);
   }
 

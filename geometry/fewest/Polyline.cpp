@@ -15,14 +15,15 @@ constexpr double kTolerance = 1.0 - 1e-6;
 
 class Follower {
  public:
-  explicit Follower(std::vector<WPoint> const& points) : points_(points) {}
+  Follower(std::vector<WPoint> const& points, bool skipsPoints)
+      : points_(points), skipsPoints_(skipsPoints) {}
 
   /// The point at which the segment from a point ends; the number of points where there is none.
   std::int32_t FindEnd(std::int32_t from) const {
     auto const count = static_cast<std::int32_t>(points_.size());
     std::int32_t good = from + 1;
     while (good < count && !IsCovered(from, good)) ++good;
-    if (good == count) return count;
+    if (good == count || !skipsPoints_) return good;
     for (std::int32_t step = 1; step > 0;) {
       bool const isFarther = good + step < count && IsCovered(from, good + step);
       if (isFarther) good += step;
@@ -56,12 +57,10 @@ class Follower {
   }
 
   std::vector<WPoint> const& points_;
+  bool skipsPoints_;
 };
 
-}  // namespace
-
-Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed) {
-  Follower const follower(points);
+Answer Follow(Follower const& follower, std::vector<WPoint> const& points, bool isClosed) {
   auto const count = static_cast<std::int32_t>(points.size());
   Answer answer;
   answer.contour.push_back(BuildSegment({}, follower.At(0)).elem);
@@ -76,6 +75,16 @@ Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed) {
   answer.ranges.back().last = count - 1;
   if (isClosed) AppendClosingSegment(&answer);
   return answer;
+}
+
+}  // namespace
+
+Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed) {
+  return Follow(Follower(points, true), points, isClosed);
+}
+
+Answer FollowEveryPoint(std::vector<WPoint> const& points, bool isClosed) {
+  return Follow(Follower(points, false), points, isClosed);
 }
 
 }  // namespace Vorn::Fewest

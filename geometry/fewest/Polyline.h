@@ -14,4 +14,8 @@ namespace Vorn::Fewest {
 /// first point, unless the last point repeats it. Without ranges when all points are equal.
 Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed);
 
+/// The same from each point to the next that differs from it: the straight path itself, which
+/// breaks no promise (see Promise::NotCrossing).
+Answer FollowEveryPoint(std::vector<WPoint> const& points, bool isClosed);
+
 }  // namespace Vorn::Fewest

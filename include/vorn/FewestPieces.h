@@ -43,15 +43,15 @@ inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
 /// - The points come in order along their piece: none lies farther behind an earlier one than 1.65
 ///   times the sum of their tolerances, as noise in dense scans makes them.
 /// - No piece crosses itself or another one where the straight path through the points does not by
-///   more than the tolerances.
+///   more than the tolerances. Only segments from one point to the next may cross by less, as the
+///   path itself does.
 /// - No arc is a full turn: a full circle comes as two arcs.
 ///
 /// Where it falls short
 /// - An open scan of one circle t times around takes the arcs that keep every one of them below 353
-///   degrees: 3 for twice around, of which the bound, 1, takes no account. Closed scans of more
-///   than two laps, and other paths that run several times along themselves or cross themselves
-///   often, may take many more pieces than the bound, or have no answer (NoFit): no piece may cross
-///   another anywhere but where the points do.
+///   degrees: 3 for twice around, of which the bound, 1, takes no account. Paths that cross
+///   themselves at nearly every point may take many more pieces than the bound, in the worst case
+///   one for each point: no piece may cross another anywhere but where the points do.
 /// - Where largestRadius is below radii of the part, short pieces stand for its arcs; all of them
 ///   may be segments though some arcs would save a few. The bound takes no account of
 ///   largestRadius.
@@ -156,10 +156,11 @@ class VORN_EXPORT FewestPieces {
   ///             maxPercent; null for no reporting. What it throws passes through to the caller:
   ///             result is untouched and nothing is lost.
   /// @param[in]  maxPercent     the percentage to report when all is done
-  /// @return Ok; NoFit when all points coincide within their tolerances, which DoPointsCoincide
-  ///         tells apart, or no chain keeps the promises; Failed for a null result, fewer than two
-  ///         points, a coordinate that is not finite, a tolerance that is not above 0 or not
-  ///         finite, more points than an std::int32_t counts, or an option outside its range
+  /// @return Ok; NoFit when all points coincide within their tolerances, see DoPointsCoincide, and
+  ///         where the numbers have too few digits left for any answer; Failed for a null result,
+  ///         fewer than two points, a coordinate that is not finite, a tolerance that is not above
+  ///         0 or not finite, more points than an std::int32_t counts, or an option outside its
+  ///         range
   /// @throws std::bad_alloc when memory runs out; result is untouched
   /// @note Time O(n log n) on noisy profiles and arcs with effort Quick, memory O(n). The answer
   ///       depends neither on where the part lies nor on how it is turned, apart from the rounding

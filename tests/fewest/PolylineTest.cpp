@@ -1,10 +1,13 @@
+#include <cmath>
 #include <cstdint>
 #include <utility>
 #include <vector>
 
 #include "geometry/fewest/Answer.h"
 #include "geometry/fewest/Polyline.h"
+#include "geometry/fewest/promises/Promises.h"
 #include "gtest/gtest.h"
+#include "support/RandomGeometry.h"
 
 namespace Vorn::Testing {
 namespace {
@@ -48,6 +51,33 @@ TEST(FollowPoints, OfOnePlaceHasNoRange) {
   std::vector<WPoint> const points(4, WPoint{3, 4, kTolerance});
   EXPECT_TRUE(Fewest::FollowPoints(points, false).ranges.empty());
   EXPECT_TRUE(Fewest::FollowPoints(points, true).ranges.empty());
+}
+
+TEST(FollowEveryPoint, SkipsOnlyRepeatedPoints) {
+  Answer const answer = Fewest::FollowEveryPoint(Angle(), false);
+  EXPECT_EQ(EndsOf(answer), (Ends{{0, 0}, {1, 0}, {2, 0}, {2, 1}, {2, 2}}));
+  EXPECT_EQ(RangesOf(answer), (Ranges{{0, 0}, {1, 1}, {2, 2}, {3, 5}}));
+}
+
+TEST(FollowEveryPoint, BreaksNoPromiseWhateverThePoints) {
+  RandomGeometry random(6406);
+  for (int round = 0; round < 2000; ++round) {
+    SCOPED_TRACE(testing::Message() << "seed 6406, round " << round);
+    bool const isGrid = random.Flip();
+    double const w = std::exp2(random.Uniform(-20.0, 8.0));
+    std::vector<WPoint> points{{-4.0, 0.0, w}};
+    for (int i = random.Integer(1, 30); i > 0; --i) {
+      auto const p = isGrid ? random.GridPoint(3) : random.PointIn(-3.0, 3.0);
+      points.push_back({p.x, p.y, w * random.Uniform(0.1, 1.0)});
+    }
+    for (bool const isClosed : {false, true}) {
+      Answer const answer = Fewest::FollowEveryPoint(points, isClosed);
+      auto const report =
+          Promises::Measure({points, answer.contour, answer.ranges, isClosed, 0.1, 0.0});
+      EXPECT_TRUE(report.violations.empty()) << "closed " << isClosed;
+      EXPECT_EQ(report.largestRatio, 0.0);
+    }
+  }
 }
 
 TEST(AppendClosingSegment, LeavesAPieceOfOnePointAlone) {

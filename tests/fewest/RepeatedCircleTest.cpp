@@ -1,5 +1,6 @@
 #include <cmath>
 #include <cstdint>
+#include <numbers>
 
 #include "gtest/gtest.h"
 #include "support/fewest/FewestCalls.h"
@@ -59,6 +60,40 @@ TEST(FewestPiecesOfARepeatedCircle, AClosedOneOfOneLapTakesTwoArcs) {
     FewestResult const result = FitKept(CircleOf(1.0, 2000, noise), Closed());
     EXPECT_EQ(PieceCount(result), 2);
     EXPECT_TRUE(result.isFewest);
+  }
+}
+
+TEST(FewestPiecesOfARepeatedCircle, AClosedScanOfAnyLapsTakesOneArcMore) {
+  for (double const turns : {1.3, 2.3, 3.3, 5.3}) {
+    for (double const noise : {0.0, 0.45}) {
+      SCOPED_TRACE(testing::Message() << turns << " turns, noise " << noise);
+      Scan const scan = MakeRepeatedCircle(6602, turns, 5.0, 750, 0.02, noise);
+      auto const pieces = static_cast<std::int32_t>(turns) + 2;
+      EXPECT_LE(PieceCount(FitKept(scan, Closed())), pieces);
+      EXPECT_LE(PieceCount(FitKept(Reversed(scan), Closed())), pieces);
+      EXPECT_LE(PieceCount(FitKept(Rotated(scan, 0.7), Closed())), pieces);
+      EXPECT_LE(PieceCount(FitKept(Shifted(scan, 1e5, -3e5), Closed())), pieces);
+    }
+  }
+}
+
+TEST(FewestPiecesOfARepeatedCircle, LapsBetweenTwoLinesTakeOneArcMoreEach) {
+  for (double const laps : {1.0, 2.0, 3.0, 5.0, 5.25}) {
+    for (std::int32_t const count : {300, 1500}) {
+      for (double const noise : {0.0, 0.4}) {
+        SCOPED_TRACE(testing::Message()
+                     << laps << " laps, " << count << " points, noise " << noise);
+        RandomGeometry random(77);
+        double const length = 2.0 * std::numbers::pi * kRadius * laps;
+        Scan const scan = SampleWithNormalNoise(
+            &random, {{40.0, 0.0}, {length, 1.0 / kRadius}, {40.0, 0.0}}, count, 0.04, noise);
+        std::int32_t const pieces = 2 + static_cast<std::int32_t>(laps) + 1;
+        EXPECT_LE(PieceCount(FitKept(scan)), pieces);
+        EXPECT_LE(PieceCount(FitKept(Reversed(scan))), pieces);
+        EXPECT_LE(PieceCount(FitKept(Rotated(scan, 0.7))), pieces);
+        EXPECT_LE(PieceCount(FitKept(Shifted(scan, 1e5, -3e5))), pieces);
+      }
+    }
   }
 }
 

@@ -16,7 +16,19 @@ using Point = GeometryUtils::Point;
 constexpr std::int64_t kRounds = 512;
 constexpr std::int64_t kLeastBudget = 1 << 20;
 
+/// The end of a piece lies on a point when it is no farther from it than this share of its
+/// tolerance: moving the points near the origin and back rounds.
+constexpr double kOnPoint = 1e-6;
+
+/// So many edges either way are looked at first where strands may run beside each other for long.
+constexpr std::int64_t kFirstReach = 4;
+
+/// A loop of the path is more than a knot of noise when one of its points is farther from the
+/// crossing than this many times its tolerance.
+constexpr double kLeavesPlace = 2.0;
+
 Point At(WPoint const& p) { return {p.x, p.y}; }
+bool AreEqual(WPoint const& p, WPoint const& q) { return p.x == q.x && p.y == q.y; }
 
 struct Bounds {
   double xLow = std::numeric_limits<double>::infinity();
@@ -62,12 +74,74 @@ bool OwnPath::IsWhereThePathCloses(Point const& p) const {
 }
 
 bool OwnPath::Crosses(std::size_t first, std::size_t second, Meeting const& meeting) {
-  if (IsWhereThePathCloses(meeting.at)) return true;
+  if (IsWhereThePathCloses(meeting.at) || (IsEdge(first) && IsEdge(second))) return true;
   Passage const ofFirst = Follow(first, meeting.alongFirst, second);
-  if (ofFirst.IsJoined() || ofFirst.StaysOnOneSide()) return false;
+  if (ofFirst.StaysOnOneSide()) return false;
   Passage const ofSecond = Follow(second, meeting.alongSecond, first);
-  if (ofSecond.IsJoined() || ofSecond.StaysOnOneSide()) return false;
-  return DoMeet(ofFirst.first, ofFirst.last, ofSecond.first, ofSecond.last);
+  if (ofSecond.StaysOnOneSide()) return false;
+  if (!ofFirst.IsJoined() && !ofSecond.IsJoined()) {
+    return DoMeet({ofFirst.first, ofFirst.last}, {ofSecond.first, ofSecond.last});
+  }
+  bool const isAhead = ofFirst.after == Side::Joined || ofSecond.before == Side::Joined;
+  bool const isBehind = ofFirst.before == Side::Joined || ofSecond.after == Side::Joined;
+  return (isAhead && HasLoop(ofFirst, ofSecond, meeting.at)) ||
+         (isBehind && HasLoop(ofSecond, ofFirst, meeting.at));
+}
+
+bool OwnPath::IsEdge(std::size_t piece) const {
+  DrawnPiece const drawn = coverage_.Drawn(piece);
+  if (drawn.isArc || drawn.length == 0.0) return false;
+  auto const isAt = [this](std::size_t number, Point const& end) {
+    WPoint const& p = coverage_.PointOf(number);
+    return std::hypot(p.x - end.x, p.y - end.y) <= kOnPoint * p.w;
+  };
+  NumberRange const& range = coverage_.RangeOf(piece);
+  std::size_t next = range.first;
+  while (next <= range.last && isAt(next, drawn.start)) ++next;
+  if (next == range.first) return false;
+  // The points behind those at the start are at the end, or the end is the first point behind.
+  while (next <= range.last && isAt(next, drawn.end)) ++next;
+  bool const endsPath = !coverage_.IsClosed() && coverage_.Next(piece) == kNone;
+  return next > range.last && (isAt(range.last, drawn.end) || (!endsPath && isAt(next, drawn.end)));
+}
+
+bool OwnPath::HasLoop(Passage const& out, Passage const& back, Point const& at) {
+  auto const size = static_cast<std::int64_t>(coverage_.GetChain().points.size());
+  // The running number at which the strand comes back, not before that at which it goes out.
+  std::int64_t const length = ((back.beyond - out.beyond) % size + size) % size;
+  std::int64_t const shift = out.beyond + length - back.beyond;
+  budget_ -= length;
+  if (budget_ < 0) return false;
+  std::int64_t tip = out.beyond;
+  double farthest = 0.0;
+  for (std::int64_t number = out.beyond; number < out.beyond + length; ++number) {
+    WPoint const& p = PointOf(number);
+    double const ratio = std::hypot(p.x - at.x, p.y - at.y) / p.w;
+    if (ratio > farthest) {
+      farthest = ratio;
+      tip = number;
+    }
+  }
+  if (farthest <= kLeavesPlace) return false;
+  // Short of a whole round on a closed contour, so that no edge is met twice.
+  std::int64_t const reach = coverage_.IsClosed() ? (size - 1 - length) / 2 : size;
+  std::int64_t const first = std::max(out.first, out.beyond - reach);
+  std::int64_t const last = std::min(back.last, back.beyond + reach) + shift;
+  return DoMeetNear({first, tip}, out.beyond, {tip, last}, back.beyond + shift);
+}
+
+bool OwnPath::DoMeetNear(Run const& mine, std::int64_t near, Run const& other,
+                         std::int64_t otherNear) {
+  auto const isWhole = [](Run const& part, Run const& run) {
+    return part.first == run.first && part.last == run.last;
+  };
+  for (std::int64_t reach = kFirstReach;; reach *= 4) {
+    Run const part{std::max(mine.first, near - reach), std::min(mine.last, near + reach)};
+    Run const otherPart{std::max(other.first, otherNear - reach),
+                        std::min(other.last, otherNear + reach)};
+    if (DoMeet(part, otherPart)) return true;
+    if (budget_ < 0 || (isWhole(part, mine) && isWhole(otherPart, other))) return false;
+  }
 }
 
 OwnPath::Passage OwnPath::Follow(std::size_t piece, double along, std::size_t other) {
@@ -76,8 +150,8 @@ OwnPath::Passage OwnPath::Follow(std::size_t piece, double along, std::size_t ot
   Strand back{beyond, -1, piece, other, drawnOther};
   Strand forth{beyond - 1, 1, piece, other, drawnOther};
   Side const before = FollowOneWay(&back);
-  Side const after = before == Side::Joined ? Side::Joined : FollowOneWay(&forth);
-  return {back.number, forth.number, before, after};
+  Side const after = FollowOneWay(&forth);
+  return {beyond, back.number, forth.number, before, after};
 }
 
 std::int64_t OwnPath::FirstNumberBeyond(std::size_t piece, double along) const {
@@ -162,27 +236,26 @@ WPoint const& OwnPath::PointOf(std::int64_t number) const {
   return coverage_.GetChain().points[static_cast<std::size_t>((number % size + size) % size)];
 }
 
-bool OwnPath::DoMeet(std::int64_t first, std::int64_t last, std::int64_t otherFirst,
-                     std::int64_t otherLast) {
-  budget_ -= last - first + otherLast - otherFirst;
-  if (budget_ < 0 || first >= last || otherFirst >= otherLast) return false;
-  Bounds mine;
-  Bounds theirs;
-  for (std::int64_t i = first; i <= last; ++i) mine.Include(PointOf(i));
-  for (std::int64_t k = otherFirst; k <= otherLast; ++k) theirs.Include(PointOf(k));
-  if (mine.IsApartFrom(theirs)) return false;
-  bool const isMineLonger = last - first >= otherLast - otherFirst;
-  if ((isMineLonger ? last - first : otherLast - otherFirst) == 1) {
-    return DoEdgesMeet(At(PointOf(first)), At(PointOf(last)), At(PointOf(otherFirst)),
-                       At(PointOf(otherLast)));
+bool OwnPath::DoMeet(Run const& mine, Run const& other) {
+  budget_ -= mine.Size() + other.Size();
+  if (budget_ < 0 || mine.Size() <= 0 || other.Size() <= 0) return false;
+  auto const boundsOf = [this](Run const& run) {
+    Bounds bounds;
+    for (std::int64_t i = run.first; i <= run.last; ++i) bounds.Include(PointOf(i));
+    return bounds;
+  };
+  if (boundsOf(mine).IsApartFrom(boundsOf(other))) return false;
+  bool const isMineLonger = mine.Size() >= other.Size();
+  Run const& longer = isMineLonger ? mine : other;
+  if (longer.Size() == 1) {
+    return !AreEqual(PointOf(mine.last), PointOf(other.first)) &&
+           !AreEqual(PointOf(other.last), PointOf(mine.first)) &&
+           DoEdgesMeet(At(PointOf(mine.first)), At(PointOf(mine.last)), At(PointOf(other.first)),
+                       At(PointOf(other.last)));
   }
-  if (isMineLonger) {
-    std::int64_t const middle = first + (last - first) / 2;
-    return DoMeet(first, middle, otherFirst, otherLast) ||
-           DoMeet(middle, last, otherFirst, otherLast);
-  }
-  std::int64_t const middle = otherFirst + (otherLast - otherFirst) / 2;
-  return DoMeet(first, last, otherFirst, middle) || DoMeet(first, last, middle, otherLast);
+  std::int64_t const middle = longer.first + longer.Size() / 2;
+  Run const& shorter = isMineLonger ? other : mine;
+  return DoMeet({longer.first, middle}, shorter) || DoMeet({middle, longer.last}, shorter);
 }
 
 }  // namespace Vorn::Promises

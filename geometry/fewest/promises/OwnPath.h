@@ -35,6 +35,7 @@ class OwnPath {
 
   /// The points of a strand up to where it comes apart from the other, and the sides there.
   struct Passage {
+    std::int64_t beyond;  ///< the first point behind the meeting
     std::int64_t first;
     std::int64_t last;
     Side before;
@@ -48,9 +49,23 @@ class OwnPath {
     }
   };
 
+  /// Consecutive points by running number, both ends included.
+  struct Run {
+    std::int64_t first;
+    std::int64_t last;
+
+    /// The number of edges; below 1 there are none.
+    std::int64_t Size() const { return last - first; }
+  };
+
   /// Whether the first and the last point of an open path, but not all of its points, lie within
   /// their tolerances of p.
   bool IsWhereThePathCloses(GeometryUtils::Point const& p) const;
+  /// Whether a piece is an edge of the path: the segment from one point to the next one.
+  bool IsEdge(std::size_t piece) const;
+  /// Whether the path goes out from a meeting and comes back, leaves the place in between, and
+  /// meets itself on the way.
+  bool HasLoop(Passage const& out, Passage const& back, GeometryUtils::Point const& at);
   /// Follows the strand of a piece both ways from a length along it, beside that of the other
   /// piece.
   Passage Follow(std::size_t piece, double along, std::size_t other);
@@ -70,10 +85,12 @@ class OwnPath {
   /// bisection: points are in order but for their noise, which the search around the place takes
   /// in.
   std::int64_t FirstNumberBeyond(std::size_t piece, double along) const;
-  /// Whether the straight lines through two runs of points meet. The longer run is halved until few
-  /// edges are left or the runs have no room in common.
-  bool DoMeet(std::int64_t first, std::int64_t last, std::int64_t otherFirst,
-              std::int64_t otherLast);
+  /// Whether the straight lines through two runs of points meet, other than in a point at which one
+  /// ends and the other goes on. The longer run is halved until few edges are left or the runs have
+  /// no room in common.
+  bool DoMeet(Run const& mine, Run const& other);
+  /// The same, looked for near a point of each run first.
+  bool DoMeetNear(Run const& mine, std::int64_t near, Run const& other, std::int64_t otherNear);
   /// The point of a running number, which may go below zero and above the size.
   WPoint const& PointOf(std::int64_t number) const;
 

@@ -59,11 +59,17 @@ enum class Promise {
   /// - when they come apart on opposite sides, or
   /// - when the path ends before they come apart, and the straight lines through the points of the
   ///   two strands meet, or
+  /// - when the strands run into each other, as at a loop beside a joint, but the path has that
+  ///   loop: the straight lines through the points meet on the way out and back, and a point in
+  ///   between is farther from X than twice its tolerance, or
+  /// - when both pieces are segments from one point of the path to the next: the segments from
+  ///   point to point break no promise, whatever the points, so that a contour can always be given,
+  ///   or
   /// - when an open path begins and ends there: X is within tolerance of its first and last point,
   ///   though not of all points.
-  /// It is not when they come apart on one side, or never do before the strands run into each
-  /// other, as at a loop beside a joint. Pieces that fold back on each other without passing to the
-  /// other side do not cross. Pieces that are nearer than rounding count as touching.
+  /// It is not when they come apart on one side, or run into each other where all points of the
+  /// loop are beside X. Pieces that fold back on each other without passing to the other side do
+  /// not cross. Pieces that are nearer than rounding count as touching.
   NotCrossing,
 };
 

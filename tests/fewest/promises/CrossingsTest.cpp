@@ -226,6 +226,32 @@ TEST(CheckCrossings, ALoopOfTwoArcsBesideTheirJointIsReported) {
   EXPECT_EQ(CrossingsOf(c), Pair(0, 1));
 }
 
+TEST(CheckCrossings, ALoopOfThePathIsNoneOfThePiecesUnlessTolerancesHideIt) {
+  // The path passes (7, 0) on the way to (10, 0) and again on the way back from (9, 1). The pieces
+  // lie a little beside it. Seen from the last of them (10, 0) lies behind its start, so that the
+  // strands run into each other.
+  std::vector<Point> const corners{{0, 0}, {10, 0}, {9, 1}, {3, -2}};
+  for (int const count : {1, 3, 20}) {
+    SCOPED_TRACE(testing::Message() << count << " points a side");
+    Case c = AlongCorners(corners, count, 0.1);
+    for (Elem& elem : c.contour) elem.end.y += 0.01;
+    EXPECT_TRUE(CrossingsOf(c).empty());
+    for (WPoint& p : c.points) p.w = 3.0;
+    EXPECT_EQ(CrossingsOf(c), Pair(0, 2));
+  }
+}
+
+TEST(CheckCrossings, SegmentsFromPointToPointMayCrossWhereThePathDoes) {
+  // All within tolerance: only the segments of the path itself are taken for what they are.
+  Case c = AlongCorners({{0, 0}, {10, 0}, {9, 1}, {3, -2}}, 1, 100.0);
+  EXPECT_TRUE(CrossingsOf(c).empty());
+  c.points[1].y += 0.01;
+  EXPECT_EQ(CrossingsOf(c), Pair(0, 2));
+  c.points[1].y -= 0.01;
+  c.contour[2].end.x -= 0.01;
+  EXPECT_EQ(CrossingsOf(c), Pair(0, 2));
+}
+
 TEST(CheckCrossings, TangentNeighboursDoNotCross) {
   Case c;
   c.points = Points({{0, 0}, {4, 0}, {9, 5}, {9, 7}, {11, 9}}, 0.5);

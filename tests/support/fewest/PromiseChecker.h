@@ -5,6 +5,7 @@
 #include <cstddef>
 #include <cstdint>
 #include <limits>
+#include <set>
 #include <sstream>
 #include <string>
 #include <tuple>
@@ -337,7 +338,7 @@ class Run {
       if (along <= rounding || along >= pieces_[k].Length() - rounding) return;
     }
     if (AreNeighbours(a, b) && IsAtJoint(a, b, x)) return;
-    if (IsAtBothEnds(x)) return;
+    if (IsAtBothEnds(x) || (IsEdgeOfPath(a) && IsEdgeOfPath(b))) return;
     if (!PathCrossesNear(a, b, x)) {
       Complain("pieces ", a, " and ", b, " cross at (", x.x, ", ", x.y, ")");
     }
@@ -355,38 +356,106 @@ class Run {
 
   bool IsWithin(std::size_t i, Vec x) const { return Norm(PointAt(i) - x) <= ToleranceAt(i); }
 
-  /// Does an edge of one strand meet an edge of the other near x? From x on, edges count for as
-  /// long as the strand stays within four tolerances of the other piece.
+  using Edges = std::pair<std::size_t, std::size_t>;
+
+  /// Whether a piece is the segment from a point to the next one.
+  bool IsEdgeOfPath(std::size_t k) const {
+    if (pieces_[k].isArc) return false;
+    auto const isAt = [&](std::size_t i, Vec end) {
+      return Norm(PointAt(i) - end) <= 1e-6L * ToleranceAt(i);
+    };
+    auto const [first, last] = spans_[k];
+    std::size_t i = first;
+    while (i <= last && isAt(i, pieces_[k].start)) ++i;
+    std::size_t const passed = i;
+    while (i <= last && isAt(i, pieces_[k].end)) ++i;
+    bool const isThere = passed <= last || chain_.isClosed || k + 1 < pieces_.size();
+    return passed > first && i > last && isThere && isAt(passed, pieces_[k].end);
+  }
+
+  /// Does an edge of the path meet another one near x? Pairs of edges are looked at from those that
+  /// pass x on, one edge farther at a time, for as long as the two are near each other.
   bool PathCrossesNear(std::size_t a, std::size_t b, Vec x) const {
-    auto const first = EdgesNear(a, b, x);
-    auto const second = EdgesNear(b, a, x);
-    for (std::size_t const i : first) {
-      for (std::size_t const j : second) {
-        if (i + 1 < j && DoEdgesMeet(i, j) && LeavesBetween(i, j, x)) return true;
-        if (j + 1 < i && DoEdgesMeet(j, i) && LeavesBetween(j, i, x)) return true;
-      }
+    std::set<Edges> seen;
+    std::vector<Edges> open;
+    auto const add = [&](std::size_t i, std::size_t j) {
+      if (i > j) std::swap(i, j);
+      if (i + 1 < j && seen.insert({i, j}).second) open.emplace_back(i, j);
+    };
+    for (std::size_t const i : EdgesAt(a, x)) {
+      for (std::size_t const j : EdgesAt(b, x)) add(i, j);
+    }
+    std::size_t const starts = open.size();
+    for (std::size_t next = 0; next < open.size(); ++next) {
+      auto const [i, j] = open[next];
+      bool const isLoop = LeavesBetween(i, j);
+      if (isLoop && DoEdgesMeet(i, j)) return true;
+      if (next >= starts && !(isLoop && AreNear(i, j))) continue;
+      for (std::size_t const k : NeighboursOf(i)) add(k, j);
+      for (std::size_t const k : NeighboursOf(j)) add(i, k);
     }
     return false;
   }
 
-  /// The edges from the one of piece k that passes x on, in both directions; of an open path into
-  /// the neighbouring pieces where need be.
-  std::vector<std::size_t> EdgesNear(std::size_t k, std::size_t other, Vec x) const {
+  std::size_t EdgeCount() const { return chain_.isClosed ? Count() : Count() - 1; }
+
+  /// The edge before and behind, by the number of its first point.
+  std::vector<std::size_t> NeighboursOf(std::size_t i) const {
+    std::size_t const count = EdgeCount();
+    if (chain_.isClosed) return {(i + 1) % count, (i + count - 1) % count};
+    std::vector<std::size_t> neighbours;
+    if (i > 0) neighbours.push_back(i - 1);
+    if (i + 1 < count) neighbours.push_back(i + 1);
+    return neighbours;
+  }
+
+  /// The edge of piece k that passes x, and its neighbours.
+  std::vector<std::size_t> EdgesAt(std::size_t k, Vec x) const {
     auto const [first, last] = spans_[k];
-    std::size_t const begin = first == 0 ? 0 : first - 1;
-    std::size_t const end = chain_.isClosed ? last + 1 : std::min(last + 1, Count() - 1);
     Real const place = pieces_[k].Along(x);
-    std::size_t middle = begin;
-    while (middle + 1 < end && pieces_[k].Along(PointAt(middle + 1)) < place) ++middle;
-    auto const isBeside = [&](std::size_t i) {
-      return pieces_[other].Distance(PointAt(i)) <= 4 * ToleranceAt(i);
-    };
-    std::vector<std::size_t> edges{middle};
-    std::size_t const lowest = chain_.isClosed ? begin : 0;
-    std::size_t const highest = chain_.isClosed ? end : Count() - 1;
-    for (std::size_t i = middle; i > lowest && isBeside(i); --i) edges.push_back(i - 1);
-    for (std::size_t i = middle + 1; i < highest && isBeside(i); ++i) edges.push_back(i);
+    std::size_t behind = first;
+    while (behind <= last && pieces_[k].Along(PointAt(behind)) < place) ++behind;
+    std::size_t const count = EdgeCount();
+    std::size_t const edge = chain_.isClosed
+                                 ? (behind + count - 1) % count
+                                 : std::min(behind - std::min<std::size_t>(behind, 1), count - 1);
+    std::vector<std::size_t> edges = NeighboursOf(edge);
+    edges.push_back(edge);
     return edges;
+  }
+
+  struct Approach {
+    Vec at;
+    Real distance = std::numeric_limits<Real>::infinity();
+  };
+
+  /// Where two edges meet or come nearest to each other.
+  Approach NearestOf(std::size_t i, std::size_t j) const {
+    Vec const u = PointAt(i + 1) - PointAt(i);
+    Vec const v = PointAt(j + 1) - PointAt(j);
+    Real const det = Cross(u, v);
+    if (det != 0 && DoEdgesMeet(i, j)) {
+      return {PointAt(i) + (Cross(PointAt(j) - PointAt(i), v) / det) * u, 0};
+    }
+    Approach nearest;
+    auto const take = [&](std::size_t point, std::size_t edge, Vec direction) {
+      Vec const p = PointAt(point);
+      Real const length2 = Dot(direction, direction);
+      Real const share = length2 == 0 ? 0 : Dot(p - PointAt(edge), direction) / length2;
+      Vec const foot = PointAt(edge) + std::clamp(share, Real{0}, Real{1}) * direction;
+      if (Norm(p - foot) < nearest.distance) nearest = {Real{0.5} * (p + foot), Norm(p - foot)};
+    };
+    take(i, j, v);
+    take(i + 1, j, v);
+    take(j, i, u);
+    take(j + 1, i, u);
+    return nearest;
+  }
+
+  /// Whether two edges are no farther apart than four of their tolerances.
+  bool AreNear(std::size_t i, std::size_t j) const {
+    return NearestOf(i, j).distance <= 4 * std::max(std::max(ToleranceAt(i), ToleranceAt(i + 1)),
+                                                    std::max(ToleranceAt(j), ToleranceAt(j + 1)));
   }
 
   bool DoEdgesMeet(std::size_t i, std::size_t j) const {
@@ -405,10 +474,15 @@ class Run {
            side(a, b, c) * side(a, b, d) <= 0 && side(c, d, a) * side(c, d, b) <= 0;
   }
 
-  /// A knot of noise is no crossing: the path has to leave the place before it comes back.
-  bool LeavesBetween(std::size_t i, std::size_t j, Vec x) const {
-    for (std::size_t k = i + 1; k <= j; ++k) {
-      if (Norm(PointAt(k) - x) > 2 * ToleranceAt(k)) return true;
+  /// A knot of noise is no crossing: the path has to leave the place where edges i and j meet
+  /// before it comes back, on a closed contour whichever way around.
+  bool LeavesBetween(std::size_t i, std::size_t j) const {
+    Vec const at = NearestOf(i, j).at;
+    return Leaves(at, i + 1, j) && (!chain_.isClosed || Leaves(at, j + 1, i + Count()));
+  }
+  bool Leaves(Vec at, std::size_t first, std::size_t last) const {
+    for (std::size_t k = first; k <= last; ++k) {
+      if (Norm(PointAt(k) - at) > ToleranceAt(k)) return true;
     }
     return false;
   }
