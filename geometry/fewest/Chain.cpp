@@ -93,7 +93,14 @@ class ChainSearch {
     std::int32_t const quarter = std::max(1, stride / 4);
     std::int32_t back = 0;
     while (farthest - back >= half) {
-      AddGates(level, farthest - back, &next);
+      std::int32_t const split = farthest - back;
+      bool const isWide = IsWideGap(split);
+      // Gates at points are enough so near to the others: more hardly ever save a piece.
+      bool const areOthersNear = back == 2 * stride || back == 3 * stride;
+      if (!isWide || !areOthersNear) AddGates(level, split, &next);
+      if (isWide) AddPointGate(level, split, split - 1, &next);
+      // Pieces that reach one point less far end beside the last point of the farthest too.
+      if (isWide && back == stride) AddPointGate(level, split, split, &next);
       if (back < stride) {
         back = std::min(back + quarter, stride);
       } else {
@@ -111,26 +118,31 @@ class ChainSearch {
     State const* from = BestFor(level, split);
     if (from == nullptr) return;
     if (!isCorner) AddState(level, MiddleGate(path_, split, from->reach.circle), next);
-    WPoint const& last = path_.At(split - 1);
-    WPoint const& first = path_.At(split);
-    bool const isWide = DistanceBetween(last, first) > kWideGap * (last.w + first.w);
-    if (next->size() == before || isCorner || isWide) AddPointGates(level, split, next);
+    bool const isPointMissing = (next->size() == before || isCorner) && !IsWideGap(split);
+    if (isPointMissing) AddPointGate(level, split, split - 1, next);
   }
 
-  /// Gates at the points beside a gap, square to the piece before and to the path behind.
-  void AddPointGates(Level const& level, std::int32_t split, Level* next) {
+  bool IsWideGap(std::int32_t split) const {
+    WPoint const& last = path_.At(split - 1);
+    WPoint const& first = path_.At(split);
+    return DistanceBetween(last, first) > kWideGap * (last.w + first.w);
+  }
+
+  /// The gate at one of the points beside a gap, square to the piece before and to the path behind.
+  /// A joint on it is within tolerance of the point, so that it matters little to which of the two
+  /// pieces the point belongs: mostly the one before the gap is enough, the other one has its turn
+  /// at the next split.
+  void AddPointGate(Level const& level, std::int32_t split, std::int32_t point, Level* next) {
     State const* from = BestFor(level, split);
     if (from == nullptr) return;
-    for (std::int32_t point = split - 1; point <= split; ++point) {
-      WPoint const& at = path_.At(point);
-      Place const place{at.x, at.y};
-      Place const out = LeftNormal(at, path_.At(std::min(point + 1, path_.Count() - 1)));
-      Gate gate = BisectorGate(place, GradientAt(from->reach.circle, place), out);
-      gate.split = split;
-      gate.least = -at.w;
-      gate.greatest = at.w;
-      AddState(level, gate, next);
-    }
+    WPoint const& at = path_.At(point);
+    Place const place{at.x, at.y};
+    Place const out = LeftNormal(at, path_.At(std::min(point + 1, path_.Count() - 1)));
+    Gate gate = BisectorGate(place, GradientAt(from->reach.circle, place), out);
+    gate.split = split;
+    gate.least = -at.w;
+    gate.greatest = at.w;
+    AddState(level, gate, next);
   }
 
   bool MakeCornerGate(Level const& level, std::int32_t split, Gate* gate) {

@@ -9,8 +9,10 @@ namespace {
 using Lanes [[gnu::vector_size(16)]] = double;
 using Bits [[gnu::vector_size(16)]] = std::int64_t;
 
-/// Rows looked at together before the largest is compared with the largest so far.
+/// Rows looked at together before the largest is compared with the largest so far, and as many of
+/// the rest. A comparison for each row would cost most of the time: its outcome is hard to foresee.
 constexpr std::int32_t kBlock = 16;
+constexpr std::int32_t kSmallBlock = 4;
 
 Lanes Load(double const* p) { return Lanes{p[0], p[1]}; }
 
@@ -61,10 +63,16 @@ class Residuals {
     return even[0] > even[1] ? even[0] : even[1];
   }
 
-  /// The first row of the block from i on that is not below its largest; the last row of the block
+  /// The largest of the kSmallBlock rows from i on.
+  double LargestOfSmallBlock(std::int32_t i) const {
+    Lanes const largest = Larger(PairAt(i + 2), PairAt(i));
+    return largest[0] > largest[1] ? largest[0] : largest[1];
+  }
+
+  /// The first row of a block from i on that is not below its largest; the last row of the block
   /// where none is.
-  std::int32_t FirstInBlock(std::int32_t i, double largest) const {
-    std::int32_t const last = i + kBlock - 1;
+  std::int32_t FirstInBlock(std::int32_t i, std::int32_t size, double largest) const {
+    std::int32_t const last = i + size - 1;
     while (At(i) < largest && i < last) ++i;
     return i;
   }
@@ -106,23 +114,20 @@ Columns::Worst Columns::FindWorst(std::int32_t first, std::int32_t last,
                                   Circle const& circle) const {
   Residuals const residuals({a_.data(), bx_.data(), by_.data(), d_.data()}, circle);
   Worst worst;
-  bool isBlock = false;
+  std::int32_t blockOfWorst = 1;
+  auto const offer = [&](std::int32_t i, std::int32_t size, double largest) {
+    if (!(largest > worst.value || worst.index < 0)) return;
+    worst = {i, largest};
+    blockOfWorst = size;
+  };
   std::int32_t i = first;
-  for (; i + kBlock <= last; i += kBlock) {
-    double const largest = residuals.LargestOfBlock(i);
-    if (largest > worst.value || worst.index < 0) {
-      worst = {i, largest};
-      isBlock = true;
-    }
+  for (; i + kBlock <= last; i += kBlock) offer(i, kBlock, residuals.LargestOfBlock(i));
+  for (; i + kSmallBlock <= last; i += kSmallBlock) {
+    offer(i, kSmallBlock, residuals.LargestOfSmallBlock(i));
   }
-  for (; i < last; ++i) {
-    double const value = residuals.At(i);
-    if (value > worst.value || worst.index < 0) {
-      worst = {i, value};
-      isBlock = false;
-    }
-  }
-  if (isBlock) worst.index = residuals.FirstInBlock(worst.index, worst.value);
+  for (; i < last; ++i) offer(i, 1, residuals.At(i));
+  if (worst.index >= 0)
+    worst.index = residuals.FirstInBlock(worst.index, blockOfWorst, worst.value);
   return worst;
 }
 

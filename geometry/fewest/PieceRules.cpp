@@ -129,11 +129,8 @@ bool PieceRules::IsFullTurn(Circle const& circle, Ends const& ends, std::int32_t
   return turn.Angle() > 2.0 * std::numbers::pi + room;
 }
 
-PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const& opening,
-                                             std::int32_t point) const {
-  std::optional<JointView> const found = ViewJoint(circle, opening, point);
-  if (!found) return Check::Hopeless;
-  JointView const& view = *found;
+PieceRules::Check PieceRules::AddBrokenView(Circle const& circle, Joint const& joint,
+                                            JointView const& view) const {
   if (view.isNextToGate) {
     double const near2 = SquaredGradient(circle, view.point);
     if (IsLargeStep(circle, view.gap2, near2, view.tolerance)) return AddStep(view.gap2, near2);
@@ -146,34 +143,40 @@ PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const
       view.gap2 <= room * room * (1.0 + kRoundingRoom)) {
     return Check::Holds;
   }
-  if (!view.isFixed) return AddOffsetLimit(circle, view);
+  if (!joint.isFixed) return AddOffsetLimit(circle, joint, view);
   Condition const condition{Negated(advance), Condition::Kind::HalfSpace, 0.0};
   return programme_->Add(condition) ? Check::Added : Check::Hopeless;
 }
 
-std::optional<PieceRules::JointView> PieceRules::ViewJoint(Circle const& circle,
-                                                           Opening const& opening,
-                                                           std::int32_t point) const {
+std::optional<PieceRules::Joint> PieceRules::FindJoint(Circle const& circle,
+                                                       Opening const& opening) const {
+  Joint joint;
+  joint.gate = opening.gate;
+  joint.gate.origin = frame_.ToLocal(opening.gate.origin);
+  joint.isFixed = opening.low == opening.high;
+  joint.offset = opening.low * frame_.scale;
+  if (!joint.isFixed && !FindCrossing(circle, joint.gate, &joint.offset)) return {};
+  joint.place = PlaceOn(joint.gate, joint.offset);
+  return joint;
+}
+
+PieceRules::JointView PieceRules::ViewJoint(Joint const& joint, std::int32_t point) const {
   Sample const sample = frame_.ToLocal(path_.At(point));
+  std::int32_t const split = joint.gate.split;
   JointView view;
   view.point = PlaceOf(sample);
   view.tolerance = sample.w;
-  view.gate = opening.gate;
-  view.gate.origin = frame_.ToLocal(opening.gate.origin);
-  view.sense = point >= view.gate.split ? 1.0 : -1.0;
-  view.isNextToGate = point == (view.sense > 0.0 ? view.gate.split : view.gate.split - 1);
-  view.isFixed = opening.low == opening.high;
-  view.offset = opening.low * frame_.scale;
-  if (!view.isFixed && !FindCrossing(circle, view.gate, &view.offset)) return {};
-  Place const joint = PlaceOn(view.gate, view.offset);
-  view.dx = view.point.x - joint.x;
-  view.dy = view.point.y - joint.y;
+  view.sense = point >= split ? 1.0 : -1.0;
+  view.isNextToGate = point == (view.sense > 0.0 ? split : split - 1);
+  view.dx = view.point.x - joint.place.x;
+  view.dy = view.point.y - joint.place.y;
   view.gap2 = view.dx * view.dx + view.dy * view.dy;
   return view;
 }
 
-PieceRules::Check PieceRules::AddOffsetLimit(Circle const& circle, JointView const& view) const {
-  Gate const& gate = view.gate;
+PieceRules::Check PieceRules::AddOffsetLimit(Circle const& circle, Joint const& joint,
+                                             JointView const& view) const {
+  Gate const& gate = joint.gate;
   Place const normal = GradientAt(circle, view.point);
   double const room = share_ * view.tolerance;
   double const fromOriginX = view.point.x - gate.origin.x;
@@ -185,7 +188,7 @@ PieceRules::Check PieceRules::AddOffsetLimit(Circle const& circle, JointView con
   double const half = reach > 0.0 ? std::sqrt(reach) : -1.0;
   bool const hasLimit = std::fabs(slope) > kLeastSlope;
   double limit = hasLimit ? (normal.y * fromOriginX - normal.x * fromOriginY) / slope : foot;
-  bool const isUpper = view.offset > limit;
+  bool const isUpper = joint.offset > limit;
   if (std::fabs(limit - foot) <= half) {
     limit = isUpper ? foot + half : foot - half;
   } else if (!hasLimit) {
@@ -197,6 +200,19 @@ PieceRules::Check PieceRules::AddOffsetLimit(Circle const& circle, JointView con
   return programme_->Add(condition) ? Check::Added : Check::Hopeless;
 }
 
+PieceRules::Check PieceRules::AddBrokenJoint(Circle const& circle, Opening const& opening,
+                                             std::int32_t first, std::int32_t last) const {
+  std::optional<Joint> const joint = FindJoint(circle, opening);
+  if (!joint) return Check::Hopeless;
+  bool const isStart = first >= joint->gate.split;
+  for (std::int32_t k = 0; k < last - first; ++k) {
+    std::int32_t const point = isStart ? first + k : last - 1 - k;
+    Check const check = AddBrokenView(circle, *joint, ViewJoint(*joint, point));
+    if (check != Check::Holds) return check;
+  }
+  return Check::Holds;
+}
+
 PieceRules::Check PieceRules::AddBroken(Circle const& circle, Ends const& ends) const {
   if (ends.first >= ends.end) return Check::Holds;
   Check const order = AddBrokenOrder(circle, ends);
@@ -204,19 +220,13 @@ PieceRules::Check PieceRules::AddBroken(Circle const& circle, Ends const& ends) 
   if (!ends.from->isFree) {
     std::int32_t const last =
         std::min(ends.end, ends.first + kPointsNearJoint * StrideFrom(path_, ends.first));
-    for (std::int32_t i = ends.first; i < last; ++i) {
-      Check const start = AddBrokenJoint(circle, *ends.from, i);
-      if (start != Check::Holds) return start;
-    }
+    Check const start = AddBrokenJoint(circle, *ends.from, ends.first, last);
+    if (start != Check::Holds) return start;
   }
   if (ends.to == nullptr || ends.to->isFree) return Check::Holds;
   std::int32_t const stride = StrideFrom(path_, std::max(ends.first, ends.end - kPointsNearJoint));
-  std::int32_t const last = std::max(ends.first, ends.end - kPointsNearJoint * stride);
-  for (std::int32_t i = ends.end; i-- > last;) {
-    Check const end = AddBrokenJoint(circle, *ends.to, i);
-    if (end != Check::Holds) return end;
-  }
-  return Check::Holds;
+  std::int32_t const first = std::max(ends.first, ends.end - kPointsNearJoint * stride);
+  return AddBrokenJoint(circle, *ends.to, first, ends.end);
 }
 
 }  // namespace Vorn::Fewest

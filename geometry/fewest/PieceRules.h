@@ -45,15 +45,20 @@ class PieceRules {
   Check AddBroken(Circle const& circle, Ends const& ends) const;
 
  private:
-  /// A point near a gate of the piece, and the joint on that gate, in local coordinates.
+  /// A joint on a gate of the piece, in local coordinates.
+  struct Joint {
+    Gate gate;
+    bool isFixed = false;  ///< whether the gate leaves the joint one place
+    double offset = 0.0;   ///< on the gate
+    Place place;
+  };
+
+  /// A point near a joint.
   struct JointView {
     Place point;
-    double tolerance = 0.0;  ///< of the point
-    Gate gate;
+    double tolerance = 0.0;     ///< of the point
     double sense = 1.0;         ///< 1 where the point follows the gate, -1 where it precedes it
     bool isNextToGate = false;  ///< whether no other point lies between
-    bool isFixed = false;       ///< whether the gate leaves the joint one place
-    double offset = 0.0;        ///< of the joint on the gate
     double dx = 0.0;            ///< from the joint to the point
     double dy = 0.0;
     double gap2 = 0.0;  ///< the square of that distance
@@ -76,15 +81,20 @@ class PieceRules {
   /// Whether the points and joints of the piece turn about the centre by more than 2 pi. Looks at
   /// one point of so many, and at the last.
   bool IsFullTurn(Circle const& circle, Ends const& ends, std::int32_t stride) const;
-  /// The rules between a joint and one of the points next to it: the step between the two, and that
-  /// the point does not lie beyond the joint.
-  Check AddBrokenJoint(Circle const& circle, Opening const& opening, std::int32_t point) const;
-  /// How the point sees the joint; nothing where the circle does not cross the gate.
-  std::optional<JointView> ViewJoint(Circle const& circle, Opening const& opening,
-                                     std::int32_t point) const;
+  /// The rules between a joint and the points [first, last) next to it, from the gate on. Hopeless
+  /// where the circle does not cross the gate.
+  Check AddBrokenJoint(Circle const& circle, Opening const& opening, std::int32_t first,
+                       std::int32_t last) const;
+  /// Where a circle crosses the gate of an opening; nothing where it does not.
+  std::optional<Joint> FindJoint(Circle const& circle, Opening const& opening) const;
+  /// How a point sees a joint.
+  JointView ViewJoint(Joint const& joint, std::int32_t point) const;
+  /// The rules between a joint and one point: the step between the two, and that the point does not
+  /// lie beyond the joint.
+  Check AddBrokenView(Circle const& circle, Joint const& joint, JointView const& view) const;
   /// The offsets for which the point lies beside the piece end at a limit; those within tolerance
   /// of the point may go beyond. Keeps the joint on its side of the limit.
-  Check AddOffsetLimit(Circle const& circle, JointView const& view) const;
+  Check AddOffsetLimit(Circle const& circle, Joint const& joint, JointView const& view) const;
 
   Path const& path_;
   LocalFrame const& frame_;

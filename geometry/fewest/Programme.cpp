@@ -2,14 +2,6 @@
 
 namespace Vorn::Fewest {
 
-namespace {
-
-Row UnitRow(int k) {
-  return {k == 0 ? 1.0 : 0.0, k == 1 ? 1.0 : 0.0, k == 2 ? 1.0 : 0.0, k == 3 ? 1.0 : 0.0};
-}
-
-}  // namespace
-
 std::int32_t Basis::FreeBox() const {
   std::int32_t id = kBox;
   while (Holds(id)) ++id;
@@ -22,9 +14,9 @@ bool Programme::Add(Condition const& condition) {
   return true;
 }
 
-Row Programme::RowOf(std::int32_t id) const {
-  if (id >= 0) return columns->At(id);
-  return Basis::IsBox(id) ? UnitRow(id - Basis::kBox) : ConditionOf(id).row;
+Row Programme::BoxRow(std::int32_t id) {
+  std::int32_t const k = id - Basis::kBox;
+  return {k == 0 ? 1.0 : 0.0, k == 1 ? 1.0 : 0.0, k == 2 ? 1.0 : 0.0, k == 3 ? 1.0 : 0.0};
 }
 
 }  // namespace Vorn::Fewest

@@ -52,7 +52,10 @@ struct Programme {
   bool Add(Condition const& condition);
 
   /// The row, the kind and the limit of a row that a basis may hold.
-  Row RowOf(std::int32_t id) const;
+  Row RowOf(std::int32_t id) const {
+    if (id >= 0) return columns->At(id);
+    return Basis::IsBox(id) ? BoxRow(id) : ConditionOf(id).row;
+  }
   /// Of points and the box: a slab.
   Condition::Kind KindOf(std::int32_t id) const {
     return id >= 0 || Basis::IsBox(id) ? Condition::Kind::Slab : ConditionOf(id).kind;
@@ -67,6 +70,8 @@ struct Programme {
     if (id >= 0) return id < first || id >= last;
     return !Basis::IsBox(id) && -1 - id >= conditionCount;
   }
+  /// The row of a side of the box.
+  static Row BoxRow(std::int32_t id);
   /// The condition of an id that is neither that of a point nor of the box.
   Condition const& ConditionOf(std::int32_t id) const {
     return conditions[static_cast<std::size_t>(-1 - id)];

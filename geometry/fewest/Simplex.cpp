@@ -68,12 +68,17 @@ bool Simplex::IsAccurate(double slack) const {
   return true;
 }
 
+void Simplex::Put(Programme const& programme, std::size_t at, std::int32_t id, Basis* basis) {
+  basis->ids[at] = id;
+  rows_[at] = programme.RowOf(id);
+  kinds_[at] = programme.KindOf(id);
+  limits_[at] = programme.LimitOf(id);
+}
+
 bool Simplex::Load(Programme const& programme, Basis* basis) {
-  for (std::int32_t j = 0; j < 4; ++j) {
-    std::int32_t& id = basis->ids[static_cast<std::size_t>(j)];
-    if (programme.IsStale(id)) id = basis->FreeBox();
-    rows_[static_cast<std::size_t>(j)] = programme.RowOf(id);
-    limits_[static_cast<std::size_t>(j)] = programme.LimitOf(id);
+  for (std::size_t j = 0; j < 4; ++j) {
+    std::int32_t const id = basis->ids[j];
+    Put(programme, j, programme.IsStale(id) ? basis->FreeBox() : id, basis);
   }
   return InvertRows(rows_, &inverse_) && TakeEqualities(programme, basis);
 }
@@ -85,7 +90,7 @@ bool Simplex::TakeEqualities(Programme const& programme, Basis* basis) {
     int best = -1;
     double largest = 0.0;
     for (std::size_t j = 0; j < 4; ++j) {
-      if (programme.KindOf(basis->ids[j]) == Condition::Kind::Equality) continue;
+      if (kinds_[j] == Condition::Kind::Equality) continue;
       double const step = std::fabs(Apply(condition.row, inverse_[j]));
       if (step > largest) {
         largest = step;
@@ -93,10 +98,7 @@ bool Simplex::TakeEqualities(Programme const& programme, Basis* basis) {
       }
     }
     if (best < 0) return false;
-    auto const l = static_cast<std::size_t>(best);
-    basis->ids[l] = -1 - k;
-    rows_[l] = condition.row;
-    limits_[l] = condition.limit;
+    Put(programme, static_cast<std::size_t>(best), -1 - k, basis);
     if (!InvertRows(rows_, &inverse_)) return false;
   }
   return true;
@@ -107,19 +109,15 @@ bool Simplex::MakeDualFeasible(Programme const& programme, Row const& objective,
     bool isChanged = false;
     for (std::size_t j = 0; j < 4; ++j) {
       duals_[j] = Apply(objective, inverse_[j]);
-      Condition::Kind const kind = programme.KindOf(basis->ids[j]);
-      if (duals_[j] >= 0.0 || kind == Condition::Kind::Equality) continue;
-      if (kind == Condition::Kind::Slab) {
+      if (duals_[j] >= 0.0 || kinds_[j] == Condition::Kind::Equality) continue;
+      if (kinds_[j] == Condition::Kind::Slab) {
         rows_[j] = Negated(rows_[j]);
         inverse_[j] = Scaled(inverse_[j], -1.0);
         duals_[j] = -duals_[j];
         continue;
       }
       // A half space on the wrong side makes way for the box row that keeps the basis regular.
-      int const best = LargestComponent(inverse_[j]);
-      basis->ids[j] = Basis::kBox + best;
-      rows_[j] = programme.RowOf(Basis::kBox + best);
-      limits_[j] = programme.box;
+      Put(programme, j, Basis::kBox + LargestComponent(inverse_[j]), basis);
       isChanged = true;
       break;
     }
@@ -164,15 +162,14 @@ Simplex::Entry Simplex::Price(Programme const& programme, Basis const& basis, do
   return entry;
 }
 
-int Simplex::FindLeaving(Programme const& programme, Basis const& basis,
-                         std::array<double, 4> const& step) const {
+int Simplex::FindLeaving(std::array<double, 4> const& step) const {
   double largest = 0.0;
   for (double s : step) largest = std::fabs(s) > largest ? std::fabs(s) : largest;
   int leaving = -1;
   double least = 0.0;
   for (std::size_t j = 0; j < 4; ++j) {
     if (!(step[j] > kLeastPivotShare * largest)) continue;
-    if (programme.KindOf(basis.ids[j]) == Condition::Kind::Equality) continue;
+    if (kinds_[j] == Condition::Kind::Equality) continue;
     double const ratio = duals_[j] / step[j];
     if (leaving < 0 || ratio < least ||
         (ratio == least && step[j] > step[static_cast<std::size_t>(leaving)])) {
@@ -199,16 +196,17 @@ void Simplex::Exchange(int leaving, std::array<double, 4> const& step) {
 bool Simplex::Pivot(Programme const& programme, Entry const& entry, Basis* basis) {
   Row row = programme.RowOf(entry.id);
   // Of two sides the broken one enters.
-  bool const isSlab = programme.KindOf(entry.id) == Condition::Kind::Slab;
-  if (isSlab && !(Apply(row, solution_) > 0.0)) row = Negated(row);
+  Condition::Kind const kind = programme.KindOf(entry.id);
+  if (kind == Condition::Kind::Slab && !(Apply(row, solution_) > 0.0)) row = Negated(row);
   std::array<double, 4> step;
   for (std::size_t j = 0; j < 4; ++j) step[j] = Apply(row, inverse_[j]);
-  int const leaving = FindLeaving(programme, *basis, step);
+  int const leaving = FindLeaving(step);
   if (leaving < 0) return false;
   auto const l = static_cast<std::size_t>(leaving);
   basis->ids[l] = entry.id;
   Exchange(leaving, step);
   rows_[l] = row;
+  kinds_[l] = kind;
   limits_[l] = programme.LimitOf(entry.id);
   return true;
 }

@@ -67,10 +67,11 @@ class Simplex {
   Entry Price(Programme const& programme, Basis const& basis, double slack);
   /// The row of the basis that may leave for the entering one so that the basis stays dual
   /// feasible; -1 when the rows contradict each other.
-  int FindLeaving(Programme const& programme, Basis const& basis,
-                  std::array<double, 4> const& step) const;
+  int FindLeaving(std::array<double, 4> const& step) const;
   /// Exchanges a row of the basis for an entering one; false when the rows contradict each other.
   bool Pivot(Programme const& programme, Entry const& entry, Basis* basis);
+  /// Has a row of the programme in a place of the basis; leaves the inverse as it is.
+  void Put(Programme const& programme, std::size_t at, std::int32_t id, Basis* basis);
   /// Computes the inverse and the duals anew; false when rounding prevents it.
   bool Refresh(Programme const& programme, Row const& objective, Basis* basis);
   /// Updates inverse and duals for a row that takes the place of the leaving one.
@@ -78,7 +79,9 @@ class Simplex {
 
   double slack_;
   Candidates candidates_;
+  // Of the rows of the basis.
   std::array<Row, 4> rows_;
+  std::array<Condition::Kind, 4> kinds_;
   std::array<double, 4> limits_;
   std::array<double, 4> duals_;
   std::array<Circle, 4> inverse_;
