@@ -37,8 +37,11 @@ RunFit FitRun(Programme const& programme, RunFit const& start, bool isTest, Simp
   RunFit best = start;
   for (int round = 0; round < kMostRounds; ++round) {
     double const enough = isTest ? kHopeless : 0.0;
-    Simplex::Status const status =
-        simplex->Maximise(programme, FormRow(best.circle), enough, basis);
+    Row const objective = FormRow(best.circle);
+    bool const isNew = round == 0 || Candidates::ArePaying(programme);
+    Simplex::Status const status = isNew
+                                       ? simplex->Maximise(programme, objective, enough, basis)
+                                       : simplex->MaximiseNext(programme, objective, enough, basis);
     if (status != Simplex::Status::Optimal) return best;
     Circle found = simplex->Solution();
     if (best.isFound) found = BestBetween(Scaled(best.circle, 1.0 / best.ratio), found);

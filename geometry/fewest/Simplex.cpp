@@ -250,9 +250,14 @@ Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objecti
     *basis = Basis();
     if (!Load(programme, basis)) return Status::Stalled;
   }
+  exchanges_ = 0;
+  return MaximiseNext(programme, objective, enough, basis);
+}
+
+Simplex::Status Simplex::MaximiseNext(Programme const& programme, Row const& objective,
+                                      double enough, Basis* basis) {
   if (!MakeDualFeasible(programme, objective, basis)) return Status::Stalled;
   Solve();
-  int exchanges = 0;
   for (int pivot = 0; pivot < kMostPivots; ++pivot) {
     // Rounding grows with the size of the circle, which the form of an objective measures.
     double const value = Apply(objective, solution_);
@@ -262,18 +267,18 @@ Simplex::Status Simplex::Maximise(Programme const& programme, Row const& objecti
     // Nothing but rounding breaks a row of the basis.
     bool const isRounding = entry.isFound && basis->Holds(entry.id);
     if (!entry.isFound || isRounding) {
-      if (exchanges == 0 || (!isRounding && IsAccurate(slack))) {
+      if (exchanges_ == 0 || (!isRounding && IsAccurate(slack))) {
         return !entry.isFound || entry.excess <= kRounded ? Status::Optimal : Status::Stalled;
       }
       if (!Refresh(programme, objective, basis)) return Status::Stalled;
       solution_ = Fewest::Solve({rows_, inverse_}, limits_);
-      exchanges = 0;
+      exchanges_ = 0;
       continue;
     }
     if (!Pivot(programme, entry, basis)) return Status::Infeasible;
-    if (++exchanges >= kExchangesBeforeInversion) {
+    if (++exchanges_ >= kExchangesBeforeInversion) {
       if (!Refresh(programme, objective, basis)) return Status::Stalled;
-      exchanges = 0;
+      exchanges_ = 0;
     }
     Solve();
   }

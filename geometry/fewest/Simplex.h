@@ -29,6 +29,11 @@ class Simplex {
   /// @return Optimal; Infeasible when the rows contradict each other; Stalled when rounding keeps
   ///         the search from an end
   Status Maximise(Programme const& programme, Row const& objective, double enough, Basis* basis);
+  /// The same from where the search before ended, which must have found the optimum of another
+  /// objective over the same rows: the inverse is used again. In long runs a new one pays, since
+  /// what it has lost in digits costs passes over all rows.
+  Status MaximiseNext(Programme const& programme, Row const& objective, double enough,
+                      Basis* basis);
 
   /// The circle found last.
   Circle const& Solution() const { return solution_; }
@@ -85,6 +90,7 @@ class Simplex {
   std::array<double, 4> limits_;
   std::array<double, 4> duals_;
   std::array<Circle, 4> inverse_;
+  int exchanges_ = 0;  ///< since the inverse was computed
   Circle solution_;
 };
 
