@@ -1,6 +1,8 @@
 #include "geometry/fewest/BothWays.h"
 
 #include <algorithm>
+#include <cstddef>
+#include <limits>
 #include <utility>
 
 namespace Vorn::Fewest {
@@ -22,6 +24,13 @@ Joint Reversed(Joint joint, std::int32_t count) {
   gate.across = {-gate.across.x, -gate.across.y};
   gate.least = -std::exchange(gate.greatest, -gate.least);
   return {gate, -joint.offset};
+}
+
+/// How many runs of the greedy cover it takes to cover so many points from the first on, which is
+/// the least number of pieces for them.
+std::size_t CountRuns(std::span<std::int32_t const> runStarts, std::int32_t points) {
+  auto const end = std::lower_bound(runStarts.begin(), runStarts.end(), points);
+  return static_cast<std::size_t>(end - runStarts.begin());
 }
 
 }  // namespace
@@ -46,14 +55,18 @@ Chain Reversed(Chain const& chain, std::int32_t count) {
   return reversed;
 }
 
-Chain FindChainBothWays(Path const& path, double share, std::size_t enough,
+Chain FindChainBothWays(Path const& path, double share, std::span<std::int32_t const> runStarts,
                         std::function<void(std::int32_t)> const& tell) {
   Chain forwards = FindChain(path, share, tell);
-  if (!forwards.pieces.empty() && forwards.pieces.size() <= enough) return forwards;
-  Chain const backwards = FindChain(Reversed(path), share, [](std::int32_t) {});
-  bool const isShorter =
-      forwards.pieces.empty() || backwards.pieces.size() < forwards.pieces.size();
-  return isShorter && !backwards.pieces.empty() ? Reversed(backwards, path.Count()) : forwards;
+  if (!forwards.pieces.empty() && forwards.pieces.size() <= runStarts.size()) return forwards;
+  std::size_t const limit =
+      forwards.pieces.empty() ? std::numeric_limits<std::size_t>::max() : forwards.pieces.size();
+  Chain const backwards =
+      FindChainWhile(Reversed(path), share, [&](std::size_t pieces, std::int32_t covered) {
+        return pieces + CountRuns(runStarts, path.Count() - covered) < limit;
+      });
+  bool const isShorter = !backwards.pieces.empty() && backwards.pieces.size() < limit;
+  return isShorter ? Reversed(backwards, path.Count()) : forwards;
 }
 
 }  // namespace Vorn::Fewest

@@ -1,8 +1,8 @@
 #pragma once
 
-#include <cstddef>
 #include <cstdint>
 #include <functional>
+#include <span>
 
 #include "geometry/fewest/Chain.h"
 
@@ -16,11 +16,16 @@ Path Reversed(Path const& path);
 /// inverse.
 Chain Reversed(Chain const& chain, std::int32_t count);
 
-/// Searches a chain over an open path forwards and, where it has more than `enough` pieces,
-/// backwards: gates are laid from the end of the piece before, so that one direction may find a
-/// joint that the other misses. The shorter chain, the one found forwards of equal ones; empty when
-/// none was found. `tell` hears how many points are covered forwards.
-Chain FindChainBothWays(Path const& path, double share, std::size_t enough,
+/// Searches a chain over an open path forwards and, where it has more pieces than the greedy cover
+/// has runs, backwards: gates are laid from the end of the piece before, so that one direction may
+/// find a joint that the other misses. The search backwards ends where the points that are left
+/// need so many runs that no shorter chain can come of it. The shorter chain, the one found
+/// forwards of equal ones; empty when none was found.
+///
+/// @param[in] runStarts the first point of each run of the greedy cover of the path, or of a path
+///                      with tolerances at least as large
+/// @param[in] tell      hears how many points are covered forwards
+Chain FindChainBothWays(Path const& path, double share, std::span<std::int32_t const> runStarts,
                         std::function<void(std::int32_t)> const& tell);
 
 }  // namespace Vorn::Fewest

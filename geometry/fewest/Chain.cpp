@@ -29,8 +29,8 @@ constexpr double kWideGap = 8.0;
 
 class ChainSearch {
  public:
-  ChainSearch(Path const& path, double share, std::function<void(std::int32_t)> const& tell)
-      : path_(path), search_(path, share), tell_(tell) {}
+  ChainSearch(Path const& path, double share, GoesOn const& goesOn)
+      : path_(path), search_(path, share), goesOn_(goesOn) {}
 
   Chain Run() {
     levels_.push_back({State()});
@@ -51,7 +51,7 @@ class ChainSearch {
         if (state.reach.end > rival.end) rival = state.reach;
       }
       farthest = rival.end;
-      tell_(farthest);
+      if (!goesOn_(levels_.size(), farthest)) return {};
       if (farthest == path_.Count()) {
         std::int32_t const last = FindLast();
         if (last >= 0) return Backwards(last);
@@ -252,14 +252,21 @@ class ChainSearch {
 
   Path const& path_;
   PieceSearch search_;
-  std::function<void(std::int32_t)> const& tell_;
+  GoesOn const& goesOn_;
   std::vector<Level> levels_;
 };
 
 }  // namespace
 
 Chain FindChain(Path const& path, double share, std::function<void(std::int32_t)> const& tell) {
-  return ChainSearch(path, share, tell).Run();
+  return FindChainWhile(path, share, [&](std::size_t, std::int32_t covered) {
+    tell(covered);
+    return true;
+  });
+}
+
+Chain FindChainWhile(Path const& path, double share, GoesOn const& goesOn) {
+  return ChainSearch(path, share, goesOn).Run();
 }
 
 }  // namespace Vorn::Fewest

@@ -85,7 +85,8 @@ ErrorCode FitDistinct(Order const& order, Fewest::Progress* progress,
       isClosed ? Fewest::LeastClosedCover(path.points, path.limits, cover) : open;
   // Three points are covered without a circle.
   bool const isOne = open == 1 && path.points.size() > 3;
-  Fewest::FitTask task{order.points, order.options, shift, std::move(path), open, bound, *progress};
+  Fewest::FitTask task{order.points, order.options, shift,    std::move(path),
+                       cover.starts, bound,         *progress};
   Fewest::Answer answer;
   Promises::Report report;
   if (!Fewest::FindContour(std::move(task), isOne ? &cover.last : nullptr, &answer, &report)) {

@@ -52,7 +52,7 @@ class Fitter {
         options_(task.options),
         shift_(task.shift),
         path_(std::move(task.path)),
-        openBound_(task.openBound),
+        runStarts_(task.runStarts),
         bound_(task.bound),
         progress_(task.progress) {}
 
@@ -132,7 +132,7 @@ class Fitter {
     Chain chain = FindOpen(share);
     // A wider look starts from other gates, so it may also end with more pieces.
     for (std::int32_t effort = 1; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
-      if (chain.pieces.size() == openBound_) break;
+      if (chain.pieces.size() == runStarts_.size()) break;
       path_.limits.mostSources = kSources[effort];
       path_.limits.looksFar = true;
       Chain wider = FindOpen(share);
@@ -145,7 +145,7 @@ class Fitter {
   }
 
   Chain FindOpen(double share) {
-    return FindChainBothWays(path_, share * kSearchShare, openBound_,
+    return FindChainBothWays(path_, share * kSearchShare, runStarts_,
                              [&](std::int32_t done) { Tell(done); });
   }
 
@@ -258,7 +258,7 @@ class Fitter {
   Options const& options_;
   Shift const& shift_;
   Path path_;
-  std::size_t openBound_;
+  std::vector<std::int32_t> const& runStarts_;
   std::size_t bound_;
   std::size_t quickSources_ = kSources[0];
   Progress& progress_;

@@ -27,9 +27,10 @@ struct FitTask {
   Shift const& shift;
   /// The points moved near the origin, with the limits of the options.
   Path path;
-  /// A number of pieces below which no chain can go that need not close, and the same for what is
-  /// asked for.
-  std::size_t openBound = 1;
+  /// The first point of each run of the greedy cover: no chain that need not close has fewer
+  /// pieces.
+  std::vector<std::int32_t> const& runStarts;
+  /// A number of pieces below which nothing can go that is asked for.
   std::size_t bound = 1;
   Progress& progress;
 };

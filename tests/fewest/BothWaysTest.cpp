@@ -1,8 +1,11 @@
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cmath>
+#include <vector>
 
 #include "geometry/fewest/BothWays.h"
+#include "geometry/fewest/Bound.h"
 #include "geometry/fewest/LocalFrame.h"
 #include "support/fewest/Scans.h"
 
@@ -21,6 +24,9 @@ Path PathOf(Testing::Scan const& scan) {
   path.leastTolerance = Tightest(scan).w * shift.scale;
   return path;
 }
+
+/// The start of a cover by one run, below which no chain comes.
+std::vector<std::int32_t> const kOneRun{0};
 
 void Silent(std::int32_t) {}
 
@@ -79,11 +85,41 @@ TEST(ReversedChain, HasItsJointsOnBothCirclesAndCoversTheReversedPoints) {
 TEST(FindChainBothWays, LooksBackwardsOnlyWhereThereMayBeFewer) {
   Path const path = Corners();
   std::size_t const forwards = FindCorners(path).pieces.size();
-  EXPECT_EQ(FindChainBothWays(path, kShare, forwards, Silent).pieces.size(), forwards);
-  EXPECT_LE(FindChainBothWays(path, kShare, 1, Silent).pieces.size(), forwards);
+  std::vector<std::int32_t> const asManyRuns(forwards, 0);
+  EXPECT_EQ(FindChainBothWays(path, kShare, asManyRuns, Silent).pieces.size(), forwards);
+  EXPECT_LE(FindChainBothWays(path, kShare, kOneRun, Silent).pieces.size(), forwards);
   Path const back = Reversed(path);
-  EXPECT_EQ(FindChainBothWays(path, kShare, 1, Silent).pieces.size(),
-            FindChainBothWays(back, kShare, 1, Silent).pieces.size());
+  EXPECT_EQ(FindChainBothWays(path, kShare, kOneRun, Silent).pieces.size(),
+            FindChainBothWays(back, kShare, kOneRun, Silent).pieces.size());
+}
+
+TEST(FindChainBothWays, LosesNoShorterChainToTheRunsThatAreLeft) {
+  int shorterBackwards = 0;
+  for (std::uint64_t seed = 1; seed <= 12; ++seed) {
+    Path const path = PathOf(MakeNoisyProfile(seed, ProfileStyle::Mixed, 4, 400, 0.99));
+    Cover const cover = CoverGreedily(path.points, path.limits, Silent);
+    std::size_t const forwards = FindCorners(path).pieces.size();
+    std::size_t const backwards = FindCorners(Reversed(path)).pieces.size();
+    if (backwards < forwards) ++shorterBackwards;
+    EXPECT_EQ(FindChainBothWays(path, kShare, cover.starts, Silent).pieces.size(),
+              std::min(forwards, backwards))
+        << "seed " << seed;
+  }
+  EXPECT_GT(shorterBackwards, 0);
+}
+
+TEST(FindChainWhile, IsEmptyAsSoonAsItIsNotToGoOn) {
+  Path const path = Corners();
+  std::size_t asked = 0;
+  std::int32_t reached = 0;
+  Chain const chain = FindChainWhile(path, kShare, [&](std::size_t pieces, std::int32_t covered) {
+    EXPECT_EQ(pieces, ++asked);
+    EXPECT_GT(covered, reached);
+    reached = covered;
+    return pieces < 5;
+  });
+  EXPECT_TRUE(chain.pieces.empty());
+  EXPECT_EQ(asked, 5U);
 }
 
 }  // namespace
