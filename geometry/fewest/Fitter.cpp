@@ -8,6 +8,7 @@
 #include "geometry/fewest/BothWays.h"
 #include "geometry/fewest/Centring.h"
 #include "geometry/fewest/Laps.h"
+#include "geometry/fewest/Mending.h"
 #include "geometry/fewest/OnePiece.h"
 #include "geometry/fewest/Polyline.h"
 #include "geometry/fewest/Seam.h"
@@ -44,6 +45,15 @@ constexpr std::int32_t kLeastReach = 4;
 /// Joints of the open chain at which a closed one is tried to begin.
 constexpr std::size_t kMostSeams = 4;
 
+/// A contour of no more than this times the bound and one piece more is not mended.
+constexpr double kNearBound = 1.1;
+
+/// How often the places are mended at which a chain breaks promises.
+constexpr int kMostMendings = 24;
+
+/// How often segments from point to point are taken shorter where they break promises.
+constexpr int kMostRefinements = 16;
+
 /// Looks for contours and measures what they promise.
 class Fitter {
  public:
@@ -63,32 +73,97 @@ class Fitter {
            RunAsLaps(covering, answer, report);
   }
 
-  /// The first contour found that keeps every promise; false when there is none.
+  /// A contour that keeps every promise; false when there is none. The first one found is taken
+  /// unless it has clearly more pieces than the bound; then one that is mended where the first
+  /// chain breaks promises may have fewer.
   bool Run(Answer* answer, Promises::Report* report) {
     if (Search(1.0, answer, report)) return true;
+    bool const isFound = RunOthers(answer, report);
+    if (isFound && IsNearBound(*answer)) return true;
+    Answer mended;
+    Promises::Report mendedReport;
+    if (!RunMended(&mended, &mendedReport)) return isFound;
+    if (isFound && mended.ranges.size() >= answer->ranges.size()) return true;
+    *answer = std::move(mended);
+    *report = std::move(mendedReport);
+    return true;
+  }
+
+ private:
+  bool IsNearBound(Answer const& answer) const {
+    return static_cast<double>(answer.ranges.size()) <=
+           kNearBound * static_cast<double>(bound_) + 1.0;
+  }
+
+  /// Other chains, ever farther from the fewest.
+  bool RunOthers(Answer* answer, Promises::Report* report) {
     // Gates that take offsets from more states lead to another chain, perhaps of as many pieces.
     quickSources_ = kMoreSources;
-    if (Search(1.0, answer, report) || RunTighter(answer, report)) return true;
+    return Search(1.0, answer, report) || RunTighter(answer, report) ||
+           RunTightened(answer, report) || RunWhole(answer, report);
+  }
+
+  /// Mends the first chain where it breaks promises.
+  bool RunMended(Answer* answer, Promises::Report* report) {
+    path_.limits.segmentsOnly = options_.segmentsOnly;
+    quickSources_ = kSources[0];
+    mends_ = true;
+    bool const isKept = Search(1.0, answer, report);
+    mends_ = false;
+    return isKept;
+  }
+
+  /// Searches the whole path again with smaller tolerances where promises are broken.
+  bool RunTightened(Answer* answer, Promises::Report* report) {
+    bool isKept = false;
+    double const leastTolerance = path_.leastTolerance;
     for (double const factor : kTightening) {
-      if (answer->ranges.empty()) break;
+      if (isKept || answer->ranges.empty()) break;
       Tighten(*answer, *report, factor);
-      if (Search(1.0, answer, report)) return true;
+      isKept = Search(1.0, answer, report);
     }
     path_.points = shift_.Apply(points_);
-    // What does not yield near the place may yield when all pieces change.
+    path_.leastTolerance = leastTolerance;
+    return isKept;
+  }
+
+  /// What does not yield near the place may yield when all pieces change.
+  bool RunWhole(Answer* answer, Promises::Report* report) {
     for (double const share : {0.9, 0.7, 0.5, 0.3}) {
       if (Search(share, answer, report)) return true;
     }
     // Segments keep to the path between the points and have no radius.
     path_.limits.segmentsOnly = true;
     if (Search(1.0, answer, report)) return true;
-    *answer = FollowPoints(points_, options_.closed);
-    if (Measure(*answer, report)) return true;
-    *answer = FollowEveryPoint(points_, options_.closed);
+    return RunAlongPoints(answer, report);
+  }
+
+  /// Segments from point to point; every point becomes a joint where they break promises.
+  bool RunAlongPoints(Answer* answer, Promises::Report* report) const {
+    std::vector<char> isJoint(points_.size(), 0);
+    for (int round = 0; round < kMostRefinements; ++round) {
+      *answer = FollowPoints(points_, options_.closed, isJoint);
+      if (Measure(*answer, report)) return true;
+      if (answer->ranges.empty()) return false;
+      for (Promises::Violation const& violation : report->violations) {
+        MarkPoints(answer->ranges[violation.piece], &isJoint);
+        if (violation.otherPiece == Promises::kNone) continue;
+        MarkPoints(answer->ranges[violation.otherPiece], &isJoint);
+      }
+    }
+    *answer = FollowPoints(points_, options_.closed, std::vector<char>(points_.size(), 1));
     return Measure(*answer, report);
   }
 
- private:
+  /// Marks the points of a piece and the one behind it.
+  void MarkPoints(FewestPieces::Range const& range, std::vector<char>* isJoint) const {
+    std::int32_t const count = path_.Count();
+    std::int32_t const length = (range.last - range.first + count) % count + 1;
+    for (std::int32_t k = 0; k <= length; ++k) {
+      (*isJoint)[static_cast<std::size_t>((range.first + k) % count)] = 1;
+    }
+  }
+
   bool RunAsOnePiece(PlacedCircle const& covering, Answer* answer, Promises::Report* report) const {
     for (Chain const& chain : MakeOnePiece(path_, covering)) {
       if (KeepsCentred(path_, 0, chain, answer, report)) return true;
@@ -141,7 +216,7 @@ class Fitter {
     }
     if (chain.pieces.empty()) return false;
     if (options_.closed) return Close(chain, share * kSearchShare, answer, report);
-    return KeepsCentred(path_, 0, chain, answer, report);
+    return KeepsAny(path_, 0, chain, answer, report);
   }
 
   Chain FindOpen(double share) {
@@ -195,7 +270,7 @@ class Fitter {
       if (isFound && chain.pieces.size() >= answer->ranges.size()) continue;
       Answer closed;
       Promises::Report closedReport;
-      bool const isKept = KeepsCentred(cut.path, cut.rotation, chain, &closed, &closedReport);
+      bool const isKept = KeepsAny(cut.path, cut.rotation, chain, &closed, &closedReport);
       if (isFound && !isKept) continue;
       *answer = std::move(closed);
       *report = std::move(closedReport);
@@ -230,6 +305,24 @@ class Fitter {
     });
   }
 
+  bool KeepsAny(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
+                Promises::Report* report) const {
+    return mends_ ? KeepsMended(path, rotation, chain, answer, report)
+                  : KeepsCentred(path, rotation, chain, answer, report);
+  }
+
+  bool KeepsMended(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
+                   Promises::Report* report) const {
+    Mending mending(path, kSearchShare, chain);
+    for (int round = 0; round < kMostMendings; ++round) {
+      if (Keeps(path, rotation, mending.Current(), answer, report)) {
+        return KeepsCentred(path, rotation, mending.Current(), answer, report);
+      }
+      if (!mending.Mend(report->violations)) return false;
+    }
+    return false;
+  }
+
   bool KeepsCentred(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
                     Promises::Report* report) const {
     if (options_.centre && Keeps(path, rotation, Centre(path, chain), answer, report)) {
@@ -260,6 +353,7 @@ class Fitter {
   Path path_;
   std::vector<std::int32_t> const& runStarts_;
   std::size_t bound_;
+  bool mends_ = false;
   std::size_t quickSources_ = kSources[0];
   Progress& progress_;
 };

@@ -18,6 +18,9 @@ struct Limits {
   double sineOfHalfStep = 0.5;
   /// How far a piece may leave the path between neighbours; infinite for none.
   double farthestBetweenPoints = std::numeric_limits<double>::infinity();
+  /// How far a joint between two points may lie off the straight way from one to the other, in
+  /// halves of it, in addition to their tolerances.
+  double jointRoom = 1.0;
   /// From how many states of the level before a gate takes offsets; more look wider.
   std::size_t mostSources = 2;
   /// Whether the gate of a corner lies where the circles of the longest runs on both sides cross,

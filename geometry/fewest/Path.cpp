@@ -70,7 +70,7 @@ Gate MiddleGate(Path const& path, std::int32_t split, PlacedCircle const& before
   gate.split = split;
   gate.origin = {0.5 * (last.x + first.x), 0.5 * (last.y + first.y)};
   double const gap = DistanceBetween(last, first);
-  gate.greatest = 0.5 * gap + 2.0 * std::max(last.w, first.w);
+  gate.greatest = path.limits.jointRoom * 0.5 * gap + 2.0 * std::max(last.w, first.w);
   gate.least = -gate.greatest;
   if (gap > kClearlyAhead * (last.w + first.w)) {
     gate.across = LeftNormal(last, first);

@@ -15,15 +15,15 @@ constexpr double kTolerance = 1.0 - 1e-6;
 
 class Follower {
  public:
-  Follower(std::vector<WPoint> const& points, bool skipsPoints)
-      : points_(points), skipsPoints_(skipsPoints) {}
+  Follower(std::vector<WPoint> const& points, std::vector<char> const& isJoint)
+      : points_(points), isJoint_(isJoint) {}
 
   /// The point at which the segment from a point ends; the number of points where there is none.
   std::int32_t FindEnd(std::int32_t from) const {
     auto const count = static_cast<std::int32_t>(points_.size());
     std::int32_t good = from + 1;
     while (good < count && !IsCovered(from, good)) ++good;
-    if (good == count || !skipsPoints_) return good;
+    if (good == count) return count;
     for (std::int32_t step = 1; step > 0;) {
       bool const isFarther = good + step < count && IsCovered(from, good + step);
       if (isFarther) good += step;
@@ -50,6 +50,8 @@ class Follower {
     for (std::int32_t i = from + 1; i < to; ++i) {
       WPoint const& p = points_[static_cast<std::size_t>(i)];
       double const along = (p.x - start.x) * dx + (p.y - start.y) * dy;
+      bool const isStart = p.x == start.x && p.y == start.y;
+      if (isJoint_[static_cast<std::size_t>(i)] != 0 && !isStart) return false;
       if (along < farthest || !(DistanceToPiece(segment, p) <= kTolerance * p.w)) return false;
       farthest = along;
     }
@@ -57,10 +59,14 @@ class Follower {
   }
 
   std::vector<WPoint> const& points_;
-  bool skipsPoints_;
+  std::vector<char> const& isJoint_;
 };
 
-Answer Follow(Follower const& follower, std::vector<WPoint> const& points, bool isClosed) {
+}  // namespace
+
+Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed,
+                    std::vector<char> const& isJoint) {
+  Follower const follower(points, isJoint);
   auto const count = static_cast<std::int32_t>(points.size());
   Answer answer;
   answer.contour.push_back(BuildSegment({}, follower.At(0)).elem);
@@ -75,16 +81,6 @@ Answer Follow(Follower const& follower, std::vector<WPoint> const& points, bool 
   answer.ranges.back().last = count - 1;
   if (isClosed) AppendClosingSegment(&answer);
   return answer;
-}
-
-}  // namespace
-
-Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed) {
-  return Follow(Follower(points, true), points, isClosed);
-}
-
-Answer FollowEveryPoint(std::vector<WPoint> const& points, bool isClosed) {
-  return Follow(Follower(points, false), points, isClosed);
 }
 
 }  // namespace Vorn::Fewest

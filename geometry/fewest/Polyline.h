@@ -9,13 +9,12 @@
 namespace Vorn::Fewest {
 
 /// The segments that run from point to point, each as far as the points that it passes by stay
-/// within their tolerances. Far from the fewest, but there wherever the straight path itself keeps
-/// what is promised, however different the tolerances are. A closed one ends with a segment to the
+/// within their tolerances and none of them is marked in `isJoint`, which has an entry for each
+/// point. Far from the fewest, but there wherever the straight path itself keeps what is promised,
+/// however different the tolerances are. With every point marked it is the straight path itself,
+/// which breaks no promise (see Promise::NotCrossing). A closed one ends with a segment to the
 /// first point, unless the last point repeats it. Without ranges when all points are equal.
-Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed);
-
-/// The same from each point to the next that differs from it: the straight path itself, which
-/// breaks no promise (see Promise::NotCrossing).
-Answer FollowEveryPoint(std::vector<WPoint> const& points, bool isClosed);
+Answer FollowPoints(std::vector<WPoint> const& points, bool isClosed,
+                    std::vector<char> const& isJoint);
 
 }  // namespace Vorn::Fewest

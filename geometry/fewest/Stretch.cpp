@@ -66,6 +66,12 @@ Chain PartOf(Chain const& chain, Stretch const& stretch) {
   return part;
 }
 
+Chain MovedBy(Chain chain, std::int32_t by) {
+  for (ChainPiece& piece : chain.pieces) piece = Moved(piece, by);
+  for (Gate& gate : chain.gates) gate = Moved(gate, by);
+  return chain;
+}
+
 void Put(Chain const& part, Stretch const& stretch, Chain* chain) {
   std::int32_t const first = chain->pieces[stretch.first].first;
   for (std::size_t k = 0; k < part.pieces.size(); ++k) {

@@ -29,6 +29,9 @@ Path PathOf(Path const& path, Chain const& chain, Stretch const& stretch);
 /// The pieces of a stretch, the points counted from its first one.
 Chain PartOf(Chain const& chain, Stretch const& stretch);
 
+/// The same pieces, the points counted from a place `by` points before.
+Chain MovedBy(Chain chain, std::int32_t by);
+
 /// Puts pieces in the place of those of a stretch, as many as it has.
 void Put(Chain const& part, Stretch const& stretch, Chain* chain);
 

@@ -159,6 +159,28 @@ TEST(FewestPiecesHostile, ScribblesHaveAnAnswer) {
   }
 }
 
+TEST(FewestPiecesHostile, AWanderingPathThatCrossesItselfCostsPiecesOnlyWhereItDoes) {
+  constexpr int kPoints = 200;
+  for (std::uint64_t const seed : {3, 4, 6, 8}) {
+    SCOPED_TRACE(testing::Message() << "seed " << seed);
+    RandomGeometry random(seed);
+    double x = 0.0;
+    double y = 0.0;
+    double heading = 0.0;
+    Scan scan;
+    for (int i = 0; i < kPoints; ++i) {
+      heading += random.Uniform(-0.8, 0.8);
+      x += std::cos(heading) * random.Uniform(0.2, 1.5);
+      y += std::sin(heading) * random.Uniform(0.2, 1.5);
+      scan.push_back({x, y, 0.05 * random.Uniform(0.3, 1.0)});
+    }
+    for (FewestOptions const& options : {FewestOptions{}, Closed()}) {
+      FewestResult const result = FitKept(scan, options);
+      EXPECT_LE(PieceCount(result), 1.65 * result.fewestPossible);
+    }
+  }
+}
+
 TEST(FewestPiecesHostile, PointsOnASmallGridHaveAnAnswer) {
   RandomGeometry random(6403);
   for (int round = 0; round < 100; ++round) {

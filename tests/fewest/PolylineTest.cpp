@@ -35,31 +35,41 @@ std::vector<WPoint> Angle() {
           {2, 1, kTolerance}, {2, 2, kTolerance}, {2, 2, kTolerance}};
 }
 
+/// No point, or every one, has to be a joint.
+std::vector<char> None(std::size_t count) { return std::vector<char>(count, 0); }
+std::vector<char> All(std::size_t count) { return std::vector<char>(count, 1); }
+
+TEST(FollowPoints, StopsAtJoints) {
+  Answer const answer = Fewest::FollowPoints(Angle(), false, {0, 0, 0, 1, 0, 0});
+  EXPECT_EQ(EndsOf(answer), (Ends{{0, 0}, {2, 0}, {2, 1}, {2, 2}}));
+  EXPECT_EQ(RangesOf(answer), (Ranges{{0, 1}, {2, 2}, {3, 5}}));
+}
+
 TEST(FollowPoints, RunsFromCornerToCorner) {
-  Answer const answer = Fewest::FollowPoints(Angle(), false);
+  Answer const answer = Fewest::FollowPoints(Angle(), false, None(6));
   EXPECT_EQ(EndsOf(answer), (Ends{{0, 0}, {2, 0}, {2, 2}}));
   EXPECT_EQ(RangesOf(answer), (Ranges{{0, 1}, {2, 5}}));
 }
 
 TEST(FollowPoints, ClosedEndsAtTheFirstPoint) {
-  Answer const answer = Fewest::FollowPoints(Angle(), true);
+  Answer const answer = Fewest::FollowPoints(Angle(), true, None(6));
   EXPECT_EQ(EndsOf(answer), (Ends{{0, 0}, {2, 0}, {2, 2}, {0, 0}}));
   EXPECT_EQ(RangesOf(answer), (Ranges{{0, 1}, {2, 4}, {5, 5}}));
 }
 
 TEST(FollowPoints, OfOnePlaceHasNoRange) {
   std::vector<WPoint> const points(4, WPoint{3, 4, kTolerance});
-  EXPECT_TRUE(Fewest::FollowPoints(points, false).ranges.empty());
-  EXPECT_TRUE(Fewest::FollowPoints(points, true).ranges.empty());
+  EXPECT_TRUE(Fewest::FollowPoints(points, false, None(4)).ranges.empty());
+  EXPECT_TRUE(Fewest::FollowPoints(points, true, None(4)).ranges.empty());
 }
 
-TEST(FollowEveryPoint, SkipsOnlyRepeatedPoints) {
-  Answer const answer = Fewest::FollowEveryPoint(Angle(), false);
+TEST(FollowPoints, SkipsOnlyRepeatedPointsWhereAllAreJoints) {
+  Answer const answer = Fewest::FollowPoints(Angle(), false, All(6));
   EXPECT_EQ(EndsOf(answer), (Ends{{0, 0}, {1, 0}, {2, 0}, {2, 1}, {2, 2}}));
   EXPECT_EQ(RangesOf(answer), (Ranges{{0, 0}, {1, 1}, {2, 2}, {3, 5}}));
 }
 
-TEST(FollowEveryPoint, BreaksNoPromiseWhateverThePoints) {
+TEST(FollowPoints, BreaksNoPromiseWhereAllPointsAreJoints) {
   RandomGeometry random(6406);
   for (int round = 0; round < 2000; ++round) {
     SCOPED_TRACE(testing::Message() << "seed 6406, round " << round);
@@ -71,7 +81,7 @@ TEST(FollowEveryPoint, BreaksNoPromiseWhateverThePoints) {
       points.push_back({p.x, p.y, w * random.Uniform(0.1, 1.0)});
     }
     for (bool const isClosed : {false, true}) {
-      Answer const answer = Fewest::FollowEveryPoint(points, isClosed);
+      Answer const answer = Fewest::FollowPoints(points, isClosed, All(points.size()));
       auto const report =
           Promises::Measure({points, answer.contour, answer.ranges, isClosed, 0.1, 0.0});
       EXPECT_TRUE(report.violations.empty()) << "closed " << isClosed;
@@ -81,7 +91,7 @@ TEST(FollowEveryPoint, BreaksNoPromiseWhateverThePoints) {
 }
 
 TEST(AppendClosingSegment, LeavesAPieceOfOnePointAlone) {
-  Answer answer = Fewest::FollowPoints({{0, 0, kTolerance}, {1, 0, kTolerance}}, false);
+  Answer answer = Fewest::FollowPoints({{0, 0, kTolerance}, {1, 0, kTolerance}}, false, None(2));
   answer.ranges = {{0, 0}};
   EXPECT_FALSE(Fewest::AppendClosingSegment(&answer));
   EXPECT_EQ(RangesOf(answer), (Ranges{{0, 0}}));
@@ -89,7 +99,7 @@ TEST(AppendClosingSegment, LeavesAPieceOfOnePointAlone) {
 }
 
 TEST(AppendClosingSegment, LeavesAContourThatEndsWhereItStartsAlone) {
-  Answer answer = Fewest::FollowPoints(Angle(), true);
+  Answer answer = Fewest::FollowPoints(Angle(), true, None(6));
   answer.ranges.back() = {4, 5};
   EXPECT_FALSE(Fewest::AppendClosingSegment(&answer));
   EXPECT_EQ(answer.contour.size(), 4U);

@@ -1,0 +1,131 @@
+#include "geometry/fewest/Mending.h"
+
+#include <algorithm>
+#include <iterator>
+#include <utility>
+
+namespace Vorn::Fewest {
+
+namespace {
+
+/// What a stretch is searched with.
+struct Tightness {
+  /// Of the tolerances.
+  double share;
+  /// Limits::jointRoom
+  double jointRoom;
+  bool segmentsOnly;
+};
+
+/// A little room is often enough and costs no piece. Segments keep to the path between the points.
+constexpr Tightness kTightness[] = {{1.0, 1.0, false},  {0.93, 1.0, false}, {0.8, 0.5, false},
+                                    {0.6, 0.25, false}, {0.4, 0.0, false},  {0.8, 0.0, true},
+                                    {0.2, 0.0, true},   {0.05, 0.0, true}};
+
+/// Copies parts of chains one after the other.
+class Copying {
+ public:
+  /// From a chain and how small the tolerances of its pieces were; both have to outlive this.
+  Copying(Chain const& old, std::vector<std::size_t> const& oldTightness)
+      : old_(old), oldTightness_(oldTightness) {}
+
+  /// The pieces of the old chain up to `end` that are not copied yet.
+  void KeepUpTo(std::size_t end) {
+    for (; next_ < end; ++next_) {
+      chain_.pieces.push_back(old_.pieces[next_]);
+      tightness_.push_back(oldTightness_[next_]);
+      AddGateBehind(next_);
+    }
+  }
+
+  /// The pieces of a part in place of those of a stretch.
+  void Replace(Stretch const& stretch, Chain const& part, std::size_t tightness) {
+    Chain const placed = MovedBy(part, old_.pieces[stretch.first].first);
+    chain_.pieces.insert(chain_.pieces.end(), placed.pieces.begin(), placed.pieces.end());
+    chain_.gates.insert(chain_.gates.end(), placed.gates.begin(), placed.gates.end());
+    chain_.offsets.insert(chain_.offsets.end(), placed.offsets.begin(), placed.offsets.end());
+    tightness_.insert(tightness_.end(), placed.pieces.size(), tightness);
+    AddGateBehind(stretch.end - 1);
+    next_ = stretch.end;
+  }
+
+  Chain&& TakeChain() { return std::move(chain_); }
+  std::vector<std::size_t>&& TakeTightness() { return std::move(tightness_); }
+
+ private:
+  void AddGateBehind(std::size_t piece) {
+    if (piece >= old_.gates.size()) return;
+    chain_.gates.push_back(old_.gates[piece]);
+    chain_.offsets.push_back(old_.offsets[piece]);
+  }
+
+  Chain const& old_;
+  std::vector<std::size_t> const& oldTightness_;
+  Chain chain_;
+  std::vector<std::size_t> tightness_;
+  std::size_t next_ = 0;
+};
+
+}  // namespace
+
+Mending::Mending(Path const& path, double share, Chain chain)
+    : path_(path), share_(share), chain_(std::move(chain)), tightness_(chain_.pieces.size()) {}
+
+bool Mending::Mend(std::vector<Promises::Violation> const& violations) {
+  Copying copying(chain_, tightness_);
+  bool isAnyLeft = false;
+  for (Stretch const& stretch : StretchesAround(violations)) {
+    auto const begin = tightness_.begin() + static_cast<std::ptrdiff_t>(stretch.first);
+    auto const end = tightness_.begin() + static_cast<std::ptrdiff_t>(stretch.end);
+    std::size_t const tightness = *std::max_element(begin, end) + 1;
+    if (tightness >= std::size(kTightness)) continue;
+    isAnyLeft = true;
+    std::fill(begin, end, tightness);
+    Chain const part = Search(stretch, tightness);
+    if (part.pieces.empty()) continue;
+    copying.KeepUpTo(stretch.first);
+    copying.Replace(stretch, part, tightness);
+  }
+  copying.KeepUpTo(chain_.pieces.size());
+  Chain next = copying.TakeChain();
+  tightness_ = copying.TakeTightness();
+  chain_ = std::move(next);
+  return isAnyLeft;
+}
+
+std::vector<Stretch> Mending::StretchesAround(
+    std::vector<Promises::Violation> const& violations) const {
+  std::size_t const count = chain_.pieces.size();
+  std::vector<char> isBad(count);
+  for (Promises::Violation const& violation : violations) {
+    isBad[violation.piece] = 1;
+    if (violation.otherPiece != Promises::kNone) isBad[violation.otherPiece] = 1;
+  }
+  std::vector<Stretch> stretches;
+  for (std::size_t k = 0; k < count; ++k) {
+    if (isBad[k] == 0) continue;
+    std::size_t const reach = 1 + tightness_[k] / 2;
+    Stretch const around{k - std::min(k, reach), std::min(k + 1 + reach, count)};
+    if (!stretches.empty() && stretches.back().end > around.first) {
+      stretches.back().end = around.end;
+    } else {
+      stretches.push_back(around);
+    }
+  }
+  return stretches;
+}
+
+Chain Mending::Search(Stretch const& stretch, std::size_t tightness) const {
+  if (!HasOuterPoints(chain_, stretch)) return {};
+  Tightness const& tighter = kTightness[tightness];
+  Path path = PathOf(path_, chain_, stretch);
+  Limits& limits = path.limits;
+  limits.jointRoom = tighter.jointRoom;
+  limits.segmentsOnly = limits.segmentsOnly || tighter.segmentsOnly;
+  if (tighter.jointRoom == 0.0) {
+    limits.farthestBetweenPoints = std::min(limits.farthestBetweenPoints, path.leastTolerance);
+  }
+  return FindChain(path, share_ * tighter.share, [](std::int32_t) {});
+}
+
+}  // namespace Vorn::Fewest
