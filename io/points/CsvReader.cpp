@@ -104,7 +104,8 @@ class Parser {
   /// Whether a line begins like a number and is no rule, or holds nothing but a comment.
   static bool MayBePoint(std::string_view line) {
     // Most lines: no search for a comment is needed to tell.
-    if (!line.empty() && IsDigit(line.front())) return true;
+    std::size_t const sign = line.substr(0, 1) == "-" ? 1 : 0;
+    if (sign < line.size() && IsDigit(line[sign])) return true;
     std::string_view const words = Trimmed(line.substr(0, FindComment(line)));
     if (words.empty() || IsDigit(words.front())) return true;
     return std::string_view("+-.").find(words.front()) != std::string_view::npos && !IsRule(words);
