@@ -126,8 +126,8 @@ Columns::Worst Columns::FindWorst(std::int32_t first, std::int32_t last,
     offer(i, kSmallBlock, residuals.LargestOfSmallBlock(i));
   }
   for (; i < last; ++i) offer(i, 1, residuals.At(i));
-  if (worst.index >= 0)
-    worst.index = residuals.FirstInBlock(worst.index, blockOfWorst, worst.value);
+  if (worst.index < 0) return worst;
+  worst.index = residuals.FirstInBlock(worst.index, blockOfWorst, worst.value);
   return worst;
 }
 

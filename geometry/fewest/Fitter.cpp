@@ -216,7 +216,7 @@ class Fitter {
     }
     if (chain.pieces.empty()) return false;
     if (options_.closed) return Close(chain, share * kSearchShare, answer, report);
-    return KeepsAny(path_, 0, chain, answer, report);
+    return KeepsSearched(path_, 0, chain, answer, report);
   }
 
   Chain FindOpen(double share) {
@@ -270,7 +270,7 @@ class Fitter {
       if (isFound && chain.pieces.size() >= answer->ranges.size()) continue;
       Answer closed;
       Promises::Report closedReport;
-      bool const isKept = KeepsAny(cut.path, cut.rotation, chain, &closed, &closedReport);
+      bool const isKept = KeepsSearched(cut.path, cut.rotation, chain, &closed, &closedReport);
       if (isFound && !isKept) continue;
       *answer = std::move(closed);
       *report = std::move(closedReport);
@@ -305,12 +305,14 @@ class Fitter {
     });
   }
 
-  bool KeepsAny(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
-                Promises::Report* report) const {
+  /// Whether a chain that was searched keeps every promise, mended where this is asked for.
+  bool KeepsSearched(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
+                     Promises::Report* report) const {
     return mends_ ? KeepsMended(path, rotation, chain, answer, report)
                   : KeepsCentred(path, rotation, chain, answer, report);
   }
 
+  /// Mends a chain until it keeps every promise; false when nothing is left to try.
   bool KeepsMended(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
                    Promises::Report* report) const {
     Mending mending(path, kSearchShare, chain);
@@ -353,7 +355,7 @@ class Fitter {
   Path path_;
   std::vector<std::int32_t> const& runStarts_;
   std::size_t bound_;
-  bool mends_ = false;
+  bool mends_ = false;  ///< whether chains that break promises are mended
   std::size_t quickSources_ = kSources[0];
   Progress& progress_;
 };

@@ -1,9 +1,12 @@
 #include <gtest/gtest.h>
 
 #include "geometry/fewest/Candidates.h"
+#include "support/fewest/Programmes.h"
 
 namespace Vorn::Fewest {
 namespace {
+
+using Testing::ProgrammeOf;
 
 constexpr Circle kAlongX{0.0, 0.0, 1.0, 0.0};
 
@@ -12,13 +15,6 @@ Columns Heights() {
   Columns columns;
   for (int i = 0; i < 16; ++i) columns.Append({1.0 * i, i % 4 == 0 ? 1.0 : i % 4 < 3 ? 3.0 : 2.0});
   return columns;
-}
-
-Programme ProgrammeOf(Columns const& columns) {
-  Programme programme;
-  programme.columns = &columns;
-  programme.last = columns.Size();
-  return programme;
 }
 
 TEST(Candidates, AreTheRowsAboveTheLimitAndTheFirstOfTheWorstIsTold) {

@@ -5,18 +5,13 @@
 
 #include "geometry/fewest/RunTest.h"
 #include "support/RandomGeometry.h"
+#include "support/fewest/Programmes.h"
 
 namespace Vorn::Fewest {
 namespace {
 
+using Testing::ProgrammeOf;
 using Testing::RandomGeometry;
-
-Programme ProgrammeOf(Columns const& columns) {
-  Programme programme;
-  programme.columns = &columns;
-  programme.last = columns.Size();
-  return programme;
-}
 
 /// The corners of a square of side 2 and its middle.
 Columns SquareWithMiddle(double tolerance) {

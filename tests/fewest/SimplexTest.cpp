@@ -3,24 +3,19 @@
 #include <cmath>
 
 #include "geometry/fewest/Simplex.h"
+#include "support/fewest/Programmes.h"
 
 namespace Vorn::Fewest {
 namespace {
 
-/// A programme over all rows.
-Programme Over(Columns const& columns) {
-  Programme programme;
-  programme.columns = &columns;
-  programme.last = columns.Size();
-  return programme;
-}
+using Testing::ProgrammeOf;
 
 /// Three points within a tenth of y = 0 and the line as what is to be largest.
 TEST(Simplex, SteepestLineThroughASlab) {
   Columns columns;
   columns.Append({-1.0, 0.0, 0.125});
   columns.Append({1.0, 0.0, 0.125});
-  Programme programme = Over(columns);
+  Programme programme = ProgrammeOf(columns);
   programme.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0});
   Simplex simplex(1e-12);
   Basis basis;
@@ -35,7 +30,7 @@ TEST(Simplex, HalfSpacesBindOnOneSideOnly) {
   Columns columns;
   columns.Append({1.0, 0.0, 1.0});
   columns.Append({0.0, 1.0, 1.0});
-  Programme programme = Over(columns);
+  Programme programme = ProgrammeOf(columns);
   programme.Add({{0.0, 0.0, 0.0, 1.0}, Condition::Kind::HalfSpace, 0.25});
   Simplex simplex(1e-12);
   Basis basis;
@@ -56,7 +51,7 @@ TEST(Simplex, LongRunsHaveTheOptimumOfAllRows) {
     double const x = static_cast<double>(i) / kHalf;
     columns.Append({x, 4.0 * x * x * x - 3.0 * x, 1.0});
   }
-  Programme programme = Over(columns);
+  Programme programme = ProgrammeOf(columns);
   programme.Add({{1.0, 0.0, 0.0, 0.0}, Condition::Kind::Equality, 0.0});
   Simplex simplex(1e-12);
   Basis basis;
@@ -75,7 +70,7 @@ TEST(Simplex, RowsOfTheBasisThatRoundingBreaksAreNotExchangedForever) {
     double const x = 1.0 + 1e-4 * i;
     columns.Append({x, 1.0 + 1e-5 * ((7 * i) % 5), 1e-4});
   }
-  Programme programme = Over(columns);
+  Programme programme = ProgrammeOf(columns);
   Simplex simplex(1e-15);
   Basis basis;
   ASSERT_EQ(simplex.Maximise(programme, {0.0, 0.0, 1.0, 0.0}, 0.0, &basis),

@@ -8,7 +8,7 @@ namespace Vorn::Cells {
 namespace {
 
 /// Room for two parts of every letter while half of the slots stay free, so that the table seldom
-/// has to be enlarged. With 2 fits by cells took 3 to 9 per cent longer.
+/// has to be enlarged. With 2 some fits by cells took 3 to 9 per cent longer.
 constexpr std::size_t kSlotsPerLetter = 4;
 
 /// The slots are doubled when one in so many is taken.
