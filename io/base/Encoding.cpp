@@ -28,6 +28,7 @@ constexpr std::uint32_t kLeadingOnes = 0xFF80;
 constexpr std::uint32_t kFirstCodeOfThree = 0x800;
 constexpr std::uint32_t kLargestCode = 0x10FFFF;
 
+constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 constexpr std::string_view kLittleEndianMark = "\xFF\xFE";
 constexpr std::string_view kBigEndianMark = "\xFE\xFF";
 
@@ -114,6 +115,11 @@ bool IsUtf8(std::string_view text) {
     text.remove_prefix(length);
   }
   return true;
+}
+
+std::string_view WithoutUtf8Mark(std::string_view text) {
+  if (text.starts_with(kUtf8Mark)) text.remove_prefix(kUtf8Mark.size());
+  return text;
 }
 
 bool IsUtf16(std::string_view text) {

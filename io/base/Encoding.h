@@ -21,6 +21,9 @@ Utf8Character FirstCharacter(std::string_view text);
 /// Whether all of the text is UTF-8.
 bool IsUtf8(std::string_view text);
 
+/// Without the byte order mark of UTF-8 that may stand ahead of the text.
+std::string_view WithoutUtf8Mark(std::string_view text);
+
 /// Whether the text begins with a byte order mark of UTF-16.
 bool IsUtf16(std::string_view text);
 

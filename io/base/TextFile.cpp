@@ -1,4 +1,4 @@
-
+#include <algorithm>
 #include <cerrno>
 #include <cstring>
 #include <filesystem>
@@ -7,7 +7,7 @@
 #include <string_view>
 
 #include "io/base/Encoding.h"
-#include "io/base/TextLines.h"
+#include "io/base/LongLines.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Files.h"
 
@@ -19,9 +19,8 @@ constexpr std::size_t kMebibyte = std::size_t{1} << 20;
 
 constexpr std::size_t kFirstBlock = std::size_t{64} * 1024;
 
-/// What is read before a line without an end can be told. A multiple of the first block by a power
-/// of two, so that blocks of doubled size come to it.
-constexpr std::size_t kFirstLook = 2 * kLongestTableLine;
+/// Of a line without an end no more is read than one block behind the longest that may be.
+constexpr std::size_t kLargestBlock = std::size_t{16} << 20;
 
 /// Far above any measurement.
 constexpr std::size_t kLargestText = std::size_t{4} << 30;
@@ -50,36 +49,31 @@ void RefuseBinary(std::string const& path, std::string_view block, std::size_t o
   Refuse(path, "is not text: byte " + std::to_string(offset + zero) + " is zero");
 }
 
-/// Only tables of points begin with a number, and these have no such lines: what else there may be
-/// need not be read.
-void RefuseEndlessLine(std::string const& path, std::string_view text) {
-  constexpr std::string_view kNumberBegins = "+-.,0123456789";
-  bool const isTable = kNumberBegins.find(text.front()) != std::string_view::npos;
-  if (!isTable || text.find_first_of("\r\n") <= kLongestTableLine) return;
-  throw Failure(FailureKind::File, {InputName(path), 1}, kLineTooLong);
+/// How much is read next. What does not say how long it is comes in blocks of doubled size.
+std::size_t NextBlock(std::size_t size, std::size_t expected) {
+  if (size < expected) return std::min(expected - size, kLargestBlock);
+  return std::clamp(size, kFirstBlock, kLargestBlock);
 }
 
 std::string ReadAll(std::string const& path, std::istream& in, std::size_t expected) {
   std::size_t const largest = expected == kFirstBlock ? kLargestStream : kLargestText;
+  LongLines lines(InputName(path));
   std::string text;
   std::size_t size = 0;
-  std::size_t room = std::min(expected, kFirstLook);
-  for (; in; room = room < expected ? expected : 2 * room) {
+  while (in) {
     if (size >= largest) {
       Refuse(path, "is too large: more than " + std::to_string(largest / kMebibyte) + " MiB");
     }
-    text.resize(std::min(room, largest + 1));
+    text.resize(std::min(size + NextBlock(size, expected), largest + 1));
     in.read(text.data() + size, static_cast<std::streamsize>(text.size() - size));
-    auto const count = static_cast<std::size_t>(in.gcount());
+    text.resize(size + static_cast<std::size_t>(in.gcount()));
     if (expected == kFirstBlock && !IsUtf16(text)) {
-      RefuseBinary(path, std::string_view(text).substr(size, count), size);
+      RefuseBinary(path, std::string_view(text).substr(size), size);
     }
-    bool const isFirstLook = size < kFirstLook && size + count >= kFirstLook;
-    size += count;
-    if (isFirstLook) RefuseEndlessLine(path, std::string_view(text).substr(0, size));
+    size = text.size();
+    lines.Look(text);
   }
   if (in.bad()) Refuse(path, "cannot be read");
-  text.resize(size);
   return text;
 }
 

@@ -11,7 +11,7 @@ inline constexpr std::size_t kLongestTableLine = std::size_t{16} << 20;
 
 /// What is said of a longer one.
 inline constexpr char const* kLineTooLong =
-    "the line is longer than 16 MiB: no points file has such lines";
+    "the line is longer than 16 MiB: no table and no tool path has such lines";
 
 /// Walks over the lines of a text; a line ends with LF, CR LF or CR.
 class TextLines {

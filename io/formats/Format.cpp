@@ -1,6 +1,7 @@
 #include <array>
 #include <filesystem>
 
+#include "io/base/FirstLine.h"
 #include "io/base/Words.h"
 #include "io/formats/CsvPieces.h"
 #include "io/formats/Dxf.h"
@@ -39,30 +40,6 @@ constexpr std::array<NamedFormat, 12> kFormats = {{
     {"png", Format::Png},
     {"ngc", Format::GCode},
 }};
-
-constexpr std::string_view kCurves[] = {"srid",         "linestring",    "circularstring",
-                                        "multicurve",   "compoundcurve", "multilinestring",
-                                        "curvepolygon", "polygon",       "multipolygon"};
-
-bool IsComment(std::string_view line) { return line.starts_with('#'); }
-
-/// The first line that says something, in lower case.
-std::string FirstLine(std::string_view text) {
-  Lines lines(text);
-  std::string_view line;
-  while (lines.Next(&line)) {
-    line = Trimmed(line);
-    if (!line.empty() && !IsComment(line)) return LowerCase(line);
-  }
-  return {};
-}
-
-bool LooksLikeWkt(std::string_view line) {
-  for (std::string_view const curve : kCurves) {
-    if (line.starts_with(curve)) return true;
-  }
-  return false;
-}
 
 bool LooksLikeGCode(std::string_view line) {
   constexpr std::string_view kSigns = "%(;";

@@ -6,6 +6,7 @@
 #include <cmath>
 #include <optional>
 
+#include "io/base/Encoding.h"
 #include "io/pieces/Shapes.h"
 #include "vorn/io/Failure.h"
 #include "vorn/io/Messages.h"
@@ -13,18 +14,7 @@
 
 namespace Vorn::IO {
 
-namespace {
-
-constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
-
-std::string_view WithoutMark(std::string_view text) {
-  if (text.starts_with(kUtf8Mark)) text.remove_prefix(kUtf8Mark.size());
-  return text;
-}
-
-}  // namespace
-
-Lines::Lines(std::string_view text) : lines_(WithoutMark(text)) {}
+Lines::Lines(std::string_view text) : lines_(WithoutUtf8Mark(text)) {}
 
 bool Lines::Next(std::string_view* line) {
   if (lines_.AtEnd()) return false;

@@ -20,7 +20,7 @@ constexpr double kSharpestTurn = 135.0 / 180.0 * pi;
 
 constexpr double kStretchInTolerances = 20.0;
 constexpr double kLargestShareOfLength = 1.0 / 20.0;
-constexpr double kLeastCorner = 20.0 / 180.0 * pi;
+constexpr double kLeastSeamTurn = 20.0 / 180.0 * pi;
 
 /// Between the directions a to b and c to d; 0 when one of them has no length.
 double TurnBetween(WPoint const& a, WPoint const& b, WPoint const& c, WPoint const& d) {
@@ -146,7 +146,7 @@ std::optional<std::size_t> SharpestCorner(std::vector<WPoint> const& points,
                                   kLargestShareOfLength * walk.Length());
   std::vector<double> const turns = walk.Turns(stretch);
   auto const sharpest = std::max_element(turns.begin(), turns.end());
-  if (*sharpest <= kLeastCorner) return {};
+  if (*sharpest <= kLeastSeamTurn) return {};
   return static_cast<std::size_t>(sharpest - turns.begin());
 }
 

@@ -22,7 +22,6 @@ namespace Vorn::IO {
 
 namespace {
 
-constexpr std::string_view kUtf8Mark = "\xEF\xBB\xBF";
 constexpr std::size_t kShortestLine = 4;  // 1,2 and its end
 
 std::string_view TakeWord(std::string_view* text) {
@@ -49,8 +48,7 @@ class Parser {
 
   PointFile Parse(std::string_view bytes) {
     std::optional<std::string> const decoded = Utf8FromUtf16(bytes);
-    std::string_view text = decoded ? *decoded : bytes;
-    if (text.substr(0, kUtf8Mark.size()) == kUtf8Mark) text.remove_prefix(kUtf8Mark.size());
+    std::string_view const text = WithoutUtf8Mark(decoded ? *decoded : bytes);
     RefuseOtherThanText(text, place_);
     ReservePoints(text);
     table_ = FindTable(text);

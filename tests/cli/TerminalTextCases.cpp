@@ -177,5 +177,29 @@ TEST_F(Program, AnEndlessLineIsRefusedBeforeItIsRead) {
   }
 }
 
+TEST_F(Program, AnEndlessLineBehindOthersIsRefusedBeforeItIsRead) {
+  struct {
+    char const* file;
+    char const* lines;
+    char const* command;
+  } const cases[] = {
+      {"table.csv", "x,y\\n1,2\\n", "info"},
+      {"pieces.csv", "type,start_x,start_y,end_x,end_y\\nline,0,0,1,1\\n", "area"},
+      {"path.nc", "G21\\nG0 X0 Y0\\n", "area"},
+      {"drawing.dxf", "0\\nSECTION\\n", "area"},
+  };
+  for (auto const& [file, lines, command] : cases) {
+    Ended const ended =
+        Run(std::string(command) + " " + file,
+            "(printf '" + std::string(lines) + "'; head -c 400000000 /dev/zero | tr '\\0' 1) >" +
+                file + ";" + MemoryLimit(300));
+    fs::remove(folder_ / file);
+    EXPECT_EQ(ended.code, 3) << file;
+    EXPECT_NE(ended.err.find(std::string(file) + ":3: the line is longer than 16 MiB"),
+              std::string::npos)
+        << ended.err;
+  }
+}
+
 }  // namespace
 }  // namespace Vorn::Cli::Testing

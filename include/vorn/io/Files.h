@@ -20,7 +20,8 @@ VORN_IO_EXPORT std::string InputName(std::string const& path);
 
 /// The whole contents of a file, read in one go; those of `in` for the path `-`.
 /// @throws Failure (FailureKind::File) naming the file when it cannot be read, is a directory, or
-///         begins with a number in a line of more than 16 MiB: of such a file 32 MiB are read.
+///         has a line of more than 16 MiB; of 256 MiB where it begins as JSON, XML or well-known
+///         text, which may stand in one line. No more than 16 MiB behind so much of it are read.
 VORN_IO_EXPORT std::string ReadTextFile(std::string const& path, std::istream& in);
 
 /// A file that appears whole or not at all: written under another name in the same folder, forced
