@@ -13,6 +13,10 @@
 namespace Vorn::Fuzz {
 namespace {
 
+/// Of most inputs, so that many are tried: a search of 48 points takes some ten times as long.
+constexpr int kMostPointsAsARule = 20;
+constexpr int kMostPoints = 48;
+
 FewestPieces::Options MakeOptions(Input* input) {
   FewestPieces::Options options;
   options.effort = FewestPieces::Effort{input->Integer(0, 2)};
@@ -68,7 +72,9 @@ extern "C" int LLVMFuzzerTestOneInput(std::uint8_t const* data, std::size_t size
   Fuzz::Input input(data, size);
   FewestPieces::Options const options = Fuzz::MakeOptions(&input);
   bool const isSpoilt = input.Byte() % 8 == 0;
-  std::vector<Vorn::WPoint> points = input.Path(48);
+  int const most = input.Byte() % 8 == 0 ? Fuzz::kMostPoints : Fuzz::kMostPointsAsARule;
+  std::vector<Vorn::WPoint> points =
+      input.PathOfRest(most, isSpoilt ? Fuzz::Input::kBytesToSpoil : 0);
   if (isSpoilt) input.Spoil(&points);
   FewestPieces::Result result;
   std::string const untouched = Fuzz::TextOf(result);

@@ -2,6 +2,7 @@
 // coincidences, collinear points and touching circles are common, with odd values among them.
 #pragma once
 
+#include <algorithm>
 #include <cstddef>
 #include <cstdint>
 #include <limits>
@@ -54,25 +55,19 @@ class Input {
   /// `most` points. One byte of the path gives a turn and a length, so that straight runs and arcs
   /// are likely.
   std::vector<WPoint> Path(int most) {
-    std::vector<WPoint> points;
-    double const tolerance = kTolerances[Byte() % 8U];
-    double x = OnGrid();
-    double y = OnGrid();
-    int heading = Byte() % kHeadings;
-    int turn = 0;
-    int const count = Integer(0, most);
-    for (int i = 0; i < count; ++i) {
-      std::uint8_t const step = Byte();
-      if (step < 64) turn = step % 7 - 3;
-      heading = (heading + turn + kHeadings) % kHeadings;
-      double const length = step % 32U == 31 ? 0.125 : 1.0;
-      x += length * Cosine(heading);
-      y += length * Cosine(heading + kHeadings - kHeadings / 4);
-      double const across = tolerance * (static_cast<int>(step % 5U) - 2) / 4.0;
-      points.push_back({x + across, y - across, step % 16U == 15 ? 0.5 * tolerance : tolerance});
-    }
-    return points;
+    PathStart const start = TakePathStart();
+    return Walk(start, Integer(0, most));
   }
+
+  /// The same with a point for each byte but the last `kept` ones, at most `most`: no step is
+  /// made up, so that the cost follows the length of the input.
+  std::vector<WPoint> PathOfRest(int most, int kept) {
+    PathStart const start = TakePathStart();
+    return Walk(start, std::clamp(static_cast<int>(end_ - data_) - kept, 0, most));
+  }
+
+  /// The bytes that Spoil takes at most.
+  static constexpr int kBytesToSpoil = 6;
 
   /// What no measuring machine delivers, put in the place of one value of one point.
   void Spoil(std::vector<WPoint>* points) {
@@ -103,6 +98,42 @@ class Input {
                                     0.1,
                                     1e-9,
                                     2.2250738585072014e-308};
+
+  struct PathStart {
+    double tolerance = 0.0;
+    double x = 0.0;
+    double y = 0.0;
+    int heading = 0;
+  };
+
+  PathStart TakePathStart() {
+    PathStart start;
+    start.tolerance = kTolerances[Byte() % 8U];
+    start.x = OnGrid();
+    start.y = OnGrid();
+    start.heading = Byte() % kHeadings;
+    return start;
+  }
+
+  std::vector<WPoint> Walk(PathStart const& start, int count) {
+    std::vector<WPoint> points;
+    double const tolerance = start.tolerance;
+    double x = start.x;
+    double y = start.y;
+    int heading = start.heading;
+    int turn = 0;
+    for (int i = 0; i < count; ++i) {
+      std::uint8_t const step = Byte();
+      if (step < 64) turn = step % 7 - 3;
+      heading = (heading + turn + kHeadings) % kHeadings;
+      double const length = step % 32U == 31 ? 0.125 : 1.0;
+      x += length * Cosine(heading);
+      y += length * Cosine(heading + kHeadings - kHeadings / 4);
+      double const across = tolerance * (static_cast<int>(step % 5U) - 2) / 4.0;
+      points.push_back({x + across, y - across, step % 16U == 15 ? 0.5 * tolerance : tolerance});
+    }
+    return points;
+  }
 
   /// A dyadic wave with the period of one turn: headings repeat exactly, on every machine.
   static double Cosine(int heading) {

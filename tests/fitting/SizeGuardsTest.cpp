@@ -158,5 +158,26 @@ TEST(SizeGuards, AnArcCellOf19531TrianglesIsNarrowedFurther) {
   ExpectFitOfArcAsPlain(points);
 }
 
+TEST(SizeGuards, AnArcCellOf19532TrianglesIsRebuilt) {
+  std::vector<WPoint> const points = Scaled({{1281, 0, 15},
+                                             {1278, 105, 33},
+                                             {1256, 207, 29},
+                                             {1256, 314, 58},
+                                             {1219, 413, 50},
+                                             {1172, 507, 32},
+                                             {1126, 601, 25},
+                                             {1086, 699, 48},
+                                             {1006, 770, 40},
+                                             {943, 853, 29},
+                                             {876, 933, 33},
+                                             {792, 995, 48},
+                                             {711, 1062, 19},
+                                             {624, 1119, 24},
+                                             {528, 1161, 24},
+                                             {432, 1202, 21}});
+  ASSERT_EQ(ArcCellSizes(points, 19531).back(), 19532u);
+  ExpectFitOfArcAsPlain(points);
+}
+
 }  // namespace
 }  // namespace Vorn::Testing

@@ -1,5 +1,6 @@
 // Inputs at the ends of what can be passed: more points than indices count, a million points in one
-// place, coordinates whose squares are infinite or vanish.
+// place, coordinates whose squares are infinite or vanish, tolerances of nothing or beyond all
+// size.
 #include <sys/mman.h>
 
 #include <cmath>
@@ -198,6 +199,43 @@ TEST(CoordinatesWithVanishingSquares, EndWithAnAnswerOfTheFewestWhenTheyAreDenor
     ErrorCode const code = FewestPieces::Fit(Corner(step), {}, &result, nullptr, 100);
     EXPECT_EQ(code == ErrorCode::Ok, !result.contour.empty());
   }
+}
+
+/// A corner in steps of 1 whose points have this tolerance.
+std::vector<WPoint> CornerOfTolerance(double tolerance) {
+  std::vector<WPoint> points = Corner(1.0);
+  for (WPoint& p : points) p.w = tolerance;
+  return points;
+}
+
+TEST(ExtremeTolerances, EndWithAnAnswerInEveryStrategy) {
+  constexpr double kLargest = std::numeric_limits<double>::max();
+  for (double const tolerance : {0.0, 0x1p-1074, 1e-300, 1e-17, 1e17, 1e300, kLargest}) {
+    SCOPED_TRACE(tolerance);
+    ExpectAnAnswerInEveryStrategy(CornerOfTolerance(tolerance));
+  }
+}
+
+TEST(ExtremeTolerances, BelowAllRoundingAreKeptByTheFewest) {
+  for (double const tolerance : {0x1p-1074, 1e-300, 1e-17}) {
+    SCOPED_TRACE(tolerance);
+    FewestPieces::Result result;
+    ASSERT_EQ(FewestPieces::Fit(CornerOfTolerance(tolerance), {}, &result, nullptr, 100),
+              ErrorCode::Ok);
+    EXPECT_LE(result.largestDeviation, 1.0);
+    EXPECT_EQ(result.ranges.size(), 2U);
+  }
+}
+
+TEST(ExtremeTolerances, OfNothingAreRefusedByTheFewestAndThoseBeyondAllPointsHaveNoFit) {
+  FewestPieces::Result result;
+  EXPECT_EQ(FewestPieces::Fit(CornerOfTolerance(0.0), {}, &result, nullptr, 100),
+            ErrorCode::Failed);
+  for (double const tolerance : {1e17, 1e300, std::numeric_limits<double>::max()}) {
+    EXPECT_EQ(FewestPieces::Fit(CornerOfTolerance(tolerance), {}, &result, nullptr, 100),
+              ErrorCode::NoFit);
+  }
+  EXPECT_TRUE(result.contour.empty());
 }
 
 /// Every product of two coordinates is 0, so lines that cross count as parallel ones.
