@@ -31,9 +31,16 @@ struct Answer {
   std::int64_t peakBytes = 0;
 };
 
-Answer Fit(std::vector<WPoint> const& points, Effort effort) {
+/// What varies from one benchmark of a profile to another.
+struct Manner {
+  Effort effort = Effort::Quick;
+  bool isClosed = false;
+};
+
+Answer Fit(std::vector<WPoint> const& points, Manner const& manner) {
   FewestPieces::Options options;
-  options.effort = effort;
+  options.effort = manner.effort;
+  options.closed = manner.isClosed;
   Answer answer;
   AllocationMeter const meter;
   answer.code = FewestPieces::Fit(points, options, &answer.result, nullptr, 100);
@@ -51,30 +58,34 @@ void Report(Profile const& profile, Answer const& answer, benchmark::State* stat
   state->counters["pieces"] = static_cast<double>(answer.result.ranges.size());
   state->counters["arcs"] = arcs;
   state->counters["bound"] = answer.result.fewestPossible;
-  if (profile.truePieces > 0) state->counters["true_pieces"] = profile.truePieces;
   state->counters["largest_relative_deviation"] = answer.result.largestDeviation;
   state->counters["peak_bytes_per_point"] = static_cast<double>(answer.peakBytes) / count;
   state->counters["code"] = static_cast<double>(answer.code);
 }
 
-char const* NameOf(Effort effort) { return effort == Effort::Quick ? "Quick" : "Wide"; }
+std::string NameOf(Manner const& manner) {
+  std::string const name = manner.effort == Effort::Quick ? "Quick" : "Wide";
+  return manner.isClosed ? name + "_closed" : name;
+}
 
-void RegisterFit(std::string const& profileName, SubjectOfSize const& subject, Effort effort,
+void RegisterFit(std::string const& profileName, SubjectOfSize const& subject, Manner manner,
                  std::shared_ptr<TimeBudget> const& budget) {
   auto const answer = std::make_shared<std::optional<Answer>>();
   auto const body = [=](benchmark::State& state) {
     if (!IsWithin(*budget, subject.size, &state)) return;
     Profile const& profile = subject.subject->Get();
     TimeWithin(budget.get(), subject.size, &state, [&] {
-      Answer next = Fit(profile.points, effort);
+      Answer next = Fit(profile.points, manner);
       if (!*answer) *answer = std::move(next);
     });
     if ((*answer)->code == ErrorCode::Ok && (*answer)->result.largestDeviation > 1.0) {
       state.SkipWithError("the contour does not keep the tolerance");
     }
     Report(profile, **answer, &state);
+    bool const isKnown = profile.truePieces > 0 && !manner.isClosed;
+    if (isKnown) state.counters["true_pieces"] = profile.truePieces;
   };
-  std::string const name = std::string("BM_FewestPieces_") + NameOf(effort) + '/' + profileName +
+  std::string const name = std::string("BM_FewestPieces_") + NameOf(manner) + '/' + profileName +
                            '/' + std::to_string(subject.size);
   benchmark::RegisterBenchmark(name.c_str(), body)->Unit(benchmark::kMillisecond);
 }
@@ -139,7 +150,7 @@ void RegisterScans(Scale scale) {
     std::int64_t const largest = scale == Scale::Smoke ? smallest : maker.largest;
     for (std::int64_t size = smallest; size <= largest; size *= 10) {
       auto const subject = std::make_shared<Subject>([=] { return maker.make(size); });
-      RegisterFit(maker.name, {size, subject}, maker.effort, budget);
+      RegisterFit(maker.name, {size, subject}, {maker.effort}, budget);
     }
   }
 }
@@ -148,7 +159,7 @@ void RegisterProfilesOfStrategies(Scale scale) {
   for (Maker const& maker : kMakers) {
     auto const budget = std::make_shared<TimeBudget>(SecondsFor(scale));
     for (SubjectOfSize const& subject : SubjectsOf(maker, SizesFor(scale))) {
-      RegisterFit(maker.name, subject, Effort::Quick, budget);
+      RegisterFit(maker.name, subject, {}, budget);
     }
   }
 }
@@ -161,7 +172,8 @@ void RegisterMeasured(Scale scale) {
     auto const subject = std::make_shared<Subject>([=] { return Load(*folder, contour); });
     auto const size = static_cast<std::int64_t>(subject->Get().points.size());
     auto const budget = std::make_shared<TimeBudget>(SecondsFor(scale));
-    RegisterFit(contour.name, {size, subject}, Effort::Quick, budget);
+    RegisterFit(contour.name, {size, subject}, {}, budget);
+    if (contour.isClosed) RegisterFit(contour.name, {size, subject}, {Effort::Quick, true}, budget);
   }
 }
 

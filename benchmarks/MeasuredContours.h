@@ -18,19 +18,20 @@ struct MeasuredContour {
   bool isPerPoint;
   int truePieces;        ///< 0 when not known
   bool isSlowWhenPlain;  ///< the plain composition takes many seconds to minutes
+  bool isClosed;         ///< the last point leads back to the first
 };
 
 constexpr MeasuredContour kMeasuredContours[] = {
-    {"rail_head_known_arcs", 0.01, false, 7, false},
-    {"wheel_worn_a", 0.03, false, 0, false},
-    {"rail_worn_low", 0.025, false, 0, false},
-    {"mirror_sphere_83m", 0.00005, false, 1, false},
-    {"hatch_boundary", 0.002, false, 0, false},
-    {"glyph_five", 2.0, true, 0, false},
-    {"test_track_centreline", 0.03, true, 0, true},
-    {"gcode_letter_d", 0.015, false, 0, false},
-    {"airfoil_clark_y", 0.0004, false, 0, false},
-    {"circle_r3", 0.001, false, 1, false},
+    {"rail_head_known_arcs", 0.01, false, 7, false, false},
+    {"wheel_worn_a", 0.03, false, 0, false, false},
+    {"rail_worn_low", 0.025, false, 0, false, false},
+    {"mirror_sphere_83m", 0.00005, false, 1, false, false},
+    {"hatch_boundary", 0.002, false, 0, false, true},
+    {"glyph_five", 2.0, true, 0, false, true},
+    {"test_track_centreline", 0.03, true, 0, true, false},
+    {"gcode_letter_d", 0.015, false, 0, false, true},
+    {"airfoil_clark_y", 0.0004, false, 0, false, false},
+    {"circle_r3", 0.001, false, 1, false, true},
 };
 
 inline Profile Load(std::string const& folder, MeasuredContour const& contour) {

@@ -183,17 +183,19 @@ def fitting_tables(cases):
 
 def fewest_rows(cases):
     for case in cases.values():
-        effort = case.function.removeprefix("BM_FewestPieces_")
-        if effort == case.function:
+        manner = case.function.removeprefix("BM_FewestPieces_")
+        if manner == case.function:
             continue
-        row = [case.profile.replace("_", " "), f"{case.size:,}", effort.lower()]
+        effort, is_closed, _ = manner.partition("_closed")
+        closed = ", closed" if is_closed else ""
+        row = [case.profile.replace("_", " ") + closed, f"{case.size:,}", effort.lower()]
         if case.error:
             yield row + [f"*left out: {left_out(case)}*"] + [""] * 8
             continue
         true_pieces = case.get("true_pieces")
         arcs = int(case.get("arcs"))
         mixed = cases.get(f"BM_CreateFittingCurve_Mixed/{case.profile}/{case.size}")
-        has_mixed = mixed is not None and mixed.per_item is not None
+        has_mixed = mixed is not None and mixed.per_item is not None and not is_closed
         yield row + [
             time_text(case.per_item),
             CODES.get(int(case.get("code")), str(int(case.get("code")))),

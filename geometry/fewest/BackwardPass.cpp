@@ -1,6 +1,7 @@
 #include "geometry/fewest/BackwardPass.h"
 
 #include <algorithm>
+#include <utility>
 
 namespace Vorn::Fewest {
 
@@ -34,7 +35,7 @@ class BackwardPass {
       behind.high -= quarter;
       k += 2;
     }
-    return chain_;
+    return std::move(chain_);
   }
 
  private:

@@ -26,18 +26,17 @@ Joint Reversed(Joint joint, std::int32_t count) {
   return {gate, -joint.offset};
 }
 
-/// How many runs of the greedy cover it takes to cover so many points from the first on, which is
-/// the least number of pieces for them.
+}  // namespace
+
 std::size_t CountRuns(std::span<std::int32_t const> runStarts, std::int32_t points) {
   auto const end = std::lower_bound(runStarts.begin(), runStarts.end(), points);
   return static_cast<std::size_t>(end - runStarts.begin());
 }
 
-}  // namespace
-
 Path Reversed(Path const& path) {
   Path reversed = path;
   std::reverse(reversed.points.begin(), reversed.points.end());
+  std::swap(reversed.before, reversed.behind);
   return reversed;
 }
 
@@ -51,6 +50,20 @@ Chain Reversed(Chain const& chain, std::int32_t count) {
     Joint const joint = Reversed({chain.gates[k - 1], chain.offsets[k - 1]}, count);
     reversed.gates.push_back(joint.gate);
     reversed.offsets.push_back(joint.offset);
+  }
+  return reversed;
+}
+
+Circuit Reversed(Circuit const& circuit, std::int32_t count) {
+  Circuit reversed;
+  for (std::size_t k = circuit.size(); k-- > 0;) {
+    // A piece starts where it ended.
+    CircuitPiece const& next = circuit[(k + 1) % circuit.size()];
+    Joint const one = Reversed({next.gate, next.low}, count);
+    Joint const other = Reversed({next.gate, next.high}, count);
+    reversed.push_back({one.gate, std::min(one.offset, other.offset),
+                        std::max(one.offset, other.offset), Scaled(circuit[k].circle, -1.0), 0});
+    reversed.back().gate.split %= count;
   }
   return reversed;
 }

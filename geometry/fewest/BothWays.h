@@ -1,10 +1,12 @@
 #pragma once
 
+#include <cstddef>
 #include <cstdint>
 #include <functional>
 #include <span>
 
 #include "geometry/fewest/Chain.h"
+#include "geometry/fewest/Circuit.h"
 
 /// The search of the chain from both ends of the path.
 namespace Vorn::Fewest {
@@ -15,6 +17,13 @@ Path Reversed(Path const& path);
 /// A chain of a reversed path as a chain of the path itself, which has `count` points. Its own
 /// inverse.
 Chain Reversed(Chain const& chain, std::int32_t count);
+
+/// The same for a circuit of a reversed path.
+Circuit Reversed(Circuit const& circuit, std::int32_t count);
+
+/// How many runs of the greedy cover it takes to cover so many points from the first on, which is
+/// the least number of pieces for them.
+std::size_t CountRuns(std::span<std::int32_t const> runStarts, std::int32_t points);
 
 /// Searches a chain over an open path forwards and, where it has more pieces than the greedy cover
 /// has runs, backwards: gates are laid from the end of the piece before, so that one direction may

@@ -10,20 +10,44 @@
 
 namespace Vorn::Fewest {
 
-Cover CoverGreedily(std::span<WPoint const> points, Limits const& limits,
-                    std::function<void(std::int32_t)> const& tell) {
+namespace {
+
+/// Covers the points until `goesOn`, which hears how many are covered, says no.
+Cover CoverWhile(std::span<WPoint const> points, Limits const& limits,
+                 std::function<bool(Cover const&, std::int32_t)> const& goesOn) {
   Cover cover;
   auto const count = static_cast<std::int32_t>(points.size());
   FreeRun run(points, limits);
   std::int32_t expected = 8;
-  for (std::int32_t start = 0; start < count;) {
+  for (std::int32_t start = 0; start < count && goesOn(cover, start);) {
     cover.starts.push_back(start);
     std::int32_t const end = run.FindEnd(start, expected);
     expected = end - start;
     start = end;
-    tell(start);
   }
   cover.last = run.Covering();
+  return cover;
+}
+
+}  // namespace
+
+Cover CoverGreedily(std::span<WPoint const> points, Limits const& limits,
+                    std::function<void(std::int32_t)> const& tell) {
+  Cover cover = CoverWhile(points, limits, [&](Cover const&, std::int32_t covered) {
+    if (covered > 0) tell(covered);
+    return true;
+  });
+  tell(static_cast<std::int32_t>(points.size()));
+  return cover;
+}
+
+Cover CoverWithin(std::size_t most, std::span<WPoint const> points, Limits const& limits) {
+  bool isEnough = true;
+  Cover cover = CoverWhile(points, limits, [&](Cover const& runs, std::int32_t) {
+    isEnough = runs.starts.size() < most;
+    return isEnough;
+  });
+  if (!isEnough) cover.starts.clear();
   return cover;
 }
 

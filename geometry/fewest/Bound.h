@@ -26,4 +26,7 @@ struct Cover {
 Cover CoverGreedily(std::span<WPoint const> points, Limits const& limits,
                     std::function<void(std::int32_t)> const& tell);
 
+/// The same where no more than `most` runs are enough; no starts where they are not.
+Cover CoverWithin(std::size_t most, std::span<WPoint const> points, Limits const& limits);
+
 }  // namespace Vorn::Fewest

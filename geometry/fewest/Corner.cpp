@@ -1,6 +1,9 @@
 #include "geometry/fewest/Corner.h"
 
+#include <algorithm>
 #include <cmath>
+
+#include "geometry/fewest/JointRoom.h"
 
 namespace Vorn::Fewest {
 
@@ -11,6 +14,9 @@ constexpr double kLeastSine = 0.2;
 
 /// Sine below which the crossing of two circles is not worth looking for.
 constexpr double kFlatSine = 1e-3;
+
+/// A gate leads away from the gap by at least this share of an offset, whatever its direction.
+constexpr double kLeastSlope = 0.1;
 
 /// Newton's method doubles the digits with each step.
 constexpr int kMostSteps = 20;
@@ -46,12 +52,20 @@ bool CornerGate(Path const& path, std::int32_t split, PlacedCircle const& before
   if (!FindMeeting(before, behind, middle.origin, &meeting)) return false;
   double const dx = meeting.x - middle.origin.x;
   double const dy = meeting.y - middle.origin.y;
-  double const room = 2.0 * middle.greatest;
-  if (!(dx * dx + dy * dy < room * room)) return false;
+  double const widest =
+      DistanceBetween(path.At(split - 1), path.At(split)) * path.limits.jointRoom +
+      4.0 * std::max(path.At(split - 1).w, path.At(split).w);
+  if (!(dx * dx + dy * dy < widest * widest)) return false;
+  JointRoom const room = RoomForJoint(path, split);
+  double const height = dx * middle.across.x + dy * middle.across.y;
+  if (!(height < room.left && -height < room.right)) return false;
   *gate = BisectorGate(meeting, GradientAt(before, meeting), GradientAt(behind, meeting));
   gate->split = split;
-  gate->least = -room;
-  gate->greatest = room;
+  // So much of an offset on the gate leads away from the gap.
+  double const slope =
+      std::max(kLeastSlope, gate->across.x * middle.across.x + gate->across.y * middle.across.y);
+  gate->least = -std::min(widest, (room.right + height) / slope);
+  gate->greatest = std::min(widest, (room.left - height) / slope);
   return true;
 }
 

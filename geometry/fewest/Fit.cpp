@@ -8,6 +8,7 @@
 #include <utility>
 #include <vector>
 
+#include "geometry/fewest/Bends.h"
 #include "geometry/fewest/Bound.h"
 #include "geometry/fewest/ClosedBound.h"
 #include "geometry/fewest/Fitter.h"
@@ -70,6 +71,36 @@ FewestPieces::Result ResultOf(Fewest::Answer answer, Promises::Report const& rep
   return result;
 }
 
+bool HasArcs(Fewest::Answer const& answer) {
+  return std::any_of(
+      answer.contour.begin(), answer.contour.end(),
+      [](GeometryUtils::Elem const& elem) { return elem.type == GeometryUtils::ElemType::Arc; });
+}
+
+/// What was found for an order.
+struct Found {
+  Fewest::Answer answer;
+  Promises::Report report;
+};
+
+/// Replaces a contour by one of segments where they are as few: points that a few segments pass
+/// say nothing of arcs.
+void PreferSegments(Order const& order, Fewest::Shift const& shift, Fewest::Progress* progress,
+                    Found* found) {
+  std::size_t const most = found->answer.ranges.size();
+  if (!HasArcs(found->answer) || Fewest::CountBentRuns(order.points, most + 1) > most) return;
+  Options options = order.options;
+  options.segmentsOnly = true;
+  Fewest::Path path = PathOf({order.points, options}, shift);
+  Fewest::Cover const cover = Fewest::CoverWithin(most, path.points, path.limits);
+  if (cover.starts.empty()) return;
+  Fewest::FitTask task{order.points, options, shift,    std::move(path),
+                       cover.starts, most,    *progress};
+  Found straight;
+  if (!Fewest::FindContour(std::move(task), nullptr, &straight.answer, &straight.report)) return;
+  if (straight.answer.ranges.size() <= most) *found = std::move(straight);
+}
+
 /// Fits points that a closed contour does not repeat.
 ErrorCode FitDistinct(Order const& order, Fewest::Progress* progress,
                       FewestPieces::Result* result) {
@@ -87,12 +118,13 @@ ErrorCode FitDistinct(Order const& order, Fewest::Progress* progress,
   bool const isOne = open == 1 && path.points.size() > 3;
   Fewest::FitTask task{order.points, order.options, shift,    std::move(path),
                        cover.starts, bound,         *progress};
-  Fewest::Answer answer;
-  Promises::Report report;
-  if (!Fewest::FindContour(std::move(task), isOne ? &cover.last : nullptr, &answer, &report)) {
+  Found found;
+  if (!Fewest::FindContour(std::move(task), isOne ? &cover.last : nullptr, &found.answer,
+                           &found.report)) {
     return ErrorCode::NoFit;
   }
-  *result = ResultOf(std::move(answer), report, bound);
+  PreferSegments(order, shift, progress, &found);
+  *result = ResultOf(std::move(found.answer), found.report, bound);
   return ErrorCode::Ok;
 }
 

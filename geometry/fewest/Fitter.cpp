@@ -1,17 +1,19 @@
 #include "geometry/fewest/Fitter.h"
 
 #include <algorithm>
+#include <functional>
 #include <limits>
 #include <utility>
 
 #include "geometry/fewest/Assembly.h"
 #include "geometry/fewest/BothWays.h"
 #include "geometry/fewest/Centring.h"
+#include "geometry/fewest/Closing.h"
 #include "geometry/fewest/Laps.h"
+#include "geometry/fewest/LineCorners.h"
 #include "geometry/fewest/Mending.h"
 #include "geometry/fewest/OnePiece.h"
 #include "geometry/fewest/Polyline.h"
-#include "geometry/fewest/Seam.h"
 
 namespace Vorn::Fewest {
 
@@ -41,9 +43,6 @@ constexpr double kTightening[] = {0.8, 0.8, 0.5, 0.5};
 
 /// At least so many points on either side of a broken promise get a smaller tolerance.
 constexpr std::int32_t kLeastReach = 4;
-
-/// Joints of the open chain at which a closed one is tried to begin.
-constexpr std::size_t kMostSeams = 4;
 
 /// A contour of no more than this times the bound and one piece more is not mended.
 constexpr double kNearBound = 1.1;
@@ -202,21 +201,29 @@ class Fitter {
   /// Finds and measures one contour; `answer` is without ranges when there was none to measure.
   bool Search(double share, Answer* answer, Promises::Report* report) {
     *answer = {};
-    path_.limits.mostSources = quickSources_;
-    path_.limits.looksFar = false;
-    Chain chain = FindOpen(share);
+    if (options_.closed) return SearchClosed(share, answer, report);
+    Chain const chain = SearchOpen(share);
+    return !chain.pieces.empty() && KeepsSearched(path_, 0, chain, answer, report);
+  }
+
+  /// The shortest open chain of all efforts; empty when there is none.
+  Chain SearchOpen(double share) {
+    Chain chain;
     // A wider look starts from other gates, so it may also end with more pieces.
-    for (std::int32_t effort = 1; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
+    for (std::int32_t effort = 0; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
+      Look(effort);
+      Chain next = FindOpen(share);
+      bool const isBetter = chain.pieces.empty() || next.pieces.size() < chain.pieces.size();
+      if (isBetter && !next.pieces.empty()) chain = std::move(next);
       if (chain.pieces.size() == runStarts_.size()) break;
-      path_.limits.mostSources = kSources[effort];
-      path_.limits.looksFar = true;
-      Chain wider = FindOpen(share);
-      bool const isBetter = chain.pieces.empty() || wider.pieces.size() < chain.pieces.size();
-      if (isBetter && !wider.pieces.empty()) chain = std::move(wider);
     }
-    if (chain.pieces.empty()) return false;
-    if (options_.closed) return Close(chain, share * kSearchShare, answer, report);
-    return KeepsSearched(path_, 0, chain, answer, report);
+    return chain;
+  }
+
+  /// Has the next search look as hard as an effort asks.
+  void Look(std::int32_t effort) {
+    path_.limits.mostSources = effort == 0 ? quickSources_ : kSources[effort];
+    path_.limits.looksFar = effort > 0;
   }
 
   Chain FindOpen(double share) {
@@ -260,26 +267,37 @@ class Fitter {
     }
   }
 
-  /// The shortest of the chains that begin and end at one of the joints of an open one.
-  bool Close(Chain const& open, double share, Answer* answer, Promises::Report* report) {
-    bool isFound = false;
-    auto cuts = CutAtJoints(path_, open, kMostSeams);
-    for (CutPath& cut : cuts) {
-      Chain const chain = CloseChain(&cut, share, [&](std::int32_t done) { Tell(done); });
-      if (chain.pieces.empty()) continue;
-      if (isFound && chain.pieces.size() >= answer->ranges.size()) continue;
-      Answer closed;
-      Promises::Report closedReport;
-      bool const isKept = KeepsSearched(cut.path, cut.rotation, chain, &closed, &closedReport);
-      if (isFound && !isKept) continue;
-      *answer = std::move(closed);
-      *report = std::move(closedReport);
-      if (!isKept) continue;
-      isFound = true;
-      if (answer->ranges.size() <= bound_) return true;
+  /// The closed contour of the fewest pieces of all efforts. Where no circuit closes it begins at a
+  /// joint of an open chain.
+  bool SearchClosed(double share, Answer* answer, Promises::Report* report) {
+    std::function<void(std::int32_t)> const tell = [&](std::int32_t done) { Tell(done); };
+    std::function<bool(CutPath const&, Chain const&, Answer*, Promises::Report*)> const keeps =
+        [&](CutPath const& cut, Chain const& chain, Answer* closed, Promises::Report* measured) {
+          return KeepsSearched(cut.path, cut.rotation, chain, closed, measured);
+        };
+    ClosingTask const task{path_, share * kSearchShare, bound_, runStarts_, tell, keeps};
+    ClosedContour best;
+    for (std::int32_t effort = 0; effort <= static_cast<std::int32_t>(options_.effort); ++effort) {
+      Look(effort);
+      ClosedContour next = CloseAnywhere(task);
+      if (IsBetter(next, best)) best = std::move(next);
+      if (best.isKept && best.answer.ranges.size() <= bound_) break;
     }
-    if (isFound && answer->ranges.size() <= open.pieces.size() + 1) return true;
-    return CloseBySegment(open, answer, report) || isFound;
+    Chain open;
+    if (!best.isShort) open = SearchOpen(share);
+    if (!open.pieces.empty()) CloseAtJoints(task, open, &best);
+    *answer = std::move(best.answer);
+    *report = std::move(best.report);
+    bool const isFew = open.pieces.empty() || answer->ranges.size() <= open.pieces.size() + 1;
+    if (best.isKept && isFew) return true;
+    return (!open.pieces.empty() && CloseBySegment(open, answer, report)) || best.isKept;
+  }
+
+  /// Whether a closed contour is to be taken for another one.
+  static bool IsBetter(ClosedContour const& one, ClosedContour const& other) {
+    if (one.isKept != other.isKept) return one.isKept;
+    return other.answer.ranges.empty() ||
+           (one.isKept && one.answer.ranges.size() < other.answer.ranges.size());
   }
 
   /// The open chain with a segment from its end back to its start; leaves the answer where that
@@ -327,15 +345,26 @@ class Fitter {
 
   bool KeepsCentred(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
                     Promises::Report* report) const {
-    if (options_.centre && Keeps(path, rotation, Centre(path, chain), answer, report)) {
-      return true;
+    if (options_.centre) {
+      Chain const centred = Centre(path, chain);
+      std::vector<BuiltPiece> pieces = BuildPieces(path, centred);
+      SharpenCorners(path, centred, &pieces);
+      if (KeepsBuilt(path, rotation, centred, pieces, answer, report)) return true;
+      if (Keeps(path, rotation, centred, answer, report)) return true;
     }
     return Keeps(path, rotation, chain, answer, report);
   }
 
   bool Keeps(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
              Promises::Report* report) const {
-    *answer = Restore(shift_, chain, BuildPieces(path, chain));
+    return KeepsBuilt(path, rotation, chain, BuildPieces(path, chain), answer, report);
+  }
+
+  /// Whether the pieces of a chain, counted from a rotated start of the points, keep every promise.
+  bool KeepsBuilt(Path const& path, std::int32_t rotation, Chain const& chain,
+                  std::vector<BuiltPiece> const& pieces, Answer* answer,
+                  Promises::Report* report) const {
+    *answer = Restore(shift_, chain, pieces);
     std::int32_t const count = path.Count();
     for (FewestPieces::Range& range : answer->ranges) {
       range = {(range.first + rotation) % count, (range.last + rotation) % count};

@@ -13,8 +13,15 @@ namespace {
 class GateFollower {
  public:
   /// `safe` is null where there are no other gates.
-  GateFollower(Path const& path, double share, Chain known, Chain const* safe)
-      : path_(path), search_(path, share), share_(share), known_(std::move(known)), safe_(safe) {}
+  GateFollower(Path const& path, double share, Chain const& known, Chain const* safe)
+      : path_(path),
+        search_(path, share),
+        share_(share),
+        known_(known),
+        safe_(safe),
+        isSafe_(known.gates.size()) {
+    links_.reserve(known.pieces.size());
+  }
 
   Chain Run() {
     Chain chain = Follow();
@@ -45,8 +52,9 @@ class GateFollower {
   bool Advance() {
     std::size_t const k = links_.size() - 1;
     Link& link = links_.back();
-    link.guess = known_.pieces[k].circle;
-    Gate const& gate = known_.gates[k];
+    Chain const& from = isSafe_[k] ? *safe_ : known_;
+    link.guess = from.pieces[k].circle;
+    Gate const& gate = from.gates[k];
     search_.MoveTo(link.opening.First(), gate.split);
     Interval const interval = search_.FindInterval(link.opening, gate, link.guess);
     if (!interval.isFound) return false;
@@ -63,14 +71,14 @@ class GateFollower {
     bool isChanged = false;
     for (std::size_t i = first; i <= k; ++i) {
       isChanged = isChanged || !IsSafe(i);
-      known_.gates[i] = safe_->gates[i];
-      known_.pieces[i].circle = safe_->pieces[i].circle;
+      isSafe_[i] = true;
     }
     links_.resize(first + 1);
     return isChanged || first > 0;
   }
 
   bool IsSafe(std::size_t k) const {
+    if (isSafe_[k]) return true;
     Gate const& gate = known_.gates[k];
     Gate const& safe = safe_->gates[k];
     return gate.split == safe.split && gate.origin.x == safe.origin.x &&
@@ -80,8 +88,9 @@ class GateFollower {
   Path const& path_;
   PieceSearch search_;
   double share_;
-  Chain known_;
+  Chain const& known_;
   Chain const* safe_;
+  std::vector<bool> isSafe_;  ///< the gates that are taken from the safe chain
   std::vector<Link> links_;
 };
 

@@ -22,6 +22,17 @@ constexpr Tightness kTightness[] = {{1.0, 1.0, false},  {0.93, 1.0, false}, {0.8
                                     {0.6, 0.25, false}, {0.4, 0.0, false},  {0.8, 0.0, true},
                                     {0.2, 0.0, true},   {0.05, 0.0, true}};
 
+/// Multiplies the tolerances of a stretch but for its first and last points: the joints beside them
+/// stay where they are, perhaps at the very edge of what these allow.
+void TightenInner(double share, Path* path) {
+  auto const tighten = [&](WPoint& p) { p.w *= share; };
+  std::int32_t const first = StrideFrom(*path, 0);
+  std::int32_t const last = path->Count() - first;
+  if (first >= last) return;
+  std::for_each(path->points.begin() + first, path->points.begin() + last, tighten);
+  path->leastTolerance *= share;
+}
+
 /// Copies parts of chains one after the other.
 class Copying {
  public:
@@ -125,7 +136,8 @@ Chain Mending::Search(Stretch const& stretch, std::size_t tightness) const {
   if (tighter.jointRoom == 0.0) {
     limits.farthestBetweenPoints = std::min(limits.farthestBetweenPoints, path.leastTolerance);
   }
-  return FindChain(path, share_ * tighter.share, [](std::int32_t) {});
+  TightenInner(tighter.share, &path);
+  return FindChain(path, share_, [](std::int32_t) {});
 }
 
 }  // namespace Vorn::Fewest

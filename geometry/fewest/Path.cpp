@@ -4,6 +4,7 @@
 #include <cmath>
 
 #include "geometry/fewest/Gates.h"
+#include "geometry/fewest/JointRoom.h"
 
 namespace Vorn::Fewest {
 
@@ -22,6 +23,15 @@ Place LeftOf(Place const& direction) { return {-direction.y, direction.x}; }
 constexpr double kClearlyAhead = 1.5;
 
 }  // namespace
+
+void Wrap(Path* path) {
+  path->before = {};
+  path->behind = {};
+  for (std::int32_t i = 0; i < std::min(2, path->Count()); ++i) {
+    path->before.Add(path->At(path->Count() - 1 - i));
+    path->behind.Add(path->At(i));
+  }
+}
 
 double DistanceBetween(WPoint const& p, WPoint const& q) {
   double const dx = q.x - p.x;
@@ -70,8 +80,10 @@ Gate MiddleGate(Path const& path, std::int32_t split, PlacedCircle const& before
   gate.split = split;
   gate.origin = {0.5 * (last.x + first.x), 0.5 * (last.y + first.y)};
   double const gap = DistanceBetween(last, first);
-  gate.greatest = path.limits.jointRoom * 0.5 * gap + 2.0 * std::max(last.w, first.w);
-  gate.least = -gate.greatest;
+  double const half = path.limits.jointRoom * 0.5 * gap + 2.0 * std::max(last.w, first.w);
+  JointRoom const room = RoomForJoint(path, split);
+  gate.greatest = std::min(half, room.left);
+  gate.least = -std::min(half, room.right);
   if (gap > kClearlyAhead * (last.w + first.w)) {
     gate.across = LeftNormal(last, first);
   } else {

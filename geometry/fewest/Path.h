@@ -1,5 +1,6 @@
 #pragma once
 
+#include <array>
 #include <cstdint>
 #include <span>
 #include <vector>
@@ -13,6 +14,20 @@
 /// The measured points as a path.
 namespace Vorn::Fewest {
 
+/// Points beyond an end of a path, the nearest first.
+struct Outside {
+  std::array<WPoint, 2> points;
+  std::int32_t count = 0;
+
+  /// The point at a position; null behind the last one.
+  WPoint const* At(std::int32_t i) const {
+    return i < count ? &points[static_cast<std::size_t>(i)] : nullptr;
+  }
+  void Add(WPoint const& p) {
+    if (count < 2) points[static_cast<std::size_t>(count++)] = p;
+  }
+};
+
 /// The points, moved near the origin, with what the search asks of them.
 struct Path {
   /// The points.
@@ -25,6 +40,10 @@ struct Path {
   /// of a closed one.
   Opening start;
   Opening finish;
+  /// The points next to the ends: those of the other end of a closed path, or of the path that this
+  /// is a part of. None where the path ends.
+  Outside before;
+  Outside behind;
 
   /// How many points there are.
   std::int32_t Count() const { return static_cast<std::int32_t>(points.size()); }
@@ -34,6 +53,9 @@ struct Path {
     return points[static_cast<std::size_t>(i)];
   }
 };
+
+/// Has the points at one end of a closed path lie beyond the other.
+void Wrap(Path* path);
 
 /// Distance of two points.
 double DistanceBetween(WPoint const& p, WPoint const& q);

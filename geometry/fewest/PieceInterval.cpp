@@ -10,7 +10,8 @@ namespace Vorn::Fewest {
 
 namespace {
 
-/// A gain of offset below this share of the gate ends the search for the extreme.
+/// Where the next gain of offset is expected to be below this share of the gate the search for the
+/// extreme ends.
 constexpr double kLeastMove = 1e-2;
 
 /// Programmes after which the search for an extreme offset gives up.
@@ -37,6 +38,12 @@ RunFit StepWithin(RunFit const& from, Circle const& to) {
   if (!(form > 0.0)) return from;
   double const norm = 1.0 / std::sqrt(form);
   return {Scaled(reached, norm), (r + share * (1.0 - r)) * norm, true};
+}
+
+/// How steeply a circle grows along a gate at an offset.
+double SlopeAt(Circle const& circle, Gate const& gate, double offset) {
+  Place const gradient = GradientAt(circle, PlaceOn(gate, offset));
+  return gradient.x * gate.across.x + gradient.y * gate.across.y;
 }
 
 }  // namespace
@@ -68,6 +75,8 @@ PieceSearch::Extreme PieceSearch::FindExtreme(Ends const& ends, RunFit const& in
   if (!FindCrossing(at.circle, gate, &extreme.offset)) return {};
   extreme.circle = at.circle;
   extreme.isFound = true;
+  double const width = (gate.greatest - gate.least) * frame_.scale;
+  double slope = SlopeAt(at.circle, gate, extreme.offset);
   for (int round = 0; round < kMostExtremeRounds; ++round) {
     programme_.conditions[static_cast<std::size_t>(normalisation_)].row = FormRow(at.circle);
     // A larger value of f beside the crossing moves the crossing down the gate.
@@ -76,7 +85,8 @@ PieceSearch::Extreme PieceSearch::FindExtreme(Ends const& ends, RunFit const& in
     Simplex::Status const status =
         simplex.Maximise(programme_, isLow ? row : Negated(row), -1e300, &basis_);
     if (status != Simplex::Status::Optimal) break;
-    at = StepWithin(at, simplex.Solution());
+    Circle const target = simplex.Solution();
+    at = StepWithin(at, target);
     double offset = 0.0;
     if (!FindCrossing(at.circle, gate, &offset)) break;
     PieceRules::Check const check = Rules().AddBroken(at.circle, ends);
@@ -90,7 +100,13 @@ PieceSearch::Extreme PieceSearch::FindExtreme(Ends const& ends, RunFit const& in
       extreme.offset = offset;
       extreme.circle = at.circle;
     }
-    if (moved <= kLeastMove * (gate.greatest - gate.least) * frame_.scale) break;
+    // The programme took the form and the slope as they were before the move: the next move is
+    // about this one times what it has changed of the two, and hardly ever larger.
+    double const newSlope = SlopeAt(at.circle, gate, offset);
+    double const changed =
+        std::fabs(Form(target, target) - 1.0) + std::fabs(newSlope / slope - 1.0);
+    if (moved * std::min(changed, 1.0) <= kLeastMove * width) break;
+    slope = newSlope;
   }
   extreme.offset /= frame_.scale;
   return extreme;

@@ -132,7 +132,8 @@ bool PieceRules::IsFullTurn(Circle const& circle, Ends const& ends, std::int32_t
 PieceRules::Check PieceRules::AddBrokenView(Circle const& circle, Joint const& joint,
                                             JointView const& view) const {
   if (view.isNextToGate) {
-    double const near2 = SquaredGradient(circle, view.point);
+    // The joint lies on the circle, where the gradient has length 1.
+    double const near2 = std::min(1.0, SquaredGradient(circle, view.point));
     if (IsLargeStep(circle, view.gap2, near2, view.tolerance)) return AddStep(view.gap2, near2);
   }
   // From a quarter turn on the direction at the point says nothing about its order.

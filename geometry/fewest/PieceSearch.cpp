@@ -3,6 +3,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "geometry/fewest/BareRun.h"
 #include "geometry/fewest/Growth.h"
 
 namespace Vorn::Fewest {
@@ -93,7 +94,9 @@ void PieceSearch::LimitCurvature(Opening const& from, std::int32_t end) {
   double limit = kUnlimited;
   // The chord of a step of angle s on a radius r is 2 r sin(s / 2), and |a| = 1 / (2 r).
   if (widest > 0.0) limit = kStepShare * path_.limits.sineOfHalfStep / widest;
-  if (path_.limits.smallestRadius > 0.0) limit = std::min(limit, 0.5 / path_.limits.smallestRadius);
+  double const least =
+      std::max(path_.limits.smallestRadius, LeastRadiusOfBareRun(path_, first, end));
+  if (least > 0.0) limit = std::min(limit, 0.5 / least);
   Row const row{1.0, 0.0, 0.0, 0.0};
   if (path_.limits.segmentsOnly) {
     programme_.Add({row, Condition::Kind::Equality, 0.0});

@@ -19,6 +19,24 @@ Gate Moved(Gate gate, std::int32_t by) {
   return gate;
 }
 
+Outside PointsBefore(Path const& path, std::int32_t first) {
+  Outside before;
+  for (std::int32_t i = first - 1; i >= 0 && before.count < 2; --i) before.Add(path.At(i));
+  for (std::int32_t i = 0; before.count < 2 && path.before.At(i) != nullptr; ++i) {
+    before.Add(*path.before.At(i));
+  }
+  return before;
+}
+
+Outside PointsFrom(Path const& path, std::int32_t end) {
+  Outside behind;
+  for (std::int32_t i = end; i < path.Count() && behind.count < 2; ++i) behind.Add(path.At(i));
+  for (std::int32_t i = 0; behind.count < 2 && path.behind.At(i) != nullptr; ++i) {
+    behind.Add(*path.behind.At(i));
+  }
+  return behind;
+}
+
 }  // namespace
 
 Stretch Stretch::Widened(std::size_t count) const {
@@ -40,6 +58,8 @@ Path PathOf(Path const& path, Chain const& chain, Stretch const& stretch) {
   part.points.assign(path.points.begin() + first, path.points.begin() + end);
   part.limits = path.limits;
   part.leastTolerance = path.leastTolerance;
+  part.before = PointsBefore(path, first);
+  part.behind = PointsFrom(path, end);
   part.start = path.start;
   part.finish = path.finish;
   if (stretch.first > 0) {
@@ -57,6 +77,8 @@ Path PathOf(Path const& path, Chain const& chain, Stretch const& stretch) {
 Chain PartOf(Chain const& chain, Stretch const& stretch) {
   std::int32_t const first = chain.pieces[stretch.first].first;
   Chain part;
+  part.pieces.reserve(stretch.end - stretch.first);
+  part.gates.reserve(stretch.end - stretch.first);
   for (std::size_t k = stretch.first; k < stretch.end; ++k) {
     part.pieces.push_back(Moved(chain.pieces[k], -first));
     if (k + 1 == stretch.end) break;

@@ -47,6 +47,18 @@ inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
 ///   path itself does.
 /// - No arc is a full turn: a full circle comes as two arcs.
 ///
+/// Points far apart against their tolerances, by more than eight times the sum of two, as drawings
+/// and tool paths have them
+/// - A joint between two of them lies no farther from the straight way from one to the other than
+/// an
+///   arc of the largest step bulges, 0.134 of the way at 60 degrees, and twice the tolerance; or,
+///   where the path runs on straight by two points or more on either side, than the place where
+///   these lines meet.
+/// - An arc that covers one or two of them turns by no more than 8 degrees from one to the next. So
+///   a square of four points is four segments.
+///
+/// Of contours of as many pieces the one of segments alone is taken where there is one.
+///
 /// Where it falls short
 /// - An open scan of one circle t times around takes the arcs that keep every one of them below 353
 ///   degrees: 3 for twice around, of which the bound, 1, takes no account. Paths that cross
@@ -54,7 +66,8 @@ inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
 ///   one for each point: no piece may cross another anywhere but where the points do.
 /// - Where largestRadius is below radii of the part, short pieces stand for its arcs; all of them
 ///   may be segments though some arcs would save a few. The bound takes no account of
-///   largestRadius.
+///   largestRadius. Limits nearer to each other than a part in 10^5 leave arcs no room for
+///   rounding.
 /// - Tolerances below 2^-1040 have too few digits left; such points may come as short segments.
 ///
 /// There is no state and there are no threads: the same input gives the same bits on every call.
@@ -80,8 +93,9 @@ class VORN_EXPORT FewestPieces {
   struct Options {
     /// How hard the search looks.
     Effort effort = Effort::Quick;
-    /// Whether the deviations are brought down as far as the number of pieces allows. Without it
-    /// pieces run wherever their points allow.
+    /// Whether the deviations are brought down as far as the number of pieces allows; corners of
+    /// segments then come where their regression lines meet, exactly so for exact points. Without
+    /// it pieces run wherever their points allow.
     bool centre = true;
     /// Whether the contour runs back from the last point to the first. The last point may repeat
     /// the first; the contour may start at any place on the path.
@@ -98,8 +112,8 @@ class VORN_EXPORT FewestPieces {
     /// Greatest radius of an arc: what is flatter comes as a segment. Above 0 and not below
     /// smallestRadius.
     double largestRadius = std::numeric_limits<double>::infinity();
-    /// How far a piece may leave the straight path between neighbouring points, in addition to
-    /// their tolerances; 0 or more. Infinite by default: no limit.
+    /// How far a piece, and the joint of two, may leave the straight path between neighbouring
+    /// points, in addition to their tolerances; 0 or more. Infinite by default: no limit.
     double farthestBetweenPoints = std::numeric_limits<double>::infinity();
   };
 

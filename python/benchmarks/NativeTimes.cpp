@@ -46,6 +46,7 @@ void TimeFit(std::string const& path, double tolerance) {
       Vorn::IO::ParsePoints(Vorn::IO::ReadTextFile(path, std::cin), path, {});
   Vorn::IO::FitChoice choice;
   choice.tolerance.same = tolerance;
+  choice.strategy = Vorn::IO::Strategy::Mixed;
   std::size_t pieces = 0;
   double const seconds =
       LeastSeconds([&] { pieces = Vorn::IO::FitContour(file, choice, nullptr).pieces.size(); });

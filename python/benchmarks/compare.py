@@ -57,7 +57,7 @@ def python_times(points):
             lambda: geometry.line_segments_intersections([0, 0, 1, 1], segments),
         "polygon_areas": lambda: geometry.polygon_areas(places, [ELEMENTS])}
     times = {name: least_seconds(run) / ELEMENTS * 1e9 for name, run in batches.items()}
-    times["fit"] = least_seconds(lambda: vorn.fit(points, tol=TOL))
+    times["fit"] = least_seconds(lambda: vorn.fit(points, tol=TOL, strategy="mixed"))
     return times
 
 
@@ -94,7 +94,7 @@ def scans_of_a_run(count, **where):
 
 def move_seconds(client, count):
     """To send a scan to a worker and a contour back, nothing being fitted there."""
-    contour = vorn.fit(scan(0), tol=TOL)
+    contour = vorn.fit(scan(0), tol=TOL, strategy="mixed")
     batches = [[scan(16 * k + i) for i in range(16)] for k in range(count // 16)]
     begin = time.perf_counter()
     client.gather([client.submit(lambda scans, answer: [answer] * len(scans), batch, contour,
@@ -106,7 +106,7 @@ def compare_workers(count):
     import distributed
 
     print(f"a scan of {POINTS} points travels as {len(pickle.dumps(scan(0)))} bytes, a contour as "
-          f"{len(pickle.dumps(vorn.fit(scan(0), tol=TOL)))}")
+          f"{len(pickle.dumps(vorn.fit(scan(0), tol=TOL, strategy='mixed')))}")
     print(f"threads of one process: {scans_a_second(count, workers=1):.1f} scans a second with 1, "
           f"{scans_a_second(count, workers=2):.1f} with 2")
     for workers in (1, 2):

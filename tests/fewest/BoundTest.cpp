@@ -24,6 +24,14 @@ TEST(CoverGreedily, ThreePointsAreOneRun) {
   EXPECT_EQ(Bound({{0.0, 0.0, 1e-6}, {1.0, 0.0, 1e-6}, {0.3, 2.0, 1e-6}}), 1u);
 }
 
+TEST(CoverGreedily, PointsOfWhichNoFourLieOnACircleAreCoveredByThrees) {
+  std::vector<WPoint> points;
+  for (int i = 0; i < 40; ++i) {
+    points.push_back({1.0 * i, 0.25 * (i * i * i % 11), 1e-6});
+    EXPECT_EQ(Bound(points), (points.size() + 2) / 3);
+  }
+}
+
 TEST(CoverGreedily, ASquareOfLongSidesHasFourRuns) {
   std::vector<WPoint> points;
   for (int i = 0; i < 10; ++i) points.push_back({0.1 * i, 0.0, 1e-3});
@@ -31,6 +39,17 @@ TEST(CoverGreedily, ASquareOfLongSidesHasFourRuns) {
   for (int i = 0; i < 10; ++i) points.push_back({1.0 - 0.1 * i, 1.0, 1e-3});
   for (int i = 0; i < 10; ++i) points.push_back({0.0, 1.0 - 0.1 * i, 1e-3});
   EXPECT_EQ(Bound(points), 4u);
+}
+
+TEST(CoverWithin, IsTheGreedyCoverOrEmptyWhereMoreRunsAreNeeded) {
+  auto const arc = Testing::MakeArcPoints({3.0, 4.0}, 10.0, 0.2, 5.0, 1000, 0.01);
+  Limits limits;
+  limits.segmentsOnly = true;
+  auto const least = CoverGreedily(arc, limits, [](std::int32_t) {}).starts;
+  EXPECT_EQ(CoverWithin(least.size(), arc, limits).starts, least);
+  EXPECT_EQ(CoverWithin(2 * least.size(), arc, limits).starts, least);
+  EXPECT_TRUE(CoverWithin(least.size() - 1, arc, limits).starts.empty());
+  EXPECT_TRUE(CoverWithin(0, arc, limits).starts.empty());
 }
 
 TEST(CoverGreedily, TellsOfEveryRunAndAtTheEndOfAllPoints) {

@@ -294,9 +294,9 @@ TEST(FewestPiecesOptions, PiecesStayNearThePathWhereAsked) {
     options.farthestBetweenPoints = farthest;
     FewestResult const result = FitKept(scan, options);
     EXPECT_LE(LargestBulge(scan, result), farthest + 0.05);
-    // Two points a segment do in any case.
-    EXPECT_LE(PieceCount(result), farthest < 0.29 ? 5 : 1);
-    EXPECT_GE(PieceCount(result), farthest < 0.29 ? 2 : 1);
+    // Segments from point to point do in any case. Two points a segment leave joints of 0.7 between
+    // them.
+    EXPECT_EQ(PieceCount(result), farthest < 0.29 ? 9 : 1);
   }
 }
 

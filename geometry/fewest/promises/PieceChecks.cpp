@@ -189,6 +189,21 @@ void CheckArc(Coverage const& coverage, std::size_t piece, Report* report) {
   }
 }
 
+void CheckJoint(Coverage const& coverage, std::size_t piece, Report* report) {
+  std::size_t const count = coverage.PieceCount();
+  bool const isEnd = piece + 1 == count && !coverage.IsClosed();
+  double const farthest = coverage.GetChain().farthestBetweenPoints;
+  if (isEnd || count < 2 || !std::isfinite(farthest)) return;
+  std::size_t const last = coverage.RangeOf(piece).last;
+  WPoint const& p = coverage.PointOf(last);
+  WPoint const& q = coverage.PointOf(coverage.RangeOf((piece + 1) % count).first);
+  Point const& joint = coverage.GetChain().contour[piece + 1].end;
+  double const off = PlaceOf(DrawSegment({p.x, p.y}, {q.x, q.y}), joint).distance;
+  if (off <= farthest + p.w + q.w) return;
+  report->violations.push_back(
+      {Promise::NearPath, piece, kNone, coverage.IndexOf(last), {p.x, p.y}, off});
+}
+
 void CheckClosing(Coverage const& coverage, Report* report) {
   if (!coverage.IsClosed()) return;
   auto const& contour = coverage.GetChain().contour;

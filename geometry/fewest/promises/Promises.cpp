@@ -50,6 +50,7 @@ Report MeasureRegular(Chain const& chain) {
   for (std::size_t piece = 0; piece < coverage->PieceCount(); ++piece) {
     CheckPoints(*coverage, piece, &report);
     CheckArc(*coverage, piece, &report);
+    CheckJoint(*coverage, piece, &report);
   }
   CheckClosing(*coverage, &report);
   CheckCrossings(*coverage, &report);

@@ -43,7 +43,9 @@ enum class Promise {
   /// are no farther apart than their tolerances.
   SmallSteps,
   /// Between neighbours, its joints counted in, an arc stays near the straight path. Measured in
-  /// the middle between them, against the limit and the larger of the two tolerances.
+  /// the middle between them, against the limit and the larger of the two tolerances. Every joint
+  /// lies near the straight path between the points beside it, within the limit and the sum of
+  /// both tolerances.
   NearPath,
   /// The circle and the angles of every arc agree with the points at which it starts and ends.
   Joined,
