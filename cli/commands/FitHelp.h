@@ -11,24 +11,24 @@ inline constexpr char const* kFitFooter =
     R"(
 Tolerance: at most one of the three options. Without one, the column w of the file counts, and
 without that its comment "# tolerance T". Neighbouring points must be more than 1.5 times the
-sum of their tolerances apart (strategies mixed and cells).
+sum of their tolerances apart for the strategies mixed and cells; fewest takes any spacing.
 
-Strategies: use fewest for scans that are denser than their tolerance, for noisy points, and where
-the number of pieces counts: it takes any spacing, does not depend on how the part lies, and proves
-below which number no contour can go: 29 (26 at least). Between neighbouring points that lie far
-apart its arcs may bulge; --largest-step and --between limit that. mixed and cells go along the
-points run by run.
+Strategies: fewest, which is used when none is named, takes noisy points and scans that are denser
+than their tolerance, does not depend on how the part lies, and proves below which number of pieces
+no contour can go: 29 (26 at least). Between neighbouring points that lie far apart its arcs may
+bulge; --largest-step and --between limit that. mixed and cells go along the points run by run; arc
+makes one arc of them all.
 
 Closed contours: with --closed auto a contour is closed when its last point is the first one
 again, or when its ends are no more than 1.5 times as far apart as the five points next to
 either end and the contour does not turn back between them (by more than 135 degrees). A thin
 body that is open at one end and a contour with its seam in a very sharp corner look alike, and
 so do a closed contour and one that is open by a single step: then say --closed yes or no. The
-contour is cut open at --start or else where it turns most (without a corner: where two pieces
-meet) and fitted all the way round. Both ends are moved to one common point where that keeps
-every point within its tolerance; otherwise a short line joins them, and where no line within the
-tolerance can, the gap is reported and the exit code is 1. The strategy fewest needs no cut: it
-begins where it suits and closes exactly. A full circle comes out as two half circles.
+strategy fewest begins where it suits and closes exactly. For the others the contour is cut open at
+--start or else where it turns most (without a corner: where two pieces meet) and fitted all the way
+round. Both ends are moved to one common point where that keeps every point within its tolerance;
+otherwise a short line joins them, and where no line within the tolerance can, the gap is reported
+and the exit code is 1. A full circle comes out as two half circles.
 
 Deviations are multiples of the tolerance of the point: up to 1 is within tolerance. They are
 printed as the fit reports them, and as measured again by the program over every point; the larger
@@ -60,7 +60,8 @@ Exit codes:
       (table and files are written)
   2   wrong usage
   3   a file cannot be read or written, or a line of the points file is wrong
-  4   two neighbouring points are too close for their tolerances
+  4   two neighbouring points are too close for their tolerances (strategies mixed and cells), or
+      coincide (--tolerance-per-point)
   5   no fit, or a contour that stops before the last point (then table and files are written)
   70  internal error
   130 interrupted
@@ -74,8 +75,8 @@ Examples:
   contour fit - -t 0.02 -o - --to dxf < part.csv > part.dxf
   contour fit part.csv --tolerance-per-point 0.05 --strategy cells -o part.json
   contour fit part.csv -t 0.02 -o part.html --field part=Cam --field date=2026-11-30
-  contour fit outline.csv -t 0.01 --closed yes --start 120
-  contour fit scan.csv -t 0.01 --strategy fewest --largest-step 30 -o scan.dxf
+  contour fit outline.csv -t 0.01 --closed yes --strategy mixed --start 120
+  contour fit scan.csv -t 0.01 --largest-step 30 --effort wide -o scan.dxf
   contour fit scans/*.csv -t 0.02 --out-dir fitted --to json,dxf -j 8
 )";
 

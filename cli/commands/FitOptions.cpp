@@ -27,7 +27,9 @@ void RefuseOtherStrategy(FitOptions const& options) {
   RefuseContradiction(options.fewest);
   if (!options.start) return;
   throw Failure(FailureKind::BadArgument,
-                "--start is not for --strategy fewest, which finds the seam itself");
+                "--start is not for " + NameOf(Strategy::Fewest) +
+                    ", the strategy when none is named, which finds the seam itself; --strategy " +
+                    NameOf(Strategy::Mixed) + " takes it");
 }
 
 /// The formats of a list as --to takes it; nothing when a word is none or comes twice.
@@ -127,22 +129,23 @@ void AddFitOptions(Command& command, FitOptions* options) {
   AddPointsOutline(command, &options->points);
   AddChoice<Strategy>(
       command, "--strategy", &options->strategy,
-      {{"mixed", Strategy::Mixed},
+      {{"fewest", Strategy::Fewest},
+       {"mixed", Strategy::Mixed},
        {"cells", Strategy::Cells},
-       {"arc", Strategy::Arc},
-       {"fewest", Strategy::Fewest}},
-      "mixed: lines and arcs compared run by run; cells: lines first, arcs between them; arc: one "
-      "arc for all points; fewest: as few pieces as the tolerances allow, for scans of any "
-      "density; " +
+       {"arc", Strategy::Arc}},
+      "fewest: as few pieces as the tolerances allow, for scans of any density; mixed: lines and "
+      "arcs compared run by run; cells: lines first, arcs between them; arc: one arc for all "
+      "points; " +
           NameOf(kUsualStrategy) + " if not said");
   AddFewestOptions(command, &options->fewest);
   AddChoice<ClosedChoice>(
       command, "--closed", &options->closed,
       {{"auto", ClosedChoice::Auto}, {"yes", ClosedChoice::Yes}, {"no", ClosedChoice::No}},
       "Whether the contour runs back to its start; auto (default): see below");
-  AddWholeNumber(command, "--start", &options->start, {0, std::numeric_limits<int>::max(), "INDEX"},
-                 "Cut a closed contour open at this point, counted from 0; without it, at its "
-                 "sharpest corner");
+  AddWholeNumber(
+      command, "--start", &options->start, {0, std::numeric_limits<int>::max(), "INDEX"},
+      "Mixed, cells, arc: cut a closed contour open at this point, counted from 0; without "
+      "it, at its sharpest corner");
   command.AddOutputs("-o,--output", &options->outputs,
                      "Write the contour to this file, in the format that its ending names; may be "
                      "given several times; - is the standard output");

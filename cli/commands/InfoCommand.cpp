@@ -18,15 +18,16 @@ constexpr char const* kText =
 
 constexpr char const* kFooter =
     R"(
-Spacing: for every strategy of 'contour fit' but fewest, neighbouring points must be more than 1.5
-times the sum of their tolerances apart. With a tolerance given, the pairs that break this rule are
-listed; without one, none is needed.
+Spacing: for the strategies mixed and cells of 'contour fit', neighbouring points must be more than
+1.5 times the sum of their tolerances apart; fewest, which is used when none is named, takes any
+spacing. With a tolerance given, the pairs that break this rule are listed; without one, none is
+needed.
 
 Corners: turns of 30 degrees or more, measured over chords long enough for the noise not to matter;
 of a closed contour the turn from its end to its start is one of them.
 Noise: what differs from point to point, not a ripple that many neighbours share. The suggestion is
-five times the noise or a ten-thousandth of the size, whichever is more; it names the strategy
-fewest where the spacing allows the others no such tolerance.
+five times the noise or a ten-thousandth of the size, whichever is more, and tells where the
+spacing allows mixed and cells no such tolerance.
 
 Points are counted from 0. Exit codes:
   0   the points are described, whatever there is to say about them

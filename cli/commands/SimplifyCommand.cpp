@@ -58,7 +58,7 @@ written as a table of x and y. Exit codes:
 
 Examples:
   contour simplify part.csv --drop-close --tolerance 0.02 -o spaced.csv
-  contour simplify part.csv --drop-close -t 0.02 | contour fit - -t 0.02
+  contour simplify part.csv --drop-close -t 0.02 | contour fit - -t 0.02 --strategy mixed
   contour simplify scan.csv --outliers 6 --spacing 0.5 --average -t 0.02 -o means.csv
 )";
 
@@ -252,8 +252,10 @@ void AddOptions(Command& command, Options* options) {
   AddPointsInput(command, &options->points);
   AddPointsOutline(command, &options->points);
   AddClosedChoice(command, &options->closed);
-  command.AddFlag("--drop-close", &options->dropClose,
-                  "Leave out points that are too close to the one before");
+  command.AddFlag(
+      "--drop-close", &options->dropClose,
+      "Leave out points that are too close to the one before for the strategies mixed and "
+      "cells of 'contour fit'");
   Option const spacing = AddPositiveNumber(command, "--spacing", &options->spacing, "S",
                                            "Keep a point every S along the path");
   command

@@ -13,7 +13,7 @@ _contour_commands() {
 # The words that an option takes. Prints nothing and fails for one that takes a file or a number.
 _contour_words() {
   case $1:$2 in
-    *:--strategy) echo mixed cells arc fewest ;;
+    *:--strategy) echo fewest mixed cells arc ;;
     *:--effort) echo quick wide full ;;
     *:--closed) echo auto yes no ;;
     *:--units) echo mm inch ;;

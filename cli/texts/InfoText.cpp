@@ -75,19 +75,19 @@ std::size_t PairCount(InfoReport const& report) {
 void AddRule(InfoReport const& report, FactList* facts) {
   std::optional<double> const& largest = report.info.largestTolerance;
   facts->Add("limit", largest ? FormatShort(*largest) +
-                                    " is the largest single tolerance that the spacing allows"
-                              : "no tolerance passes: neighbours coincide");
+                                    " is the largest single tolerance that mixed and cells take"
+                              : "mixed and cells take no tolerance: neighbours coincide");
   if (!report.rule) return;
   RuleCheck const& rule = *report.rule;
   std::string tolerance = FormatShort(rule.smallest);
   if (rule.smallest != rule.largest) tolerance += " to " + FormatShort(rule.largest);
   std::string const pairs = Counted(PairCount(report), "pair");
-  facts->Add(
-      "tolerance",
-      tolerance + " (" + rule.source + "): " +
-          (rule.broken.empty() ? "no pair is too close"
-                               : std::to_string(rule.broken.size()) + " of " + pairs +
-                                     (rule.broken.size() == 1 ? " is" : " are") + " too close"));
+  facts->Add("tolerance",
+             tolerance + " (" + rule.source + "): " +
+                 (rule.broken.empty() ? "no pair is too close"
+                                      : std::to_string(rule.broken.size()) + " of " + pairs +
+                                            (rule.broken.size() == 1 ? " is" : " are") +
+                                            " too close for mixed and cells"));
   for (std::size_t i = 0; i < std::min(rule.broken.size(), kMostListed); ++i) {
     ClosePair const& pair = rule.broken[i];
     std::string const name = PairName(report.file, pair.first, pair.second);
@@ -98,7 +98,8 @@ void AddRule(InfoReport const& report, FactList* facts) {
                     : name + " coincide: no tolerance can follow from a spacing of zero");
   }
   facts->AddRest(rule.broken.size());
-  if (!rule.broken.empty()) facts->GoOn("way out: contour fit --strategy fewest takes them all");
+  if (!rule.broken.empty())
+    facts->GoOn("way out: --strategy fewest, the usual one, takes them all");
 }
 
 void AddCorners(InfoReport const& report, FactList* facts) {
@@ -127,10 +128,8 @@ void AddClosing(InfoReport const& report, FactList* facts) {
 std::string SuggestionText(Suggestion const& suggestion) {
   switch (suggestion.way) {
     case Suggestion::Way::Same:
-      return "--tolerance " + FormatShort(suggestion.tolerance) + " (" + suggestion.reason + ")";
     case Suggestion::Way::Fewest:
-      return "--tolerance " + FormatShort(suggestion.tolerance) + " --strategy fewest (" +
-             suggestion.reason + ")";
+      return "--tolerance " + FormatShort(suggestion.tolerance) + " (" + suggestion.reason + ")";
     case Suggestion::Way::None:
       return suggestion.reason;
   }

@@ -87,8 +87,10 @@ FitReport ReportClosed(FitInput input, FitChoice const& choice, FitAnswer answer
 
 void RefuseStart(PointFile const& file, FitChoice const& choice) {
   if (!choice.start) return;
-  throw Failure(FailureKind::BadArgument, {file.path},
-                "a start is not for the fewest pieces, which find the seam themselves");
+  throw Failure(
+      FailureKind::BadArgument, {file.path},
+      "a start is not for the fewest pieces, which find the seam themselves: the strategy mixed "
+      "takes one");
 }
 
 }  // namespace

@@ -19,9 +19,6 @@ constexpr double kTolerancePerSize = 1e-4;
 /// Keeps the shape of a flat profile.
 constexpr double kTolerancePerNarrowSide = 1e-2;
 
-/// A single tolerance that much below the one wanted is still preferred to one for each point.
-constexpr double kLeastShareOfWanted = 0.1;
-
 constexpr int kSuggestedDigits = 2;
 
 double Rounded(double value) {
@@ -68,12 +65,11 @@ Suggestion SuggestTolerance(PointsInfo const& info) {
   double const wanted = Rounded(isNoisy ? forNoise : forShape.tolerance);
   std::string const reason = isNoisy ? "five times the noise" : forShape.reason;
   if (!(wanted > 0.0)) return {Suggestion::Way::None, 0.0, "all points coincide"};
-  double const allowed = info.largestTolerance.value_or(0.0);
-  if (wanted <= allowed) return {Suggestion::Way::Same, wanted, reason};
-  if (allowed > 0.0 && allowed >= forNoise && allowed >= kLeastShareOfWanted * wanted) {
-    return {Suggestion::Way::Same, allowed, "the largest that the spacing allows"};
+  if (wanted <= info.largestTolerance.value_or(0.0)) {
+    return {Suggestion::Way::Same, wanted, reason};
   }
-  return {Suggestion::Way::Fewest, wanted, reason + "; the points are too close for the others"};
+  return {Suggestion::Way::Fewest, wanted,
+          reason + "; too much for mixed and cells at this spacing"};
 }
 
 PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed) {

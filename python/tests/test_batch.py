@@ -79,12 +79,12 @@ def test_every_scan_is_fitted_by_one_job(batch_system, tmp_path):
 
 def test_a_job_goes_on_past_files_that_cannot_be_fitted(batch_system, tmp_path):
     write_scans(tmp_path, 45)
-    spoilt = {7: "x,y\n0,0\n1,one\n", 30: "x,y\n0,0\n0,0\n1,1\n"}
+    spoilt = {7: "x,y\n0,0\n1,one\n", 30: "x,y\n1,1\n1,1\n1,1\n"}
     for number, text in spoilt.items():
         (tmp_path / "scans" / f"scan {number}.csv").write_text(text)
     jobs = batch_system.submit(job_script())
-    # 3: a line of the file is wrong; 4: two points are too close.
-    assert sorted(code for code, _ in jobs.values()) == [0] * 18 + [3, 4]
+    # 3: a line of the file is wrong; 5: all points are in one place.
+    assert sorted(code for code, _ in jobs.values()) == [0] * 18 + [3, 5]
     messages = "".join(said for _, said in jobs.values())
     assert "scan 7.csv:3" in messages and "scan 30.csv" in messages
     for number in set(range(45)) - set(spoilt):

@@ -31,9 +31,10 @@ def fit(points: Any, tol: Optional[npt.ArrayLike] = None, strategy: Optional[str
         How far the contour may pass from the points, in their unit; goes before the tolerances that
         the points bring.
     strategy : str, optional
-        "fewest": as few pieces as the tolerances allow, at any spacing of the points. "mixed":
+        "fewest", which is used if none is said: as few pieces as the tolerances allow, at any
+        spacing of the points; where these lie far apart, its arcs may bulge between them. "mixed":
         lines and arcs compared run by run. "cells": lines first, arcs between them. "arc": one arc
-        for all points. If not said, what the program ``contour fit`` uses.
+        for all points.
     closed : "auto", bool, "yes" or "no"
         Whether the contour runs back to its start; "auto" judges by the ends of the points.
     progress : callable, optional

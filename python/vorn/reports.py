@@ -178,7 +178,7 @@ class FitReport:
         squares, deviations, closure, verdict.
 
         >>> report([(0, 0), (1, 0), (2, 0)], tol=0.01).facts["strategy"]
-        'mixed'
+        'fewest'
         """
         return dict(json.loads(self.to_json()))
 

@@ -44,7 +44,8 @@ class Escaping : public Program {
       if (c == '/') c = '|';
     }
     Write(name, Corner());
-    std::string const fit = "fit " + Quote(name) + " -t 0.01 --field part=" + Quote(text);
+    std::string const fit =
+        "fit " + Quote(name) + " -t 0.01 --strategy mixed --field part=" + Quote(text);
     Write("head.txt", "(name {name})\n");
     // Tool paths know two units only, so their name alone carries the text there.
     for (std::string const& line : {fit + " --feed 1 --header head.txt -o a.nc",

@@ -24,7 +24,7 @@ std::vector<Case> const kCases = {
     {3, {"fit", "@none.csv", "-t", "1"}},
     {3, {"fit", "@words.csv", "-t", "1"}},
     {3, {"fit", "@good.csv", "-t", "0.01", "-o", "@none/a.json"}},
-    {4, {"fit", "@good.csv", "-t", "0.4"}},
+    {4, {"fit", "@good.csv", "-t", "0.4", "--strategy", "mixed"}},
     {5, {"fit", "@two.csv", "-t", "0.1", "--strategy", "arc"}},
     {0, {"check", "@good.csv", "@corner.wkt"}},
     {0, {"check", "@good.csv", "@corner.wkt", "-t", "0.1"}},

@@ -87,9 +87,11 @@ TEST(FewestOptions, EachStrategyTakesItsOwnAlone) {
   }
   for (auto const& [name, value] : options) {
     EXPECT_EQ(Refusal({"--strategy", "fewest", name, value}), "") << name;
+    EXPECT_EQ(Refusal({name, value}), "") << name << ", the strategy not being named";
   }
   EXPECT_EQ(Refusal({"--strategy", "fewest", "--start", "1"}),
-            "contour: --start is not for --strategy fewest, which finds the seam itself");
+            "contour: --start is not for fewest, the strategy when none is named, which finds the "
+            "seam itself; --strategy mixed takes it");
 }
 
 }  // namespace

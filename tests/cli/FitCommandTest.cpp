@@ -24,12 +24,13 @@ std::string UsageError(std::vector<std::string> const& words) {
   return result.err;
 }
 
-TEST(FitCommand, StrategyIsMixedUnlessSaid) {
+TEST(FitCommand, StrategyIsFewestUnlessSaid) {
   auto const strategy = [](std::vector<std::string> words) {
     words.insert(words.begin(), {"fit", "-", "-t", "0.1"});
     return SummaryLine(RunInProcess(words, kPoints).out, "strategy");
   };
-  EXPECT_EQ(strategy({}), "mixed");
+  EXPECT_EQ(strategy({}), "fewest");
+  EXPECT_EQ(strategy({"--strategy", "mixed"}), "mixed");
   EXPECT_EQ(strategy({"--strategy=cells"}), "cells");
   EXPECT_EQ(strategy({"--strategy", "arc"}), "arc");
   EXPECT_EQ(strategy({"--strategy", "fewest"}), "fewest");
@@ -82,7 +83,7 @@ TEST(FitCommand, ContradictionsAndUnknownsAreUsageErrors) {
 
 TEST(FitCommand, UsageErrorsPointToTheHelpOfTheCommand) {
   EXPECT_NE(UsageError({"fit", "p.csv", "--strategy", "spline"})
-                .find("'spline' is none of mixed, cells, arc, fewest\nRun 'contour fit --help'"),
+                .find("'spline' is none of fewest, mixed, cells, arc\nRun 'contour fit --help'"),
             std::string::npos);
   EXPECT_NE(UsageError({"bend"}).find("\nRun 'contour --help'"), std::string::npos);
 }
@@ -98,10 +99,26 @@ TEST(FitCommand, OneFileIsNotTwoThings) {
 
 TEST(FitCommand, HelpNamesEveryOptionAndExitCode) {
   std::string const help = RunInProcess({"fit", "--help"}).out;
-  for (char const* part :
-       {"POINTS", "-t,--tolerance", "--tolerance-column", "--tolerance-per-point", "--units",
-        "--strategy", "mixed", "cells", "arc", "--json", "--svg", "Exit codes", "\n  0 ", "\n  1 ",
-        "\n  2 ", "\n  3 ", "\n  4 ", "\n  5 ", "\n  130 "}) {
+  for (char const* part : {"POINTS",
+                           "-t,--tolerance",
+                           "--tolerance-column",
+                           "--tolerance-per-point",
+                           "--units",
+                           "--strategy",
+                           "fewest",
+                           "mixed",
+                           "cells",
+                           "arc",
+                           "--json",
+                           "--svg",
+                           "Exit codes",
+                           "\n  0 ",
+                           "\n  1 ",
+                           "\n  2 ",
+                           "\n  3 ",
+                           "\n  4 ",
+                           "\n  5 ",
+                           "\n  130 "}) {
     EXPECT_NE(help.find(part), std::string::npos) << part;
   }
   EXPECT_NE(RunInProcess({"--help"}).out.find("fit"), std::string::npos);

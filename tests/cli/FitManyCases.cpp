@@ -109,8 +109,9 @@ TEST_F(ManyFiles, GiveTheSameBytesForAnyNumberOfJobs) {
   Ended first;
   for (char const* jobs : {"1", "2", "8"}) {
     std::string const folder = std::string("out") + jobs;
-    Ended const ended = Run("fit in/*.csv -t 0.01 --to json,dxf,svg --no-time -j " +
-                            std::string(jobs) + " --out-dir " + folder);
+    Ended const ended =
+        Run("fit in/*.csv -t 0.01 --strategy mixed --to json,dxf,svg --no-time -j " +
+            std::string(jobs) + " --out-dir " + folder);
     EXPECT_EQ(ended.code, 3) << ended.err;
     auto const contents = ContentsOf(folder);
     EXPECT_EQ(contents.size(), 36u) << "twelve of fourteen, in three formats";
@@ -127,7 +128,7 @@ TEST_F(ManyFiles, GiveTheSameBytesForAnyNumberOfJobs) {
 
 TEST_F(ManyFiles, HaveALineEachInTheOrderOfTheInputs) {
   WriteInputs();
-  Ended const ended = Run("fit in/*.csv -t 0.01 --no-time -j 4");
+  Ended const ended = Run("fit in/*.csv -t 0.01 --strategy mixed --no-time -j 4");
   std::size_t at = ended.out.find("file        ");
   ASSERT_EQ(at, 0u) << ended.out;
   for (int i = 0; i < 12; ++i) {
@@ -166,8 +167,8 @@ TEST_F(ManyFiles, EndWithTheWorstCode) {
   Write("bare.csv", "0,0\n3,0\n6,1\n");
   EXPECT_EQ(Run("fit good.csv bare.csv -t 0.01").code, 0);
   EXPECT_EQ(Run("fit good.csv bare.csv -t 0.3 --strategy arc").code, 1);
-  EXPECT_EQ(Run("fit good.csv close.csv -t 0.01").code, 4);
-  EXPECT_EQ(Run("fit close.csv good.csv -t 0.01").code, 4);
+  EXPECT_EQ(Run("fit good.csv close.csv -t 0.01 --strategy mixed").code, 4);
+  EXPECT_EQ(Run("fit close.csv good.csv -t 0.01 --strategy mixed").code, 4);
   EXPECT_EQ(Run("fit close.csv good.csv --tolerance-column w").code, 3);
   EXPECT_EQ(Run("fit close.csv bare.csv").code, 2) << "no tolerance";
   EXPECT_EQ(Run("fit close.csv bad.csv good.csv -t 0.01").code, 3);

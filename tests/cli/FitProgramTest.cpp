@@ -87,7 +87,8 @@ TEST_F(FitProgram, WritesEveryFormatInOneRun) {
       "fit p.csv -t 0.01 --units mm -o a.json -o a.csv -o a.dxf -o a.nc -o a.wkt -o a.svg -o a.png "
       "--feed 300");
   ASSERT_EQ(ended.code, 0) << ended.err;
-  EXPECT_NE(ended.out.find("pieces      2: 2 lines, 0 arcs\n"), std::string::npos);
+  EXPECT_NE(ended.out.find("pieces      2 (proven the fewest): 2 lines, 0 arcs\n"),
+            std::string::npos);
   EXPECT_NE(ended.out.find("wrote       a.json\nwrote       a.csv\nwrote       a.dxf\n"
                            "wrote       a.nc\nwrote       a.wkt\nwrote       a.svg\n"
                            "wrote       a.png\n"),
@@ -132,7 +133,7 @@ TEST_F(FitProgram, FormatMustBeToldWhereTheNameDoesNot) {
 
 TEST_F(FitProgram, DigitsAreForTheTableOnly) {
   Write("p.csv", "0,0\n1,3\n");
-  Ended const ended = Run("fit p.csv -t 0.1 --digits 1 -o a.json");
+  Ended const ended = Run("fit p.csv -t 0.1 --strategy mixed --digits 1 -o a.json");
   EXPECT_EQ(ended.code, 0) << ended.err;
   EXPECT_NE(ended.out.find("  3.2       2\n"), std::string::npos) << ended.out;
   EXPECT_EQ(Document("a.json").at("elements").at(0).at("length").get<double>(), std::hypot(1, 3));
@@ -144,7 +145,7 @@ TEST_F(FitProgram, ClosedContourIsClosedInTheFilesAsWell) {
   std::string text;
   for (char const* corner : {"0,0", "4,0", "4,3", "0,3", "0,0"}) text += std::string(corner) + "\n";
   Write("p.csv", text);
-  Ended const ended = Run("fit p.csv -t 0.01 -o a.json -o a.dxf -o a.nc");
+  Ended const ended = Run("fit p.csv -t 0.01 --strategy mixed -o a.json -o a.dxf -o a.nc");
   ASSERT_EQ(ended.code, 0) << ended.err;
   EXPECT_NE(ended.out.find("closed      yes (the last point is the first), joined exactly at point "
                            "0 (line 1)\n"),
@@ -159,8 +160,8 @@ TEST_F(FitProgram, ClosedContourIsClosedInTheFilesAsWell) {
   EXPECT_EQ(Run("fit p.csv -t 0.01 --closed no -o a.json").code, 0);
   EXPECT_EQ(Document("a.json").at("closed"), false);
   EXPECT_EQ(Run("fit p.csv -t 0.01 --closed maybe").code, 2);
-  EXPECT_EQ(Run("fit p.csv -t 0.01 --start 5").code, 2);
-  EXPECT_EQ(Run("fit p.csv -t 0.01 --start 2 -o a.json").code, 0);
+  EXPECT_EQ(Run("fit p.csv -t 0.01 --strategy mixed --start 5").code, 2);
+  EXPECT_EQ(Run("fit p.csv -t 0.01 --strategy mixed --start 2 -o a.json").code, 0);
   EXPECT_EQ(Document("a.json").at("seam"), 2);
 }
 

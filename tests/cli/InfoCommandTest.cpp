@@ -31,22 +31,24 @@ TEST(InfoCommand, TellsTheFactsOnStandardOutput) {
             "corners     2 of 30 degrees or more, the sharpest first\n"
             "            point 1 (line 4): 90.0 degrees to the left\n"
             "            point 2 (line 5): 90.0 degrees to the left\n"
-            "limit       no tolerance passes: neighbours coincide\n"
+            "limit       mixed and cells take no tolerance: neighbours coincide\n"
             "noise       too few points to tell\n"
-            "suggestion  --tolerance 0.00041 --strategy fewest (a ten-thousandth of the size; the "
-            "points are too close for the others)\n");
+            "suggestion  --tolerance 0.00041 (a ten-thousandth of the size; too much for mixed and "
+            "cells at this spacing)\n");
 }
 
 TEST(InfoCommand, ListsThePairsThatBreakTheRule) {
   RunResult const run = RunInProcess({"info", "-", "-t", "0.4"}, kSmall);
   EXPECT_EQ(run.code, ExitCode::Ok);
-  EXPECT_NE(run.out.find("tolerance   0.4 (given for all points): 2 of 4 pairs are too close\n"
-                         "            point 1 (line 4) and point 2 (line 5): distance 1, needed "
-                         "more than 1.2\n"
-                         "            point 2 (line 5) and point 3 (line 6): distance 0, needed "
-                         "more than 1.2\n"
-                         "            way out: contour fit --strategy fewest takes them all\n"),
-            std::string::npos)
+  EXPECT_NE(
+      run.out.find(
+          "tolerance   0.4 (given for all points): 2 of 4 pairs are too close for mixed and cells\n"
+          "            point 1 (line 4) and point 2 (line 5): distance 1, needed "
+          "more than 1.2\n"
+          "            point 2 (line 5) and point 3 (line 6): distance 0, needed "
+          "more than 1.2\n"
+          "            way out: --strategy fewest, the usual one, takes them all\n"),
+      std::string::npos)
       << run.out;
   EXPECT_NE(RunInProcess({"info", "-", "-t", "0.3"}, "0,0\n1,0\n2,0\n")
                 .out.find("tolerance   0.3 (given for all points): no pair is too close\n"),
@@ -58,7 +60,7 @@ TEST(InfoCommand, AnswersWhereNoToleranceCanFollowFromTheSpacing) {
   EXPECT_EQ(run.code, ExitCode::Ok);
   EXPECT_EQ(run.err, "");
   EXPECT_NE(run.out.find("tolerance   0 to 0.5 (0.3 of the spacing, at most 0.5): 1 of 4 pairs is "
-                         "too close\n"
+                         "too close for mixed and cells\n"
                          "            point 2 (line 5) and point 3 (line 6) coincide: no tolerance "
                          "can follow from a spacing of zero\n"),
             std::string::npos)

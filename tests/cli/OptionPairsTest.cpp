@@ -135,8 +135,12 @@ TEST(OptionPairs, OptionsOfTheFewestPiecesAreForThatStrategy) {
                 option[0] + " is for --strategy fewest, not for " + strategy);
     }
   }
-  EXPECT_EQ(Refusal({"fit", "p.csv", "--strategy", "fewest", "--start", "3"}),
-            "--start is not for --strategy fewest, which finds the seam itself");
+  for (Words const& line : {Words{"fit", "p.csv"}, Words{"fit", "p.csv", "--strategy", "fewest"}}) {
+    EXPECT_EQ(
+        Refusal(Joined(line, {"--start", "3"})),
+        "--start is not for fewest, the strategy when none is named, which finds the seam itself; "
+        "--strategy mixed takes it");
+  }
   EXPECT_EQ(
       Refusal({"fit", "p.csv", "--strategy", "fewest", "--min-radius", "5", "--max-radius", "4"}),
       "--min-radius is larger than --max-radius");

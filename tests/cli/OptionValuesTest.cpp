@@ -141,7 +141,7 @@ struct WordOption {
 };
 
 std::vector<WordOption> const kWordOptions = {
-    {"--strategy", {"fit"}, "mixed, cells, arc, fewest"},
+    {"--strategy", {"fit"}, "fewest, mixed, cells, arc"},
     {"--effort", {"fit"}, "quick, wide, full"},
     {"--closed", {"fit", "check", "info", "simplify"}, "auto, yes, no"},
     {"--points-from", kWithPoints, "csv, dxf, gcode, wkt, geojson, svg, json"},

@@ -62,7 +62,8 @@ TEST_F(OutlineFit, OneOutlineCanBeChosen) {
   Write("two.svg", kTwoOutlines);
   Ended const ended = Run("fit two.svg -t 0.1 --outline 2 -o b.json");
   EXPECT_EQ(ended.code, 0) << ended.err;
-  EXPECT_NE(ended.out.find("pieces      2: 2 lines, 0 arcs"), std::string::npos) << ended.out;
+  EXPECT_NE(ended.out.find("pieces      2 (proven the fewest): 2 lines, 0 arcs"), std::string::npos)
+      << ended.out;
   ExpectRefusal("fit two.svg -t 0.1 --outline 3", 2,
                 "two.svg: there is no outline 3, the file has 2 outlines");
   ExpectRefusal("info two.svg", 2, "two.svg: holds 2 outlines: --outline N takes one of them");
@@ -70,7 +71,7 @@ TEST_F(OutlineFit, OneOutlineCanBeChosen) {
 
 TEST_F(OutlineFit, ASeamIsForOneOutline) {
   Write("two.svg", kTwoOutlines);
-  ExpectRefusal("fit two.svg -t 0.1 --start 3", 2,
+  ExpectRefusal("fit two.svg -t 0.1 --strategy mixed --start 3", 2,
                 "--start is for one outline, and there are 2: --outline N takes one of them");
 }
 
@@ -96,7 +97,7 @@ TEST_F(OutlineFit, ArcsBecomePointsWhenAskedFor) {
 
 TEST_F(OutlineFit, TheFormatOfPointsCanBeSaid) {
   Write("path.txt", "G21\nG0 X0 Y0\nG1 X5\nX10\nY5\nY10\nM2\n");
-  Ended const ended = Run("fit path.txt --points-from gcode -t 0.1");
+  Ended const ended = Run("fit path.txt --points-from gcode -t 0.1 --strategy mixed");
   EXPECT_EQ(ended.code, 0) << ended.err;
   EXPECT_NE(ended.out.find("pieces      2: 2 lines"), std::string::npos) << ended.out;
 }

@@ -24,7 +24,7 @@ TEST_F(Program, ClosePointsAreSeenDroppedFittedAndChecked) {
   std::string text = Corner();
   text.insert(text.find("5,0\n"), "4.99,0\n");
   Write("p.csv", text);
-  EXPECT_EQ(Run("fit p.csv -t 0.01 -o p.dxf").code, 4);
+  EXPECT_EQ(Run("fit p.csv -t 0.01 --strategy mixed -o p.dxf").code, 4);
   Ended const info = Run("info p.csv -t 0.01");
   EXPECT_EQ(info.code, 0);
   EXPECT_NE(info.out.find("1 of 21 pairs is too close"), std::string::npos) << info.out;
@@ -33,7 +33,8 @@ TEST_F(Program, ClosePointsAreSeenDroppedFittedAndChecked) {
   EXPECT_EQ(simple.out, "");
   EXPECT_EQ(simple.err, "contour: p.csv: dropped 1 of 22 points: point 6 (line 8)\n");
   EXPECT_EQ(Contents(folder_ / "d.csv"), "point,line,x,y\n6,8,5,0\n");
-  ASSERT_EQ(Run("fit q.csv -t 0.01 -o p.dxf -o p.nc -o p.wkt -o p.csv.json").code, 0);
+  ASSERT_EQ(Run("fit q.csv -t 0.01 --strategy mixed -o p.dxf -o p.nc -o p.wkt -o p.csv.json").code,
+            0);
   for (char const* contour : {"p.dxf", "p.nc", "p.wkt", "p.csv.json"}) {
     Ended const checked = Run(std::string("check p.csv ") + contour + " -t 0.01");
     EXPECT_EQ(checked.code, 0) << contour << ": " << checked.out << checked.err;

@@ -38,11 +38,11 @@ TEST_F(Program, TwoPointsGiveOneLine) {
       "points      2\n"
       "columns     1 and 2\n"
       "tolerance   0.1 (given for all points)\n"
-      "strategy    mixed\n"
+      "strategy    fewest\n"
       "closed      no (the last point is not the first)\n"
-      "pieces      1: 1 line, 0 arcs\n"
+      "pieces      1 (proven the fewest): 1 line, 0 arcs\n"
       "compression 2.0 points a piece, 50.0 % of the points\n"
-      "reported    0.000000 of the tolerance, exact by construction\n"
+      "reported    0.000000 of the tolerance at point 0 (line 1)\n"
       "re-measured 0.000000 of the tolerance at point 0 (line 1), 0 from piece 1\n"
       "deviation   0.000000 of the tolerance at point 0 (line 1), the largest that was found\n"
       "scatter     root mean square 0, mean 0, none of 2 points outside\n"
@@ -75,7 +75,9 @@ TEST_F(Program, CornerBecomesTwoLinesInTableJsonAndDrawing) {
   Write("p.csv", Corner());
   Ended const ended = Run("fit p.csv --tolerance 0.01 --json p.json --svg p.svg");
   EXPECT_EQ(ended.code, 0) << ended.err;
-  EXPECT_NE(ended.out.find("pieces      2: 2 lines, 0 arcs\n"), std::string::npos) << ended.out;
+  EXPECT_NE(ended.out.find("pieces      2 (proven the fewest): 2 lines, 0 arcs\n"),
+            std::string::npos)
+      << ended.out;
   EXPECT_NE(ended.out.find("wrote       p.json\nwrote       p.svg\n"), std::string::npos);
   auto const json = nlohmann::json::parse(Contents(folder_ / "p.json"));
   ASSERT_EQ(json.at("elements").size(), 2u);
@@ -161,7 +163,7 @@ TEST_F(Program, ExitCode3UnreadableFiles) {
 
 TEST_F(Program, ExitCode4PointsTooClose) {
   Write("p.csv", "x,y\n0,0\n1,0\n1.5,0\n3,0\n");
-  ExpectRefusal("fit p.csv --tolerance 0.25 --svg p.svg", 4,
+  ExpectRefusal("fit p.csv --tolerance 0.25 --strategy mixed --svg p.svg", 4,
                 "p.csv: point 1 (line 3) and point 2 (line 4) are too close: distance 0.5, needed "
                 "more than 0.75 (1.5 times the sum of their tolerances)\n"
                 "the largest single tolerance that would pass for this file is 0.166666\n"
@@ -170,12 +172,14 @@ TEST_F(Program, ExitCode4PointsTooClose) {
                 "or --tolerance 0.166666, or --tolerance-per-point CAP to follow the spacing\n"
                 "or leave points out: contour simplify p.csv -t 0.25 --drop-close");
   EXPECT_EQ(Files(), std::vector<std::string>{"p.csv"});
-  EXPECT_EQ(Run("fit p.csv --tolerance 0.166666").code, 0) << "the tolerance named must pass";
+  EXPECT_EQ(Run("fit p.csv --tolerance 0.166666 --strategy mixed").code, 0)
+      << "the tolerance named must pass";
+  EXPECT_EQ(Run("fit p.csv --tolerance 0.25").code, 0) << "the usual strategy takes any spacing";
 }
 
 TEST_F(Program, ExitCode4CoincidingPoints) {
   Write("p.csv", "0,0\n1,0\n1,0\n3,0\n");
-  Ended const ended = Run("fit p.csv --tolerance 0.1");
+  Ended const ended = Run("fit p.csv --tolerance 0.1 --strategy mixed");
   EXPECT_EQ(ended.code, 4);
   EXPECT_NE(ended.err.find("no tolerance would pass"), std::string::npos) << ended.err;
   ExpectRefusal("fit p.csv --tolerance-per-point 0.1", 4,

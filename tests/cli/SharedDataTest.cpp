@@ -57,7 +57,7 @@ class SharedData : public testing::TestWithParam<SharedContour> {
     std::string name = (fs::temp_directory_path() / "contour-shared-XXXXXX").string();
     folder_ = mkdtemp(name.data());
     points_ = *data + "/" + GetParam().name + ".csv";
-    std::vector<std::string> words = {"--gcode-decimals", kGCodeDecimals};
+    std::vector<std::string> words = {"--strategy", "mixed", "--gcode-decimals", kGCodeDecimals};
     for (char const* ending : {"json", "csv", "dxf", "nc", "wkt", "svg", "html"}) {
       words.insert(words.end(), {"-o", FileOf(ending)});
     }

@@ -110,7 +110,7 @@ TEST(SimplifyCommand, AveragesInWindows) {
 }
 
 TEST(SimplifyCommand, ARestThatCannotBeFittedIsSaid) {
-  RunResult const run = RunInProcess({"simplify", "-", "--spacing", "0.2", "-t", "5"}, Scan());
+  RunResult const run = RunInProcess({"simplify", "-", "--spacing", "0.2", "-t", "50"}, Scan());
   EXPECT_EQ(run.code, ExitCode::Ok);
   EXPECT_NE(run.err.find("the rest cannot be fitted: "), std::string::npos) << run.err;
 }

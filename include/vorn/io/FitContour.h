@@ -21,8 +21,8 @@ struct FitChoice {
   ToleranceChoice tolerance;                 ///< where the tolerances come from
   Strategy strategy = kUsualStrategy;        ///< how the contour is found
   ClosedChoice closed = ClosedChoice::Auto;  ///< whether the contour runs back to its start
-  /// The seam of a closed contour, as counted in the file. Not for the fewest pieces, which find
-  /// their own.
+  /// The seam of a closed contour, as counted in the file. Not for the fewest pieces, the usual
+  /// strategy, which find their own.
   std::optional<std::size_t> start;
   /// What the fewest pieces are asked for; `closed` follows from the points.
   FewestPieces::Options fewest;

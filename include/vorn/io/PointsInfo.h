@@ -20,7 +20,8 @@ VORN_IO_EXPORT std::vector<ClosePair> FindClosePairs(std::vector<WPoint> const& 
 
 /// A tolerance that suits the points, and why.
 struct Suggestion {
-  /// One tolerance for all points, the same for the fewest pieces alone, or none that would do.
+  /// One tolerance for all points and strategies, one that the spacing denies the strategies with
+  /// cells, or none that would do.
   enum class Way { Same, Fewest, None };
   Way way = Way::None;     ///< which of these
   double tolerance = 0.0;  ///< for all points
@@ -43,8 +44,8 @@ struct PointsInfo {
 VORN_IO_EXPORT PointsInfo Analyse(std::vector<WPoint> const& points, ClosedChoice closed);
 
 /// Five times the noise, or what the shape asks for where that is more: a ten-thousandth of the
-/// size, of a flat profile at most a hundredth of its height. Where the spacing
-/// rule allows only much less, it is one for the fewest pieces, which have no such rule.
+/// size, of a flat profile at most a hundredth of its height. Where the spacing rule allows only
+/// less, it is one for the fewest pieces, which have no such rule.
 VORN_IO_EXPORT Suggestion SuggestTolerance(PointsInfo const& info);
 
 }  // namespace Vorn::IO

@@ -15,7 +15,7 @@ enum class Strategy {
 };
 
 /// What is used when nobody names a strategy.
-inline constexpr Strategy kUsualStrategy = Strategy::Mixed;
+inline constexpr Strategy kUsualStrategy = Strategy::Fewest;
 
 /// As written on the command line: mixed, cells, arc, fewest.
 VORN_IO_EXPORT std::string NameOf(Strategy strategy);

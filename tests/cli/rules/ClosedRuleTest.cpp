@@ -90,7 +90,7 @@ nlohmann::json Fitted(Points const& points, std::vector<std::string> const& more
 }
 
 TEST(ClosedRule, AFitIsCutOpenAtTheStartThatIsSaidElseWhereItTurnsMost) {
-  EXPECT_EQ(Fitted(Square(1.0), {"--start", "13"}).at("seam"), 13);
+  EXPECT_EQ(Fitted(Square(1.0), {"--strategy", "mixed", "--start", "13"}).at("seam"), 13);
   // The corner of a drop: two lines that meet under a sharp angle, closed by an arc.
   Points drop;
   for (int i = 10; i >= 0; --i) drop.emplace_back(-i * 1.0, i * 0.5);
@@ -99,7 +99,8 @@ TEST(ClosedRule, AFitIsCutOpenAtTheStartThatIsSaidElseWhereItTurnsMost) {
     double const angle = std::numbers::pi * (1.5 - 0.1 * i);
     drop.emplace_back(-10 + 5 * std::cos(angle), 5 * std::sin(angle));
   }
-  EXPECT_EQ(Fitted(drop, {"--closed", "yes"}).at("seam"), 10) << "the point at the origin";
+  EXPECT_EQ(Fitted(drop, {"--strategy", "mixed", "--closed", "yes"}).at("seam"), 10)
+      << "the point at the origin";
 }
 
 TEST(ClosedRule, AFullCircleBecomesTwoHalfCircles) {

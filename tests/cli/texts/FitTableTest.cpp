@@ -65,6 +65,7 @@ FitReport FitSquare(ClosedChoice closed) {
                                  : WPoint{0.0, 4.0 - along, 0.0});
   }
   FitChoice choice;
+  choice.strategy = Strategy::Mixed;
   choice.tolerance.same = 0.01;
   choice.closed = closed;
   choice.start = closed == ClosedChoice::No ? std::optional<std::size_t>() : 2;

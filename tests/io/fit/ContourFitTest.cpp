@@ -69,7 +69,7 @@ PointFile Cam() {
 TEST(FitContour, SmoothContourIsCutOpenAtAJoint) {
   // The file of the cam begins in the middle of an arc.
   auto const fit = [](std::optional<std::size_t> start) {
-    FitChoice choice;
+    FitChoice choice = Mixed();
     choice.start = start;
     return FitContour(Cam(), choice, nullptr);
   };
@@ -91,7 +91,7 @@ class Percents final : public ExecutionState {
 };
 
 TEST(FitContour, ProgressOfTwoAttemptsIsOneBar) {
-  FitChoice choice;
+  FitChoice choice = Mixed();
   Percents percents;
   FitContour(Cam(), choice, &percents);
   ASSERT_FALSE(percents.seen.empty());

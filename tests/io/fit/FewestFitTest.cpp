@@ -160,8 +160,10 @@ TEST(FitFewest, SaysWhyThereIsNone) {
 TEST(FitFewest, TakesNoStart) {
   FitChoice choice = Fewest(0.01);
   choice.start = 3;
-  ExpectNoFit(Rectangle(), choice, FailureKind::BadArgument,
-              "a start is not for the fewest pieces, which find the seam themselves");
+  ExpectNoFit(
+      Rectangle(), choice, FailureKind::BadArgument,
+      "a start is not for the fewest pieces, which find the seam themselves: the strategy mixed "
+      "takes one");
 }
 
 TEST(FitFewest, ReportsTellTheBound) {

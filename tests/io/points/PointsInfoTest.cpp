@@ -90,15 +90,15 @@ TEST(SuggestTolerance, KeepsTheShapeOfAFlatProfile) {
   EXPECT_EQ(SuggestTolerance(InfoWith(200, 0.1, 1e-8, 1.0)).tolerance, 0.001);
 }
 
-TEST(SuggestTolerance, GoesDownToTheSpacingOrNamesTheFewestPieces) {
-  Suggestion const little = SuggestTolerance(InfoWith(30, 40, 0.0, 0.00244662));
-  EXPECT_EQ(little.way, Suggestion::Way::Same);
-  EXPECT_EQ(little.tolerance, 0.00244662);
-  Suggestion const much = SuggestTolerance(InfoWith(30, 40, 0.0, 0.0001));
-  EXPECT_EQ(much.way, Suggestion::Way::Fewest);
-  EXPECT_EQ(much.tolerance, 0.005);
-  Suggestion const noisy = SuggestTolerance(InfoWith(30, 40, 0.01, 0.04));
-  EXPECT_EQ(noisy.way, Suggestion::Way::Fewest) << "less than the noise asks for";
+TEST(SuggestTolerance, SaysWhereItIsForTheFewestPiecesAloneAndDoesNotFollowTheSpacing) {
+  EXPECT_EQ(SuggestTolerance(InfoWith(30, 40, 0.0, 0.005)).way, Suggestion::Way::Same);
+  for (double const largest : {0.0049, 0.0001}) {
+    Suggestion const suggestion = SuggestTolerance(InfoWith(30, 40, 0.0, largest));
+    EXPECT_EQ(suggestion.way, Suggestion::Way::Fewest);
+    EXPECT_EQ(suggestion.tolerance, 0.005);
+    EXPECT_EQ(suggestion.reason,
+              "a ten-thousandth of the size; too much for mixed and cells at this spacing");
+  }
 }
 
 TEST(SuggestTolerance, NamesTheFewestPiecesWhereNeighboursCoincide) {

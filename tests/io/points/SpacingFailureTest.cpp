@@ -21,6 +21,7 @@ std::optional<SpacingFailure> FailureOf(PointFile file, FitChoice const& choice)
 
 TEST(SpacingFailure, OfAFitTellsThePairAndWhatWasAsked) {
   FitChoice choice;
+  choice.strategy = Strategy::Mixed;
   choice.tolerance.same = 0.25;
   auto const failure = FailureOf(FileWith({{0, 0, 0}, {1, 0, 0}, {1.5, 0, 0}, {3, 0, 0}}), choice);
   ASSERT_TRUE(failure);
@@ -40,6 +41,7 @@ TEST(SpacingFailure, OfAFitTellsThePairAndWhatWasAsked) {
 TEST(SpacingFailure, OfAClosedContourNamesPointsAsTheFileCountsThem) {
   // A square whose last point is close to its first: the pair spans the end of the file.
   FitChoice choice;
+  choice.strategy = Strategy::Mixed;
   choice.tolerance.same = 0.5;
   choice.closed = ClosedChoice::Yes;
   auto const failure =
@@ -69,6 +71,7 @@ TEST(SpacingFailure, OfPointsInOnePlaceAdvisesToLeaveOneOut) {
 
 TEST(SpacingFailure, NamesNoProgram) {
   FitChoice choice;
+  choice.strategy = Strategy::Mixed;
   choice.tolerance.same = 1.0;
   auto const failure = FailureOf(FileWith({{0, 0, 0}, {1, 0, 0}}), choice);
   ASSERT_TRUE(failure);
@@ -77,6 +80,7 @@ TEST(SpacingFailure, NamesNoProgram) {
 
 TEST(SpacingFailure, IsAFailureWhenCaughtAsOne) {
   FitChoice choice;
+  choice.strategy = Strategy::Mixed;
   choice.tolerance.same = 1.0;
   try {
     FitContour(FileWith({{0, 0, 0}, {1, 0, 0}}), choice, nullptr);
