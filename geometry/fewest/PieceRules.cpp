@@ -26,6 +26,10 @@ constexpr double kNoiseStep = 1.65;
 /// degrees, whose sine is 0.83 of their angle.
 constexpr double kTurnToCount = 4.5;
 
+/// Where a circle turns by no more than this between two points, in radians, the direction at the
+/// first tells which one is ahead.
+constexpr double kLittleTurn = 0.5;
+
 /// From so many points on the spacing of a run is looked at before its points are.
 constexpr std::int32_t kLongRun = 256;
 
@@ -43,28 +47,51 @@ double SquaredGradient(Circle const& circle, Place const& place) {
   return gradient.x * gradient.x + gradient.y * gradient.y;
 }
 
+/// From such a stride on points are so dense that their joint can be wherever they turn.
+constexpr std::int32_t kDenseStride = 6;
+
+/// How far a point may lie back behind an earlier one that is not its neighbour: by noise, and by a
+/// tolerance, since the earlier one may lie beyond the end of its piece.
+double MostBack(Sample const& earlier, Sample const& point, std::int32_t stride) {
+  double const beyondEnd = stride < kDenseStride ? earlier.w : 0.0;
+  return kNoiseStep * (earlier.w + point.w) + beyondEnd;
+}
+
+/// How far a circle that has this gradient at a place advances from there to another one.
+double AdvanceTo(Place const& gradient, Place const& from, Place const& to) {
+  return gradient.y * (to.x - from.x) - gradient.x * (to.y - from.y);
+}
+
 }  // namespace
 
 std::int32_t PieceRules::FindStride(Circle const& circle, Ends const& ends) const {
   if (ends.end - ends.first < kLongRun) return 1;
-  DenseOrder const dense(circle, spacing_.Of(ends.first, ends.end), frame_);
+  RunSpacing const spacing = spacing_.Of(ends.first, ends.end);
+  DenseOrder const dense(circle, spacing, frame_);
   constexpr double kRoom = 1.0 - 1e-6;
   double const largestStep = kRoom * kStepShare * path_.limits.sineOfHalfStep;
-  bool const isSure = dense.IsInOrder(kNoiseStep) && dense.HasSmallSteps(largestStep);
+  double const mostBack = kRoom * 2.0 * kNoiseStep * spacing.leastTolerance;
+  bool const isSure = dense.IsInOrder(kNoiseStep) && dense.HasSmallSteps(largestStep) &&
+                      backsteps_.AreWithin(mostBack, circle, frame_, ends.first, ends.end);
   return isSure ? dense.Stride() : 1;
 }
 
 PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& ends) const {
   std::int32_t const stride = FindStride(circle, ends);
   if (stride > 1) return IsFullTurn(circle, ends, stride) ? Check::Hopeless : Check::Holds;
-  double worst = 0.0;
-  std::int32_t broken = -1;
+  StepBack worst;
+  StepBack slow;  // by more than one step
   double length = 0.0;
   double const noise = kNoiseStep * (1.0 + kRoundingRoom) * frame_.scale;
+  std::int32_t farthest = ends.first;
   WPoint const* last = &path_.At(ends.first);
   Place p = frame_.ToLocal(Place{last->x, last->y});
   Place gradient = GradientAt(circle, p);
   double here2 = gradient.x * gradient.x + gradient.y * gradient.y;
+  // Points behind the joint are as far along as the joint.
+  double const start =
+      ends.from->isFree ? 0.0 : AdvanceTo(gradient, p, frame_.ToLocal(ends.from->gate.origin));
+  double reach = std::max(0.0, start) - noise * path_.At(ends.first).w;
   for (std::int32_t i = ends.first + 1; i < ends.end; ++i) {
     WPoint const& next = path_.At(i);
     Place const q = frame_.ToLocal(Place{next.x, next.y});
@@ -73,10 +100,15 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
     // The unit direction of travel times the step.
     double const advance = gradient.y * dx - gradient.x * dy;
     length += advance;
-    double const excess = -advance - noise * (last->w + next.w);
-    if (excess > worst) {
-      worst = excess;
-      broken = i;
+    double const room = noise * next.w;
+    if (reach > std::max(length, start) + room) {
+      worst.Take({i - 1, i, -advance - noise * (last->w + next.w)});
+      slow.Take({farthest, i, ExcessOfStepBack(circle, farthest, i)});
+    }
+    double const along = std::max(length, start);
+    if (along - room > reach) {
+      reach = along - room;
+      farthest = i;
     }
     gradient = GradientAt(circle, q);
     double const gap2 = dx * dx + dy * dy;
@@ -91,15 +123,31 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
   if (2.0 * std::fabs(circle.a) * length > kTurnToCount && IsFullTurn(circle, ends, stride)) {
     return Check::Hopeless;
   }
-  if (broken < 0) return Check::Holds;
-  return programme_->Add(StepCondition(broken)) ? Check::Added : Check::Hopeless;
+  if (!(worst.excess > 0.0)) worst = slow;
+  if (!(worst.excess > 0.0)) return Check::Holds;
+  return programme_->Add(OrderCondition(worst)) ? Check::Added : Check::Hopeless;
 }
 
-Condition PieceRules::StepCondition(std::int32_t point) const {
-  Sample const p = frame_.ToLocal(path_.At(point - 1));
+double PieceRules::ExcessOfStepBack(Circle const& circle, std::int32_t earlier,
+                                    std::int32_t point) const {
+  Sample const p = frame_.ToLocal(path_.At(earlier));
   Sample const q = frame_.ToLocal(path_.At(point));
+  double const dx = q.x - p.x;
+  double const dy = q.y - p.y;
+  bool const isNear = 2.0 * std::fabs(circle.a) * std::sqrt(dx * dx + dy * dy) <= kLittleTurn;
+  double const advance = Apply(AdvanceRow(PlaceOf(p), dx, dy), circle);
+  return isNear ? -advance - (1.0 + kRoundingRoom) * MostBack(p, q, StrideFrom(path_, earlier))
+                : 0.0;
+}
+
+Condition PieceRules::OrderCondition(StepBack const& broken) const {
+  Sample const p = frame_.ToLocal(path_.At(broken.earlier));
+  Sample const q = frame_.ToLocal(path_.At(broken.point));
   Row const advance = AdvanceRow(PlaceOf(p), q.x - p.x, q.y - p.y);
-  return {Negated(advance), Condition::Kind::HalfSpace, kNoiseStep * (p.w + q.w)};
+  bool const areNeighbours = broken.earlier + 1 == broken.point;
+  double const limit =
+      areNeighbours ? kNoiseStep * (p.w + q.w) : MostBack(p, q, StrideFrom(path_, broken.earlier));
+  return {Negated(advance), Condition::Kind::HalfSpace, limit};
 }
 
 bool PieceRules::IsLargeStep(Circle const& circle, double gap2, double near2, double w) const {

@@ -3,6 +3,7 @@
 #include <cstdint>
 #include <optional>
 
+#include "geometry/fewest/Backsteps.h"
 #include "geometry/fewest/Columns.h"
 #include "geometry/fewest/Gates.h"
 #include "geometry/fewest/LocalFrame.h"
@@ -34,8 +35,13 @@ class PieceRules {
  public:
   /// Tolerances are multiplied by `share`. What is referred to has to outlive the rules.
   PieceRules(Path const& path, LocalFrame const& frame, double share, Spacing* spacing,
-             Programme* programme)
-      : path_(path), frame_(frame), share_(share), spacing_(*spacing), programme_(programme) {}
+             Backsteps* backsteps, Programme* programme)
+      : path_(path),
+        frame_(frame),
+        share_(share),
+        spacing_(*spacing),
+        backsteps_(*backsteps),
+        programme_(programme) {}
 
   /// Holds: the circle keeps all rules. Added: it breaks one, and the programme has one condition
   /// more. Hopeless: it breaks one that no condition mends, or the programme is full.
@@ -70,8 +76,21 @@ class PieceRules {
   /// Of how many points one needs to be looked at: above 1 where the spacing of a long run tells
   /// that its points are in order along the circle by small steps, and that so many turn little.
   std::int32_t FindStride(Circle const& circle, Ends const& ends) const;
-  /// That a point lies no farther back than noise may put it behind the one before.
-  Condition StepCondition(std::int32_t point) const;
+  /// A point that lies back behind an earlier one, by how much more than noise may put it there.
+  struct StepBack {
+    std::int32_t earlier = 0;
+    std::int32_t point = 0;
+    double excess = 0.0;
+
+    void Take(StepBack const& other) {
+      if (other.excess > excess) *this = other;
+    }
+  };
+  /// By how much more than noise may put it there a point lies back behind an earlier one; 0 where
+  /// the circle turns too much between the two to tell.
+  double ExcessOfStepBack(Circle const& circle, std::int32_t earlier, std::int32_t point) const;
+  /// That a point lies no farther back than noise may put it.
+  Condition OrderCondition(StepBack const& broken) const;
   /// Whether two points are further apart along the circle than the greatest step. Their feet on
   /// the circle are as far apart as the points, divided by the distance of the nearer one from the
   /// centre in radii; `near2` is the square of that distance. Points nearer than `w` make no step.
@@ -100,6 +119,7 @@ class PieceRules {
   LocalFrame const& frame_;
   double share_;
   Spacing& spacing_;
+  Backsteps& backsteps_;
   Programme* programme_;
 };
 

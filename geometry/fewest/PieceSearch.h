@@ -3,6 +3,7 @@
 #include <cmath>
 #include <cstdint>
 
+#include "geometry/fewest/Backsteps.h"
 #include "geometry/fewest/Columns.h"
 #include "geometry/fewest/Gates.h"
 #include "geometry/fewest/LocalFrame.h"
@@ -52,7 +53,8 @@ inline Opening StartOn(Gate const& gate, Interval const& interval) {
 class PieceSearch {
  public:
   /// Tolerances are multiplied by `share`.
-  PieceSearch(Path const& path, double share) : path_(path), spacing_(path), share_(share) {}
+  PieceSearch(Path const& path, double share)
+      : path_(path), spacing_(path), backsteps_(path), share_(share) {}
 
   /// Moves the local coordinates to the points [first, last), about which the next searches go.
   void MoveTo(std::int32_t first, std::int32_t last);
@@ -135,7 +137,7 @@ class PieceSearch {
   /// here.
   RunFit FitAnyRadius(RunFit const& start, bool isTest, Ends const& ends);
   /// The rules in the local coordinates of now.
-  PieceRules Rules() { return {path_, frame_, share_, &spacing_, &programme_}; }
+  PieceRules Rules() { return {path_, frame_, share_, &spacing_, &backsteps_, &programme_}; }
   /// A reach in local coordinates.
   struct LocalReach {
     std::int32_t end = 0;
@@ -159,6 +161,7 @@ class PieceSearch {
   RunFit FirstFit(Opening const& from, std::int32_t end);
   Path const& path_;
   Spacing spacing_;
+  Backsteps backsteps_;
   double share_;
   double slack_ = 0.0;
   LocalFrame frame_;

@@ -1,5 +1,6 @@
 #include <cmath>
 #include <cstdint>
+#include <numbers>
 #include <vector>
 
 #include "gtest/gtest.h"
@@ -12,6 +13,8 @@
 
 namespace Vorn::Testing {
 namespace {
+
+constexpr double kHalfTurn = std::numbers::pi;
 
 /// Every promise kept, or NoFit where all points coincide.
 void FitUnlessCoincident(Scan const& scan, FewestOptions const& options = {}) {
@@ -233,6 +236,21 @@ TEST(FewestPiecesHostile, OutAndBackOnOneLineIsFollowed) {
   scan.insert(scan.end(), back.begin() + 1, back.end());
   FewestResult const result = FitKept(scan);
   EXPECT_EQ(PieceCount(result), 2);
+}
+
+TEST(FewestPiecesHostile, DenseScansOutAndBackOnOneLineAreFollowed) {
+  // Every step is as short as noise may be; only many of them tell that the scan turns back.
+  for (int const count : {150, 300, 600, 1200}) {
+    for (double const noise : {0.1, 0.4}) {
+      for (std::uint64_t seed = 1; seed <= 5; ++seed) {
+        SCOPED_TRACE(testing::Message() << count << " points, noise " << noise << ", " << seed);
+        RandomGeometry random(seed);
+        std::vector<NominalPiece> const pieces{{3.0, 0.0, 0.0}, {4.0, 0.0, kHalfTurn}};
+        Scan const scan = SampleWithNormalNoise(&random, pieces, count, 0.02, noise);
+        EXPECT_EQ(PieceCount(FitKept(scan)), 2);
+      }
+    }
+  }
 }
 
 TEST(FewestPiecesHostile, AFigureEightIsFollowed) {

@@ -39,7 +39,8 @@ Answer AskOrder(Path const& path, double scale) {
   Opening const from;
   Answer answer;
   Spacing spacing(path);
-  PieceRules const rules(path, frame, 1.0, &spacing, &answer.programme);
+  Backsteps backsteps(path);
+  PieceRules const rules(path, frame, 1.0, &spacing, &backsteps, &answer.programme);
   answer.check = rules.AddBrokenOrder(circle, {&from, nullptr, 0, path.Count()});
   return answer;
 }
@@ -138,7 +139,8 @@ TEST(PieceRules, AFullProgrammeIsHopeless) {
   Opening const from;
   Programme programme;
   Spacing spacing(path);
-  PieceRules const rules(path, frame, 1.0, &spacing, &programme);
+  Backsteps backsteps(path);
+  PieceRules const rules(path, frame, 1.0, &spacing, &backsteps, &programme);
   Ends const ends{&from, nullptr, 0, 2};
   for (int i = 0; i < Programme::kMostConditions; ++i) {
     ASSERT_EQ(rules.AddBrokenOrder({-0.5, 0.0, 0.0, 0.5}, ends), Check::Added);
