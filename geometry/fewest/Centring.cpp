@@ -91,7 +91,9 @@ class Centring {
     double before = 0.0;
     double behind = 0.0;
     if (!FindCrossing(chain_.pieces[k].circle, gate, &before)) return 0.0;
-    if (!FindCrossing(chain_.pieces[k + 1].circle, SeenFromBehind(gate), &behind)) return before;
+    if (!FindCrossing(chain_.pieces[k + 1].circle, SeenFromBehind(gate), &behind)) {
+      return std::clamp(before, gate.least, gate.greatest);
+    }
     if (gate.isCusp) behind = -behind;
     double const roomBefore = std::max(kLeastRoom, 1.0 - alone_[k]);
     double const roomBehind = std::max(kLeastRoom, 1.0 - alone_[k + 1]);

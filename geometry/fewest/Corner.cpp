@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <optional>
 
 #include "geometry/fewest/JointRoom.h"
 
@@ -23,6 +24,8 @@ constexpr int kMostSteps = 20;
 
 double Cross(Place const& a, Place const& b) { return a.x * b.y - a.y * b.x; }
 
+Place PlaceAt(Path const& path, std::int32_t point) { return {path.At(point).x, path.At(point).y}; }
+
 /// The crossing of two circles near a place, by Newton's method.
 bool FindMeeting(PlacedCircle const& one, PlacedCircle const& other, Place start, Place* meeting) {
   for (int i = 0; i < kMostSteps; ++i) {
@@ -41,13 +44,50 @@ bool FindMeeting(PlacedCircle const& one, PlacedCircle const& other, Place start
   return true;
 }
 
+/// The point near a split that lies farthest along a circle; nothing where the path runs on.
+std::optional<std::int32_t> FindTip(Path const& path, std::int32_t split,
+                                    PlacedCircle const& circle) {
+  std::int32_t const stride = StrideFrom(path, split);
+  std::int32_t const first = std::max(0, split - stride);
+  std::int32_t const last = std::min(path.Count() - 1, split + stride);
+  Place const start = PlaceAt(path, first);
+  Place const gradient = GradientAt(circle, start);
+  std::int32_t tip = first;
+  double farthest = 0.0;
+  for (std::int32_t i = first + 1; i <= last; ++i) {
+    Place const p = PlaceAt(path, i);
+    double const advance = gradient.y * (p.x - start.x) - gradient.x * (p.y - start.y);
+    if (advance <= farthest) continue;
+    farthest = advance;
+    tip = i;
+  }
+  if (tip == first || tip == last) return {};
+  return tip;
+}
+
+/// The gate at the tip of a fold of a dense scan. Points of sparse ones tell the way themselves.
+bool FoldGate(Path const& path, std::int32_t split, PlacedCircle const& before,
+              PlacedCircle const& behind, Gate* gate) {
+  if (IsWideGap(path, split)) return false;
+  std::optional<std::int32_t> const tip = FindTip(path, split, before);
+  if (!tip) return false;
+  Place const place = PlaceAt(path, *tip);
+  *gate = BisectorGate(place, GradientAt(before, place), GradientAt(behind, place));
+  gate->split = split;
+  JointRoom const room = RoomForJoint(path, split);
+  double const half = 2.0 * path.At(*tip).w;
+  gate->least = -std::min(half, room.right);
+  gate->greatest = std::min(half, room.left);
+  return gate->isCusp;
+}
+
 }  // namespace
 
 bool CornerGate(Path const& path, std::int32_t split, PlacedCircle const& before,
                 PlacedCircle const& behind, Gate* gate) {
   Gate const middle = MiddleGate(path, split, before);
   double const sine = Cross(GradientAt(before, middle.origin), GradientAt(behind, middle.origin));
-  if (!(std::fabs(sine) > kLeastSine)) return false;
+  if (!(std::fabs(sine) > kLeastSine)) return FoldGate(path, split, before, behind, gate);
   Place meeting;
   if (!FindMeeting(before, behind, middle.origin, &meeting)) return false;
   double const dx = meeting.x - middle.origin.x;

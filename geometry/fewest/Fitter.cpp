@@ -9,9 +9,8 @@
 #include "geometry/fewest/BothWays.h"
 #include "geometry/fewest/Centring.h"
 #include "geometry/fewest/Closing.h"
+#include "geometry/fewest/Keeping.h"
 #include "geometry/fewest/Laps.h"
-#include "geometry/fewest/LineCorners.h"
-#include "geometry/fewest/Mending.h"
 #include "geometry/fewest/OnePiece.h"
 #include "geometry/fewest/Polyline.h"
 
@@ -21,18 +20,11 @@ namespace {
 
 using Options = FewestPieces::Options;
 
-/// The search works within this share of the tolerances, so that its rounding and its second order
-/// terms stay within the true ones.
-constexpr double kSearchShare = 1.0 - 1e-6;
-
 /// From how many states a gate takes offsets, for each effort.
 constexpr std::size_t kSources[] = {1, 4, 64};
 
 /// The same for the quick one once a chain has broken a promise.
 constexpr std::size_t kMoreSources = 2;
-
-/// By how much rounding may change a radius, relative to it.
-constexpr double kRadiusRounding = 1e-9;
 
 /// Shares of the tolerances at which another chain is looked for when one breaks a promise.
 constexpr double kTighter[] = {0.97, 0.93, 0.88};
@@ -47,9 +39,6 @@ constexpr std::int32_t kLeastReach = 4;
 /// A contour of no more than this times the bound and one piece more is not mended.
 constexpr double kNearBound = 1.1;
 
-/// How often the places are mended at which a chain breaks promises.
-constexpr int kMostMendings = 24;
-
 /// How often segments from point to point are taken shorter where they break promises.
 constexpr int kMostRefinements = 16;
 
@@ -60,6 +49,7 @@ class Fitter {
       : points_(task.points),
         options_(task.options),
         shift_(task.shift),
+        keeping_(task.points, task.options, task.shift),
         path_(std::move(task.path)),
         runStarts_(task.runStarts),
         bound_(task.bound),
@@ -73,68 +63,102 @@ class Fitter {
   }
 
   /// A contour that keeps every promise; false when there is none. The first one found is taken
-  /// unless it has clearly more pieces than the bound; then one that is mended where the first
+  /// unless it has clearly more pieces than the bound; then one that is repaired where the first
   /// chain breaks promises may have fewer.
   bool Run(Answer* answer, Promises::Report* report) {
-    if (Search(1.0, answer, report)) return true;
-    bool const isFound = RunOthers(answer, report);
-    if (isFound && IsNearBound(*answer)) return true;
-    Answer mended;
-    Promises::Report mendedReport;
-    if (!RunMended(&mended, &mendedReport)) return isFound;
-    if (isFound && mended.ranges.size() >= answer->ranges.size()) return true;
-    *answer = std::move(mended);
-    *report = std::move(mendedReport);
+    FindBest();
+    if (!best_.isKept) return false;
+    *answer = std::move(best_.answer);
+    *report = std::move(best_.report);
     return true;
   }
 
  private:
-  bool IsNearBound(Answer const& answer) const {
-    return static_cast<double>(answer.ranges.size()) <=
-           kNearBound * static_cast<double>(bound_) + 1.0;
-  }
+  /// A contour and what was measured on it; without ranges where there was none to measure.
+  struct Contour {
+    Answer answer;
+    Promises::Report report;
+    bool isKept = false;
 
-  /// Other chains, ever farther from the fewest.
-  bool RunOthers(Answer* answer, Promises::Report* report) {
+    std::size_t Size() const { return answer.ranges.size(); }
+  };
+
+  /// Tries other chains, ever farther from the fewest, until one keeps every promise.
+  void FindBest() {
+    if (Offer(Search(1.0))) return;
     // Gates that take offsets from more states lead to another chain, perhaps of as many pieces.
     quickSources_ = kMoreSources;
-    return Search(1.0, answer, report) || RunTighter(answer, report) ||
-           RunTightened(answer, report) || RunWhole(answer, report);
+    Contour broken = Search(1.0);
+    if (Offer(broken)) return;
+    bool const hasAsFew = TryTighter(broken);
+    if (!hasAsFew) TryTightened(std::move(broken));
+    if (!best_.isKept) TryWhole();
+    for (Repair const repair : {Repair::Mend, Repair::Retrace}) {
+      if (IsNearBound()) return;
+      TryRepaired(repair);
+    }
   }
 
-  /// Mends the first chain where it breaks promises.
-  bool RunMended(Answer* answer, Promises::Report* report) {
-    path_.limits.segmentsOnly = options_.segmentsOnly;
-    quickSources_ = kSources[0];
-    mends_ = true;
-    bool const isKept = Search(1.0, answer, report);
-    mends_ = false;
+  /// Takes a contour for the best one when it keeps every promise with fewer pieces; whether it
+  /// keeps them.
+  bool Offer(Contour contour) {
+    bool const isKept = contour.isKept;
+    if (isKept && (!best_.isKept || contour.Size() < best_.Size())) best_ = std::move(contour);
     return isKept;
+  }
+
+  /// Whether the best contour has hardly more pieces than there have to be.
+  bool IsNearBound() const {
+    return best_.isKept &&
+           static_cast<double>(best_.Size()) <= kNearBound * static_cast<double>(bound_) + 1.0;
+  }
+
+  /// Tries tolerances that are a little tighter everywhere, in place of a contour that breaks a
+  /// promise: another chain of as many pieces may keep them all. Whether one does.
+  bool TryTighter(Contour const& broken) {
+    for (double const share : kTighter) {
+      Contour const other = Search(share);
+      bool const isKept = Offer(other);
+      if (broken.Size() > 0 && other.Size() > broken.Size()) return false;
+      if (isKept) return true;
+    }
+    return false;
   }
 
   /// Searches the whole path again with smaller tolerances where promises are broken.
-  bool RunTightened(Answer* answer, Promises::Report* report) {
-    bool isKept = false;
+  void TryTightened(Contour broken) {
     double const leastTolerance = path_.leastTolerance;
     for (double const factor : kTightening) {
-      if (isKept || answer->ranges.empty()) break;
-      Tighten(*answer, *report, factor);
-      isKept = Search(1.0, answer, report);
+      if (broken.Size() == 0) break;
+      Tighten(broken.answer, broken.report, factor);
+      broken = Search(1.0);
+      if (Offer(broken)) break;
     }
     path_.points = shift_.Apply(points_);
     path_.leastTolerance = leastTolerance;
-    return isKept;
   }
 
   /// What does not yield near the place may yield when all pieces change.
-  bool RunWhole(Answer* answer, Promises::Report* report) {
+  void TryWhole() {
     for (double const share : {0.9, 0.7, 0.5, 0.3}) {
-      if (Search(share, answer, report)) return true;
+      if (Offer(Search(share))) return;
     }
     // Segments keep to the path between the points and have no radius.
     path_.limits.segmentsOnly = true;
-    if (Search(1.0, answer, report)) return true;
-    return RunAlongPoints(answer, report);
+    bool const isKept = Offer(Search(1.0));
+    path_.limits.segmentsOnly = options_.segmentsOnly;
+    if (isKept) return;
+    Contour along;
+    along.isKept = RunAlongPoints(&along.answer, &along.report);
+    Offer(std::move(along));
+  }
+
+  /// Repairs the first chain where it breaks promises.
+  void TryRepaired(Repair repair) {
+    quickSources_ = kSources[0];
+    repair_ = repair;
+    Offer(Search(1.0));
+    repair_ = Repair::None;
   }
 
   /// Segments from point to point; every point becomes a joint where they break promises.
@@ -142,7 +166,7 @@ class Fitter {
     std::vector<char> isJoint(points_.size(), 0);
     for (int round = 0; round < kMostRefinements; ++round) {
       *answer = FollowPoints(points_, options_.closed, isJoint);
-      if (Measure(*answer, report)) return true;
+      if (keeping_.IsKept(*answer, report)) return true;
       if (answer->ranges.empty()) return false;
       for (Promises::Violation const& violation : report->violations) {
         MarkPoints(answer->ranges[violation.piece], &isJoint);
@@ -151,7 +175,7 @@ class Fitter {
       }
     }
     *answer = FollowPoints(points_, options_.closed, std::vector<char>(points_.size(), 1));
-    return Measure(*answer, report);
+    return keeping_.IsKept(*answer, report);
   }
 
   /// Marks the points of a piece and the one behind it.
@@ -165,9 +189,9 @@ class Fitter {
 
   bool RunAsOnePiece(PlacedCircle const& covering, Answer* answer, Promises::Report* report) const {
     for (Chain const& chain : MakeOnePiece(path_, covering)) {
-      if (KeepsCentred(path_, 0, chain, answer, report)) return true;
+      if (keeping_.KeepsCentred({path_, 0}, chain, answer, report)) return true;
       RoundEnds(Tightest(points_).w, answer);
-      if (Measure(*answer, report)) return true;
+      if (keeping_.IsKept(*answer, report)) return true;
     }
     return false;
   }
@@ -178,32 +202,20 @@ class Fitter {
     Path path = path_;
     path.start = laps.start;
     path.finish = laps.finish;
-    return Keeps(path, 0, laps.chain, answer, report);
+    return keeping_.Keeps({path, 0}, laps.chain, answer, report);
   }
 
-  /// Tries tolerances that are a little tighter everywhere, in place of a contour that breaks a
-  /// promise: another chain of as many pieces may keep them all. Leaves the answer otherwise.
-  bool RunTighter(Answer* answer, Promises::Report* report) {
-    for (double const share : kTighter) {
-      Answer other;
-      Promises::Report otherReport;
-      bool const isKept = Search(share, &other, &otherReport);
-      bool const hasAny = !answer->ranges.empty();
-      if (hasAny && other.ranges.size() > answer->ranges.size()) return false;
-      if (!isKept) continue;
-      *answer = std::move(other);
-      *report = std::move(otherReport);
-      return true;
+  /// Finds and measures one contour.
+  Contour Search(double share) {
+    Contour found;
+    if (options_.closed) {
+      found.isKept = SearchClosed(share, &found.answer, &found.report);
+      return found;
     }
-    return false;
-  }
-
-  /// Finds and measures one contour; `answer` is without ranges when there was none to measure.
-  bool Search(double share, Answer* answer, Promises::Report* report) {
-    *answer = {};
-    if (options_.closed) return SearchClosed(share, answer, report);
     Chain const chain = SearchOpen(share);
-    return !chain.pieces.empty() && KeepsSearched(path_, 0, chain, answer, report);
+    found.isKept = !chain.pieces.empty() &&
+                   keeping_.KeepsRepaired(repair_, {path_, 0}, chain, &found.answer, &found.report);
+    return found;
   }
 
   /// The shortest open chain of all efforts; empty when there is none.
@@ -249,16 +261,7 @@ class Fitter {
                    double factor) {
     std::int32_t const count = path_.Count();
     std::int32_t const length = (range.last - range.first + count) % count + 1;
-    std::int32_t nearest = 0;
-    double least = std::numeric_limits<double>::infinity();
-    for (std::int32_t k = 0; k < length; ++k) {
-      WPoint const& p = points_[static_cast<std::size_t>((range.first + k) % count)];
-      double const distance = DistanceBetween(p, {at.x, at.y, 0.0});
-      if (distance < least) {
-        least = distance;
-        nearest = k;
-      }
-    }
+    std::int32_t const nearest = keeping_.NearestOf({range.first, range.first + length - 1}, at);
     std::int32_t const reach = std::max(kLeastReach, length / 8);
     for (std::int32_t k = nearest - reach; k <= nearest + reach; ++k) {
       std::int32_t const i = range.first + k;
@@ -273,7 +276,7 @@ class Fitter {
     std::function<void(std::int32_t)> const tell = [&](std::int32_t done) { Tell(done); };
     std::function<bool(CutPath const&, Chain const&, Answer*, Promises::Report*)> const keeps =
         [&](CutPath const& cut, Chain const& chain, Answer* closed, Promises::Report* measured) {
-          return KeepsSearched(cut.path, cut.rotation, chain, closed, measured);
+          return keeping_.KeepsRepaired(repair_, {cut.path, cut.rotation}, chain, closed, measured);
         };
     ClosingTask const task{path_, share * kSearchShare, bound_, runStarts_, tell, keeps};
     ClosedContour best;
@@ -307,7 +310,7 @@ class Fitter {
     for (Chain const* chain : {&centred, &open}) {
       Answer closed = Restore(shift_, *chain, BuildPieces(path_, *chain));
       Promises::Report closedReport;
-      if (!AppendClosingSegment(&closed) || !Measure(closed, &closedReport)) continue;
+      if (!AppendClosingSegment(&closed) || !keeping_.IsKept(closed, &closedReport)) continue;
       *answer = std::move(closed);
       *report = std::move(closedReport);
       return true;
@@ -315,76 +318,15 @@ class Fitter {
     return false;
   }
 
-  bool AreRadiiAllowed(std::vector<GeometryUtils::Elem> const& contour) const {
-    return std::all_of(contour.begin(), contour.end(), [&](GeometryUtils::Elem const& elem) {
-      return elem.type == GeometryUtils::ElemType::Segment ||
-             (elem.radius >= options_.smallestRadius * (1.0 - kRadiusRounding) &&
-              elem.radius <= options_.largestRadius * (1.0 + kRadiusRounding));
-    });
-  }
-
-  /// Whether a chain that was searched keeps every promise, mended where this is asked for.
-  bool KeepsSearched(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
-                     Promises::Report* report) const {
-    return mends_ ? KeepsMended(path, rotation, chain, answer, report)
-                  : KeepsCentred(path, rotation, chain, answer, report);
-  }
-
-  /// Mends a chain until it keeps every promise; false when nothing is left to try.
-  bool KeepsMended(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
-                   Promises::Report* report) const {
-    Mending mending(path, kSearchShare, chain);
-    for (int round = 0; round < kMostMendings; ++round) {
-      if (Keeps(path, rotation, mending.Current(), answer, report)) {
-        return KeepsCentred(path, rotation, mending.Current(), answer, report);
-      }
-      if (!mending.Mend(report->violations)) return false;
-    }
-    return false;
-  }
-
-  bool KeepsCentred(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
-                    Promises::Report* report) const {
-    if (options_.centre) {
-      Chain const centred = Centre(path, chain);
-      std::vector<BuiltPiece> pieces = BuildPieces(path, centred);
-      SharpenCorners(path, centred, &pieces);
-      if (KeepsBuilt(path, rotation, centred, pieces, answer, report)) return true;
-      if (Keeps(path, rotation, centred, answer, report)) return true;
-    }
-    return Keeps(path, rotation, chain, answer, report);
-  }
-
-  bool Keeps(Path const& path, std::int32_t rotation, Chain const& chain, Answer* answer,
-             Promises::Report* report) const {
-    return KeepsBuilt(path, rotation, chain, BuildPieces(path, chain), answer, report);
-  }
-
-  /// Whether the pieces of a chain, counted from a rotated start of the points, keep every promise.
-  bool KeepsBuilt(Path const& path, std::int32_t rotation, Chain const& chain,
-                  std::vector<BuiltPiece> const& pieces, Answer* answer,
-                  Promises::Report* report) const {
-    *answer = Restore(shift_, chain, pieces);
-    std::int32_t const count = path.Count();
-    for (FewestPieces::Range& range : answer->ranges) {
-      range = {(range.first + rotation) % count, (range.last + rotation) % count};
-    }
-    return Measure(*answer, report);
-  }
-
-  bool Measure(Answer const& answer, Promises::Report* report) const {
-    *report = Promises::Measure({points_, answer.contour, answer.ranges, options_.closed,
-                                 options_.largestStep, options_.farthestBetweenPoints});
-    return report->violations.empty() && AreRadiiAllowed(answer.contour);
-  }
-
   std::vector<WPoint> const& points_;
   Options const& options_;
   Shift const& shift_;
+  Keeping keeping_;
   Path path_;
   std::vector<std::int32_t> const& runStarts_;
   std::size_t bound_;
-  bool mends_ = false;  ///< whether chains that break promises are mended
+  Repair repair_ = Repair::None;
+  Contour best_;
   std::size_t quickSources_ = kSources[0];
   Progress& progress_;
 };

@@ -137,7 +137,8 @@ void Levels::AddPointGate(Level const& level, std::int32_t split, std::int32_t p
   if (from == nullptr) return;
   WPoint const& at = path_.At(point);
   Place const place{at.x, at.y};
-  Place const out = LeftNormal(at, path_.At(std::min(point + 1, path_.Count() - 1)));
+  std::int32_t const ahead = std::min(point + StrideFrom(path_, point), path_.Count() - 1);
+  Place const out = LeftNormal(at, path_.At(ahead));
   Gate gate = BisectorGate(place, GradientAt(from->reach.circle, place), out);
   gate.split = split;
   gate.least = -at.w;

@@ -33,57 +33,18 @@ void TightenInner(double share, Path* path) {
   path->leastTolerance *= share;
 }
 
-/// Copies parts of chains one after the other.
-class Copying {
- public:
-  /// From a chain and how small the tolerances of its pieces were; both have to outlive this.
-  Copying(Chain const& old, std::vector<std::size_t> const& oldTightness)
-      : old_(old), oldTightness_(oldTightness) {}
-
-  /// The pieces of the old chain up to `end` that are not copied yet.
-  void KeepUpTo(std::size_t end) {
-    for (; next_ < end; ++next_) {
-      chain_.pieces.push_back(old_.pieces[next_]);
-      tightness_.push_back(oldTightness_[next_]);
-      AddGateBehind(next_);
-    }
-  }
-
-  /// The pieces of a part in place of those of a stretch.
-  void Replace(Stretch const& stretch, Chain const& part, std::size_t tightness) {
-    Chain const placed = MovedBy(part, old_.pieces[stretch.first].first);
-    chain_.pieces.insert(chain_.pieces.end(), placed.pieces.begin(), placed.pieces.end());
-    chain_.gates.insert(chain_.gates.end(), placed.gates.begin(), placed.gates.end());
-    chain_.offsets.insert(chain_.offsets.end(), placed.offsets.begin(), placed.offsets.end());
-    tightness_.insert(tightness_.end(), placed.pieces.size(), tightness);
-    AddGateBehind(stretch.end - 1);
-    next_ = stretch.end;
-  }
-
-  Chain&& TakeChain() { return std::move(chain_); }
-  std::vector<std::size_t>&& TakeTightness() { return std::move(tightness_); }
-
- private:
-  void AddGateBehind(std::size_t piece) {
-    if (piece >= old_.gates.size()) return;
-    chain_.gates.push_back(old_.gates[piece]);
-    chain_.offsets.push_back(old_.offsets[piece]);
-  }
-
-  Chain const& old_;
-  std::vector<std::size_t> const& oldTightness_;
-  Chain chain_;
-  std::vector<std::size_t> tightness_;
-  std::size_t next_ = 0;
-};
-
 }  // namespace
 
 Mending::Mending(Path const& path, double share, Chain chain)
     : path_(path), share_(share), chain_(std::move(chain)), tightness_(chain_.pieces.size()) {}
 
 bool Mending::Mend(std::vector<Promises::Violation> const& violations) {
-  Copying copying(chain_, tightness_);
+  Splicing splicing(chain_);
+  std::vector<std::size_t> tightnesses;
+  std::size_t next = 0;
+  auto const keepUpTo = [&](std::size_t end) {
+    for (; next < end; ++next) tightnesses.push_back(tightness_[next]);
+  };
   bool isAnyLeft = false;
   for (Stretch const& stretch : StretchesAround(violations)) {
     auto const begin = tightness_.begin() + static_cast<std::ptrdiff_t>(stretch.first);
@@ -94,13 +55,14 @@ bool Mending::Mend(std::vector<Promises::Violation> const& violations) {
     std::fill(begin, end, tightness);
     Chain const part = Search(stretch, tightness);
     if (part.pieces.empty()) continue;
-    copying.KeepUpTo(stretch.first);
-    copying.Replace(stretch, part, tightness);
+    splicing.Replace(stretch, part);
+    keepUpTo(stretch.first);
+    tightnesses.insert(tightnesses.end(), part.pieces.size(), tightness);
+    next = stretch.end;
   }
-  copying.KeepUpTo(chain_.pieces.size());
-  Chain next = copying.TakeChain();
-  tightness_ = copying.TakeTightness();
-  chain_ = std::move(next);
+  keepUpTo(tightness_.size());
+  tightness_ = std::move(tightnesses);
+  chain_ = splicing.Finish();
   return isAnyLeft;
 }
 

@@ -1,6 +1,7 @@
 #include "geometry/fewest/Stretch.h"
 
 #include <algorithm>
+#include <utility>
 
 #include "math/Assert.h"
 
@@ -50,28 +51,33 @@ bool HasOuterPoints(Chain const& chain, Stretch const& stretch) {
   return first.first < first.end && last.first < last.end;
 }
 
-Path PathOf(Path const& path, Chain const& chain, Stretch const& stretch) {
-  VORN_ASSERT(HasOuterPoints(chain, stretch));
-  std::int32_t const first = chain.pieces[stretch.first].first;
-  std::int32_t const end = chain.pieces[stretch.end - 1].end;
+Path PathBetween(Path const& path, PathEnd const& start, PathEnd const& finish) {
   Path part;
-  part.points.assign(path.points.begin() + first, path.points.begin() + end);
+  part.points.assign(path.points.begin() + start.point, path.points.begin() + finish.point);
   part.limits = path.limits;
   part.leastTolerance = path.leastTolerance;
-  part.before = PointsBefore(path, first);
-  part.behind = PointsFrom(path, end);
-  part.start = path.start;
-  part.finish = path.finish;
+  part.before = PointsBefore(path, start.point);
+  part.behind = PointsFrom(path, finish.point);
+  part.start = start.opening;
+  part.finish = finish.opening;
+  if (!part.start.isFree) part.start.gate.split = 0;
+  part.finish.gate.split = finish.point - start.point;
+  return part;
+}
+
+Path PathOf(Path const& path, Chain const& chain, Stretch const& stretch) {
+  VORN_ASSERT(HasOuterPoints(chain, stretch));
+  PathEnd start{chain.pieces[stretch.first].first, path.start};
+  PathEnd finish{chain.pieces[stretch.end - 1].end, path.finish};
   if (stretch.first > 0) {
     std::size_t const k = stretch.first - 1;
-    part.start = StartAt(Moved(chain.gates[k], -first), chain.offsets[k]);
+    start.opening = StartAt(chain.gates[k], chain.offsets[k]);
   }
   if (stretch.end < chain.pieces.size()) {
     std::size_t const k = stretch.end - 1;
-    part.finish = EndAt(chain.gates[k], chain.offsets[k]);
+    finish.opening = EndAt(chain.gates[k], chain.offsets[k]);
   }
-  part.finish.gate.split = end - first;
-  return part;
+  return PathBetween(path, start, finish);
 }
 
 Chain PartOf(Chain const& chain, Stretch const& stretch) {
@@ -88,6 +94,12 @@ Chain PartOf(Chain const& chain, Stretch const& stretch) {
   return part;
 }
 
+void Append(Chain const& part, Chain* chain) {
+  chain->pieces.insert(chain->pieces.end(), part.pieces.begin(), part.pieces.end());
+  chain->gates.insert(chain->gates.end(), part.gates.begin(), part.gates.end());
+  chain->offsets.insert(chain->offsets.end(), part.offsets.begin(), part.offsets.end());
+}
+
 Chain MovedBy(Chain chain, std::int32_t by) {
   for (ChainPiece& piece : chain.pieces) piece = Moved(piece, by);
   for (Gate& gate : chain.gates) gate = Moved(gate, by);
@@ -102,6 +114,31 @@ void Put(Chain const& part, Stretch const& stretch, Chain* chain) {
     chain->gates[stretch.first + k] = Moved(part.gates[k], first);
     chain->offsets[stretch.first + k] = part.offsets[k];
   }
+}
+
+void Splicing::Replace(Stretch const& stretch, Chain const& part) {
+  KeepUpTo(stretch.first);
+  Append(MovedBy(part, chain_.pieces[stretch.first].first), &spliced_);
+  AddGateBehind(stretch.end - 1);
+  next_ = stretch.end;
+}
+
+Chain Splicing::Finish() {
+  KeepUpTo(chain_.pieces.size());
+  return std::move(spliced_);
+}
+
+void Splicing::KeepUpTo(std::size_t end) {
+  for (; next_ < end; ++next_) {
+    spliced_.pieces.push_back(chain_.pieces[next_]);
+    AddGateBehind(next_);
+  }
+}
+
+void Splicing::AddGateBehind(std::size_t piece) {
+  if (piece >= chain_.gates.size()) return;
+  spliced_.gates.push_back(chain_.gates[piece]);
+  spliced_.offsets.push_back(chain_.offsets[piece]);
 }
 
 }  // namespace Vorn::Fewest

@@ -44,7 +44,8 @@ inline bool DoPointsCoincide(std::vector<WPoint> const& points) {
 ///   times the sum of their tolerances, as noise in dense scans makes them.
 /// - No piece crosses itself or another one where the straight path through the points does not by
 ///   more than the tolerances. Only segments from one point to the next may cross by less, as the
-///   path itself does.
+///   path itself does. Where the path passes itself by less than 1/32 of the sum of two tolerances
+///   it counts as touching itself: a side may be scanned out and back.
 /// - No arc is a full turn: a full circle comes as two arcs.
 ///
 /// Points far apart against their tolerances, by more than eight times the sum of two, as drawings

@@ -1,3 +1,4 @@
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <numbers>
@@ -240,8 +241,8 @@ TEST(FewestPiecesHostile, OutAndBackOnOneLineIsFollowed) {
 
 TEST(FewestPiecesHostile, DenseScansOutAndBackOnOneLineAreFollowed) {
   // Every step is as short as noise may be; only many of them tell that the scan turns back.
-  for (int const count : {150, 300, 600, 1200}) {
-    for (double const noise : {0.1, 0.4}) {
+  for (int const count : {150, 300, 600, 1200, 3000, 6000}) {
+    for (double const noise : {0.1, 0.4, 0.7}) {
       for (std::uint64_t seed = 1; seed <= 5; ++seed) {
         SCOPED_TRACE(testing::Message() << count << " points, noise " << noise << ", " << seed);
         RandomGeometry random(seed);
@@ -251,6 +252,84 @@ TEST(FewestPiecesHostile, DenseScansOutAndBackOnOneLineAreFollowed) {
       }
     }
   }
+}
+
+/// Six sides, each folded back over the one before by exactly half a turn.
+std::vector<NominalPiece> MakeFoldedSides(bool areSomeArcs) {
+  double const bend = areSomeArcs ? 1.0 : 0.0;
+  return {{8.0, 0.0, 0.0},        {9.0, 0.08 * bend, kHalfTurn},   {10.0, -0.06 * bend, -kHalfTurn},
+          {11.0, 0.0, kHalfTurn}, {12.0, 0.08 * bend, -kHalfTurn}, {13.0, -0.06 * bend, kHalfTurn}};
+}
+
+TEST(FewestPiecesHostile, SidesFoldedOverEachOtherTakeAPieceEach) {
+  // Closed scans of arcs do not end where they begin and take one more.
+  for (bool const areSomeArcs : {false, true}) {
+    for (int const count : {396, 1200}) {
+      for (double const noise : {0.0, 0.1, 0.4, 0.7}) {
+        SCOPED_TRACE(testing::Message() << areSomeArcs << ", " << count << " points, " << noise);
+        RandomGeometry random(1);
+        Scan const scan =
+            SampleWithNormalNoise(&random, MakeFoldedSides(areSomeArcs), count, 0.02, noise);
+        EXPECT_EQ(PieceCount(FitKept(scan)), 6);
+        EXPECT_EQ(PieceCount(FitKept(scan, Closed())), areSomeArcs ? 7 : 6);
+      }
+    }
+  }
+}
+
+TEST(FewestPiecesHostile, TheJointOfADenseFoldLiesAtItsTip) {
+  constexpr double kTolerance = 0.02;
+  for (std::uint64_t seed = 1; seed <= 5; ++seed) {
+    SCOPED_TRACE(testing::Message() << "seed " << seed);
+    RandomGeometry random(seed);
+    Scan const scan = SampleWithNormalNoise(&random, {{3.0, 0.0, 0.0}, {4.0, 0.0, kHalfTurn}}, 3000,
+                                            kTolerance, 0.4);
+    FewestResult const result = FitKept(scan);
+    ASSERT_EQ(PieceCount(result), 2);
+    EXPECT_NEAR(result.contour[1].end.x, 3.0, 0.2 * kTolerance);
+  }
+}
+
+/// Two to six lines and arcs that cross and fold back over each other at random.
+Scan MakeRandomFolds(std::uint64_t seed, std::int32_t* pieceCount) {
+  RandomGeometry random(seed);
+  bool const isExact = random.Flip();
+  bool const areSomeArcs = random.Flip();
+  std::vector<NominalPiece> pieces;
+  double length = 0.0;
+  *pieceCount = random.Integer(2, 6);
+  for (int k = 0; k < *pieceCount; ++k) {
+    double const turn = isExact ? kHalfTurn : random.Uniform(2.4, kHalfTurn);
+    double const curvature = areSomeArcs && random.Flip() ? random.Uniform(-0.1, 0.1) : 0.0;
+    pieces.push_back({random.Uniform(3.0, 9.0), curvature, random.Flip() ? turn : -turn});
+    length += pieces.back().length;
+  }
+  double const spacing = std::pow(10.0, random.Uniform(-2.3, -0.3));
+  double const noise = random.Uniform(0.0, 0.7);
+  if (random.Flip() && spacing < 0.05) {
+    return SampleDense(seed, pieces, spacing, 0.02, 0.02 * noise);
+  }
+  auto const count = static_cast<std::int32_t>(length / spacing) + 2 * *pieceCount;
+  return SampleWithNormalNoise(&random, pieces, count, 0.02, noise);
+}
+
+TEST(FewestPiecesHostile, RandomFoldsMostlyTakeAPieceForEachSide) {
+  constexpr int kRounds = 200;
+  constexpr std::int32_t kMostMore = 150;
+  int open = 0;
+  int closed = 0;
+  for (int round = 0; round < kRounds; ++round) {
+    SCOPED_TRACE(testing::Message() << "round " << round);
+    std::int32_t sides = 0;
+    Scan const scan = MakeRandomFolds(static_cast<std::uint64_t>(6700 + round), &sides);
+    std::int32_t const pieces = PieceCount(FitKept(scan));
+    std::int32_t const closedPieces = PieceCount(FitKept(scan, Closed()));
+    open += pieces <= sides ? 1 : 0;
+    closed += closedPieces <= sides + 1 ? 1 : 0;
+    EXPECT_LE(std::max(pieces, closedPieces), sides + kMostMore);
+  }
+  EXPECT_GE(open, 95 * kRounds / 100);
+  EXPECT_GE(closed, 95 * kRounds / 100);
 }
 
 TEST(FewestPiecesHostile, AFigureEightIsFollowed) {

@@ -1,65 +1,26 @@
 #include <gtest/gtest.h>
 
 #include <cstddef>
-#include <cstdint>
 #include <vector>
 
-#include "geometry/fewest/Chain.h"
-#include "geometry/fewest/LocalFrame.h"
 #include "geometry/fewest/Mending.h"
-#include "support/fewest/Scans.h"
+#include "support/fewest/ProfileChain.h"
 
 // A noisy profile of sixteen pieces of which one is said to break a promise.
 
 namespace Vorn::Fewest {
 namespace {
 
-constexpr double kShare = 1.0 - 1e-6;
 constexpr std::size_t kBroken = 7;
-
-Path Profile() {
-  Testing::Scan const scan =
-      Testing::MakeNoisyProfile(8201, Testing::ProfileStyle::Mixed, 1, 600, 0.45);
-  Shift const shift = ShiftFor(scan);
-  Path path;
-  path.points = shift.Apply(scan);
-  path.leastTolerance = Tightest(scan).w * shift.scale;
-  return path;
-}
-
-Chain ChainOf(Path const& path) {
-  return FindChain(path, kShare, [](std::int32_t) {});
-}
 
 std::vector<Promises::Violation> BrokenAt(std::size_t piece) {
   return {{Promises::Promise::InOrder, piece, Promises::kNone, 0, {}, 1.0}};
 }
 
-void ExpectSamePiece(ChainPiece const& one, ChainPiece const& other) {
-  EXPECT_EQ(one.first, other.first);
-  EXPECT_EQ(one.end, other.end);
-  EXPECT_EQ(one.circle.about.a, other.circle.about.a);
-  EXPECT_EQ(one.circle.about.d, other.circle.about.d);
-}
-
-void ExpectEveryPointOnce(Chain const& chain, std::int32_t count) {
-  ASSERT_FALSE(chain.pieces.empty());
-  ASSERT_EQ(chain.gates.size() + 1, chain.pieces.size());
-  ASSERT_EQ(chain.offsets.size(), chain.gates.size());
-  std::int32_t next = 0;
-  for (std::size_t k = 0; k < chain.pieces.size(); ++k) {
-    EXPECT_EQ(chain.pieces[k].first, next);
-    next = chain.pieces[k].end;
-    if (k == chain.gates.size()) break;
-    EXPECT_EQ(chain.gates[k].split, next);
-  }
-  EXPECT_EQ(next, count);
-}
-
 TEST(Mending, WithoutViolationsLeavesTheChain) {
-  Path const path = Profile();
+  Path const path = NoisyProfile();
   Chain const chain = ChainOf(path);
-  Mending mending(path, kShare, chain);
+  Mending mending(path, kChainShare, chain);
   EXPECT_FALSE(mending.Mend({}));
   ASSERT_EQ(mending.Current().pieces.size(), chain.pieces.size());
   for (std::size_t k = 0; k < chain.pieces.size(); ++k) {
@@ -68,10 +29,10 @@ TEST(Mending, WithoutViolationsLeavesTheChain) {
 }
 
 TEST(Mending, SearchesThePieceAndItsNeighboursAndLeavesTheOthers) {
-  Path const path = Profile();
+  Path const path = NoisyProfile();
   Chain const chain = ChainOf(path);
   ASSERT_EQ(chain.pieces.size(), 16U);
-  Mending mending(path, kShare, chain);
+  Mending mending(path, kChainShare, chain);
   ASSERT_TRUE(mending.Mend(BrokenAt(kBroken)));
   Chain const& mended = mending.Current();
   ExpectEveryPointOnce(mended, path.Count());
@@ -89,8 +50,8 @@ TEST(Mending, SearchesThePieceAndItsNeighboursAndLeavesTheOthers) {
 }
 
 TEST(Mending, EndsWhenNoSmallerToleranceIsLeft) {
-  Path const path = Profile();
-  Mending mending(path, kShare, ChainOf(path));
+  Path const path = NoisyProfile();
+  Mending mending(path, kChainShare, ChainOf(path));
   int rounds = 0;
   while (rounds < 100 && mending.Mend(BrokenAt(kBroken))) {
     ++rounds;
@@ -101,9 +62,9 @@ TEST(Mending, EndsWhenNoSmallerToleranceIsLeft) {
 }
 
 TEST(Mending, MendsPlacesThatAreFarApartAtOnce) {
-  Path const path = Profile();
+  Path const path = NoisyProfile();
   Chain const chain = ChainOf(path);
-  Mending mending(path, kShare, chain);
+  Mending mending(path, kChainShare, chain);
   std::vector<Promises::Violation> violations = BrokenAt(1);
   violations.push_back(BrokenAt(14).front());
   ASSERT_TRUE(mending.Mend(violations));

@@ -23,6 +23,13 @@ constexpr double kOnPoint = 1e-6;
 /// So many edges either way are looked at first where strands may run beside each other for long.
 constexpr std::int64_t kFirstReach = 4;
 
+/// Strands of the path touch where they are no farther apart than this share of the sum of their
+/// tolerances: of a fold that is narrower no scan could tell whether its sides meet.
+constexpr double kTouching = 1.0 / 32.0;
+
+/// Halving a step of the path so often leads to where it comes apart from another strand.
+constexpr int kMostHalvings = 40;
+
 /// A loop of the path is more than a knot of noise when one of its points is farther from the
 /// crossing than this many times its tolerance.
 constexpr double kLeavesPlace = 2.0;
@@ -46,6 +53,35 @@ struct Bounds {
     return xLow > other.xHigh || other.xLow > xHigh || yLow > other.yHigh || other.yLow > yHigh;
   }
 };
+
+/// Whether two places on strands are as good as one.
+bool DoTouch(Approach const& one, Approach const& other) {
+  return std::hypot(one.at.x - other.at.x, one.at.y - other.at.y) <=
+         kTouching * (one.tolerance + other.tolerance);
+}
+
+/// The direction of a piece at an end of it; its length does not matter.
+Point DirectionAt(DrawnPiece const& piece, Point const& end) {
+  if (!piece.isArc) return piece.toEnd;
+  return {piece.sense * (piece.centre.y - end.y), piece.sense * (end.x - piece.centre.x)};
+}
+
+/// Whether the second of two neighbours goes back over the first: they turn by more than a right
+/// angle at their joint.
+bool DoFold(DrawnPiece const& before, DrawnPiece const& behind) {
+  Point const in = DirectionAt(before, before.end);
+  Point const out = DirectionAt(behind, behind.start);
+  return in.x * out.x + in.y * out.y < 0.0;
+}
+
+/// How far the second of two neighbours that fold lies on the left of the first, where the shorter
+/// one ends or an arc has turned by a radian.
+double WayBackOnTheLeft(DrawnPiece const& before, DrawnPiece const& behind) {
+  double along = std::min(before.length, behind.length);
+  if (before.isArc) along = std::min(along, before.radius);
+  if (behind.isArc) along = std::min(along, behind.radius);
+  return PlaceOf(before, PointAt(behind, along)).left;
+}
 
 }  // namespace
 
@@ -75,12 +111,16 @@ bool OwnPath::IsWhereThePathCloses(Point const& p) const {
 
 bool OwnPath::Crosses(std::size_t first, std::size_t second, Meeting const& meeting) {
   if (IsWhereThePathCloses(meeting.at) || (IsEdge(first) && IsEdge(second))) return true;
-  Passage const ofFirst = Follow(first, meeting.alongFirst, second);
+  Passage const ofFirst = Follow(first, meeting.alongFirst, second, meeting.at);
   if (ofFirst.StaysOnOneSide()) return false;
-  Passage const ofSecond = Follow(second, meeting.alongSecond, first);
+  Passage const ofSecond = Follow(second, meeting.alongSecond, first, meeting.at);
   if (ofSecond.StaysOnOneSide()) return false;
   if (!ofFirst.IsJoined() && !ofSecond.IsJoined()) {
-    return DoMeet({ofFirst.first, ofFirst.last}, {ofSecond.first, ofSecond.last});
+    Run const firstRun{ofFirst.first, ofFirst.last};
+    Run const secondRun{ofSecond.first, ofSecond.last};
+    return DoMeet(firstRun, secondRun) ||
+           DoTouch(EdgeBeside(meeting.at, firstRun, ofFirst.beyond),
+                   EdgeBeside(meeting.at, secondRun, ofSecond.beyond));
   }
   bool const isAhead = ofFirst.after == Side::Joined || ofSecond.before == Side::Joined;
   bool const isBehind = ofFirst.before == Side::Joined || ofSecond.after == Side::Joined;
@@ -127,7 +167,18 @@ bool OwnPath::HasLoop(Passage const& out, Passage const& back, Point const& at) 
   std::int64_t const reach = coverage_.IsClosed() ? (size - 1 - length) / 2 : size;
   std::int64_t const first = std::max(out.first, out.beyond - reach);
   std::int64_t const last = std::min(back.last, back.beyond + reach) + shift;
-  return DoMeetNear({first, tip}, out.beyond, {tip, last}, back.beyond + shift);
+  Run const wayOut{first, tip};
+  Run const wayBack{tip, last};
+  return DoMeetNear(wayOut, out.beyond, wayBack, back.beyond + shift) ||
+         DoTouch(EdgeBeside(at, wayOut, out.beyond), EdgeBeside(at, wayBack, back.beyond + shift));
+}
+
+Approach OwnPath::EdgeBeside(Point const& at, Run const& run, std::int64_t beyond) const {
+  if (beyond <= run.first || beyond > run.last) return {};
+  WPoint const& from = PointOf(beyond - 1);
+  WPoint const& to = PointOf(beyond);
+  DrawnPiece const edge = DrawSegment(At(from), At(to));
+  return {PointAt(edge, PlaceOf(edge, at).along), std::min(from.w, to.w)};
 }
 
 bool OwnPath::DoMeetNear(Run const& mine, std::int64_t near, Run const& other,
@@ -144,13 +195,14 @@ bool OwnPath::DoMeetNear(Run const& mine, std::int64_t near, Run const& other,
   }
 }
 
-OwnPath::Passage OwnPath::Follow(std::size_t piece, double along, std::size_t other) {
+OwnPath::Passage OwnPath::Follow(std::size_t piece, double along, std::size_t other,
+                                 Point const& at) {
   std::int64_t const beyond = FirstNumberBeyond(piece, along);
   DrawnPiece const drawnOther = coverage_.Drawn(other);
   Strand back{beyond, -1, piece, other, drawnOther};
   Strand forth{beyond - 1, 1, piece, other, drawnOther};
-  Side const before = FollowOneWay(&back);
-  Side const after = FollowOneWay(&forth);
+  Side const before = FollowOneWay(&back, at);
+  Side const after = FollowOneWay(&forth, at);
   return {beyond, back.number, forth.number, before, after};
 }
 
@@ -170,15 +222,35 @@ std::int64_t OwnPath::FirstNumberBeyond(std::size_t piece, double along) const {
   return static_cast<std::int64_t>(low);
 }
 
-OwnPath::Side OwnPath::FollowOneWay(Strand* strand) {
+OwnPath::Side OwnPath::FollowOneWay(Strand* strand, Point from) {
   while (StepOn(strand)) {
     if (--budget_ < 0) return Side::Joined;
     WPoint const& p = PointOf(strand->number);
+    Strand const last = *strand;
     Place place;
     if (!MoveToNearest(strand, At(p), &place)) return Side::Joined;
-    if (place.distance > p.w + widest_[strand->other]) return SideOf(*strand, At(p), place);
+    if (IsApart(*strand, place, p.w)) return SideWhereApart(last, from, p);
+    from = At(p);
   }
   return Side::Unknown;
+}
+
+bool OwnPath::IsApart(Strand const& strand, Place const& place, double w) const {
+  return place.distance > w + widest_[strand.other];
+}
+
+OwnPath::Side OwnPath::SideWhereApart(Strand const& strand, Point const& from,
+                                      WPoint const& p) const {
+  Side side = Side::Unknown;
+  Point at = At(p);
+  for (int halving = 0; halving < kMostHalvings; ++halving) {
+    Strand there = strand;
+    Place place;
+    if (!MoveToNearest(&there, at, &place) || !IsApart(there, place, p.w)) break;
+    side = SideOf(there, at, place);
+    at = {0.5 * (from.x + at.x), 0.5 * (from.y + at.y)};
+  }
+  return side;
 }
 
 bool OwnPath::StepOn(Strand* strand) const {
@@ -221,14 +293,20 @@ bool OwnPath::MoveToNearest(Strand* strand, Point const& p, Place* place) const 
 }
 
 OwnPath::Side OwnPath::SideOf(Strand const& strand, Point const& p, Place const& place) const {
-  double left = place.left;
-  if (place.beside != Beside::Piece) {
-    std::size_t const neighbour = place.beside == Beside::End ? coverage_.Next(strand.other)
-                                                              : coverage_.Previous(strand.other);
-    if (neighbour == kNone) return Side::Unknown;
-    left += PlaceOf(coverage_.Drawn(neighbour), p).left;
+  if (place.beside == Beside::Piece) return place.left > 0.0 ? Side::Left : Side::Right;
+  bool const isBehind = place.beside == Beside::End;
+  std::size_t const neighbour =
+      isBehind ? coverage_.Next(strand.other) : coverage_.Previous(strand.other);
+  if (neighbour == kNone) return Side::Unknown;
+  DrawnPiece const drawn = coverage_.Drawn(neighbour);
+  DrawnPiece const& before = isBehind ? strand.drawnOther : drawn;
+  DrawnPiece const& behind = isBehind ? drawn : strand.drawnOther;
+  if (!DoFold(before, behind)) {
+    return place.left + PlaceOf(drawn, p).left > 0.0 ? Side::Left : Side::Right;
   }
-  return left > 0.0 ? Side::Left : Side::Right;
+  double const wayBack = WayBackOnTheLeft(before, behind);
+  if (std::fabs(wayBack) <= widest_[strand.other] + widest_[neighbour]) return Side::Unknown;
+  return wayBack > 0.0 ? Side::Right : Side::Left;
 }
 
 WPoint const& OwnPath::PointOf(std::int64_t number) const {

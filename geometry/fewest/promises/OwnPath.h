@@ -2,6 +2,7 @@
 
 #include <cstddef>
 #include <cstdint>
+#include <limits>
 #include <vector>
 
 #include "geometry/fewest/promises/Coverage.h"
@@ -10,6 +11,13 @@
 /// Whether the path through the points crosses itself where two pieces do; the rule stands at
 /// Promise::NotCrossing.
 namespace Vorn::Promises {
+
+/// A place on the straight path through the points.
+struct Approach {
+  GeometryUtils::Point at{};
+  /// The smaller one of the two points beside it. Without points it is below everything.
+  double tolerance = -std::numeric_limits<double>::infinity();
+};
 
 class OwnPath {
  public:
@@ -66,11 +74,20 @@ class OwnPath {
   /// Whether the path goes out from a meeting and comes back, leaves the place in between, and
   /// meets itself on the way.
   bool HasLoop(Passage const& out, Passage const& back, GeometryUtils::Point const& at);
-  /// Follows the strand of a piece both ways from a length along it, beside that of the other
-  /// piece.
-  Passage Follow(std::size_t piece, double along, std::size_t other);
-  /// Steps along until the strands are apart, meet or end; the strand is left at the last point.
-  Side FollowOneWay(Strand* strand);
+  /// Follows the strand of a piece both ways from a length along it, where it is at a place, beside
+  /// that of the other piece.
+  Passage Follow(std::size_t piece, double along, std::size_t other,
+                 GeometryUtils::Point const& at);
+  /// Steps along from a place until the strands are apart, meet or end; the strand is left at the
+  /// last point.
+  Side FollowOneWay(Strand* strand, GeometryUtils::Point from);
+  /// Whether a place of a strand is farther from the other one than both tolerances.
+  bool IsApart(Strand const& strand, Place const& place, double w) const;
+  /// On which side the strands come apart on the straight way from a place to the next point p,
+  /// which may lie far beyond: the place on it is taken that is still apart when the way to it is
+  /// halved time and again.
+  Side SideWhereApart(Strand const& strand, GeometryUtils::Point const& from,
+                      WPoint const& p) const;
   /// Goes on to the next point and its piece; false at the end of the path, and on a closed contour
   /// after one round.
   bool StepOn(Strand* strand) const;
@@ -79,7 +96,8 @@ class OwnPath {
   bool MoveToNearest(Strand* strand, GeometryUtils::Point const& p, Place* place) const;
   /// On which side of the other strand p lies; unknown beyond the end of the contour. Outside a
   /// corner, where p is beyond the ends of both pieces, the sum of both deviations has the right
-  /// sign.
+  /// sign. Beyond the tip of a fold, where it may not, p lies on the side away from the way back;
+  /// unknown when that is within tolerances of the way out.
   Side SideOf(Strand const& strand, GeometryUtils::Point const& p, Place const& place) const;
   /// The running number of the first point of a piece that lies beyond a length along it, by
   /// bisection: points are in order but for their noise, which the search around the place takes
@@ -91,6 +109,9 @@ class OwnPath {
   bool DoMeet(Run const& mine, Run const& other);
   /// The same, looked for near a point of each run first.
   bool DoMeetNear(Run const& mine, std::int64_t near, Run const& other, std::int64_t otherNear);
+  /// Where the edge of a run before a point of it passes nearest to a place; without a tolerance
+  /// where the run has no such edge.
+  Approach EdgeBeside(GeometryUtils::Point const& at, Run const& run, std::int64_t beyond) const;
   /// The point of a running number, which may go below zero and above the size.
   WPoint const& PointOf(std::int64_t number) const;
 

@@ -54,21 +54,25 @@ enum class Promise {
   /// No arc has equal angles or comes back to where it starts.
   BelowFullTurn,
   /// Two pieces have no common point but the joint that they share, unless the path through the
-  /// points crosses itself there. Let X be such a point. From X the points of one piece are
-  /// followed both ways, into the neighbouring pieces where need be, until they are farther from
-  /// the other piece (or its neighbours) than their own tolerance and the largest one there. The
-  /// crossing is the path's own
+  /// points crosses itself there. Let X be such a point. From X the straight path through the
+  /// points of one piece is followed both ways, into the neighbouring pieces where need be, until
+  /// it is farther from the other piece (or its neighbours) than the tolerance of its next point
+  /// and the largest one there. The crossing is the path's own
   /// - when they come apart on opposite sides, or
-  /// - when the path ends before they come apart, and the straight lines through the points of the
-  ///   two strands meet, or
+  /// - when it is not known on which side they come apart, since the path ends before or passes the
+  ///   tip of a fold whose ways out and back are within their tolerances of each other, and the
+  ///   straight lines through the points of the two strands meet or touch at X, or
   /// - when the strands run into each other, as at a loop beside a joint, but the path has that
-  ///   loop: the straight lines through the points meet on the way out and back, and a point in
-  ///   between is farther from X than twice its tolerance, or
+  ///   loop: the straight lines through the points meet on the way out and back, or touch at X, and
+  ///   a point in between is farther from X than twice its tolerance, or
   /// - when both pieces are segments from one point of the path to the next: the segments from
   ///   point to point break no promise, whatever the points, so that a contour can always be given,
   ///   or
   /// - when an open path begins and ends there: X is within tolerance of its first and last point,
   ///   though not of all points.
+  /// Lines touch at X where they are no farther apart there than 1/32 of the sum of their
+  /// tolerances, so that a side that is scanned twice without noise does not count by its last
+  /// bits.
   /// It is not when they come apart on one side, or run into each other where all points of the
   /// loop are beside X. Pieces that fold back on each other without passing to the other side do
   /// not cross. Pieces that are nearer than rounding count as touching.

@@ -170,6 +170,31 @@ TEST(CheckCrossings, ManyShortPiecesOnTwoLapsMayBeFollowed) {
   EXPECT_TRUE(CrossingsOf(c).empty());
 }
 
+TEST(CheckCrossings, FarPointsBeyondACornerDoNotHideThatThePathCrosses) {
+  // The last side comes from below, and its end lies below as well, seen from the second side: it
+  // has crossed both.
+  Case c = AlongCorners({{-10, 0}, {10, 0}, {10, 100}, {-50, 100}, {-50, -10}, {0, -10}, {31, 40}},
+                        1, 0.1);
+  for (Elem& elem : c.contour) elem.end.y += 0.01;
+  EXPECT_TRUE(CrossingsOf(c).empty());
+}
+
+TEST(CheckCrossings, StrandsOnOneLineTouch) {
+  // Out, back and out again beside the x axis. The third piece crosses the first at (5, 0) and runs
+  // on past its tip.
+  Case c = AlongCorners({{0, 0}, {10, 0}, {2, 0}, {12, 0}}, 20, 0.1);
+  c.contour = ContourBuilder(0, -0.03).To(10, 0.03).To(2, 0).To(12, 0).Build();
+  for (auto const& [apart, crosses] : {std::pair{0.0, true}, {0.003, true}, {0.02, false}}) {
+    SCOPED_TRACE(testing::Message() << apart << " from side to side");
+    for (std::size_t k = 0; k < c.ranges.size(); ++k) {
+      for (std::int32_t i = c.ranges[k].first; i <= c.ranges[k].last; ++i) {
+        c.points[static_cast<std::size_t>(i)].y = apart * static_cast<double>(k);
+      }
+    }
+    EXPECT_EQ(CrossingsOf(c), crosses ? Pairs() : Pair(0, 2));
+  }
+}
+
 // --- The path does not ---------------------------------------------------------------------------
 
 TEST(CheckCrossings, PiecesThatCrossWhereThePathPassesByAreReported) {
@@ -325,6 +350,34 @@ TEST(CheckCrossings, AClosedContourSharesTheJointAtItsStart) {
        ContourBuilder(3, -4).Around({0, 0}, 3, 4, 1).Around({6, 0}, 3, -4, 1).Build(),
        {{0, 1}, {2, 3}},
        true};
+  EXPECT_TRUE(CrossingsOf(c).empty());
+}
+
+TEST(CheckCrossings, PiecesThatCutOffTheTipOfACuspAreReported) {
+  // A side along the x axis and an arc that leads back below it. The last side passes the tip at
+  // the origin on the right; its piece cuts it off.
+  Case c;
+  c.points = Points({{-10, 0},
+                     {-5, 0},
+                     {0, 0},
+                     {-5, -0.635},
+                     {-10, -2.68},
+                     {-20, -5},
+                     {-20, 5},
+                     {-2, 5},
+                     {0.65, -1.5}},
+                    0.5);
+  c.contour = ContourBuilder(-10, 0)
+                  .To(0, 0)
+                  .Around({0, -20}, -10, -20 + std::sqrt(300.0), 1)
+                  .To(-20, -5)
+                  .To(-20, 5)
+                  .To(-2, 5)
+                  .To(0.2, -1.5)
+                  .Build();
+  c.ranges = {{0, 2}, {3, 4}, {5, 5}, {6, 6}, {7, 7}, {8, 8}};
+  EXPECT_EQ(CrossingsOf(c), (Pairs{{0, 5}, {1, 5}}));
+  c.contour.back().end = {0.8, -1.5};
   EXPECT_TRUE(CrossingsOf(c).empty());
 }
 

@@ -47,6 +47,18 @@ inline double RoundingOf(Scan const& scan) {
   return 1e-14 * extent / least;
 }
 
+/// No joint lies far from the points, in terms of how far these are apart.
+inline void ExpectJointsNear(Scan const& scan, FewestResult const& result) {
+  WPoint const& first = scan.front();
+  double extent = 0.0;
+  for (WPoint const& p : scan) {
+    extent = std::fmax(extent, std::hypot(p.x - first.x, p.y - first.y) + p.w);
+  }
+  for (auto const& elem : result.contour) {
+    EXPECT_LE(std::hypot(elem.end.x - first.x, elem.end.y - first.y), 4.0 * extent);
+  }
+}
+
 /// All that a result promises, measured from the points. What the service says of itself has to
 /// agree with it.
 inline void ExpectPromisesKept(Scan const& scan, FewestOptions const& options,
@@ -54,6 +66,7 @@ inline void ExpectPromisesKept(Scan const& scan, FewestOptions const& options,
   auto const check = CheckPromises<FewestPieces::Range>(
       {scan, result.contour, result.ranges, options.closed, options.largestStep});
   EXPECT_TRUE(check.complaints.empty()) << check.Text();
+  ExpectJointsNear(scan, result);
   EXPECT_NEAR(result.largestDeviation, check.largestRatio, 1e-6 + RoundingOf(scan));
   EXPECT_LE(result.largestDeviation, 1.0);
   EXPECT_GE(result.largestDeviationIndex, 0);

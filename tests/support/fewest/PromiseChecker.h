@@ -394,7 +394,46 @@ class Run {
       for (std::size_t const k : NeighboursOf(i)) add(k, j);
       for (std::size_t const k : NeighboursOf(j)) add(i, k);
     }
+    return PathTouchesNear(a, b, x);
+  }
+
+  /// Whether the path passes x twice as good as in one place: nearer to itself than a sixteenth of
+  /// its tolerances, and it leaves x in between.
+  bool PathTouchesNear(std::size_t a, std::size_t b, Vec x) const {
+    for (std::size_t const i : EdgesPassing(a, x)) {
+      for (std::size_t const j : EdgesPassing(b, x)) {
+        Real const apart = Norm(FootOn(i, x) - FootOn(j, x));
+        bool const isNear = 16 * apart <= LeastToleranceOf(i) + LeastToleranceOf(j);
+        if (i != j && isNear && LeavesBetween(std::min(i, j), std::max(i, j))) return true;
+      }
+    }
     return false;
+  }
+
+  Real LeastToleranceOf(std::size_t edge) const {
+    return std::min(ToleranceAt(edge), ToleranceAt(edge + 1));
+  }
+
+  /// The edges of the points of piece k, a few more at either end, that are no farther from x than
+  /// twice their tolerances.
+  std::vector<std::size_t> EdgesPassing(std::size_t k, Vec x) const {
+    auto const [first, last] = spans_[k];
+    std::size_t const more = 4;
+    std::size_t const count = EdgeCount();
+    std::vector<std::size_t> edges;
+    for (std::size_t number = first + count - more; number <= last + count + more; ++number) {
+      if (!chain_.isClosed && (number < count || number >= 2 * count)) continue;
+      std::size_t const edge = number % count;
+      if (Norm(FootOn(edge, x) - x) <= 2 * LeastToleranceOf(edge)) edges.push_back(edge);
+    }
+    return edges;
+  }
+
+  Vec FootOn(std::size_t edge, Vec p) const {
+    Vec const u = PointAt(edge + 1) - PointAt(edge);
+    Real const length2 = Dot(u, u);
+    Real const share = length2 == 0 ? 0 : Dot(p - PointAt(edge), u) / length2;
+    return PointAt(edge) + std::clamp(share, Real{0}, Real{1}) * u;
   }
 
   std::size_t EdgeCount() const { return chain_.isClosed ? Count() : Count() - 1; }
@@ -438,17 +477,15 @@ class Run {
       return {PointAt(i) + (Cross(PointAt(j) - PointAt(i), v) / det) * u, 0};
     }
     Approach nearest;
-    auto const take = [&](std::size_t point, std::size_t edge, Vec direction) {
+    auto const take = [&](std::size_t point, std::size_t edge) {
       Vec const p = PointAt(point);
-      Real const length2 = Dot(direction, direction);
-      Real const share = length2 == 0 ? 0 : Dot(p - PointAt(edge), direction) / length2;
-      Vec const foot = PointAt(edge) + std::clamp(share, Real{0}, Real{1}) * direction;
+      Vec const foot = FootOn(edge, p);
       if (Norm(p - foot) < nearest.distance) nearest = {Real{0.5} * (p + foot), Norm(p - foot)};
     };
-    take(i, j, v);
-    take(i + 1, j, v);
-    take(j, i, u);
-    take(j + 1, i, u);
+    take(i, j);
+    take(i + 1, j);
+    take(j, i);
+    take(j + 1, i);
     return nearest;
   }
 
