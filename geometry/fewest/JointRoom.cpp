@@ -11,9 +11,9 @@ namespace {
 /// In gaps wider than this many times the sum of the tolerances directions are known to 1/8.
 constexpr double kWideGap = 8.0;
 
-/// Cosine of the sharpest turn of a corner between two points, 120 degrees: a path that turns by
-/// more has another side there.
-constexpr double kSharpestCosine = -0.5;
+/// Cosine of the sharpest turn of a corner between two points, 150 degrees: a path that turns by
+/// more has another side there, and the lines meet far out.
+constexpr double kSharpestCosine = -0.8660254037844387;
 
 /// Cosine of the largest turn, 30 degrees, of a path that runs on.
 constexpr double kRunningOn = 0.8660254037844387;
@@ -37,7 +37,7 @@ double Length(Way const& way) { return std::sqrt(Dot(way, way)); }
 
 /// How high above a gap, in gaps and positive to the left, the lines through the ways before and
 /// behind it meet on the way ahead; 0 where they do not, or where the corner would be too sharp. At
-/// most sin(60)^2 / sin(120) = 0.87.
+/// most sin(75)^2 / sin(150) = 1.87.
 double HeightOfCorner(Way const& before, Way const& gap, Way const& behind) {
   double const turn = Cross(before, behind);
   double const turnIn = Cross(before, gap);

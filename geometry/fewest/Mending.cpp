@@ -18,9 +18,9 @@ struct Tightness {
 };
 
 /// A little room is often enough and costs no piece. Segments keep to the path between the points.
-constexpr Tightness kTightness[] = {{1.0, 1.0, false},  {0.93, 1.0, false}, {0.8, 0.5, false},
-                                    {0.6, 0.25, false}, {0.4, 0.0, false},  {0.8, 0.0, true},
-                                    {0.2, 0.0, true},   {0.05, 0.0, true}};
+constexpr Tightness kTightness[] = {{1.0, 1.0, false}, {0.93, 1.0, false}, {1.0, 0.0, false},
+                                    {0.8, 0.5, false}, {0.6, 0.25, false}, {0.4, 0.0, false},
+                                    {0.8, 0.0, true},  {0.2, 0.0, true},   {0.05, 0.0, true}};
 
 /// Multiplies the tolerances of a stretch but for its first and last points: the joints beside them
 /// stay where they are, perhaps at the very edge of what these allow.

@@ -36,7 +36,7 @@ std::map<std::string, std::uint64_t> const kRecordedSections = {
     {"mixedFits", 0x34c636288ac6f106},
     {"mixedCellsFits", 0x3182adf4338e28c3},
     {"singleArcFits", 0x5324a08db19385a4},
-    {"fewestProfiles", 0x9c556dfdb4488a2e},
+    {"fewestProfiles", 0xad03a5854a87c5c4},
     {"fewestScans", 0x96a6f8d16484dece},
     {"fewestScribbles", 0x49c8cb0d53d7051b},
     {"angles", 0x51a1950d86935987},

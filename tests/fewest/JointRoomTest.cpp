@@ -65,12 +65,12 @@ TEST(RoomForJoint, HasNoCornerWhereTheLinesMeetElsewhere) {
   ExpectRoom(PathThrough({{-10, 0}, {0, 0}, {10, 0}, {10, 10}, {20, 10}, {30, 10}}), room, room);
 }
 
-TEST(RoomForJoint, HasNoCornerSharperThan120Degrees) {
+TEST(RoomForJoint, HasNoCornerThatTurnsByMoreThan150Degrees) {
   double const room = PlainRoom(2.0);
-  // Symmetric about x = 0: the lines meet at a depth of the tangent of their slope, 59.5 and 60.5
+  // Symmetric about x = 0: the lines meet at a depth of the tangent of their slope, 74.5 and 75.5
   // degrees, and turn by twice that.
-  double const flat = std::tan(59.5 / 180.0 * std::numbers::pi);
-  double const steep = std::tan(60.5 / 180.0 * std::numbers::pi);
+  double const flat = std::tan(74.5 / 180.0 * std::numbers::pi);
+  double const steep = std::tan(75.5 / 180.0 * std::numbers::pi);
   auto const bowl = [](double slope) {
     return PathThrough({{-3, 2 * slope}, {-2, slope}, {-1, 0}, {1, 0}, {2, slope}, {3, 2 * slope}});
   };

@@ -489,10 +489,15 @@ class Run {
     return nearest;
   }
 
-  /// Whether two edges are no farther apart than four of their tolerances.
+  /// Whether two edges are no farther apart than four of their tolerances, or than a joint may lie
+  /// off a wide gap.
   bool AreNear(std::size_t i, std::size_t j) const {
-    return NearestOf(i, j).distance <= 4 * std::max(std::max(ToleranceAt(i), ToleranceAt(i + 1)),
-                                                    std::max(ToleranceAt(j), ToleranceAt(j + 1)));
+    return NearestOf(i, j).distance <= std::max(RoomBeside(i), RoomBeside(j));
+  }
+  Real RoomBeside(std::size_t edge) const {
+    Real const w = std::max(ToleranceAt(edge), ToleranceAt(edge + 1));
+    Real const length = Norm(PointAt(edge + 1) - PointAt(edge));
+    return length > 16 * w ? 4 * w + 0.134L * length : 4 * w;
   }
 
   bool DoEdgesMeet(std::size_t i, std::size_t j) const {
