@@ -15,14 +15,7 @@ Chain ChainOf(Path const& path, PlacedCircle const& circle, double ratio) {
 }  // namespace
 
 PlacedCircle AlongPath(Path const& path, PlacedCircle const& circle) {
-  double advance = 0.0;
-  for (std::int32_t i = 1; i < path.Count(); ++i) {
-    WPoint const& p = path.At(i - 1);
-    WPoint const& q = path.At(i);
-    Place const gradient = GradientAt(circle, {p.x, p.y});
-    advance += gradient.y * (q.x - p.x) - gradient.x * (q.y - p.y);
-  }
-  return advance < 0.0 ? Scaled(circle, -1.0) : circle;
+  return AdvanceAlong(path, circle, 0, path.Count(), 1) < 0.0 ? Scaled(circle, -1.0) : circle;
 }
 
 std::vector<Chain> MakeOnePiece(Path const& path, PlacedCircle const& covering) {

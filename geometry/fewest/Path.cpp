@@ -44,6 +44,18 @@ WPoint const& Tightest(std::vector<WPoint> const& points) {
                            [](WPoint const& p, WPoint const& q) { return p.w < q.w; });
 }
 
+double AdvanceAlong(Path const& path, PlacedCircle const& circle, std::int32_t first,
+                    std::int32_t last, std::int32_t step) {
+  double advance = 0.0;
+  for (std::int32_t i = first; i + 1 < last; i += step) {
+    WPoint const& p = path.At(i);
+    WPoint const& q = path.At(std::min(i + step, last - 1));
+    Place const gradient = GradientAt(circle, {p.x, p.y});
+    advance += gradient.y * (q.x - p.x) - gradient.x * (q.y - p.y);
+  }
+  return advance;
+}
+
 std::int32_t StrideFrom(Path const& path, std::int32_t point) {
   WPoint const& from = path.At(point);
   std::int32_t const count = path.Count();

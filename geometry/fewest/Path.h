@@ -68,6 +68,11 @@ WPoint const& Tightest(std::vector<WPoint> const& points);
 /// about direction or order. Every "few points" of the search counts in these strides.
 std::int32_t StrideFrom(Path const& path, std::int32_t point);
 
+/// How far a circle advances with the points [first, last), of which the first, every `step`th and
+/// the last are looked at; below 0 where they run against it.
+double AdvanceAlong(Path const& path, PlacedCircle const& circle, std::int32_t first,
+                    std::int32_t last, std::int32_t step);
+
 /// The gate in the middle of the gap before point `split`, square to the path, which is that of
 /// `before`, the piece before it, where the points are too dense to tell.
 Gate MiddleGate(Path const& path, std::int32_t split, PlacedCircle const& before);

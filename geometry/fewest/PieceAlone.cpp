@@ -11,13 +11,22 @@ namespace {
 /// Strides at which the search for the longest run begins.
 constexpr std::int32_t kFirstStrides = 16;
 
+/// By so many steps at most it is told in which sense points run along a circle.
+constexpr std::int32_t kSteps = 32;
+
 }  // namespace
 
 PieceFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last) {
   UseRows(first, last);
   Circle const chord = LineThrough(PlaceOf(frame_.ToLocal(path_.At(first))),
                                    PlaceOf(frame_.ToLocal(path_.At(last - 1))));
-  return FitRows({chord, 0.0, false});
+  PieceFit fit = FitRows({chord, 0.0, false});
+  // The chord of an arc beyond half a turn runs against it, and so may a circle found from there.
+  std::int32_t const step = (last - first - 1) / kSteps + 1;
+  if (AdvanceAlong(path_, fit.circle, first, last, step) < 0.0) {
+    fit.circle = Scaled(fit.circle, -1.0);
+  }
+  return fit;
 }
 
 PieceFit PieceSearch::FitAlone(std::int32_t first, std::int32_t last, PieceFit const& start) {

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <limits>
 #include <numbers>
 
 #include "geometry/fewest/DenseOrder.h"
@@ -91,8 +92,9 @@ PieceRules::Check PieceRules::AddBrokenOrder(Circle const& circle, Ends const& e
   Place gradient = GradientAt(circle, p);
   double here2 = gradient.x * gradient.x + gradient.y * gradient.y;
   // Points behind the joint are as far along as the joint.
-  double const start =
-      ends.from->isFree ? 0.0 : AdvanceTo(gradient, p, frame_.ToLocal(ends.from->gate.origin));
+  double const start = ends.from->isFree
+                           ? -std::numeric_limits<double>::infinity()
+                           : AdvanceTo(gradient, p, frame_.ToLocal(ends.from->gate.origin));
   double reach = std::max(0.0, start) - noise * path_.At(ends.first).w;
   for (std::int32_t i = ends.first + 1; i < ends.end; ++i) {
     WPoint const& next = path_.At(i);

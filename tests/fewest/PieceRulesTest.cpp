@@ -86,6 +86,21 @@ TEST(PieceRules, AStepBackIsNoiseUpTo165OfBothTolerances) {
   }
 }
 
+TEST(PieceRules, DensePointsThatRunAgainstTheCircleAreNotInOrder) {
+  // Every step is a tenth of a tolerance, and the first point is not at a joint.
+  for (std::int32_t const count : {50, 3000}) {
+    Path path;
+    for (std::int32_t i = 0; i < count; ++i) {
+      double const angle = -0.001 * i;
+      path.points.push_back({std::cos(angle), std::sin(angle), 0.01});
+    }
+    path.leastTolerance = 0.01;
+    for (double const scale : kScales) {
+      EXPECT_EQ(AskOrder(path, scale).check, Check::Added) << count << " points";
+    }
+  }
+}
+
 TEST(PieceRules, TheWorstStepBackIsTheOneThatIsAdded) {
   for (double const scale : kScales) {
     Path const path = OnUnitCircle({0, 20, 15, 30, 20, 40, 35}, 0.01);
