@@ -19,8 +19,9 @@ constexpr double kRadiusRounding = 1e-9;
 /// How often the places are repaired at which a chain breaks promises.
 constexpr int kMostRepairs = 24;
 
-/// So many points on either side of a broken promise the path is followed at first.
-constexpr std::int32_t kLeastReach = 4;
+/// So many points on either side of a broken promise the path is followed at first, twice as many
+/// every other time.
+constexpr std::int32_t kFirstReach = 4;
 
 }  // namespace
 
@@ -56,7 +57,7 @@ bool Keeping::KeepsRetraced(RotatedPath const& path, Chain const& chain, Answer*
     if (Keeps(path, retracing.Current(), answer, report)) {
       return KeepsCentred(path, retracing.Current(), answer, report);
     }
-    std::int32_t const reach = kLeastReach << (round / 2);
+    std::int32_t const reach = kFirstReach << (round / 2);
     std::vector<std::int32_t> const places = PlacesOf(*report, retracing.Current(), path.rotation);
     if (!retracing.Follow(places, reach)) return false;
   }

@@ -17,7 +17,8 @@ struct Tightness {
   bool segmentsOnly;
 };
 
-/// A little room is often enough and costs no piece. Segments keep to the path between the points.
+/// A little room is often enough and costs no piece; without room for joints pieces stay near the
+/// path, within all of their tolerances. Segments keep to the path between the points.
 constexpr Tightness kTightness[] = {{1.0, 1.0, false}, {0.93, 1.0, false}, {1.0, 0.0, false},
                                     {0.8, 0.5, false}, {0.6, 0.25, false}, {0.4, 0.0, false},
                                     {0.8, 0.0, true},  {0.2, 0.0, true},   {0.05, 0.0, true}};

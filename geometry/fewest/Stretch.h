@@ -64,6 +64,7 @@ class Splicing {
  private:
   /// Takes the pieces up to `end` that are not taken yet.
   void KeepUpTo(std::size_t end);
+  /// Takes the gate behind a piece; the last piece has none.
   void AddGateBehind(std::size_t piece);
 
   Chain const& chain_;

@@ -181,7 +181,7 @@ TEST(FewestPiecesOfSparsePoints, JointsStayNearTheirGap) {
         scan, FitKept(scan),
         [](GeometryUtils::Point const& joint, WPoint const& p, WPoint const& q) {
           double const gap = std::hypot(q.x - p.x, q.y - p.y);
-          // 0.87 where lines of three points meet, which random places hardly ever give.
+          // 1.87 where lines of three points meet, which random places hardly ever give.
           double const room = gap > 16.0 * kTolerance ? 0.134 * gap + 2.001 * kTolerance : 100.0;
           return DistanceFromWay(joint, p, q) - room;
         });

@@ -73,9 +73,9 @@ enum class Promise {
   /// Lines touch at X where they are no farther apart there than 1/32 of the sum of their
   /// tolerances, so that a side that is scanned twice without noise does not count by its last
   /// bits.
-  /// It is not when they come apart on one side, or run into each other where all points of the
-  /// loop are beside X. Pieces that fold back on each other without passing to the other side do
-  /// not cross. Pieces that are nearer than rounding count as touching.
+  /// The crossing is not the path's own when they come apart on one side, or run into each other
+  /// where all points of the loop are beside X. Pieces that fold back on each other without passing
+  /// to the other side do not cross. Pieces that are nearer than rounding count as touching.
   NotCrossing,
 };
 

@@ -397,13 +397,14 @@ class Run {
     return PathTouchesNear(a, b, x);
   }
 
-  /// Whether the path passes x twice as good as in one place: nearer to itself than a sixteenth of
-  /// its tolerances, and it leaves x in between.
+  /// Whether the path passes x twice as good as in one place: nearer to itself than 1/32 of the
+  /// sum of its tolerances, and it leaves x in between.
   bool PathTouchesNear(std::size_t a, std::size_t b, Vec x) const {
     for (std::size_t const i : EdgesPassing(a, x)) {
       for (std::size_t const j : EdgesPassing(b, x)) {
         Real const apart = Norm(FootOn(i, x) - FootOn(j, x));
-        bool const isNear = 16 * apart <= LeastToleranceOf(i) + LeastToleranceOf(j);
+        bool const isNear =
+            32 * apart <= (LeastToleranceOf(i) + LeastToleranceOf(j)) * (1 + kSlack);
         if (i != j && isNear && LeavesBetween(std::min(i, j), std::max(i, j))) return true;
       }
     }
@@ -418,8 +419,8 @@ class Run {
   /// twice their tolerances.
   std::vector<std::size_t> EdgesPassing(std::size_t k, Vec x) const {
     auto const [first, last] = spans_[k];
-    std::size_t const more = 4;
     std::size_t const count = EdgeCount();
+    std::size_t const more = std::min<std::size_t>(4, count);
     std::vector<std::size_t> edges;
     for (std::size_t number = first + count - more; number <= last + count + more; ++number) {
       if (!chain_.isClosed && (number < count || number >= 2 * count)) continue;
